@@ -1,0 +1,29 @@
+# How every target of Plume is built: warnings are errors, sanitizers come from PLUME_SANITIZE.
+
+add_library(plume_options INTERFACE)
+target_compile_options(plume_options INTERFACE
+  -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wsign-conversion -Wnon-virtual-dtor -Woverloaded-virtual
+  -Wimplicit-fallthrough -Werror)
+if(PLUME_SANITIZE)
+  target_compile_options(plume_options INTERFACE
+    -fsanitize=${PLUME_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+  target_link_options(plume_options INTERFACE -fsanitize=${PLUME_SANITIZE})
+endif()
+
+# plume_library(<name> SOURCES <files…> SEES <libraries…>)
+# One library a folder. SEES lists the layers whose headers it may include; tools/check_layers.py holds it to that.
+function(plume_library name)
+  cmake_parse_arguments(LIB "" "" "SOURCES;SEES" ${ARGN})
+  add_library(${name} STATIC ${LIB_SOURCES})
+  target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/src)
+  target_link_libraries(${name} PUBLIC ${LIB_SEES} PRIVATE plume_options)
+endfunction()
+
+# plume_test(<name> SOURCES <files…> SEES <libraries…>)
+function(plume_test name)
+  cmake_parse_arguments(TEST "" "" "SOURCES;SEES" ${ARGN})
+  add_executable(${name} ${TEST_SOURCES})
+  target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR})
+  target_link_libraries(${name} PRIVATE ${TEST_SEES} plume_options GTest::gmock GTest::gtest_main)
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST WORKING_DIRECTORY ${CMAKE_SOURCE_DIR})
+endfunction()

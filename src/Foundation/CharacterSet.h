@@ -1,0 +1,54 @@
+// An immutable set of characters with set algebra; copies share their storage.
+//
+// Membership of a UTF-16 unit is one look-up in a bitmap of the basic plane, fit for the road of a keystroke;
+// characters beyond it are kept too. May be used from any thread.
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace plume {
+
+class CharacterSet {
+  public:
+    // The empty set.
+    CharacterSet();
+
+    static CharacterSet withCharacters(std::u16string_view characters);
+    // All code points from first to last, both included.
+    static CharacterSet withRange(char32_t first, char32_t last);
+
+    // The platform's standard sets. Letters are L* and M*, lower case Ll, upper case Lu and Lt, alphanumerics L*, M*
+    // and N*, decimal digits Nd, white space Zs and tab, newlines U+000A to U+000D, U+0085, U+2028 and U+2029.
+    static const CharacterSet& letters();
+    static const CharacterSet& lowercaseLetters();
+    static const CharacterSet& uppercaseLetters();
+    static const CharacterSet& alphanumerics();
+    static const CharacterSet& decimalDigits();
+    static const CharacterSet& whitespaces();
+    static const CharacterSet& newlines();
+    static const CharacterSet& whitespacesAndNewlines();
+
+    // O(1). A surrogate unit is a member only when it was put in as such.
+    bool contains(char16_t unit) const;
+    bool contains(char32_t codePoint) const;
+    bool isEmpty() const;
+
+    CharacterSet united(const CharacterSet& other) const;
+    CharacterSet intersected(const CharacterSet& other) const;
+    CharacterSet subtracting(const CharacterSet& other) const;
+    CharacterSet inverted() const;
+
+    // Every member as text, in code-point order. Meant for the small sets a user writes, not for `letters()`.
+    std::u16string characters() const;
+
+    bool operator==(const CharacterSet& other) const;
+
+  private:
+    struct Storage;
+    explicit CharacterSet(std::shared_ptr<const Storage> storage);
+    std::shared_ptr<const Storage> storage_;
+};
+
+}  // namespace plume

@@ -1,0 +1,19 @@
+// Find-and-replace on the clipboard's content for clipboard placeholders.
+#pragma once
+
+#include <string>
+
+#include "Foundation/AttributedString.h"
+#include "content/ContentEnvironment.h"
+#include "content/SnippetVariable.h"
+
+namespace plume {
+
+// The content after find-and-replace. A pattern that does not compile, or takes more than the keystroke's road allows,
+// leaves the content unchanged and is reported, once for each pattern.
+std::u16string processClipboardVariable(const SnippetClipboardVariable& variable, const std::u16string& content,
+                                        const ContentEnvironment& environment);
+AttributedString processClipboardVariable(const SnippetClipboardVariable& variable, const AttributedString& content,
+                                          const ContentEnvironment& environment);
+
+}  // namespace plume

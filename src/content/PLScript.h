@@ -1,0 +1,40 @@
+// A script cut out of a content, or the content of a script snippet: run it, and its output is the text to deliver.
+//
+// Made on the thread that sends, then handed to a background thread that calls execute(); one thread at a time has it.
+#pragma once
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "Foundation/ZDEvent.h"
+#include "content/SnippetVariable.h"
+
+namespace plume {
+
+class ScriptRunner;
+
+class PLScript {
+  public:
+    using Text = std::optional<std::u16string>;
+
+    // Raised by execute(), on its thread, when the script has run.
+    ZDEvent<PLScript> executed;
+
+    std::shared_ptr<SnippetAbbreviationVariable> snippetVariable;
+    bool isAppleScript = false;
+    // Where the output goes: an index into the expanded content, or, for a nested script, into the parent's text.
+    std::size_t location = 0;
+    std::u16string script;  // with nested scripts cut out
+    std::vector<std::shared_ptr<PLScript>> nestedScripts;
+    Text result;
+    Text suffix;  // appended to an output that is not empty
+
+    // Runs the nested scripts in order, puts their results into the text, runs it, sets `result`. Blocks.
+    void execute(ScriptRunner& runner);
+    // Puts the nested results into `script`.
+    void mergerNestedScriptResults();
+};
+
+}  // namespace plume

@@ -1,0 +1,36 @@
+// The arguments of the input service's events. A listener swallows a key by setting `cancel`.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "input/GeneralHotKey.h"
+
+namespace plume {
+
+struct ZDCancelEventArgs {
+    bool cancel = false;
+};
+
+struct ZDKeyEventArgs : ZDCancelEventArgs {
+    std::uint16_t key = 0;            // virtual key code
+    char16_t c = 0;                   // first unit of `s`; 0 when there is none
+    std::optional<std::u16string> s;  // what the key produces
+};
+
+struct ZDMouseEventArgs : ZDCancelEventArgs {
+    double x = 0;
+    double y = 0;
+};
+
+struct ZDHotKeysPressedEventArgs : ZDCancelEventArgs {
+    std::vector<GeneralHotKey> hotKeys;
+};
+
+struct ZDUnregisteredHotKeyPressedEventArgs : ZDKeyEventArgs {
+    GeneralHotKey hotKey;
+};
+
+}  // namespace plume

@@ -1,0 +1,41 @@
+// The engine's view of the input service: the events it hears, and what it asks about the last one.
+//
+// Owned by the composition root and outlives the engine. Everything here belongs to the thread that delivers the key
+// events; the key events are raised synchronously, inside the callback that decides whether the key is swallowed.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+
+#include "Foundation/ZDEvent.h"
+#include "input/EventArgs.h"
+#include "platform/ProcessManager.h"
+#include "platform/RunLoop.h"
+
+namespace plume {
+
+// The keyboard went to another program, or a shortcut may have changed the text.
+struct InputContextChange {};
+
+class InputService {
+  public:
+    ZDEvent<ZDKeyEventArgs> keyDownEvent;
+    ZDEvent<InputContextChange> inputContextChangedEvent;
+    ZDEvent<ZDMouseEventArgs> mouseDownEvent;
+    ZDEvent<ZDUnregisteredHotKeyPressedEventArgs> unregisteredHotKeyPressedEvent;
+
+    virtual ~InputService() = default;
+
+    // The modifiers held now (KeyModifier bits).
+    virtual std::int32_t keyModifier() const = 0;
+    // The last key went to Plume itself.
+    virtual bool isSameProcess() const = 0;
+    virtual ProcessSerialNumber lastProcessReceivedKeyEvent() const = 0;
+    // What a key code produces with the modifiers of these event flags.
+    virtual std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const = 0;
+    // The loop of the thread that delivers the key events.
+    virtual RunLoop& runLoop() = 0;
+};
+
+}  // namespace plume

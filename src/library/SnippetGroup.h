@@ -1,0 +1,138 @@
+// An ordered group of snippets with the settings that say when and where they expand.
+//
+// Groups are shared by std::shared_ptr and own their snippets. All operations belong to the thread that owns the
+// library. Whoever keeps something derived from the snippets (an index) observes the group.
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "Foundation/CharacterSet.h"
+#include "Foundation/Date.h"
+#include "Foundation/KeyedCoding.h"
+#include "Foundation/Uuid.h"
+#include "library/PLFunctionAvailability.h"
+#include "library/Snippet.h"
+
+namespace plume {
+
+// What must stand before the abbreviation.
+enum class ExpandAfter : std::int32_t { Delimiter = 0, Whitespace = 1, Anything = 2, Digits = 3 };
+// When the abbreviation expands.
+enum class ExpandTrigger : std::int32_t {
+    Immediately = 0,
+    DelimiterKept = 1,
+    DelimiterSwallowed = 2,
+    Never = 3,
+    HotKey = 4
+};
+
+// Told of a change right after it, on the thread that made it. Observers are not owned.
+class SnippetGroupObserver {
+  public:
+    virtual ~SnippetGroupObserver() = default;
+    // `snippet` stands in `items` with another abbreviation than before.
+    virtual void abbreviationChanged(SnippetGroup& group, Snippet& snippet) = 0;
+    // `items` [first, first + count) are new, all others unchanged.
+    virtual void itemsAdded(SnippetGroup& group, std::size_t first, std::size_t count) = 0;
+    // `snippet` stands in `items` no more.
+    virtual void itemRemoved(SnippetGroup& group, Snippet& snippet) = 0;
+    // `abbreviationPrefix`, `expandTrigger` or `delimiters` changed.
+    virtual void matchingSettingsChanged(SnippetGroup& group) = 0;
+};
+
+class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_this<SnippetGroup> {
+  public:
+    using Text = std::optional<std::u16string>;
+
+    static std::shared_ptr<SnippetGroup> make();
+    // Reads an archived group with its snippets; nothing that the archive holds or lacks makes it fail.
+    static std::shared_ptr<SnippetGroup> makeWithCoder(const KeyedDecoder& coder);
+    SnippetGroup(const SnippetGroup&) = delete;
+    SnippetGroup& operator=(const SnippetGroup&) = delete;
+
+    // Nothing when an archive held a string that is no UUID.
+    const std::optional<Uuid>& uuid() const { return uuid_; }
+    const std::optional<Date>& dateCreated() const { return dateCreated_; }
+
+    const Text& name() const { return name_; }
+    void setName(Text name) { name_ = std::move(name); }
+
+    const std::vector<std::shared_ptr<Snippet>>& items() const { return items_; }
+    void addItem(const std::shared_ptr<Snippet>& snippet);
+    void addItems(const std::vector<std::shared_ptr<Snippet>>& snippets);
+    // An index past the end appends.
+    void insertItem(const std::shared_ptr<Snippet>& snippet, std::size_t index);
+    // No error when the snippet is not listed. Its parentGroup is cleared when it is this group.
+    void removeItem(const std::shared_ptr<Snippet>& snippet);
+
+    ExpandAfter expandAfter() const { return expandAfter_; }
+    void setExpandAfter(ExpandAfter value) { expandAfter_ = value; }
+    // Nil stands for the default delimiters.
+    const std::optional<CharacterSet>& expandAfterDelimiters() const { return expandAfterDelimiters_; }
+    void setExpandAfterDelimiters(std::optional<CharacterSet> set) { expandAfterDelimiters_ = std::move(set); }
+    ExpandTrigger expandTrigger() const { return expandTrigger_; }
+    void setExpandTrigger(ExpandTrigger value);
+    // Nil stands for the default delimiters.
+    const std::optional<CharacterSet>& delimiters() const { return delimiters_; }
+    void setDelimiters(std::optional<CharacterSet> set);
+    CaseSensitivity caseSensitivity() const { return caseSensitivity_; }
+    void setCaseSensitivity(CaseSensitivity value) { caseSensitivity_ = value; }
+    bool showInMenuBar() const { return showInMenuBar_; }
+    void setShowInMenuBar(bool value) { showInMenuBar_ = value; }
+    bool suggestAbbreviations() const { return suggestAbbreviations_; }
+    void setSuggestAbbreviations(bool value) { suggestAbbreviations_ = value; }
+    const Text& abbreviationPrefix() const { return abbreviationPrefix_; }
+    void setAbbreviationPrefix(Text prefix);
+    bool hasAbbreviationPrefix() const;
+    PLFunctionAvailability& availability() { return availability_; }
+    const PLFunctionAvailability& availability() const { return availability_; }
+    bool resetFormatting() const { return resetFormatting_; }
+    void setResetFormatting(bool value) { resetFormatting_ = value; }
+
+    // A new group with the name, the prefix and the settings, and duplicates of the snippets when asked for.
+    std::shared_ptr<SnippetGroup> copySnippetGroup(bool withItems) const;
+    void copySettingsFromGroup(const SnippetGroup& other);
+
+    // The first snippet with exactly this abbreviation, the prefix not considered; null when there is none.
+    std::shared_ptr<Snippet> findSnippetWithAbbreviation(std::u16string_view abbreviation) const;
+
+    // Typed Return arrives as U+000D: a set with line feed gets that instead.
+    static std::optional<CharacterSet> replaceNewlineCharacterByCarriageReturnCharacter(
+        const std::optional<CharacterSet>& set);
+
+    void addGroupObserver(SnippetGroupObserver* observer);
+    void removeGroupObserver(SnippetGroupObserver* observer);
+
+    std::string_view archiveClassName() const override { return "SnippetGroup"; }
+    void encodeWithCoder(KeyedEncoder& coder) const override;
+
+  private:
+    friend class Snippet;
+    SnippetGroup();
+    // From a snippet whose parentGroup this is, whether it is listed or not.
+    void snippetAbbreviationChanged(Snippet& snippet);
+    void notifyMatchingSettingsChanged();
+
+    std::optional<Uuid> uuid_;
+    std::optional<Date> dateCreated_;
+    Text name_;
+    std::vector<std::shared_ptr<Snippet>> items_;
+    ExpandAfter expandAfter_ = ExpandAfter::Delimiter;
+    std::optional<CharacterSet> expandAfterDelimiters_;
+    ExpandTrigger expandTrigger_ = ExpandTrigger::Immediately;
+    std::optional<CharacterSet> delimiters_;
+    CaseSensitivity caseSensitivity_ = CaseSensitivity::CaseSensitive;
+    bool showInMenuBar_ = true;
+    bool suggestAbbreviations_ = true;
+    Text abbreviationPrefix_;
+    PLFunctionAvailability availability_;
+    bool resetFormatting_ = false;
+    std::vector<SnippetGroupObserver*> observers_;
+};
+
+}  // namespace plume

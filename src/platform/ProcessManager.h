@@ -1,0 +1,37 @@
+// Who is running, and who has the keyboard.
+#pragma once
+
+#include <compare>
+#include <cstdint>
+#include <optional>
+#include <string>
+
+namespace plume {
+
+// Names a process for as long as the session lives; 0/0 names none.
+struct ProcessSerialNumber {
+    std::uint32_t highLongOfPSN = 0;
+    std::uint32_t lowLongOfPSN = 0;
+
+    auto operator<=>(const ProcessSerialNumber&) const = default;
+};
+
+// What the system knows of a running application.
+struct RunningApplication {
+    std::int64_t processIdentifier = 0;
+    std::optional<std::u16string> bundleIdentifier;
+    std::optional<std::u16string> localizedName;
+};
+
+// Called on the tap thread for every key, so answers come from what is already known and never wait for a program.
+class ProcessManager {
+  public:
+    virtual ~ProcessManager() = default;
+    virtual ProcessSerialNumber currentProcess() const = 0;
+    // The process that has the keyboard, or nothing.
+    virtual std::optional<ProcessSerialNumber> frontProcess() const = 0;
+    // Nothing when the process is gone or is no application.
+    virtual std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const = 0;
+};
+
+}  // namespace plume
