@@ -1,0 +1,196 @@
+// How long a key waits for the matcher, by the size of the library.
+#include <cstdlib>
+#include <memory>
+#include <new>
+#include <random>
+#include <string>
+#include <vector>
+
+#include "bench/Figures.h"
+#include "engine/SnippetMatcher.h"
+
+namespace {
+std::size_t allocations = 0;
+}
+
+void* operator new(std::size_t size) {
+    ++allocations;
+    if (void* memory = std::malloc(size ? size : 1)) return memory;
+    throw std::bad_alloc();
+}
+void operator delete(void* memory) noexcept {
+    std::free(memory);
+}
+void operator delete(void* memory, std::size_t) noexcept {
+    std::free(memory);
+}
+
+namespace plume::bench {
+namespace {
+
+constexpr std::size_t GroupCount = 20;
+
+struct Editor final : MatchContext {
+    std::optional<std::u16string> bundleIdentifier() const override { return u"org.example.editor"; }
+    std::optional<std::u16string> inputSourceIdentifier() const override { return u"us"; }
+};
+
+class Library {
+  public:
+    explicit Library(std::size_t size) {
+        for (std::size_t i = 0; i < GroupCount; ++i) groups.push_back(makeGroup(i));
+        for (std::size_t i = 0; i < size; ++i) {
+            groups[i % GroupCount]->addItem(std::make_shared<Snippet>(randomAbbreviation(), u"content"));
+        }
+    }
+
+    // Three to twelve letters or digits, the first one never a vowel: what people make up.
+    std::u16string randomAbbreviation() {
+        std::u16string text(1, u"bcdfghjklmnpqrstvwxz"[random() % 20]);
+        for (std::size_t length = 2 + random() % 10; length > 0; --length) {
+            text += u"abcdefghijklmnopqrstuvwxyz0123456789"[random() % 36];
+        }
+        return text;
+    }
+
+    std::vector<std::shared_ptr<SnippetGroup>> groups;
+    std::mt19937 random{20};  // the same library in every run
+
+  private:
+    // A quarter with a prefix, a tenth limited to applications, half expanding at a delimiter.
+    static std::shared_ptr<SnippetGroup> makeGroup(std::size_t i) {
+        const auto group = SnippetGroup::make();
+        group->setExpandTrigger(i % 2 == 0 ? ExpandTrigger::Immediately : ExpandTrigger::DelimiterKept);
+        group->setExpandAfter(static_cast<ExpandAfter>(i % 3));
+        if (i % 4 == 1) group->setAbbreviationPrefix(i % 8 == 1 ? u";" : u";;");
+        if (i % 10 == 4) {
+            group->availability().availability = PLFunctionAvailability::OnlyListed;
+            group->availability().applications = {{u"org.example.editor", u"org.example.mail"}};
+        }
+        return group;
+    }
+};
+
+CharacterSet defaultDelimiters() {
+    return CharacterSet::withCharacters(u" \t\r.!?,;:-\"'(){}[]/\\&+*=<>%^#_@$`|~");
+}
+
+// Words of a person, none of which is an abbreviation: vowels come first in each, and never a digit.
+std::u16string prose(std::size_t length, std::mt19937& random) {
+    std::u16string text;
+    while (text.size() < length) {
+        text += u"aeiou"[random() % 5];
+        for (std::size_t n = 1 + random() % 7; n > 0; --n) text += u"abcdefghijklmnopqrstuvwxyz"[random() % 26];
+        text += random() % 8 ? u" " : u", ";
+    }
+    return text;
+}
+
+constexpr std::size_t KeysInBatch = 20'000;
+
+// Typing at the end of a buffer: nanoseconds for a key that completes nothing. Keys that complete something by chance
+// are left out beforehand.
+double missNanoseconds(const SnippetMatcher& matcher, std::size_t bufferLength, std::mt19937& random) {
+    const std::u16string text = prose(bufferLength + KeysInBatch, random);
+    const std::u16string_view all = text;
+    const Editor editor;
+    std::vector<std::size_t> misses;
+    for (std::size_t i = bufferLength; i < bufferLength + KeysInBatch - 1; ++i) {
+        const std::size_t start = i - bufferLength;
+        const auto letters = all.substr(start, bufferLength + 1);
+        const auto before = all.substr(start, bufferLength);
+        if (matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty()) misses.push_back(start);
+    }
+    const double batch = medianNanoseconds(31, [&] {
+        for (const std::size_t start : misses) {
+            const auto letters = all.substr(start, bufferLength + 1);
+            const auto before = all.substr(start, bufferLength);
+            if (!matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty()) std::abort();
+        }
+    });
+    return batch / static_cast<double>(misses.size());
+}
+
+void benchMisses() {
+    std::size_t allocated = 0;
+    for (const std::size_t size : {100U, 1'000U, 10'000U, 100'000U}) {
+        Library library(size);
+        SnippetMatcher matcher(defaultDelimiters());
+        matcher.setSnippetGroups(library.groups);
+        double slowest = 0;
+        for (const std::size_t buffer : {10U, 1'000U, 100'000U}) {
+            slowest = std::max(slowest, missNanoseconds(matcher, buffer, library.random));
+        }
+        print("matching.miss." + std::to_string(size), slowest, "ns");
+
+        const std::u16string text = u"a buffer in which nothing stands that anybody would abbreviat";
+        const Editor editor;
+        const std::size_t before = allocations;
+        for (std::size_t i = 0; i < text.size(); ++i) {
+            const auto letters = std::u16string_view(text).substr(0, i + 1);
+            if (!matcher.findSnippetsInLetters(letters, text[i], letters.substr(0, i), editor).empty()) std::abort();
+        }
+        allocated += allocations - before;
+    }
+    print("matching.miss.allocations", static_cast<double>(allocated), "count");
+}
+
+// Every 37th snippet typed to its end, with whatever its group wants before and after it.
+void benchHits() {
+    Library library(100'000);
+    SnippetMatcher matcher(defaultDelimiters());
+    matcher.setSnippetGroups(library.groups);
+    std::vector<std::u16string> typings;
+    std::vector<bool> delimited;
+    for (const auto& group : library.groups) {
+        for (std::size_t i = 0; i < group->items().size(); i += 37) {
+            const bool atDelimiter = group->expandTrigger() == ExpandTrigger::DelimiterKept;
+            typings.push_back(u"and then " + *group->items()[i]->abbreviationWithPrefix() + (atDelimiter ? u" " : u""));
+            delimited.push_back(atDelimiter);
+        }
+    }
+    const Editor editor;
+    std::size_t found = 0;
+    const double batch = medianNanoseconds(31, [&] {
+        found = 0;
+        for (const auto& typing : typings) {
+            const std::u16string_view letters = typing;
+            const auto before = letters.substr(0, letters.size() - 1);
+            found += matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty() ? 0 : 1;
+        }
+    });
+    if (found != typings.size()) std::abort();
+    print("matching.hit.100000", batch / static_cast<double>(typings.size()), "ns");
+}
+
+void benchBuilding() {
+    Library library(100'000);
+    print("matching.build.100000",
+          medianNanoseconds(15,
+                            [&] {
+                                SnippetMatcher matcher(defaultDelimiters());
+                                matcher.setSnippetGroups(library.groups);
+                            }) /
+              1e6,
+          "ms");
+
+    SnippetMatcher matcher(defaultDelimiters());
+    matcher.setSnippetGroups(library.groups);
+    std::vector<double> times;
+    for (int i = 0; i < 20'000; ++i) {
+        const auto& items = library.groups[library.random() % GroupCount]->items();
+        const auto& snippet = items[library.random() % items.size()];
+        std::u16string abbreviation = library.randomAbbreviation();
+        times.push_back(nanosecondsOf([&] { snippet->setAbbreviation(std::move(abbreviation)); }));
+    }
+    print("matching.edit.100000", median(times) / 1e3, "us");
+}
+
+}  // namespace
+}  // namespace plume::bench
+
+int main() {
+    plume::bench::benchMisses();
+    plume::bench::benchHits();
+    plume::bench::benchBuilding();
+}

@@ -1,0 +1,307 @@
+#include "engine/AbbreviationIndex.h"
+
+#include <algorithm>
+#include <bit>
+
+#include "Foundation/Strings.h"
+#include "library/AbbreviationHash.h"
+
+namespace plume {
+
+namespace {
+
+constexpr bool isHighSurrogate(char16_t unit) {
+    return (unit & 0xfc00) == 0xd800;
+}
+constexpr bool isLowSurrogate(char16_t unit) {
+    return (unit & 0xfc00) == 0xdc00;
+}
+
+// The key under which a suffix of this hash and length is filed. Mixed, so that all its bits depend on all of the
+// hash's.
+constexpr std::uint64_t keyOf(std::uint64_t hash, std::size_t length) {
+    std::uint64_t key = hash + length * 0xd6e8feb86659fd93ULL;
+    key = (key ^ (key >> 32)) * 0xd6e8feb86659fd93ULL;
+    return key ^ (key >> 32);
+}
+
+// Reads a text from its end, each unit folded as part of the character it belongs to.
+class FoldedUnitsFromEnd {
+  public:
+    explicit FoldedUnitsFromEnd(std::u16string_view text) : text_(text), position_(text.size()) {}
+
+    // Must not be called more often than the text has units.
+    char16_t next() {
+        const char16_t unit = text_[--position_];
+        if (unit < 0x80) return unit >= u'A' && unit <= u'Z' ? static_cast<char16_t>(unit + 0x20) : unit;
+        if (isLowSurrogate(unit) && position_ > 0 && isHighSurrogate(text_[position_ - 1])) {
+            return static_cast<char16_t>(0xdc00 + (foldedPair(position_ - 1) & 0x3ff));
+        }
+        if (isHighSurrogate(unit) && position_ + 1 < text_.size() && isLowSurrogate(text_[position_ + 1])) {
+            return static_cast<char16_t>(0xd7c0 + (foldedPair(position_) >> 10));
+        }
+        return static_cast<char16_t>(foldedCodePoint(unit));
+    }
+
+  private:
+    char32_t foldedPair(std::size_t high) const {
+        return foldedCodePoint(0x10000 + ((text_[high] & 0x3ffU) << 10) + (text_[high + 1] & 0x3ffU));
+    }
+
+    std::u16string_view text_;
+    std::size_t position_;
+};
+
+std::uint64_t keyOfAbbreviation(std::u16string_view prefixed, std::size_t longest) {
+    const std::size_t length = std::min(prefixed.size(), longest);
+    FoldedUnitsFromEnd units(prefixed);
+    std::uint64_t hash = EmptySuffixHash;
+    for (std::size_t i = 0; i < length; ++i) hash = extendSuffixHash(hash, units.next());
+    return keyOf(hash, length);
+}
+
+// Two occurrences of the text can share units: some proper start of it is also its end.
+bool overlapsItself(std::u16string_view text) {
+    for (std::size_t shift = 1; shift < text.size(); ++shift) {
+        if (equalsIgnoringCase(text.substr(shift), text.substr(0, text.size() - shift))) return true;
+    }
+    return false;
+}
+
+std::optional<AbbreviationIndex::Trigger> tableFor(ExpandTrigger trigger) {
+    switch (trigger) {
+        case ExpandTrigger::Immediately:
+            return AbbreviationIndex::Trigger::Immediately;
+        case ExpandTrigger::DelimiterKept:
+        case ExpandTrigger::DelimiterSwallowed:
+            return AbbreviationIndex::Trigger::Delimiter;
+        case ExpandTrigger::HotKey:
+            return AbbreviationIndex::Trigger::HotKey;
+        case ExpandTrigger::Never:
+            break;
+    }
+    return std::nullopt;
+}
+
+}  // namespace
+
+AbbreviationIndex::AbbreviationIndex(CharacterSet defaultDelimiters)
+    : defaultDelimiters_(std::move(defaultDelimiters)) {}
+
+AbbreviationIndex::~AbbreviationIndex() {
+    for (const auto& [key, indexed] : groups_) indexed->group->removeGroupObserver(this);
+}
+
+void AbbreviationIndex::setGroups(const Groups& groups) {
+    std::unordered_map<const SnippetGroup*, std::size_t> wanted;
+    for (std::size_t i = 0; i < groups.size(); ++i) wanted.try_emplace(groups[i].get(), i);
+
+    for (auto entry = groups_.begin(); entry != groups_.end();) {
+        if (wanted.contains(entry->first)) {
+            ++entry;
+        } else {
+            removeGroup(*entry->second);
+            entry = groups_.erase(entry);
+        }
+    }
+    std::size_t snippets = records_.size();
+    for (const auto& group : groups) snippets += groups_.contains(group.get()) ? 0 : group->items().size();
+    records_.reserve(snippets);
+    for (const auto& [group, order] : wanted) {
+        if (!groups_.contains(group)) addGroup(groups[order]);
+        groups_[group]->order = order;
+    }
+    refreshDelimiters();
+}
+
+AbbreviationIndex::IndexedGroup* AbbreviationIndex::find(SnippetGroup& group) {
+    const auto found = groups_.find(&group);
+    return found == groups_.end() ? nullptr : found->second.get();
+}
+
+void AbbreviationIndex::addGroup(const std::shared_ptr<SnippetGroup>& group) {
+    auto& indexed = groups_[group.get()] = std::make_unique<IndexedGroup>();
+    indexed->group = group;
+    refreshSettings(*indexed);
+    itemsAdded(*group, 0, group->items().size());
+    group->addGroupObserver(this);
+}
+
+void AbbreviationIndex::removeGroup(IndexedGroup& group) {
+    group.group->removeGroupObserver(this);
+    for (const auto& [snippet, record] : group.records) removeRecord(record);
+}
+
+void AbbreviationIndex::refreshSettings(IndexedGroup& group) {
+    group.prefix = group.group->abbreviationPrefix().value_or(u"");
+    group.prefixOverlapsItself = overlapsItself(group.prefix);
+    group.table = tableFor(group.group->expandTrigger());
+}
+
+void AbbreviationIndex::refreshDelimiters() {
+    delimiters_ = CharacterSet();
+    for (const auto& [key, indexed] : groups_) {
+        if (indexed->table != Trigger::Delimiter) continue;
+        delimiters_ = delimiters_.united(indexed->group->delimiters().value_or(defaultDelimiters_));
+    }
+}
+
+void AbbreviationIndex::matchingSettingsChanged(SnippetGroup& group) {
+    IndexedGroup* indexed = find(group);
+    if (!indexed) return;
+    for (const auto& [snippet, record] : indexed->records) unfile(record);
+    refreshSettings(*indexed);
+    reserve(*indexed, indexed->records.size());
+    for (const auto& [snippet, record] : indexed->records) file(record);
+    refreshDelimiters();
+}
+
+void AbbreviationIndex::itemsAdded(SnippetGroup& group, std::size_t first, std::size_t count) {
+    IndexedGroup* indexed = find(group);
+    if (!indexed) return;
+    const auto& items = group.items();
+    reserve(*indexed, count);
+    for (std::size_t i = first; i < first + count; ++i) addRecord(*indexed, items[i], static_cast<std::uint32_t>(i));
+    if (first + count < items.size()) indexed->ranksAreStale = true;
+}
+
+void AbbreviationIndex::itemRemoved(SnippetGroup& group, Snippet& snippet) {
+    IndexedGroup* indexed = find(group);
+    if (!indexed) return;
+    const auto found = indexed->records.find(&snippet);
+    if (found == indexed->records.end()) return;
+    removeRecord(found->second);
+    indexed->records.erase(found);
+    // The ranks that stay are still in order among themselves, but the next appended snippet's would not be.
+    indexed->ranksAreStale = true;
+}
+
+void AbbreviationIndex::abbreviationChanged(SnippetGroup& group, Snippet& snippet) {
+    IndexedGroup* indexed = find(group);
+    if (!indexed) return;
+    const auto found = indexed->records.find(&snippet);
+    if (found == indexed->records.end()) return;
+    unfile(found->second);
+    file(found->second);
+}
+
+void AbbreviationIndex::addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet, std::uint32_t rank) {
+    std::uint32_t index;
+    if (freeRecords_.empty()) {
+        index = static_cast<std::uint32_t>(records_.size());
+        records_.emplace_back();
+    } else {
+        index = freeRecords_.back();
+        freeRecords_.pop_back();
+    }
+    if (!group.records.try_emplace(snippet.get(), index).second) {
+        freeRecords_.push_back(index);  // listed twice: found once is enough
+        return;
+    }
+    Record& record = records_[index];
+    record = Record{};
+    record.snippet = snippet;
+    record.group = &group;
+    record.rank = rank;
+    file(index);
+}
+
+void AbbreviationIndex::removeRecord(std::uint32_t index) {
+    unfile(index);
+    records_[index] = Record{};
+    freeRecords_.push_back(index);
+}
+
+void AbbreviationIndex::file(std::uint32_t index) {
+    Record& record = records_[index];
+    const auto& abbreviation = record.snippet->abbreviation();
+    if (!record.group->table || !abbreviation || abbreviation->empty()) return;
+    record.length = record.group->prefix.size() + abbreviation->size();
+    record.key = keyOfAbbreviation(record.group->prefix.empty() ? *abbreviation : record.group->prefix + *abbreviation,
+                                   LongestSuffix);
+
+    Table& table = tableOf(*record.group);
+    const std::size_t lengthIndex = std::min(record.length, LongestSuffix) - 1;
+    ++table.lengthCounts[lengthIndex];
+    table.lengthsInUse |= std::uint64_t{1} << lengthIndex;
+    const auto [head, isNew] = table.heads.try_emplace(record.key, index);
+    if (!isNew) {
+        record.next = head->second;
+        records_[head->second].previous = index;
+        head->second = index;
+        return;
+    }
+    table.filter.add(record.key);
+    if (table.filter.isFull()) rebuildFilter(table, 2 * table.heads.size());
+}
+
+void AbbreviationIndex::unfile(std::uint32_t index) {
+    Record& record = records_[index];
+    if (record.length == 0) return;
+    Table& table = tableOf(*record.group);
+    const std::size_t lengthIndex = std::min(record.length, LongestSuffix) - 1;
+    if (--table.lengthCounts[lengthIndex] == 0) table.lengthsInUse &= ~(std::uint64_t{1} << lengthIndex);
+
+    if (record.next != NoRecord) records_[record.next].previous = record.previous;
+    if (record.previous != NoRecord) {
+        records_[record.previous].next = record.next;
+    } else if (record.next != NoRecord) {
+        table.heads[record.key] = record.next;
+    } else {
+        table.heads.erase(record.key);
+        if (++table.staleKeys > table.heads.size() / 2 + 1000) rebuildFilter(table, table.heads.size());
+    }
+    record.length = 0;
+    record.next = record.previous = NoRecord;
+}
+
+void AbbreviationIndex::reserve(IndexedGroup& group, std::size_t count) {
+    group.records.reserve(group.records.size() + count);
+    if (!group.table) return;
+    Table& table = tableOf(group);
+    const std::size_t expected = table.heads.size() + count;
+    if (expected < 2 * table.heads.size()) return;  // doubling by itself is soon enough
+    table.heads.reserve(expected);
+    rebuildFilter(table, expected);
+}
+
+void AbbreviationIndex::rebuildFilter(Table& table, std::size_t room) {
+    table.filter.reset(room);
+    table.staleKeys = 0;
+    for (const auto& [key, head] : table.heads) table.filter.add(key);
+}
+
+void AbbreviationIndex::collectCandidates(Trigger trigger, std::u16string_view text,
+                                          std::vector<Candidate>& candidates) const {
+    const Table& table = tables_[static_cast<std::size_t>(trigger)];
+    const std::size_t longest = static_cast<std::size_t>(std::bit_width(table.lengthsInUse));
+    const std::size_t walked = std::min(longest, text.size());
+    FoldedUnitsFromEnd units(text);
+    std::uint64_t hash = EmptySuffixHash;
+    for (std::size_t length = 1; length <= walked; ++length) {
+        hash = extendSuffixHash(hash, units.next());
+        if ((table.lengthsInUse >> (length - 1) & 1) == 0) continue;
+        const std::uint64_t key = keyOf(hash, length);
+        if (table.filter.mayContain(key)) collectUnderKey(table, key, text.size(), candidates);
+    }
+}
+
+void AbbreviationIndex::collectUnderKey(const Table& table, std::uint64_t key, std::size_t textLength,
+                                        std::vector<Candidate>& candidates) const {
+    const auto head = table.heads.find(key);
+    if (head == table.heads.end()) return;
+    for (std::uint32_t index = head->second; index != NoRecord; index = records_[index].next) {
+        const Record& record = records_[index];
+        if (record.length > textLength) continue;
+        if (record.group->ranksAreStale) refreshRanks(*record.group);
+        candidates.push_back({record.group, &record.snippet, record.length, record.rank});
+    }
+}
+
+void AbbreviationIndex::refreshRanks(IndexedGroup& group) const {
+    std::uint32_t rank = 0;
+    for (const auto& snippet : group.group->items()) records_[group.records.at(snippet.get())].rank = rank++;
+    group.ranksAreStale = false;
+}
+
+}  // namespace plume

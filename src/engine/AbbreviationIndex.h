@@ -1,0 +1,119 @@
+// Finds the snippets whose abbreviation, with its group's prefix, could end a text, at a cost that does not grow with
+// the library.
+//
+// An abbreviation is filed, together with its prefix, under the hash of its folded text and its length. Hashes grow to
+// the left (library/AbbreviationHash.h), so one walk over the end of the typed text gives the hash of every suffix;
+// each length that some abbreviation has costs one look into a filter. Abbreviations longer than LongestSuffix are
+// filed under their last LongestSuffix units. There is one table for each way of triggering.
+//
+// What comes out are candidates: equal hashes, and nothing else checked. Owned by the matcher, on its thread.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include "Foundation/CharacterSet.h"
+#include "engine/SuffixFilter.h"
+#include "library/SnippetGroup.h"
+
+namespace plume {
+
+class AbbreviationIndex final : public SnippetGroupObserver {
+  public:
+    using Groups = std::vector<std::shared_ptr<SnippetGroup>>;
+
+    // The ways of triggering that have something to find.
+    enum class Trigger : std::uint8_t { Immediately, Delimiter, HotKey };
+
+    // A group of the library as the index knows it.
+    struct IndexedGroup {
+        std::shared_ptr<SnippetGroup> group;
+        std::size_t order = 0;  // place in the library
+        std::u16string prefix;
+        bool prefixOverlapsItself = false;
+        std::optional<Trigger> table;  // where its snippets are filed; nothing for groups that never expand
+        std::unordered_map<const Snippet*, std::uint32_t> records;
+        bool ranksAreStale = false;
+    };
+
+    struct Candidate {
+        const IndexedGroup* group;
+        const std::shared_ptr<Snippet>* snippet;
+        std::size_t length;  // of prefix and abbreviation
+        std::uint32_t rank;  // place in the group's items
+    };
+
+    explicit AbbreviationIndex(CharacterSet defaultDelimiters);
+    ~AbbreviationIndex() override;
+    AbbreviationIndex(const AbbreviationIndex&) = delete;
+    AbbreviationIndex& operator=(const AbbreviationIndex&) = delete;
+
+    // Groups that were there before are not indexed again.
+    void setGroups(const Groups& groups);
+
+    // Some group expands after this delimiter.
+    bool isDelimiter(char16_t unit) const { return delimiters_.contains(unit); }
+
+    // Adds to `candidates` what could end the text, in no particular order.
+    void collectCandidates(Trigger trigger, std::u16string_view text, std::vector<Candidate>& candidates) const;
+
+    void abbreviationChanged(SnippetGroup& group, Snippet& snippet) override;
+    void itemsAdded(SnippetGroup& group, std::size_t first, std::size_t count) override;
+    void itemRemoved(SnippetGroup& group, Snippet& snippet) override;
+    void matchingSettingsChanged(SnippetGroup& group) override;
+
+  private:
+    static constexpr std::size_t LongestSuffix = 64;
+    static constexpr std::uint32_t NoRecord = 0xffffffff;
+
+    // One snippet of the library; records under the same key form a list.
+    struct Record {
+        std::shared_ptr<Snippet> snippet;
+        IndexedGroup* group = nullptr;
+        std::uint64_t key = 0;
+        std::size_t length = 0;  // 0: filed nowhere
+        std::uint32_t rank = 0;
+        std::uint32_t next = NoRecord;
+        std::uint32_t previous = NoRecord;
+    };
+
+    struct Table {
+        std::uint64_t lengthsInUse = 0;  // bit n-1: some abbreviation is n units long, or longer for the last bit
+        std::array<std::size_t, LongestSuffix> lengthCounts{};
+        SuffixFilter filter;
+        std::size_t staleKeys = 0;  // removed, but still admitted by the filter
+        std::unordered_map<std::uint64_t, std::uint32_t> heads;
+    };
+
+    Table& tableOf(const IndexedGroup& group) { return tables_[static_cast<std::size_t>(*group.table)]; }
+
+    IndexedGroup* find(SnippetGroup& group);
+    void addGroup(const std::shared_ptr<SnippetGroup>& group);
+    void removeGroup(IndexedGroup& group);
+    void refreshSettings(IndexedGroup& group);
+    void refreshDelimiters();
+
+    void addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet, std::uint32_t rank);
+    void removeRecord(std::uint32_t index);
+    void file(std::uint32_t index);
+    void unfile(std::uint32_t index);
+    void reserve(IndexedGroup& group, std::size_t count);
+    static void rebuildFilter(Table& table, std::size_t room);
+    void collectUnderKey(const Table& table, std::uint64_t key, std::size_t textLength,
+                         std::vector<Candidate>& candidates) const;
+    void refreshRanks(IndexedGroup& group) const;
+
+    CharacterSet defaultDelimiters_;
+    CharacterSet delimiters_;
+    std::unordered_map<const SnippetGroup*, std::unique_ptr<IndexedGroup>> groups_;
+    mutable std::vector<Record> records_;  // ranks are brought up to date when they are asked for
+    std::vector<std::uint32_t> freeRecords_;
+    std::array<Table, 3> tables_;
+};
+
+}  // namespace plume

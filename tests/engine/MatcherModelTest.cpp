@@ -1,0 +1,211 @@
+// The fast matcher held against a naive one, written straight from the rules without index or hash, on random
+// libraries, edits and typings.
+#include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
+
+#include "Foundation/Strings.h"
+#include "engine/SnippetMatcher.h"
+#include "tests/engine/MatcherSupport.h"
+
+namespace plume {
+namespace {
+
+class NaiveMatcher {
+  public:
+    NaiveMatcher(std::vector<std::shared_ptr<SnippetGroup>> groups, std::u16string before, std::u16string key,
+                 Place place)
+        : groups_(std::move(groups)), before_(std::move(before)), key_(std::move(key)), place_(std::move(place)) {}
+
+    std::vector<SnippetMatcher::Match> find() const {
+        std::vector<SnippetMatcher::Match> found;
+        for (const auto& group : groups_) {
+            if (!triggers(*group) || !isActive(group->availability())) continue;
+            const bool atOnce = group->expandTrigger() == ExpandTrigger::Immediately;
+            const std::u16string text = atOnce ? before_ + key_ : before_;
+            if (group->hasAbbreviationPrefix()) {
+                findPrefixed(*group, text, found);
+            } else {
+                findPlain(*group, text, found);
+            }
+        }
+        return found;
+    }
+
+  private:
+    bool triggers(const SnippetGroup& group) const {
+        const bool hotKey = key_.empty();
+        switch (static_cast<int>(group.expandTrigger())) {
+            case 0:
+                return !hotKey;
+            case 1:
+            case 2:
+                return !hotKey && group.delimiters().value_or(testDelimiters()).contains(key_[0]);
+            case 4:
+                return hotKey;
+            default:
+                return false;
+        }
+    }
+
+    static bool lists(const std::optional<std::vector<std::u16string>>& list,
+                      const std::optional<std::u16string>& item) {
+        return list && item && std::find(list->begin(), list->end(), *item) != list->end();
+    }
+
+    bool isActive(const PLFunctionAvailability& where) const {
+        const bool inApplications = lists(where.applications, place_.application);
+        const bool inSources = lists(where.inputMethods, place_.inputSource);
+        const bool application = where.availability == 0 || (where.availability == 1 && !inApplications) ||
+                                 (where.availability == 2 && inApplications);
+        const bool source = where.inputMethodsOption == 0 || (where.inputMethodsOption == 1 ? !inSources : inSources);
+        return application && source;
+    }
+
+    static bool mayStandAfter(const SnippetGroup& group, const std::u16string& text, std::size_t index) {
+        const std::u16string before = text.substr(0, index);
+        if (group.expandAfter() == ExpandAfter::Anything) return true;
+        if (before.empty()) return group.expandAfter() != ExpandAfter::Digits;
+        const char16_t last = before.back() == u'\n' ? u'\r' : before.back();
+        if (last == 0xfffc) return true;
+        if (group.expandAfter() == ExpandAfter::Delimiter) {
+            return group.expandAfterDelimiters().value_or(testDelimiters()).contains(last);
+        }
+        if (group.expandAfter() == ExpandAfter::Whitespace) return isWhite(last);
+        const std::size_t digits = before.size() - (before.find_last_not_of(u"0123456789") + 1);
+        if (digits == 0) return false;
+        if (digits == before.size()) return true;
+        const char16_t edge = before[before.size() - digits - 1];
+        return isWhite(edge) || testDelimiters().contains(edge);
+    }
+    static bool isWhite(char16_t unit) { return unit == u' ' || unit == u'\t' || unit == u'\n' || unit == u'\r'; }
+
+    static void findPlain(const SnippetGroup& group, const std::u16string& text,
+                          std::vector<SnippetMatcher::Match>& found) {
+        for (const auto& snippet : group.items()) {
+            const std::u16string wanted = snippet->abbreviation().value_or(u"");
+            if (wanted.empty() || wanted.size() > text.size() || !snippet->hasContent()) continue;
+            const std::size_t start = text.size() - wanted.size();
+            const std::u16string typed = text.substr(start);
+            const bool equal = snippet->caseSensitivity() == CaseSensitivity::CaseSensitive
+                                   ? typed == wanted
+                                   : folded(typed) == folded(wanted);
+            if (equal && mayStandAfter(group, text, start)) found.push_back({snippet, typed});
+        }
+    }
+
+    static void findPrefixed(const SnippetGroup& group, const std::u16string& text,
+                             std::vector<SnippetMatcher::Match>& found) {
+        const std::u16string prefix = *group.abbreviationPrefix();
+        const std::u16string foldedText = folded(text);
+        std::size_t start = 0;
+        while ((start = foldedText.find(folded(prefix), start)) != std::u16string::npos) {
+            const std::size_t end = start + prefix.size();
+            const std::u16string rest = text.substr(end);
+            if (!rest.empty() && mayStandAfter(group, text, start)) {
+                for (const auto& snippet : group.items()) {
+                    if (!snippet->hasContent() || folded(snippet->abbreviation().value_or(u"")) != folded(rest))
+                        continue;
+                    const std::u16string typed = text.substr(start);
+                    const bool exact = snippet->caseSensitivity() == CaseSensitivity::CaseSensitive;
+                    if (exact && typed != prefix + *snippet->abbreviation()) continue;
+                    found.push_back({snippet, typed});
+                }
+            }
+            start = end;
+        }
+    }
+
+    std::vector<std::shared_ptr<SnippetGroup>> groups_;
+    std::u16string before_;
+    std::u16string key_;
+    Place place_;
+};
+
+// Few characters, so that random typings complete random abbreviations often.
+const std::vector<std::u16string> Alphabet = {u"a",      u"A",      u"b",      u";",          u" ",
+                                              u"1",      u".",      u"\n",     u"\u00e9",     u"\u00c9",
+                                              u"\u03c3", u"\u03a3", u"\u03c2", u"\U00010400", u"\U00010428"};
+
+std::u16string randomText(int most, std::size_t letters = Alphabet.size()) {
+    std::u16string text;
+    const int length = *rc::gen::inRange(0, most + 1);
+    for (int i = 0; i < length; ++i) text += Alphabet[*rc::gen::inRange<std::size_t>(0, letters)];
+    return text;
+}
+
+void randomizeSettings(SnippetGroup& group) {
+    group.setExpandTrigger(static_cast<ExpandTrigger>(*rc::gen::element(0, 0, 0, 1, 2, 3, 4)));
+    group.setExpandAfter(static_cast<ExpandAfter>(*rc::gen::element(0, 1, 2, 2, 3)));
+    group.setAbbreviationPrefix(*rc::gen::element<std::u16string>(u"", u"", u";", u";;", u"aA", u"a;a", u"\u00e9"));
+    group.setDelimiters(*rc::gen::element<std::optional<CharacterSet>>(
+        std::nullopt, CharacterSet::withCharacters(u"b "), CharacterSet::withCharacters(u".")));
+    group.availability().availability = *rc::gen::element(0, 0, 0, 1, 2);
+    group.availability().applications = {{u"org.editor"}};
+    group.availability().inputMethodsOption = *rc::gen::element(0, 0, 0, 1, 2);
+    group.availability().inputMethods = {{u"US"}};
+}
+
+std::shared_ptr<Snippet> randomSnippet() {
+    const bool hasContent = *rc::gen::inRange(0, 10) > 0;
+    auto snippet = std::make_shared<Snippet>(randomText(3), hasContent ? Snippet::Text(u"content") : std::nullopt);
+    snippet->setCaseSensitivity(static_cast<CaseSensitivity>(*rc::gen::inRange(0, 3)));
+    return snippet;
+}
+
+void editLibrary(std::vector<std::shared_ptr<SnippetGroup>>& groups) {
+    if (groups.empty()) return;
+    const auto group = *rc::gen::elementOf(groups);
+    switch (*rc::gen::inRange(0, 5)) {
+        case 0:
+            randomizeSettings(*group);
+            break;
+        case 1:
+            group->insertItem(randomSnippet(), *rc::gen::inRange<std::size_t>(0, group->items().size() + 1));
+            break;
+        case 2:
+            if (!group->items().empty()) group->removeItem(*rc::gen::elementOf(group->items()));
+            break;
+        case 3:
+            if (!group->items().empty()) (*rc::gen::elementOf(group->items()))->setAbbreviation(randomText(3));
+            break;
+        default:
+            std::rotate(groups.begin(), groups.begin() + 1, groups.end());
+    }
+}
+
+RC_GTEST_PROP(MatcherModel, AgreesWithTheRules, ()) {
+    std::vector<std::shared_ptr<SnippetGroup>> groups;
+    SnippetMatcher matcher(testDelimiters());
+    const int groupCount = *rc::gen::inRange(1, 6);
+    for (int i = 0; i < groupCount; ++i) {
+        groups.push_back(SnippetGroup::make());
+        randomizeSettings(*groups.back());
+        const int snippets = *rc::gen::inRange(0, 12);
+        for (int j = 0; j < snippets; ++j) groups.back()->addItem(randomSnippet());
+    }
+    matcher.setSnippetGroups(groups);
+
+    // Sometimes a long buffer, and sometimes one full of prefixes that overlap themselves.
+    std::u16string letters = *rc::gen::element(0, 0, 1) ? std::u16string(5000, u'x') : randomText(8);
+    if (*rc::gen::inRange(0, 4) == 0) letters += std::u16string(*rc::gen::inRange<std::size_t>(1, 40), u';');
+    const Place place(*rc::gen::element<std::optional<std::u16string>>(u"org.editor", u"org.mail", std::nullopt),
+                      *rc::gen::element<std::optional<std::u16string>>(u"US", u"German"));
+    const int keys = *rc::gen::inRange(1, 40);
+    std::size_t matchesSeen = 0;
+    for (int i = 0; i < keys; ++i) {
+        if (*rc::gen::inRange(0, 8) == 0) {
+            editLibrary(groups);
+            matcher.setSnippetGroups(groups);
+        }
+        const bool hotKey = *rc::gen::inRange(0, 8) == 0;
+        const std::u16string key = hotKey ? u"" : Alphabet[*rc::gen::inRange<std::size_t>(0, Alphabet.size())];
+        const auto expected = NaiveMatcher(groups, letters, key, place).find();
+        RC_ASSERT(typeKey(matcher, letters, key, place) == expected);
+        matchesSeen += expected.size();
+        letters += key;
+    }
+    RC_CLASSIFY(matchesSeen > 0);
+}
+
+}  // namespace
+}  // namespace plume

@@ -1,0 +1,29 @@
+# Sourced by the scripts at the root: installs the Debian packages that a job needs and that are not there yet.
+
+need_packages() {
+    local missing=() package
+    for package in "$@"; do
+        dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q '^install ok installed' || missing+=("$package")
+    done
+    [ ${#missing[@]} -eq 0 ] && return 0
+    local as_root=()
+    if [ "$(id -u)" -ne 0 ]; then
+        command -v sudo >/dev/null || { echo "Please install: ${missing[*]} (no sudo here to do it)" >&2; return 1; }
+        as_root=(sudo)
+    fi
+    echo "Installing ${missing[*]}"
+    export DEBIAN_FRONTEND=noninteractive
+    "${as_root[@]}" apt-get update -qq
+    "${as_root[@]}" apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
+}
+
+BUILD_PACKAGES=(g++ cmake ninja-build ccache libicu-dev)
+TEST_PACKAGES=(libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
+CHECK_PACKAGES=(clang clang-format clang-tidy libclang-rt-14-dev git)
+
+# build <preset>: configures and builds, quietly unless something is wrong.
+build() {
+    cmake --preset "$1" >"build-$1.log" 2>&1 || { cat "build-$1.log"; rm -f "build-$1.log"; return 1; }
+    rm -f "build-$1.log"
+    cmake --build --preset "$1" -- --quiet
+}
