@@ -4,6 +4,7 @@
 // characters beyond it are kept too. May be used from any thread.
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -14,6 +15,10 @@ class CharacterSet {
   public:
     // The empty set.
     CharacterSet();
+    // Moving copies: a set that was moved from must not be left with a bitmap that is gone.
+    CharacterSet(const CharacterSet&) = default;
+    CharacterSet& operator=(const CharacterSet&) = default;
+    ~CharacterSet() = default;
 
     static CharacterSet withCharacters(std::u16string_view characters);
     // All code points from first to last, both included.
@@ -30,8 +35,9 @@ class CharacterSet {
     static const CharacterSet& newlines();
     static const CharacterSet& whitespacesAndNewlines();
 
-    // O(1). A surrogate unit is a member only when it was put in as such.
-    bool contains(char16_t unit) const;
+    // O(1). A surrogate unit is a member only when it was put in as such; the inverse of a set holds those that it does
+    // not.
+    bool contains(char16_t unit) const { return ((bitmap_[unit >> 6] >> (unit & 63)) & 1) != 0; }
     bool contains(char32_t codePoint) const;
     bool isEmpty() const;
 
@@ -49,6 +55,7 @@ class CharacterSet {
     struct Storage;
     explicit CharacterSet(std::shared_ptr<const Storage> storage);
     std::shared_ptr<const Storage> storage_;
+    const std::uint64_t* bitmap_;  // the storage's: one bit a unit
 };
 
 }  // namespace plume
