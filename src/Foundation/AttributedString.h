@@ -2,7 +2,10 @@
 //
 // A value type: copies are cheap (they share their storage until one of them changes) and independent. Neighbouring
 // runs with equal attributes are always joined, so two strings that look the same are equal. Positions past the end are
-// brought back to the end; nothing here fails. One string may be read, not changed, from several threads.
+// brought back to the end; nothing here fails. One string may be read, not changed, from several threads; copies of it
+// may be changed on different threads. A string that was moved from is empty.
+//
+// Appending costs what is appended, a substring what it holds; edits elsewhere cost the length of the whole.
 #pragma once
 
 #include <cstddef>
@@ -24,7 +27,13 @@ class AttributedString {
     };
 
     AttributedString();
+    // Attributes that say nothing are kept as null, here and wherever attributes are given.
     explicit AttributedString(std::u16string text, SharedAttributes attributes = nullptr);
+    AttributedString(const AttributedString& other);
+    AttributedString(AttributedString&& other) noexcept = default;
+    AttributedString& operator=(const AttributedString& other);
+    AttributedString& operator=(AttributedString&& other) noexcept = default;
+    ~AttributedString() = default;
 
     const std::u16string& string() const;
     std::size_t length() const;
@@ -53,8 +62,9 @@ class AttributedString {
 
   private:
     struct Storage;
+    const Storage& storage() const;
     Storage& mutableStorage();
-    std::shared_ptr<Storage> storage_;
+    std::shared_ptr<Storage> storage_;  // null: empty
 };
 
 }  // namespace plume
