@@ -15,6 +15,7 @@
 #include "Foundation/Date.h"
 #include "Foundation/KeyedCoding.h"
 #include "Foundation/Uuid.h"
+#include "library/AbbreviationHash.h"
 
 namespace plume {
 
@@ -29,7 +30,8 @@ class Snippet final : public KeyedCodable {
 
     Snippet();
     Snippet(Text abbreviation, Text plainTextContent);
-    // Reads an archived snippet; nothing that the archive holds or lacks makes it fail.
+    // Reads an archived snippet; nothing that the archive holds or lacks makes it fail. A date that is missing stays
+    // missing; an unreadable content is none.
     explicit Snippet(const KeyedDecoder& coder);
     Snippet(const Snippet&) = delete;
     Snippet& operator=(const Snippet&) = delete;
@@ -91,13 +93,18 @@ class Snippet final : public KeyedCodable {
     void encodeWithCoder(KeyedEncoder& coder) const override;
 
   private:
+    void readContent(const KeyedDecoder& coder);
+    ArchivedContent archivedContent() const;
+
     std::optional<Uuid> uuid_;
     bool initialized_ = false;
     Text abbreviation_;
-    std::uint64_t abbreviationHash_;
+    std::uint64_t abbreviationHash_ = EmptySuffixHash;
     CaseSensitivity caseSensitivity_ = CaseSensitivity::CaseSensitive;
     ContentType contentType_ = ContentType::PlainText;
     std::optional<AttributedString> richTextContent_;
+    // Archived bytes that could not be read, written back until the snippet is given a content.
+    std::optional<ArchivedData> unreadContent_;
     Text label_;
     std::optional<Date> dateCreated_;
     std::optional<Date> dateModified_;

@@ -4,7 +4,9 @@
 // library. Whoever keeps something derived from the snippets (an index) observes the group.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -35,11 +37,12 @@ enum class ExpandTrigger : std::int32_t {
 class SnippetGroupObserver {
   public:
     virtual ~SnippetGroupObserver() = default;
-    // `snippet` stands in `items` with another abbreviation than before.
+    // `snippet`, whose parentGroup is the group, has another abbreviation than before. It need not stand in `items`:
+    // duplicates name the group of their original before they are added to one.
     virtual void abbreviationChanged(SnippetGroup& group, Snippet& snippet) = 0;
     // `items` [first, first + count) are new, all others unchanged.
     virtual void itemsAdded(SnippetGroup& group, std::size_t first, std::size_t count) = 0;
-    // `snippet` stands in `items` no more.
+    // `snippet` stands in `items` no more; its parentGroup is set already.
     virtual void itemRemoved(SnippetGroup& group, Snippet& snippet) = 0;
     // `abbreviationPrefix`, `expandTrigger` or `delimiters` changed.
     virtual void matchingSettingsChanged(SnippetGroup& group) = 0;
@@ -62,12 +65,14 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     const Text& name() const { return name_; }
     void setName(Text name) { name_ = std::move(name); }
 
+    // Never holds null: adding one does nothing. Adding makes the group the snippet's parentGroup, but does not take
+    // the snippet from the list of another group.
     const std::vector<std::shared_ptr<Snippet>>& items() const { return items_; }
     void addItem(const std::shared_ptr<Snippet>& snippet);
     void addItems(const std::vector<std::shared_ptr<Snippet>>& snippets);
     // An index past the end appends.
     void insertItem(const std::shared_ptr<Snippet>& snippet, std::size_t index);
-    // No error when the snippet is not listed. Its parentGroup is cleared when it is this group.
+    // No error when the snippet is not listed. The parentGroup of a listed one is cleared when it is this group.
     void removeItem(const std::shared_ptr<Snippet>& snippet);
 
     ExpandAfter expandAfter() const { return expandAfter_; }
@@ -105,6 +110,7 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     static std::optional<CharacterSet> replaceNewlineCharacterByCarriageReturnCharacter(
         const std::optional<CharacterSet>& set);
 
+    // Observers may come and go while they are told of a change.
     void addGroupObserver(SnippetGroupObserver* observer);
     void removeGroupObserver(SnippetGroupObserver* observer);
 
@@ -114,9 +120,12 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
   private:
     friend class Snippet;
     SnippetGroup();
+    void readAvailability(const KeyedDecoder& coder);
+    void encodeAvailability(KeyedEncoder& coder) const;
     // From a snippet whose parentGroup this is, whether it is listed or not.
     void snippetAbbreviationChanged(Snippet& snippet);
     void notifyMatchingSettingsChanged();
+    void notifyObservers(const std::function<void(SnippetGroupObserver&)>& tell);
 
     std::optional<Uuid> uuid_;
     std::optional<Date> dateCreated_;
