@@ -6,6 +6,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -18,7 +19,7 @@ namespace plume {
 class Snippet;
 
 // The parameters of a placeholder's body by name; a parameter without a value maps to the empty string.
-using VariableParams = std::map<std::u16string, std::u16string>;
+using VariableParams = std::map<std::u16string, std::u16string, std::less<>>;
 
 class SnippetVariable {
   public:
@@ -86,7 +87,13 @@ class SnippetFieldVariable final : public SnippetVariable {
 // A key pressed in the middle of the text.
 class SnippetKeyVariable final : public SnippetVariable {
   public:
+    static constexpr std::uint16_t NoKey = 65535;
+    // What a body may ask for at most; more is brought down to it when it is read.
+    static constexpr std::uint64_t MaximumCount = 10'000;
+    static constexpr double MaximumDelay = 24 * 60 * 60;
+
     SnippetKeyVariable() = default;
+    // A code outside 16 bits is no key; a count below 1 or unreadable is 1; a negative or unreadable delay is 0.
     explicit SnippetKeyVariable(const VariableParams& params);
     SnippetKeyVariable(std::u16string label, std::uint16_t code);
     std::u16string toString() const override;
@@ -97,7 +104,7 @@ class SnippetKeyVariable final : public SnippetVariable {
     bool command() const;
 
     Text key;  // the label shown to the user
-    std::uint16_t keyCode = 65535;
+    std::uint16_t keyCode = NoKey;
     std::uint64_t count = 1;
     double delay = 0;             // seconds
     std::uint64_t modifiers = 0;  // event flag bits

@@ -1,0 +1,42 @@
+// A changed copy of a rich text, made in one walk from its start to its end: linear however many pieces change.
+#pragma once
+
+#include <string_view>
+
+#include "Foundation/AttributedString.h"
+
+namespace plume {
+
+// Positions are those of the source and only grow; the source must outlive the rewriter.
+class AttributedStringRewriter {
+  public:
+    explicit AttributedStringRewriter(const AttributedString& source) : source_(source) {}
+
+    // Takes over what stands between the present position and this one.
+    void copyTo(std::size_t position);
+    // Leaves it out.
+    void skipTo(std::size_t position);
+    void append(std::u16string_view text, SharedAttributes attributes) { result_.append(text, std::move(attributes)); }
+    void append(const AttributedString& text) { result_.append(text); }
+
+    // Those of the source's unit at the present position; at its end those of its last unit.
+    SharedAttributes attributes() const;
+    // Those of the unit before the present position; at its start those of its first unit.
+    SharedAttributes attributesBefore() const;
+
+    std::size_t resultLength() const { return result_.length(); }
+
+    // The result, with the rest of the source taken over.
+    AttributedString finish();
+
+  private:
+    std::size_t runLeft() const { return source_.runs()[run_].length - offsetInRun_; }
+
+    const AttributedString& source_;
+    AttributedString result_;
+    std::size_t position_ = 0;
+    std::size_t run_ = 0;
+    std::size_t offsetInRun_ = 0;
+};
+
+}  // namespace plume
