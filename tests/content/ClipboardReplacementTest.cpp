@@ -1,0 +1,206 @@
+#include "content/ClipboardReplacement.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
+
+#include <chrono>
+
+#include "Foundation/Strings.h"
+
+namespace plume {
+namespace {
+
+class Reports {
+  public:
+    Reports() {
+        environment_.report = [this](const std::string& sentence) { sentences_.push_back(sentence); };
+    }
+    const ContentEnvironment& environment() const { return environment_; }
+    const std::vector<std::string>& sentences() const { return sentences_; }
+
+  private:
+    ContentEnvironment environment_;
+    std::vector<std::string> sentences_;
+};
+
+SnippetClipboardVariable variable(const std::u16string& find, const std::u16string& replacement, int flags) {
+    return SnippetClipboardVariable(
+        {{u"find", find}, {u"replacement", replacement}, {u"flags", fromUtf8(std::to_string(flags))}});
+}
+
+std::u16string replaced(const std::u16string& find, const std::u16string& replacement, int flags,
+                        const std::u16string& content) {
+    return processClipboardVariable(variable(find, replacement, flags), content, ContentEnvironment());
+}
+
+SharedAttributes size(double points) {
+    TextAttributes attributes;
+    attributes.font = FontAttribute{u"Times", points, false, false};
+    return std::make_shared<const TextAttributes>(attributes);
+}
+
+struct FlagsCase {
+    int flags;
+    const char16_t* result;
+};
+
+TEST(ClipboardReplacement, FollowsEveryCombinationOfFlags) {
+    const FlagsCase cases[] = {
+        {0, u"# #x y# y#x ax"},   {2, u"# #x ya. yA.x ax"},   {4, u"# A.x ya. yA.x ax"},  {6, u"# A.x y# yA.x ax"},
+        {8, u"# A.x y# yA.x ax"}, {10, u"# A.x ya. yA.x ax"}, {12, u"# A.x ya. yA.x ax"}, {14, u"# A.x y# yA.x ax"},
+        {1, u"# #x y# y#x #"},    {3, u"# #x y# y#x #"},      {5, u"# #x y# y#x #"},      {7, u"# #x y# y#x #"},
+        {9, u"# A.x y# yA.x #"},  {11, u"# A.x y# yA.x #"},   {13, u"# A.x y# yA.x #"},   {15, u"# A.x y# yA.x #"}};
+    for (const FlagsCase& c : cases) {
+        EXPECT_EQ(toUtf8(replaced(u"a.", u"#", c.flags, u"a. A.x ya. yA.x ax")), toUtf8(c.result)) << c.flags;
+    }
+}
+
+struct ReplacementCase {
+    const char* what;
+    std::u16string find;
+    std::u16string replacement;
+    int flags;
+    std::u16string content;
+    std::u16string result;
+};
+
+TEST(ClipboardReplacement, ReplacesPlainText) {
+    const ReplacementCase cases[] = {
+        {"nothing to find", u"", u"x", 1, u"a", u"a"},
+        {"empty content", u"a", u"x", 0, u"", u""},
+        {"anywhere", u"a", u"b", 0, u"a ab ba", u"b bb bb"},
+        {"whole words", u"a", u"b", 4, u"a ab ba", u"b ab ba"},
+        {"whole words side by side", u"a", u"b", 4, u"a,a a", u"b,b b"},
+        {"whole words in other scripts", u"été", u"x", 4, u"été étés l'été (été)", u"x étés l'x (x)"},
+        {"underscores and digits belong to words", u"a", u"b", 4, u"a_ a1 _a a", u"a_ a1 _a b"},
+        {"find text that ends quoting", u"a\\Eb", u"x", 4, u"a\\Eb ab aEb", u"x ab aEb"},
+        {"find text that ends in a backslash", u"a\\", u"x", 2, u"a\\ a", u"x a"},
+        {"find text full of syntax", u"[(*\\Q", u"x", 6, u"[(*\\Q", u"x"},
+        {"literal replacement stays literal", u"a", u"$0\\", 0, u"a", u"$0\\"},
+        {"removal", u" ", u"", 0, u"a b c", u"abc"},
+        {"groups", u"(\\w+)@(\\w+)", u"$2 at $1", 1, u"me@home", u"home at me"},
+        {"named group", u"(?<user>\\w+)@", u"${user}!", 1, u"me@home", u"me!home"},
+        {"whole match", u"a", u"[$0]", 4, u"a ba", u"[a] ba"},
+        {"group that took no part", u"(a)|b", u"<$1>", 1, u"ab", u"<a><>"},
+        {"digit after the last group", u"(a)", u"$12", 1, u"a", u"a2"},
+        {"escaped dollar", u"a", u"\\$1", 1, u"a", u"$1"},
+        {"dollar before no group", u"a", u"US$ $", 1, u"a", u"US$ $"},
+        {"empty matches", u"x*", u"-", 1, u"axb", u"-a--b-"},
+        {"empty matches around a surrogate pair", u"y*", u"-", 1, u"😀", u"-😀-"},
+        {"look-behind sees what was replaced", u"(?<=a)b|a", u"x", 1, u"abb", u"xxb"},
+        {"unpaired surrogates", u"b", u"x", 1,
+         u"a\xD83D"
+         u"b",
+         u"a\xD83D"
+         u"x"}};
+    for (const ReplacementCase& c : cases) {
+        EXPECT_EQ(toUtf8(replaced(c.find, c.replacement, c.flags, c.content)), toUtf8(c.result)) << c.what;
+    }
+}
+
+TEST(ClipboardReplacement, DefaultsToRemovingWithoutAReplacement) {
+    SnippetClipboardVariable removal;
+    removal.find = u"a";
+    EXPECT_EQ(processClipboardVariable(removal, u"banana", ContentEnvironment()), u"bnn");
+}
+
+TEST(ClipboardReplacement, LeavesTheContentAndReportsOnceWhatCannotWork) {
+    const ReplacementCase cases[] = {{"unbalanced", u"(one", u"x", 1, u"(one", u""},
+                                     {"no such group", u"two", u"$9", 1, u"two", u""},
+                                     {"no such name", u"three", u"${nobody}", 1, u"three", u""},
+                                     {"name without an end", u"four", u"${four", 1, u"four", u""},
+                                     {"lone backslash", u"five", u"x\\", 4, u"five", u""},
+                                     {"pattern without end", std::u16string(100'000, u'6'), u"x", 1, u"6", u""}};
+    for (const ReplacementCase& c : cases) {
+        Reports reports;
+        for (int i = 0; i < 3; ++i) {
+            const auto pattern = variable(c.find, c.replacement, c.flags);
+            EXPECT_EQ(processClipboardVariable(pattern, c.content, reports.environment()), c.content) << c.what;
+            const AttributedString rich(c.content, size(9));
+            EXPECT_EQ(processClipboardVariable(pattern, rich, reports.environment()), rich) << c.what;
+        }
+        EXPECT_EQ(reports.sentences().size(), 1U) << c.what;
+    }
+}
+
+TEST(ClipboardReplacement, GivesUpOnPatternsThatExplode) {
+    const std::u16string explosive = std::u16string(5'000, u'a') + u"b";
+    const std::u16string deep = std::u16string(3'000'000, u'a');
+    const struct {
+        std::u16string find;
+        const std::u16string& content;
+    } cases[] = {{u"(a+)+$", explosive}, {u"(a|aa)+$", explosive}, {u"(?:a|b)*c", deep}};
+    for (const auto& c : cases) {
+        Reports reports;
+        const auto start = std::chrono::steady_clock::now();
+        EXPECT_EQ(processClipboardVariable(variable(c.find, u"x", 1), c.content, reports.environment()), c.content);
+        EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2)) << toUtf8(c.find);
+        EXPECT_EQ(reports.sentences().size(), 1U) << toUtf8(c.find);
+    }
+}
+
+TEST(ClipboardReplacement, RefusesResultsThatGrowWithoutMeasure) {
+    std::u16string copies;
+    for (int i = 0; i < 4'000; ++i) copies += u"$0";
+    const std::u16string content(100'000, u'a');
+    Reports reports;
+    EXPECT_EQ(processClipboardVariable(variable(u".*grow|.+", copies, 1), content, reports.environment()), content);
+    EXPECT_EQ(processClipboardVariable(variable(u"a", std::u16string(10'000, u'x'), 0), content, reports.environment()),
+              content);
+    EXPECT_EQ(reports.sentences().size(), 2U);
+}
+
+TEST(ClipboardReplacement, GivesTheReplacementTheLookOfWhatItReplaces) {
+    AttributedString content(u"one ", size(1));
+    content.append(u"two", size(2));
+    content.append(u" three", size(3));
+    AttributedString expected(u"one ", size(1));
+    expected.append(u"zwei drei", size(2));
+    EXPECT_EQ(processClipboardVariable(variable(u"two three", u"zwei drei", 0), content, ContentEnvironment()),
+              expected);
+    EXPECT_EQ(processClipboardVariable(variable(u"(two) three", u"zwei drei", 1), content, ContentEnvironment()),
+              expected);
+}
+
+TEST(ClipboardReplacement, GivesTextAtAnEmptyMatchTheLookOfWhatStandsBefore) {
+    AttributedString content(u"ab", size(1));
+    content.append(u"cd", size(2));
+    AttributedString expected(u"ab|", size(1));
+    expected.append(u"cd", size(2));
+    EXPECT_EQ(processClipboardVariable(variable(u"(?=c)", u"|", 1), content, ContentEnvironment()), expected);
+}
+
+TEST(ClipboardReplacement, PutsNoFileBehindTextThatReplacesOne) {
+    TextAttributes file;
+    file.attachment = std::make_shared<const TextAttachment>(TextAttachment{u"a.png", "bytes", u""});
+    const AttributedString content(u"\uFFFC", std::make_shared<const TextAttributes>(file));
+    EXPECT_EQ(processClipboardVariable(variable(u"\uFFFC", u"x", 0), content, ContentEnvironment()),
+              AttributedString(u"x"));
+}
+
+TEST(ClipboardReplacement, RewritesRichTextOfManyRuns) {
+    AttributedString content;
+    AttributedString expected;
+    for (int i = 0; i < 50'000; ++i) {
+        const SharedAttributes look = size(i % 7 + 1);
+        content.append(u"ab", look);
+        expected.append(u"xyb", look);
+    }
+    EXPECT_EQ(processClipboardVariable(variable(u"a", u"xy", 1), content, ContentEnvironment()), expected);
+    EXPECT_EQ(processClipboardVariable(variable(u"a", u"xy", 0), content, ContentEnvironment()), expected);
+}
+
+RC_GTEST_PROP(ClipboardReplacement, SaysTheSameInRichAndInPlainText, ()) {
+    const auto texts = rc::gen::container<std::string>(rc::gen::elementOf(std::string("aAb. ")));
+    const auto pieces = *rc::gen::container<std::vector<std::string>>(texts);
+    AttributedString content;
+    for (std::size_t i = 0; i < pieces.size(); ++i) content.append(fromUtf8(pieces[i]), size(static_cast<double>(i)));
+    const auto find = fromUtf8(*rc::gen::nonEmpty(texts));
+    const auto pattern = variable(find, u"<>", *rc::gen::inRange(0, 16));
+    const AttributedString result = processClipboardVariable(pattern, content, ContentEnvironment());
+    RC_ASSERT(toUtf8(result.string()) ==
+              toUtf8(processClipboardVariable(pattern, content.string(), ContentEnvironment())));
+}
+
+}  // namespace
+}  // namespace plume
