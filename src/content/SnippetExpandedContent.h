@@ -27,6 +27,9 @@ class SnippetExpandedContent {
     std::shared_ptr<Snippet> originalSnippet;
     std::vector<std::shared_ptr<SnippetVariable>> variables;
     std::vector<std::shared_ptr<PLScript>> scripts;
+    // For each of `scripts`, how many of `variables` were listed before its placeholder: where several things stand at
+    // one location, this says what comes first.
+    std::vector<std::size_t> variablesBeforeScripts;
     std::u16string suffix;
 
     bool isRich() const { return std::holds_alternative<AttributedString>(content); }

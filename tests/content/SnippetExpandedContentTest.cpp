@@ -1,0 +1,199 @@
+#include "content/SnippetExpandedContent.h"
+
+#include <gmock/gmock.h>
+#include <rapidcheck/gtest.h>
+
+#include <algorithm>
+
+#include "Foundation/Strings.h"
+#include "content/PLOutput.h"
+#include "tests/content/ContentWorld.h"
+
+namespace plume {
+namespace {
+
+constexpr std::uint16_t Return = 36;
+constexpr std::uint16_t Tab = 48;
+constexpr std::uint16_t Escape = 53;
+constexpr std::uint16_t KeypadEnter = 76;
+constexpr std::uint16_t RightArrow = 124;
+
+std::shared_ptr<SnippetVariable> caret(std::size_t location) {
+    auto variable = std::make_shared<SnippetContentCaret>();
+    variable->location = location;
+    return variable;
+}
+
+std::shared_ptr<SnippetVariable> key(std::uint16_t code, std::size_t location, std::uint64_t count = 1) {
+    auto variable = std::make_shared<SnippetKeyVariable>(u"k", code);
+    variable->location = location;
+    variable->count = count;
+    return variable;
+}
+
+// "a|key36|b": the pieces in order.
+std::string describe(const std::vector<PLOutput::Fragment>& fragments) {
+    std::string text;
+    for (const auto& fragment : fragments) {
+        if (!text.empty()) text += "|";
+        if (const auto* plain = std::get_if<std::u16string>(&fragment)) {
+            text += toUtf8(*plain);
+        } else if (const auto* richText = std::get_if<AttributedString>(&fragment)) {
+            text += notation(*richText);
+        } else {
+            text += "key" + std::to_string(std::get<2>(fragment)->keyCode);
+        }
+    }
+    return text;
+}
+
+struct Case {
+    const char* text;
+    std::vector<std::shared_ptr<SnippetVariable>> variables;
+    std::int64_t caretLocation;
+    std::int64_t distance;
+    std::int64_t distanceIgnoringKeys;
+    const char* copyString;
+    const char* fragments;
+};
+
+TEST(SnippetExpandedContent, CaretArithmeticCopyStringAndFragments) {
+    const Case cases[] = {
+        {"abc", {}, -1, 0, 0, "abc", "abc"},
+        {"", {}, -1, 0, 0, "", ""},
+        {"ab", {key(Return, 1), caret(2)}, 3, 0, 0, "a b", "a|key36|b"},
+        {"abc", {caret(1), key(Tab, 3, 2)}, 2, 4, 2, "abc ", "abc|key48"},
+        {"abc", {caret(1), caret(2)}, 2, 1, 1, "abc", "abc"},
+        {"abc", {key(Return, 0)}, 0, 0, 0, " abc", "key36|abc"},
+        {"abc", {caret(0), key(KeypadEnter, 1, 3), key(Escape, 2)}, 0, 6, 3, "abc", "a|key76|b|key53|c"},
+        {"abc", {key(Return, 1), key(Tab, 1)}, 1, 0, 0, "a  bc", "a|key36|key48|bc"},
+        {"abcd", {key(Tab, 3), key(RightArrow, 2)}, 0, 0, 0, "abc cd", "abc|key48|key124|cd"},
+        {"ab", {key(RightArrow, 3)}, -1, 0, 0, "ab", "ab|key124"},
+        {"ab", {caret(5)}, 5, -3, -3, "ab", "ab"},
+    };
+    for (const Case& example : cases) {
+        SCOPED_TRACE(std::string(example.text) + ": " + example.fragments);
+        for (const bool isRich : {false, true}) {
+            SnippetExpandedContent content;
+            const std::u16string text = fromUtf8(example.text);
+            if (isRich) {
+                content.setContent(AttributedString(text));
+            } else {
+                content.setContent(text);
+            }
+            content.variables = example.variables;
+            EXPECT_EQ(content.caretLocation(), example.caretLocation);
+            EXPECT_EQ(content.caretDistanceFromEnding(), example.distance);
+            EXPECT_EQ(content.caretDistanceFromEndingIgnoreKeys(), example.distanceIgnoringKeys);
+            EXPECT_EQ(toUtf8(content.copyString()), example.copyString);
+            PLOutput output;
+            output.snippetExpandedContent = std::make_shared<SnippetExpandedContent>(content);
+            output.refreshFragments();
+            EXPECT_EQ(describe(output.fragments), example.fragments);
+        }
+    }
+}
+
+TEST(SnippetExpandedContent, SaysWhatItHolds) {
+    SnippetExpandedContent content;
+    EXPECT_FALSE(content.hasCaret() || content.hasCaretLocationOrKeys() || content.hasCaretLocationOrArrowKeys() ||
+                 content.hasCaretOrFields() || content.hasDelayedKey());
+
+    content.variables = {key(122, 0)};
+    EXPECT_TRUE(content.hasCaretLocationOrKeys());
+    EXPECT_FALSE(content.hasCaret() || content.hasCaretLocationOrArrowKeys() || content.hasCaretOrFields());
+    content.variables = {key(127, 0)};
+    EXPECT_FALSE(content.hasCaretLocationOrArrowKeys());
+    for (std::uint16_t code = 123; code <= 126; ++code) {
+        content.variables = {key(code, 0)};
+        EXPECT_TRUE(content.hasCaretLocationOrArrowKeys());
+    }
+    EXPECT_FALSE(content.hasDelayedKey());
+    content.keys()[0]->delay = 0.1;
+    EXPECT_TRUE(content.hasDelayedKey());
+
+    content.variables = {caret(0)};
+    EXPECT_TRUE(content.hasCaret() && content.hasCaretLocationOrKeys() && content.hasCaretLocationOrArrowKeys() &&
+                content.hasCaretOrFields());
+    content.variables = {std::make_shared<SnippetFieldVariable>()};
+    EXPECT_TRUE(content.hasCaretOrFields());
+    EXPECT_FALSE(content.hasCaret() || content.hasCaretLocationOrKeys());
+}
+
+TEST(SnippetExpandedContent, AppendsItsSuffixUnstyled) {
+    SnippetExpandedContent plain(u"ab");
+    plain.suffix = u".";
+    plain.variables = {caret(2)};
+    plain.applySuffix();
+    EXPECT_EQ(plain.string(), u"ab.");
+    EXPECT_EQ(plain.variables[0]->location, 2u);
+
+    SnippetExpandedContent styled(rich("*ab*"));
+    styled.suffix = u" ";
+    styled.applySuffix();
+    EXPECT_EQ(notation(styled), "*ab* ");
+
+    SnippetExpandedContent none(rich("*ab*"));
+    none.applySuffix();
+    EXPECT_EQ(notation(none), "*ab*");
+}
+
+TEST(PLOutput, CutsRichContentWithItsLook) {
+    SnippetExpandedContent content(rich("a*bc*d"));
+    content.variables = {key(Return, 2)};
+    EXPECT_EQ(describe(PLOutput::fragmentsForRichTextSnippet(content)), "a*b*|key36|*c*d");
+}
+
+TEST(PLOutput, WithoutContentHasNoFragments) {
+    PLOutput output;
+    output.fragments.emplace_back(u"old");
+    output.refreshFragments();
+    EXPECT_TRUE(output.fragments.empty());
+}
+
+TEST(PLOutput, WhatIsSentAgainHasAnEnd) {
+    SnippetExpandedContent content(std::u16string(1'000'000, u'x'));
+    for (int count = 0; count < 1'000; ++count) {
+        content.variables.push_back(key(Return, 1'000'000));
+        content.variables.push_back(key(RightArrow, 0));
+    }
+    std::size_t length = 0;
+    std::size_t keys = 0;
+    for (const auto& fragment : PLOutput::fragmentsForPlainTextSnippet(content)) {
+        if (const auto* text = std::get_if<std::u16string>(&fragment)) {
+            length += text->size();
+        } else {
+            ++keys;
+        }
+    }
+    EXPECT_EQ(keys, 2'000u);
+    EXPECT_EQ(length, 16u * 1024 * 1024);
+    EXPECT_EQ(content.copyString().size(), 16u * 1024 * 1024 + 1'000);
+}
+
+// Keys in the order of the text take nothing from it.
+RC_GTEST_PROP(PLOutput, FragmentsJoinedAgainAreTheContent, ()) {
+    const auto text = *rc::gen::container<std::u16string>(rc::gen::inRange<char16_t>(u'a', u'z'));
+    auto locations = *rc::gen::container<std::vector<std::size_t>>(rc::gen::inRange<std::size_t>(0, text.size() + 1));
+    std::sort(locations.begin(), locations.end());
+    SnippetExpandedContent content(text);
+    for (const std::size_t location : locations) content.variables.push_back(key(Escape, location));
+
+    std::u16string joined;
+    std::size_t keys = 0;
+    for (const auto& fragment : PLOutput::fragmentsForPlainTextSnippet(content)) {
+        if (const auto* piece = std::get_if<std::u16string>(&fragment)) {
+            RC_ASSERT(!piece->empty() || locations.empty());
+            joined += *piece;
+        } else {
+            RC_ASSERT(locations[keys] == joined.size());
+            ++keys;
+        }
+    }
+    RC_ASSERT(joined == text);
+    RC_ASSERT(keys == locations.size());
+    RC_ASSERT(content.copyString() == text);
+}
+
+}  // namespace
+}  // namespace plume
