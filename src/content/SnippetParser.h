@@ -32,6 +32,7 @@ class SnippetParser {
     // Null when the snippet cannot be expanded: it has no content, its type is unknown, or it never ends (the user is
     // told which one).
     Expansion parseSnippet(const std::shared_ptr<Snippet>& snippet, const Groups& groups);
+    // The given text in place of the snippet's own, which must not be null. Null when the expansion never ends.
     Expansion parse(const std::shared_ptr<Snippet>& snippet, std::u16string_view plainTextContent,
                     const Groups& groups);
     Expansion parse(const std::shared_ptr<Snippet>& snippet, const AttributedString& richTextContent,
@@ -39,8 +40,12 @@ class SnippetParser {
 
     // Puts the fill-in values into the content.
     static void mergeFields(SnippetExpandedContent& content);
-    // Cuts nested script snippets out of the content into its `scripts`.
+    // Cuts nested script snippets out of the content into its `scripts`; the locations of what stands behind one move
+    // with the text.
     static void processScripts(SnippetExpandedContent& content);
+    // Puts the results of the scripts that processScripts cut out into the content, with the attributes of their
+    // placeholders; what was written behind a script moves behind its result.
+    static void mergeScriptResults(SnippetExpandedContent& content);
     // Builds the script of `variable` from the text, removing it and what is nested in it from `variables`.
     static std::shared_ptr<PLScript> newScriptWithAbbreviationVariable(
         const std::shared_ptr<SnippetAbbreviationVariable>& variable, std::u16string_view snippetContent,
