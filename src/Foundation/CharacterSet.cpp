@@ -15,10 +15,10 @@ constexpr char32_t LastCodePoint = 0x10FFFF;
 
 }  // namespace
 
-// The whole set as ICU keeps it, and its part in the basic plane once more as bits.
+// The whole set as ICU keeps it (not frozen: copies of a frozen set cannot be changed), and its part in the basic plane
+// once more as bits.
 struct CharacterSet::Storage {
     explicit Storage(const icu::UnicodeSet& members) : set(members) {
-        set.freeze();
         for (int32_t i = 0; i < set.getRangeCount(); ++i) {
             const auto first = static_cast<char32_t>(set.getRangeStart(i));
             const auto last = std::min(static_cast<char32_t>(set.getRangeEnd(i)), LastOfBasicPlane);
