@@ -1,7 +1,12 @@
-// The small arithmetic language of number fields.
+// The small arithmetic language of number fields: "2 * (price - discount)", "total = a + b; round(total)".
 //
-// Binding, from loosest to tightest: "=" (right-associative); "+" and "-"; "*", "/" and "%"; unary "-"; "^"
-// (right-associative, so -2^2 is -4 and 2^-1 is 0.5). Names are letters, digits and "_" and do not start with a digit.
+// Expressions are separated by ";" or line breaks, and empty ones are skipped. Binding, from loosest to tightest: "="
+// (right-associative); "+" and "-"; "*", "/" and "%"; unary "-"; "^" (right-associative, so -2^2 is -4 and 2^-1 is
+// 0.5). An assignment may stand wherever a value may and reaches as far to the right as it can: 2*x=1+2 is 6. Names are
+// letters, digits and "_" and do not start with one of the digits 0 to 9; a variable that nobody has set is 0. A
+// function needs its parentheses and cannot be assigned to.
+//
+// Time and memory are linear in the text, and call depth is constant. Used by one thread at a time.
 #pragma once
 
 #include <map>
@@ -28,9 +33,11 @@ class MathExpressionParser {
 
     MathExpressionParser();
 
-    // The value of the last complete expression of the text, 0 when there is none. Throws MathExpressionError.
+    // The value of the last expression of the text, 0 when there is none. Throws MathExpressionError; what the
+    // expressions before the faulty one assigned stays.
     double evaluate(std::u16string_view expression);
     void setSymbolValue(double value, std::u16string_view key);
+    // 0 for a variable that nobody has set.
     double symbolValueForKey(std::u16string_view key) const;
     const std::u16string& expression() const { return expression_; }
     void setResult(double value) { result_ = value; }

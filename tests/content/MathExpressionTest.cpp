@@ -1,0 +1,303 @@
+#include <gmock/gmock.h>
+#include <rapidcheck/gtest.h>
+
+#include <clocale>
+#include <cmath>
+#include <limits>
+#include <memory>
+#include <numbers>
+
+#include "Foundation/Strings.h"
+#include "content/MathExpressionParser.h"
+
+namespace plume {
+namespace {
+
+constexpr double Infinity = std::numeric_limits<double>::infinity();
+
+struct Evaluation {
+    const char16_t* expression;
+    double value;
+};
+
+void expectValues(std::initializer_list<Evaluation> cases) {
+    for (const Evaluation& c : cases) {
+        double value = 0;
+        EXPECT_NO_THROW(value = MathExpressionParser::evaluateExpression(c.expression)) << toUtf8(c.expression);
+        EXPECT_DOUBLE_EQ(value, c.value) << toUtf8(c.expression);
+    }
+}
+
+std::string problemOf(std::u16string_view expression) {
+    try {
+        MathExpressionParser::evaluateExpression(expression);
+    } catch (const MathExpressionError& error) {
+        return std::string(error.name) + ": " + error.what();
+    }
+    return "none";
+}
+
+TEST(MathExpression, ReadsNumbers) {
+    expectValues({{u"42", 42},
+                  {u".5", 0.5},
+                  {u"1.", 1},
+                  {u"1.25e2", 125},
+                  {u"1e3", 1000},
+                  {u"1E-2", 0.01},
+                  {u"2e+1", 20},
+                  {u"007", 7},
+                  {u"1e400", Infinity},
+                  {u"1e99999999999999999999999", Infinity},
+                  {u"1e-400", 0},
+                  {u"1e-99999999999999999999999", 0},
+                  {u"0.0001e-330", 0},
+                  {u"0e99999", 0},
+                  {u"1000e306", Infinity},
+                  {u"0.001e311", 1e308}});
+}
+
+TEST(MathExpression, BindsOperators) {
+    expectValues({{u"2+3*4", 14}, {u"(2+3)*4", 20}, {u"10-4-3", 3},  {u"100/10/5", 2}, {u"7%3", 1},
+                  {u"-7%3", -1},  {u"2*7%4", 2},    {u"7.5%2", 1.5}, {u"2^3^2", 512},  {u"2*3^2", 18},
+                  {u"-2^2", -4},  {u"(-2)^2", 4},   {u"2^-1", 0.5},  {u"2^-1*4", 2},   {u"2^-3^2", std::pow(2, -9)},
+                  {u"--3", 3},    {u"2--3", 5},     {u"2*-3+10", 4}, {u" 1\t+ 2 ", 3}, {u"((((5))))", 5}});
+}
+
+TEST(MathExpression, DividesByZeroWithoutAnError) {
+    expectValues({{u"1/0", Infinity}, {u"-1/0", -Infinity}});
+    EXPECT_TRUE(std::isnan(MathExpressionParser::evaluateExpression(u"0/0")));
+    EXPECT_TRUE(std::isnan(MathExpressionParser::evaluateExpression(u"5%0")));
+}
+
+TEST(MathExpression, CallsFunctions) {
+    expectValues({{u"sin(pi/2)", 1},      {u"cos(0)", 1},
+                  {u"tan(pi/4)", 1},      {u"log(1000)", 3},
+                  {u"log2(8)", 3},        {u"ln(exp(2))", 2},
+                  {u"exp(0)", 1},         {u"abs(-3)", 3},
+                  {u"sqrt(16)", 4},       {u"asin(1)*2", 3.141592653589793},
+                  {u"acos(1)", 0},        {u"atan(1)*4", 3.141592653589793},
+                  {u"sinh(0)", 0},        {u"cosh(0)", 1},
+                  {u"tanh(0)", 0},        {u"asinh(sinh(1))", 1},
+                  {u"acosh(cosh(1))", 1}, {u"atanh(tanh(1))", 1},
+                  {u"ceil(1.2)", 2},      {u"floor(-1.2)", -2},
+                  {u"round(2.5)", 3},     {u"round(-2.5)", -3},
+                  {u"trunc(-1.9)", -1},   {u"rint(2.5)", 2},
+                  {u"near(3.5)", 4},      {u"dtor(180)", std::numbers::pi},
+                  {u"rtod(pi)", 180},     {u"sqrt (9) + 1", 4},
+                  {u"-sqrt(4)^2", -4},    {u"sqrt(abs(-16))", 4}});
+}
+
+TEST(MathExpression, AssignsAndReadsVariables) {
+    expectValues({{u"x=3", 3},
+                  {u"x=3; x*x", 9},
+                  {u"a=b=2; a+b", 4},
+                  {u"x=1+2*3", 7},
+                  {u"1+x=3", 4},
+                  {u"2*x=1+2", 6},
+                  {u"2^x=3", 8},
+                  {u"(x=2)*3+x", 8},
+                  {u"x+(x=3)", 3},
+                  {u"unknown", 0},
+                  {u"unknown+1", 1},
+                  {u"pi=3; pi", 3},
+                  {u"x_1=2; x_1^2", 4},
+                  {u"_=4;_", 4},
+                  {u"größe=5; größe+1", 6},
+                  {u"\U0001D465=5; \U0001D465", 5},
+                  {u"Sin=2; Sin", 2},
+                  {u"x = 1; X", 0}});
+}
+
+TEST(MathExpression, AnswersTheLastOfSeveralExpressions) {
+    expectValues({{u"", 0},
+                  {u"   ", 0},
+                  {u";;\n;", 0},
+                  {u"1;2;3", 3},
+                  {u"1\n2", 2},
+                  {u"1\r\n2\r\n", 2},
+                  {u"4;\n\n;", 4},
+                  {u";5", 5}});
+}
+
+TEST(MathExpression, RefusesWhatItCannotRead) {
+    for (const char16_t* expression :
+         {u"2+",   u"+2",    u"*2",    u"2 3",       u"2x",    u"(2",     u"2)", u"()",  u"(2;3)", u"(2\n)",
+          u"sin",  u"sin 2", u"sin()", u"sin=2",     u"sin(2", u"sin)2(", u"=2", u"2=3", u"x=",    u"(x)=2",
+          u"x==2", u".",     u"1..2",  u"1.2.3",     u"2e",    u"0x10",   u"2$", u"2,5", u"a b",   u"\xD835",
+          u"1;2+", u"2**3",  u"x(2)",  u"2\u00A0+3", u"--",    u"2^",     u"%"}) {
+        EXPECT_EQ(problemOf(expression), "Error in expression: error = parse error") << toUtf8(expression);
+    }
+}
+
+TEST(MathExpression, RefusesWhatIsNestedTooDeeply) {
+    const std::string overflow = "Error in expression: error = parser stack overflow";
+    const auto nested = [](std::size_t depth) {
+        return std::u16string(depth, u'(') + u"7" + std::u16string(depth, u')');
+    };
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(nested(9'999)), 7);
+    EXPECT_EQ(problemOf(nested(10'000)), overflow);
+    EXPECT_EQ(problemOf(nested(1'000'000)), overflow);
+    EXPECT_EQ(problemOf(std::u16string(1'000'000, u'-') + u"1"), overflow);
+    std::u16string powers = u"1", assignments, calls;
+    for (int i = 0; i < 20'000; ++i) {
+        powers += u"^1";
+        assignments += u"a=";
+        calls += u"abs(";
+    }
+    EXPECT_EQ(problemOf(powers), overflow);
+    EXPECT_EQ(problemOf(assignments), overflow);
+    EXPECT_EQ(problemOf(calls), overflow);
+}
+
+TEST(MathExpression, ReadsLongTexts) {
+    std::u16string sum = u"0";
+    while (sum.size() < 1'000'000) sum += u"+1";
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(sum), static_cast<double>(sum.size() / 2));
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(u"0." + std::u16string(1'000'000, u'0') + u"1"), 0);
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(std::u16string(1'000'000, u'9')), Infinity);
+    const std::u16string name(300'000, u'n');
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(name + u"=2;" + name), 2);
+}
+
+TEST(MathExpression, ReadsADecimalPointInEveryLocale) {
+    const std::string before = std::setlocale(LC_NUMERIC, nullptr);
+    std::setlocale(LC_NUMERIC, "de_DE.UTF-8");
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(u"1.5+.5"), 2);
+    std::setlocale(LC_NUMERIC, before.c_str());
+}
+
+TEST(MathExpressionParser, KeepsVariablesFromTextToText) {
+    MathExpressionParser parser;
+    EXPECT_EQ(parser.symbolValueForKey(u"x"), 0);
+    EXPECT_EQ(parser.symbolValueForKey(u"pi"), std::numbers::pi);
+    EXPECT_EQ(parser.evaluate(u"x=3"), 3);
+    EXPECT_EQ(parser.symbolValueForKey(u"x"), 3);
+    parser.setSymbolValue(4, u"x");
+    EXPECT_EQ(parser.evaluate(u"x*2"), 8);
+    EXPECT_EQ(parser.expression(), u"x*2");
+    EXPECT_EQ(parser.evaluate(u""), 0);
+    EXPECT_THROW(parser.evaluate(u"x=9; y=2+"), MathExpressionError);
+    EXPECT_EQ(parser.symbolValueForKey(u"x"), 9);
+    EXPECT_EQ(parser.symbolValueForKey(u"y"), 0);
+    EXPECT_EQ(parser.evaluate(u"x"), 9);
+}
+
+TEST(MathExpressionParser, KnowsVariableNames) {
+    for (const char16_t* name : {u"a_1", u"x", u"__", u"_a", u"1a", u"Größe", u"数", u"\U0001D465"}) {
+        EXPECT_TRUE(MathExpressionParser::isValidMathVariableName(name)) << toUtf8(name);
+    }
+    for (const char16_t* name : {u"", u"_", u"a-b", u"a b", u"a.b", u"½", u"\xD835", u"a\n"}) {
+        EXPECT_FALSE(MathExpressionParser::isValidMathVariableName(name)) << toUtf8(name);
+    }
+}
+
+// ---- Random expressions against a naive evaluator ----
+
+// An expression as a tree. It can be written with every parenthesis, or with those alone that the binding asks for.
+struct Tree {
+    char16_t operation = 0;  // 0: a number; 'n': negation; 'f': abs
+    int number = 0;
+    std::shared_ptr<Tree> left, right;
+
+    double value() const {
+        switch (operation) {
+            case u'n':
+                return -right->value();
+            case u'f':
+                return std::fabs(right->value());
+            case u'+':
+                return left->value() + right->value();
+            case u'-':
+                return left->value() - right->value();
+            case u'*':
+                return left->value() * right->value();
+            case u'/':
+                return left->value() / right->value();
+            case u'%':
+                return std::fmod(left->value(), right->value());
+            case u'^':
+                return std::pow(left->value(), right->value());
+            default:
+                return number;
+        }
+    }
+
+    std::u16string withAllParentheses() const {
+        if (operation == 0) return numeral();
+        if (operation == u'n') return u"(-" + right->withAllParentheses() + u")";
+        if (operation == u'f') return u"abs(" + right->withAllParentheses() + u")";
+        return u"(" + left->withAllParentheses() + operation + right->withAllParentheses() + u")";
+    }
+
+    std::u16string withFewParentheses() const {
+        if (operation == 0) return numeral();
+        if (operation == u'f') return u"abs(" + right->withFewParentheses() + u")";
+        // A sign may stand at the right of any operator, because nothing else can begin there.
+        const bool isSign = right->operation == u'n';
+        if (operation == u'n') return u"-" + right->wrapped(right->level() < level());
+        const bool isPower = operation == u'^';
+        const bool wrapLeft = isPower ? left->level() <= level() : left->level() < level();
+        const bool wrapRight = !isSign && (isPower ? right->level() < level() : right->level() <= level());
+        return left->wrapped(wrapLeft) + operation + right->wrapped(wrapRight);
+    }
+
+  private:
+    std::u16string numeral() const { return fromUtf8(std::to_string(number)); }
+    std::u16string wrapped(bool wrap) const { return wrap ? u"(" + withFewParentheses() + u")" : withFewParentheses(); }
+    int level() const {
+        switch (operation) {
+            case u'+':
+            case u'-':
+                return 1;
+            case u'*':
+            case u'/':
+            case u'%':
+                return 2;
+            case u'n':
+                return 3;
+            case u'^':
+                return 4;
+            default:
+                return 5;
+        }
+    }
+};
+
+rc::Gen<std::shared_ptr<Tree>> trees(int depth) {
+    const auto leaf = rc::gen::map(rc::gen::inRange(0, 10), [](int number) {
+        return std::make_shared<Tree>(Tree{0, number, nullptr, nullptr});
+    });
+    if (depth == 0) return leaf;
+    const auto node = rc::gen::mapcat(rc::gen::elementOf(std::u16string(u"+-*/%^nf")), [depth](char16_t operation) {
+        return rc::gen::apply(
+            [operation](const std::shared_ptr<Tree>& left, const std::shared_ptr<Tree>& right) {
+                return std::make_shared<Tree>(Tree{operation, 0, left, right});
+            },
+            trees(depth - 1), trees(depth - 1));
+    });
+    return rc::gen::weightedOneOf<std::shared_ptr<Tree>>({{1, leaf}, {3, node}});
+}
+
+bool same(double a, double b) {
+    return a == b || (std::isnan(a) && std::isnan(b));
+}
+
+RC_GTEST_PROP(MathExpressionProperty, ComputesWhatTheTreeComputes, ()) {
+    const auto tree = *trees(5);
+    RC_ASSERT(same(MathExpressionParser::evaluateExpression(tree->withAllParentheses()), tree->value()));
+    RC_LOG() << toUtf8(tree->withFewParentheses());
+    RC_ASSERT(same(MathExpressionParser::evaluateExpression(tree->withFewParentheses()), tree->value()));
+}
+
+RC_GTEST_PROP(MathExpressionProperty, EitherComputesOrRefusesAnyText, ()) {
+    const auto text = *rc::gen::container<std::u16string>(
+        rc::gen::elementOf(std::u16string(u"0123456789.eE+-*/^%()=;\n \tabsinx_é$")));
+    try {
+        MathExpressionParser::evaluateExpression(text);
+    } catch (const MathExpressionError& error) {
+        RC_ASSERT(std::string(error.what()) == "error = parse error");
+    }
+}
+
+}  // namespace
+}  // namespace plume
