@@ -19,6 +19,10 @@ class PLScript {
   public:
     using Text = std::optional<std::u16string>;
 
+    PLScript() = default;
+    // Takes the nested scripts apart level by level: scripts may be nested as deep as a content is long.
+    ~PLScript();
+
     // Raised by execute(), on its thread, when the script has run.
     ZDEvent<PLScript> executed;
 
@@ -31,10 +35,15 @@ class PLScript {
     Text result;
     Text suffix;  // appended to an output that is not empty
 
-    // Runs the nested scripts in order, puts their results into the text, runs it, sets `result`. Blocks.
+    // Runs the nested scripts in order, puts their results into the text, runs it, sets `result`. Blocks, whatever the
+    // scripts do no longer than the runner lets them.
     void execute(ScriptRunner& runner);
-    // Puts the nested results into `script`.
+    // Puts the nested results into `script`, each at its location; one that has no result adds nothing.
     void mergerNestedScriptResults();
+
+  private:
+    // Runs this script alone.
+    void runMerged(ScriptRunner& runner);
 };
 
 }  // namespace plume

@@ -11,8 +11,8 @@ class ScriptRunner {
   public:
     virtual ~ScriptRunner() = default;
     // Runs the script to its end, or to the time limit, and returns its whole output (standard error when standard
-    // output stayed empty) without one trailing line feed; nothing when there was none. Blocks; one script at a time,
-    // others wait. From any thread.
+    // output stayed empty) without one trailing line feed; nothing when there was none. Blocks; where scripts share a
+    // shell, one at a time has it and the others wait. From any thread.
     virtual std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) = 0;
 };
 

@@ -1,0 +1,54 @@
+#include "content/PLScript.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "content/ScriptRunner.h"
+
+namespace plume {
+
+PLScript::~PLScript() {
+    auto remaining = std::move(nestedScripts);
+    while (!remaining.empty()) {
+        const auto dropped = std::move(remaining.back());
+        remaining.pop_back();
+        if (!dropped || dropped.use_count() > 1) continue;
+        for (auto& nested : dropped->nestedScripts) remaining.push_back(std::move(nested));
+        dropped->nestedScripts.clear();
+    }
+}
+
+// A walk with a list of its own instead of a recursion, so that no depth of nesting is too deep for a thread's stack.
+void PLScript::execute(ScriptRunner& runner) {
+    struct Level {
+        PLScript* owner;
+        std::size_t nextNested;
+    };
+    std::vector<Level> levels{{this, 0}};
+    while (!levels.empty()) {
+        Level& level = levels.back();
+        PLScript* const current = level.owner;
+        if (level.nextNested < current->nestedScripts.size()) {
+            levels.push_back({current->nestedScripts[level.nextNested++].get(), 0});
+        } else {
+            levels.pop_back();
+            current->runMerged(runner);
+        }
+    }
+}
+
+void PLScript::mergerNestedScriptResults() {
+    for (auto nested = nestedScripts.rbegin(); nested != nestedScripts.rend(); ++nested) {
+        const Text& output = (*nested)->result;
+        if (output) script.insert(std::min((*nested)->location, script.size()), *output);
+    }
+}
+
+void PLScript::runMerged(ScriptRunner& runner) {
+    mergerNestedScriptResults();
+    result = runner.run(script, isAppleScript);
+    if (result && !result->empty() && suffix) *result += *suffix;
+    executed.raise(*this);
+}
+
+}  // namespace plume

@@ -1,0 +1,157 @@
+#include "content/PLScript.h"
+
+#include <gmock/gmock.h>
+
+#include <functional>
+
+#include "content/ScriptRunner.h"
+
+namespace plume {
+namespace {
+
+using testing::ElementsAre;
+
+// Answers every script by a function of its text and remembers what it was asked to run.
+class FakeRunner final : public ScriptRunner {
+  public:
+    using Answer = std::function<std::optional<std::u16string>(std::u16string_view)>;
+    explicit FakeRunner(Answer answer) : answer_(std::move(answer)) {}
+
+    std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) override {
+        ran.emplace_back(script);
+        if (isAppleScript) appleScripts.emplace_back(script);
+        return answer_(script);
+    }
+
+    std::vector<std::u16string> ran;
+    std::vector<std::u16string> appleScripts;
+
+  private:
+    Answer answer_;
+};
+
+std::optional<std::u16string> inAngles(std::u16string_view script) {
+    return u"<" + std::u16string(script) + u">";
+}
+
+std::shared_ptr<PLScript> makeScript(std::u16string text, std::size_t location = 0) {
+    auto script = std::make_shared<PLScript>();
+    script->script = std::move(text);
+    script->location = location;
+    return script;
+}
+
+TEST(PLScript, RunsItsTextAndKeepsTheResult) {
+    FakeRunner runner(inAngles);
+    PLScript script;
+    script.script = u"date";
+    script.isAppleScript = true;
+    script.execute(runner);
+    EXPECT_EQ(script.result, u"<date>");
+    EXPECT_THAT(runner.appleScripts, ElementsAre(u"date"));
+}
+
+TEST(PLScript, InsertsNestedResultsBeforeTheOuterScriptRuns) {
+    FakeRunner runner(inAngles);
+    auto outer = makeScript(u"echo  and ;");
+    outer->nestedScripts = {makeScript(u"one", 5), makeScript(u"two", 10)};
+    outer->execute(runner);
+    EXPECT_THAT(runner.ran, ElementsAre(u"one", u"two", u"echo <one> and <two>;"));
+    EXPECT_EQ(outer->result, u"<echo <one> and <two>;>");
+}
+
+TEST(PLScript, RunsEachLevelFromTheInsideOut) {
+    FakeRunner runner(inAngles);
+    auto outer = makeScript(u"a");
+    auto middle = makeScript(u"b", 1);
+    middle->nestedScripts = {makeScript(u"c", 0)};
+    outer->nestedScripts = {middle, makeScript(u"d", 1)};
+    outer->execute(runner);
+    EXPECT_THAT(runner.ran, ElementsAre(u"c", u"<c>b", u"d", u"a<<c>b><d>"));
+}
+
+TEST(PLScript, KeepsTheOrderOfResultsAtOnePlace) {
+    auto outer = makeScript(u"()");
+    outer->nestedScripts = {makeScript(u"", 1), makeScript(u"", 1)};
+    outer->nestedScripts[0]->result = u"first";
+    outer->nestedScripts[1]->result = u"second";
+    outer->mergerNestedScriptResults();
+    EXPECT_EQ(outer->script, u"(firstsecond)");
+}
+
+TEST(PLScript, InsertsNothingForANestedScriptWithoutResult) {
+    FakeRunner runner([](std::u16string_view script) { return script == u"silent" ? std::nullopt : inAngles(script); });
+    auto outer = makeScript(u"ab");
+    outer->nestedScripts = {makeScript(u"silent", 1)};
+    outer->execute(runner);
+    EXPECT_EQ(outer->result, u"<ab>");
+}
+
+TEST(PLScript, BringsLocationsPastTheEndBackToTheEnd) {
+    FakeRunner runner(inAngles);
+    auto outer = makeScript(u"ab");
+    outer->nestedScripts = {makeScript(u"x", 99)};
+    outer->execute(runner);
+    EXPECT_EQ(runner.ran.back(), u"ab<x>");
+}
+
+TEST(PLScript, AppendsTheSuffixToAnOutputThatIsNotEmpty) {
+    struct Case {
+        std::optional<std::u16string> output, suffix, expected;
+    };
+    const Case cases[] = {
+        {u"out", u".", u"out."}, {u"out", std::nullopt, u"out"},     {u"out", u"", u"out"},
+        {u"", u".", u""},        {std::nullopt, u".", std::nullopt},
+    };
+    for (const Case& c : cases) {
+        FakeRunner runner([&](std::u16string_view) { return c.output; });
+        PLScript script;
+        script.suffix = c.suffix;
+        script.execute(runner);
+        EXPECT_EQ(script.result, c.expected);
+    }
+}
+
+TEST(PLScript, TellsThatItRanOnceItsResultStands) {
+    struct Listener {
+        void scriptExecuted(PLScript& script) { results.push_back(script.result.value_or(u"none")); }
+        std::vector<std::u16string> results;
+    } listener;
+    FakeRunner runner(inAngles);
+    auto outer = makeScript(u"outer");
+    auto nested = makeScript(u"nested");
+    outer->nestedScripts = {nested};
+    outer->suffix = u"!";
+    for (const auto& script : {outer, nested}) script->executed.addObserver(&listener, &Listener::scriptExecuted);
+    outer->execute(runner);
+    EXPECT_THAT(listener.results, ElementsAre(u"<nested>", u"<<nested>outer>!"));
+}
+
+TEST(PLScript, RunsAndGoesAwayHoweverDeepItIsNested) {
+    constexpr std::size_t Depth = 200'000;
+    auto outermost = makeScript(u"");
+    PLScript* innermost = outermost.get();
+    for (std::size_t i = 0; i < Depth; ++i) {
+        innermost->nestedScripts = {makeScript(u"")};
+        innermost = innermost->nestedScripts[0].get();
+    }
+    innermost->script = u"x";
+    FakeRunner runner([](std::u16string_view script) { return std::u16string(script); });
+    outermost->execute(runner);
+    EXPECT_EQ(outermost->result, u"x");
+    EXPECT_EQ(runner.ran.size(), Depth + 1);
+    outermost.reset();
+}
+
+TEST(PLScript, LeavesScriptsThatOthersStillHold) {
+    auto outer = makeScript(u"outer");
+    auto kept = makeScript(u"kept");
+    kept->nestedScripts = {makeScript(u"inner")};
+    outer->nestedScripts = {kept};
+    outer.reset();
+    ASSERT_EQ(kept->nestedScripts.size(), 1u);
+    EXPECT_EQ(kept->nestedScripts[0]->script, u"inner");
+}
+
+}  // namespace
+}  // namespace plume
