@@ -7,6 +7,8 @@
 #include <functional>
 #include <limits>
 #include <memory>
+#include <optional>
+#include <string_view>
 #include <variant>
 #include <vector>
 
@@ -188,14 +190,49 @@ class PatternReplacement {
     std::u16string_view content_;
 };
 
-std::string visitOccurrences(const SnippetClipboardVariable& variable, std::u16string_view content,
-                             const Visitor& visitor) {
-    const std::u16string replacement = variable.replacement.value_or(std::u16string());
-    for (const Range range : rangesOfString(content, *variable.find, !variable.matchCase)) {
-        if (!visitor(range, replacement)) return "makes the text too long";
+// The occurrences of a literal text, one after the other, in time linear in both texts: the content is anybody's.
+class LiteralReplacement {
+  public:
+    LiteralReplacement(const SnippetClipboardVariable& variable, std::u16string_view content)
+        : find_(comparable(*variable.find, variable)),
+          content_(comparable(content, variable)),
+          replacement_(variable.replacement.value_or(std::u16string())) {}
+
+    // As PatternReplacement::visit.
+    std::string visit(const Visitor& visitor) {
+        const std::vector<std::size_t> fallback = fallbackLengths();
+        std::size_t matched = 0;
+        for (std::size_t i = 0; i < content_.size(); ++i) {
+            while (matched > 0 && content_[i] != find_[matched]) matched = fallback[matched - 1];
+            if (content_[i] == find_[matched]) ++matched;
+            if (matched < find_.size()) continue;
+            if (!visitor({i + 1 - matched, matched}, replacement_)) return "makes the text too long";
+            matched = 0;
+        }
+        return "";
     }
-    return "";
-}
+
+  private:
+    static std::u16string comparable(std::u16string_view text, const SnippetClipboardVariable& variable) {
+        return variable.matchCase ? std::u16string(text) : folded(text);
+    }
+
+    // For each length of the find text's start: how much of it is also its end, so that a search that fails there goes
+    // on from here.
+    std::vector<std::size_t> fallbackLengths() const {
+        std::vector<std::size_t> lengths(find_.size(), 0);
+        for (std::size_t i = 1; i < find_.size(); ++i) {
+            std::size_t length = lengths[i - 1];
+            while (length > 0 && find_[i] != find_[length]) length = lengths[length - 1];
+            lengths[i] = find_[i] == find_[length] ? length + 1 : 0;
+        }
+        return lengths;
+    }
+
+    std::u16string find_;
+    std::u16string content_;
+    std::u16string replacement_;
+};
 
 // Calls the visitor for every replacement to make. False, with the reason reported, when the content is to stay.
 bool visitReplacements(const SnippetClipboardVariable& variable, std::u16string_view content,
@@ -203,7 +240,7 @@ bool visitReplacements(const SnippetClipboardVariable& variable, std::u16string_
     if (!variable.find || variable.find->empty()) return false;
     if (content.size() > std::numeric_limits<std::int32_t>::max()) return false;
     const std::string problem = usesPattern(variable) ? PatternReplacement(variable, content).visit(visitor)
-                                                      : visitOccurrences(variable, content, visitor);
+                                                      : LiteralReplacement(variable, content).visit(visitor);
     if (problem.empty()) return true;
     reportOnce(environment, "The clipboard is inserted unchanged: the find text " + quotedForReport(*variable.find) +
                                 " of its placeholder " + problem + ".");
