@@ -51,6 +51,7 @@ INSTANTIATE_TEST_SUITE_P(
                     WrittenBack{"grouped delay", u"key:A code:0 delay:1,234.5", u"key:A code:0 delay:1,234.5"},
                     WrittenBack{"ungrouped delay", u"key:A code:0 delay:1234.5", u"key:A code:0 delay:1,234.5"},
                     WrittenBack{"comma that groups nothing", u"key:A code:0 delay:1,5", u"key:A code:0 delay:1"},
+                    WrittenBack{"comma before four digits", u"key:A code:0 delay:1,2345", u"key:A code:0 delay:1"},
                     WrittenBack{"three fraction digits", u"key:A code:0 delay:0.12345", u"key:A code:0 delay:0.123"},
                     WrittenBack{"delay with exponent", u"key:A code:0 delay:5e-1", u"key:A code:0 delay:0.5"},
                     WrittenBack{"delay with sign and space", u"key:A code:0 delay:\" +2\"", u"key:A code:0 delay:2"},

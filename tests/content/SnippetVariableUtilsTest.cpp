@@ -34,6 +34,7 @@ TEST(ParseParams, ReadsBodies) {
         {"stray quote", u"a:x\"y b:2", {{u"a", u"x"}}},
         {"text after a quoted value", u"a:\"x\"y b:2", {{u"a", u"x"}}},
         {"quote without an end", u"a:1 b:\"x c:3", {{u"a", u"1"}, {u"b", u""}}},
+        {"quote without an end after a doubled one", u"a:\"x\"\"y", {{u"a", u""}}},
         {"quote without an end in the name", u"a:1 \"b", {{u"a", u"1"}}},
         {"newlines are text", u"field:N value:a\nb c:d", {{u"field", u"N"}, {u"value", u"a\nb"}, {u"c", u"d"}}},
         {"empty name", u":x", {{u"", u"x"}}}};
