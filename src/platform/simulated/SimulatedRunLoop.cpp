@@ -8,7 +8,7 @@ namespace plume {
 
 namespace {
 
-constexpr std::size_t MaxCallsAtOneMoment = 1'000'000;
+constexpr std::size_t MaxCallsAtOneMoment = 100'000;
 
 }  // namespace
 
