@@ -1,0 +1,191 @@
+#include "Foundation/ZDEvent.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <string>
+
+namespace plume {
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+struct Arguments {
+    bool cancel = false;
+    std::vector<std::string> calls;
+};
+
+using Event = ZDEvent<Arguments>;
+
+class Listener {
+  public:
+    explicit Listener(std::string name) : name_(std::move(name)) {}
+
+    void first(Arguments& arguments) {
+        arguments.calls.push_back(name_ + ".first");
+        if (during) during();
+    }
+    void second(Arguments& arguments) { arguments.calls.push_back(name_ + ".second"); }
+    void cancels(Arguments& arguments) { arguments.cancel = true; }
+    void readsCancel(Arguments& arguments) { arguments.calls.push_back(arguments.cancel ? "cancelled" : "open"); }
+
+    std::function<void()> during;
+
+  private:
+    std::string name_;
+};
+
+class ZDEventTest : public testing::Test {
+  protected:
+    std::vector<std::string> raise() {
+        Arguments arguments;
+        event_.raise(arguments);
+        return arguments.calls;
+    }
+
+    // Stands for the main thread: keeps the calls until they are run.
+    void raiseLater(const std::shared_ptr<Arguments>& arguments) {
+        event_.raiseOnMainThread(arguments, [this](std::function<void()> call) { queue_.push_back(std::move(call)); });
+    }
+    void runQueue() {
+        for (const auto& call : queue_) call();
+        queue_.clear();
+    }
+
+    Event event_;
+    Listener a_{"a"};
+    Listener b_{"b"};
+    std::vector<std::function<void()>> queue_;
+};
+
+TEST_F(ZDEventTest, CallsInTheOrderOfRegistration) {
+    event_.addObserver(&b_, &Listener::second);
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("b.second", "a.first", "b.first"));
+}
+
+TEST_F(ZDEventTest, RemovesTheFirstOfTwoEqualHandlers) {
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    event_.addObserver(&a_, &Listener::first);
+    event_.removeObserver(&a_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("b.first", "a.first"));
+}
+
+TEST_F(ZDEventTest, RemovesOnlyTheHandlerThatWasNamed) {
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&a_, &Listener::second);
+    event_.removeObserver(&a_, &Listener::second);
+    event_.removeObserver(&b_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("a.first"));
+}
+
+TEST_F(ZDEventTest, RemovesEveryHandlerOfAnObserver) {
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    event_.addObserver(&a_, &Listener::second);
+    event_.removeObservers(&a_);
+    EXPECT_THAT(raise(), ElementsAre("b.first"));
+}
+
+TEST_F(ZDEventTest, AHandlerRemovedWhileTheEventIsRaisedIsNotCalled) {
+    a_.during = [this] { event_.removeObservers(&b_); };
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    event_.addObserver(&a_, &Listener::second);
+    EXPECT_THAT(raise(), ElementsAre("a.first", "a.second"));
+}
+
+TEST_F(ZDEventTest, AHandlerMayRemoveItself) {
+    a_.during = [this] { event_.removeObserver(&a_, &Listener::first); };
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("a.first", "b.first"));
+    EXPECT_THAT(raise(), ElementsAre("b.first"));
+}
+
+TEST_F(ZDEventTest, RemovingTwiceWhileRaisedTakesBothOfTwoEqualHandlers) {
+    a_.during = [this] {
+        event_.removeObserver(&b_, &Listener::first);
+        event_.removeObserver(&b_, &Listener::first);
+    };
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("a.first"));
+}
+
+TEST_F(ZDEventTest, AHandlerAddedWhileTheEventIsRaisedIsCalledFromTheNextTimeOn) {
+    a_.during = [this] {
+        a_.during = nullptr;
+        for (int i = 0; i < 100; ++i) event_.addObserver(&b_, &Listener::second);
+    };
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("a.first", "b.first"));
+    EXPECT_EQ(raise().size(), 102U);
+}
+
+TEST_F(ZDEventTest, RemovingWhileRaisedWithinAHandlerKeepsThePlacesOfTheOuterRaise) {
+    std::vector<std::string> inner;
+    a_.during = [&] {
+        a_.during = nullptr;
+        event_.removeObserver(&a_, &Listener::first);
+        inner = raise();
+    };
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    event_.addObserver(&b_, &Listener::second);
+    EXPECT_THAT(raise(), ElementsAre("a.first", "b.first", "b.second"));
+    EXPECT_THAT(inner, ElementsAre("b.first", "b.second"));
+}
+
+TEST_F(ZDEventTest, LaterHandlersAndTheRaiserSeeWhatAHandlerSet) {
+    event_.addObserver(&a_, &Listener::readsCancel);
+    event_.addObserver(&a_, &Listener::cancels);
+    event_.addObserver(&b_, &Listener::readsCancel);
+    Arguments arguments;
+    event_.raise(arguments);
+    EXPECT_TRUE(arguments.cancel);
+    EXPECT_THAT(arguments.calls, ElementsAre("open", "cancelled"));
+}
+
+TEST_F(ZDEventTest, OnTheMainThreadEveryHandlerGetsACallOfItsOwn) {
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    const auto arguments = std::make_shared<Arguments>();
+    raiseLater(arguments);
+    EXPECT_EQ(queue_.size(), 2U);
+    EXPECT_THAT(arguments->calls, IsEmpty());
+    runQueue();
+    EXPECT_THAT(arguments->calls, ElementsAre("a.first", "b.first"));
+}
+
+TEST_F(ZDEventTest, AHandlerRemovedBeforeItsCallArrivesIsNotCalled) {
+    event_.addObserver(&a_, &Listener::first);
+    event_.addObserver(&b_, &Listener::first);
+    const auto arguments = std::make_shared<Arguments>();
+    raiseLater(arguments);
+    event_.removeObservers(&a_);
+    runQueue();
+    EXPECT_THAT(arguments->calls, ElementsAre("b.first"));
+}
+
+TEST_F(ZDEventTest, QueuedCallsKeepTheArgumentAliveAndOutliveTheEvent) {
+    auto arguments = std::make_shared<Arguments>();
+    const std::weak_ptr<Arguments> watched = arguments;
+    {
+        Event event;
+        event.addObserver(&a_, &Listener::first);
+        event.raiseOnMainThread(arguments, [this](std::function<void()> call) { queue_.push_back(std::move(call)); });
+    }
+    arguments.reset();
+    EXPECT_FALSE(watched.expired());
+    runQueue();
+    EXPECT_TRUE(watched.expired());
+}
+
+}  // namespace
+}  // namespace plume
