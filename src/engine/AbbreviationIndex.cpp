@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <bit>
+#include <cstddef>
+#include <utility>
 
 #include "Foundation/Strings.h"
 #include "library/AbbreviationHash.h"
@@ -19,7 +21,7 @@ constexpr bool isLowSurrogate(char16_t unit) {
 
 // The key under which a suffix of this hash and length is filed. Mixed, so that all its bits depend on all of the
 // hash's.
-constexpr std::uint64_t keyOf(std::uint64_t hash, std::size_t length) {
+constexpr std::uint64_t mixedKey(std::uint64_t hash, std::size_t length) {
     std::uint64_t key = hash + length * 0xd6e8feb86659fd93ULL;
     key = (key ^ (key >> 32)) * 0xd6e8feb86659fd93ULL;
     return key ^ (key >> 32);
@@ -51,14 +53,6 @@ class FoldedUnitsFromEnd {
     std::u16string_view text_;
     std::size_t position_;
 };
-
-std::uint64_t keyOfAbbreviation(std::u16string_view prefixed, std::size_t longest) {
-    const std::size_t length = std::min(prefixed.size(), longest);
-    FoldedUnitsFromEnd units(prefixed);
-    std::uint64_t hash = EmptySuffixHash;
-    for (std::size_t i = 0; i < length; ++i) hash = extendSuffixHash(hash, units.next());
-    return keyOf(hash, length);
-}
 
 // Two occurrences of the text can share units: some proper start of it is also its end.
 bool overlapsItself(std::u16string_view text) {
@@ -129,7 +123,7 @@ void AbbreviationIndex::addGroup(const std::shared_ptr<SnippetGroup>& group) {
 
 void AbbreviationIndex::removeGroup(IndexedGroup& group) {
     group.group->removeGroupObserver(this);
-    for (const auto& [snippet, record] : group.records) removeRecord(record);
+    for (const std::uint32_t record : group.records) removeRecord(record);
 }
 
 void AbbreviationIndex::refreshSettings(IndexedGroup& group) {
@@ -149,10 +143,9 @@ void AbbreviationIndex::refreshDelimiters() {
 void AbbreviationIndex::matchingSettingsChanged(SnippetGroup& group) {
     IndexedGroup* indexed = find(group);
     if (!indexed) return;
-    for (const auto& [snippet, record] : indexed->records) unfile(record);
+    for (const std::uint32_t record : indexed->records) unfile(record);
     refreshSettings(*indexed);
-    reserve(*indexed, indexed->records.size());
-    for (const auto& [snippet, record] : indexed->records) file(record);
+    for (const std::uint32_t record : indexed->records) file(record);
     refreshDelimiters();
 }
 
@@ -160,32 +153,54 @@ void AbbreviationIndex::itemsAdded(SnippetGroup& group, std::size_t first, std::
     IndexedGroup* indexed = find(group);
     if (!indexed) return;
     const auto& items = group.items();
-    reserve(*indexed, count);
-    for (std::size_t i = first; i < first + count; ++i) addRecord(*indexed, items[i], static_cast<std::uint32_t>(i));
+    if (indexed->table) {
+        SuffixTable& suffixes = tableOf(*indexed).suffixes;
+        suffixes.reserve(suffixes.size() + count, records_.size() + count);
+    }
+    std::vector<std::uint32_t> added;
+    added.reserve(count);
+    for (std::size_t i = first; i < first + count; ++i) added.push_back(addRecord(*indexed, items[i], i));
+    indexed->records.insert(indexed->records.begin() + static_cast<std::ptrdiff_t>(first), added.begin(), added.end());
     if (first + count < items.size()) indexed->ranksAreStale = true;
 }
 
-void AbbreviationIndex::itemRemoved(SnippetGroup& group, Snippet& snippet) {
+void AbbreviationIndex::itemRemoved(SnippetGroup& group, Snippet&, std::size_t index) {
     IndexedGroup* indexed = find(group);
     if (!indexed) return;
-    const auto found = indexed->records.find(&snippet);
-    if (found == indexed->records.end()) return;
-    removeRecord(found->second);
-    indexed->records.erase(found);
+    removeRecord(indexed->records[index]);
+    indexed->records.erase(indexed->records.begin() + static_cast<std::ptrdiff_t>(index));
     // The ranks that stay are still in order among themselves, but the next appended snippet's would not be.
     indexed->ranksAreStale = true;
 }
 
-void AbbreviationIndex::abbreviationChanged(SnippetGroup& group, Snippet& snippet) {
+void AbbreviationIndex::abbreviationChanged(SnippetGroup& group, Snippet& snippet,
+                                            const std::optional<std::u16string>& previous) {
     IndexedGroup* indexed = find(group);
-    if (!indexed) return;
-    const auto found = indexed->records.find(&snippet);
-    if (found == indexed->records.end()) return;
-    unfile(found->second);
-    file(found->second);
+    if (!indexed || !indexed->table) return;
+    const std::uint32_t record = recordFiledUnder(*indexed, snippet, previous);
+    if (record == SuffixTable::None) return;
+    unfile(record);
+    file(record);
 }
 
-void AbbreviationIndex::addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet, std::uint32_t rank) {
+// The group's record of the snippet while its abbreviation was the given one, or None when the group does not list it.
+std::uint32_t AbbreviationIndex::recordFiledUnder(IndexedGroup& group, const Snippet& snippet,
+                                                  const std::optional<std::u16string>& abbreviation) {
+    const auto isIt = [&](std::uint32_t record) {
+        return records_[record].snippet.get() == &snippet && records_[record].group == &group;
+    };
+    if (!abbreviation || abbreviation->empty()) {  // it was filed nowhere
+        const auto found = std::find_if(group.records.begin(), group.records.end(), isIt);
+        return found == group.records.end() ? SuffixTable::None : *found;
+    }
+    const SuffixTable& suffixes = tableOf(group).suffixes;
+    std::uint32_t record = suffixes.first(keyOf(group, *abbreviation));
+    while (record != SuffixTable::None && !isIt(record)) record = suffixes.next(record);
+    return record;
+}
+
+std::uint32_t AbbreviationIndex::addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet,
+                                           std::size_t rank) {
     std::uint32_t index;
     if (freeRecords_.empty()) {
         index = static_cast<std::uint32_t>(records_.size());
@@ -194,16 +209,12 @@ void AbbreviationIndex::addRecord(IndexedGroup& group, const std::shared_ptr<Sni
         index = freeRecords_.back();
         freeRecords_.pop_back();
     }
-    if (!group.records.try_emplace(snippet.get(), index).second) {
-        freeRecords_.push_back(index);  // listed twice: found once is enough
-        return;
-    }
     Record& record = records_[index];
-    record = Record{};
     record.snippet = snippet;
     record.group = &group;
-    record.rank = rank;
+    record.rank = static_cast<std::uint32_t>(rank);
     file(index);
+    return index;
 }
 
 void AbbreviationIndex::removeRecord(std::uint32_t index) {
@@ -212,27 +223,26 @@ void AbbreviationIndex::removeRecord(std::uint32_t index) {
     freeRecords_.push_back(index);
 }
 
+std::uint64_t AbbreviationIndex::keyOf(const IndexedGroup& group, std::u16string_view abbreviation) {
+    prefixed_.assign(group.prefix).append(abbreviation);
+    const std::size_t length = std::min(prefixed_.size(), LongestSuffix);
+    FoldedUnitsFromEnd units(prefixed_);
+    std::uint64_t hash = EmptySuffixHash;
+    for (std::size_t i = 0; i < length; ++i) hash = extendSuffixHash(hash, units.next());
+    return mixedKey(hash, length);
+}
+
 void AbbreviationIndex::file(std::uint32_t index) {
     Record& record = records_[index];
     const auto& abbreviation = record.snippet->abbreviation();
     if (!record.group->table || !abbreviation || abbreviation->empty()) return;
     record.length = record.group->prefix.size() + abbreviation->size();
-    record.key = keyOfAbbreviation(record.group->prefix.empty() ? *abbreviation : record.group->prefix + *abbreviation,
-                                   LongestSuffix);
 
     Table& table = tableOf(*record.group);
     const std::size_t lengthIndex = std::min(record.length, LongestSuffix) - 1;
     ++table.lengthCounts[lengthIndex];
     table.lengthsInUse |= std::uint64_t{1} << lengthIndex;
-    const auto [head, isNew] = table.heads.try_emplace(record.key, index);
-    if (!isNew) {
-        record.next = head->second;
-        records_[head->second].previous = index;
-        head->second = index;
-        return;
-    }
-    table.filter.add(record.key);
-    if (table.filter.isFull()) rebuildFilter(table, 2 * table.heads.size());
+    table.suffixes.add(index, keyOf(*record.group, *abbreviation));
 }
 
 void AbbreviationIndex::unfile(std::uint32_t index) {
@@ -241,38 +251,11 @@ void AbbreviationIndex::unfile(std::uint32_t index) {
     Table& table = tableOf(*record.group);
     const std::size_t lengthIndex = std::min(record.length, LongestSuffix) - 1;
     if (--table.lengthCounts[lengthIndex] == 0) table.lengthsInUse &= ~(std::uint64_t{1} << lengthIndex);
-
-    if (record.next != NoRecord) records_[record.next].previous = record.previous;
-    if (record.previous != NoRecord) {
-        records_[record.previous].next = record.next;
-    } else if (record.next != NoRecord) {
-        table.heads[record.key] = record.next;
-    } else {
-        table.heads.erase(record.key);
-        if (++table.staleKeys > table.heads.size() / 2 + 1000) rebuildFilter(table, table.heads.size());
-    }
+    table.suffixes.remove(index);
     record.length = 0;
-    record.next = record.previous = NoRecord;
 }
 
-void AbbreviationIndex::reserve(IndexedGroup& group, std::size_t count) {
-    group.records.reserve(group.records.size() + count);
-    if (!group.table) return;
-    Table& table = tableOf(group);
-    const std::size_t expected = table.heads.size() + count;
-    if (expected < 2 * table.heads.size()) return;  // doubling by itself is soon enough
-    table.heads.reserve(expected);
-    rebuildFilter(table, expected);
-}
-
-void AbbreviationIndex::rebuildFilter(Table& table, std::size_t room) {
-    table.filter.reset(room);
-    table.staleKeys = 0;
-    for (const auto& [key, head] : table.heads) table.filter.add(key);
-}
-
-void AbbreviationIndex::collectCandidates(Trigger trigger, std::u16string_view text,
-                                          std::vector<Candidate>& candidates) const {
+void AbbreviationIndex::visitCandidates(Trigger trigger, std::u16string_view text, Visitor& visitor) const {
     const Table& table = tables_[static_cast<std::size_t>(trigger)];
     const std::size_t longest = static_cast<std::size_t>(std::bit_width(table.lengthsInUse));
     const std::size_t walked = std::min(longest, text.size());
@@ -281,27 +264,21 @@ void AbbreviationIndex::collectCandidates(Trigger trigger, std::u16string_view t
     for (std::size_t length = 1; length <= walked; ++length) {
         hash = extendSuffixHash(hash, units.next());
         if ((table.lengthsInUse >> (length - 1) & 1) == 0) continue;
-        const std::uint64_t key = keyOf(hash, length);
-        if (table.filter.mayContain(key)) collectUnderKey(table, key, text.size(), candidates);
+        const std::uint64_t key = mixedKey(hash, length);
+        if (!table.suffixes.mayContain(key)) continue;
+        for (auto index = table.suffixes.first(key); index != SuffixTable::None; index = table.suffixes.next(index)) {
+            const Record& record = records_[index];
+            if (record.length > text.size()) continue;
+            if (record.group->ranksAreStale) refreshRanks(*record.group);
+            visitor.visit({record.group, &record.snippet, record.length, record.rank});
+        }
     }
 }
 
-void AbbreviationIndex::collectUnderKey(const Table& table, std::uint64_t key, std::size_t textLength,
-                                        std::vector<Candidate>& candidates) const {
-    const auto head = table.heads.find(key);
-    if (head == table.heads.end()) return;
-    for (std::uint32_t index = head->second; index != NoRecord; index = records_[index].next) {
-        const Record& record = records_[index];
-        if (record.length > textLength) continue;
-        if (record.group->ranksAreStale) refreshRanks(*record.group);
-        candidates.push_back({record.group, &record.snippet, record.length, record.rank});
-    }
-}
-
-void AbbreviationIndex::refreshRanks(IndexedGroup& group) const {
+void AbbreviationIndex::refreshRanks(const IndexedGroup& group) const {
     std::uint32_t rank = 0;
-    for (const auto& snippet : group.group->items()) records_[group.records.at(snippet.get())].rank = rank++;
-    group.ranksAreStale = false;
+    for (const std::uint32_t record : group.records) records_[record].rank = rank++;
+    records_[group.records.front()].group->ranksAreStale = false;
 }
 
 }  // namespace plume

@@ -13,12 +13,13 @@
 #include <cstdint>
 #include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
 #include "Foundation/CharacterSet.h"
-#include "engine/SuffixFilter.h"
+#include "engine/SuffixTable.h"
 #include "library/SnippetGroup.h"
 
 namespace plume {
@@ -36,8 +37,8 @@ class AbbreviationIndex final : public SnippetGroupObserver {
         std::size_t order = 0;  // place in the library
         std::u16string prefix;
         bool prefixOverlapsItself = false;
-        std::optional<Trigger> table;  // where its snippets are filed; nothing for groups that never expand
-        std::unordered_map<const Snippet*, std::uint32_t> records;
+        std::optional<Trigger> table;        // where its snippets are filed; nothing for groups that never expand
+        std::vector<std::uint32_t> records;  // of its items, in their order
         bool ranksAreStale = false;
     };
 
@@ -46,6 +47,12 @@ class AbbreviationIndex final : public SnippetGroupObserver {
         const std::shared_ptr<Snippet>* snippet;
         std::size_t length;  // of prefix and abbreviation
         std::uint32_t rank;  // place in the group's items
+    };
+
+    class Visitor {
+      public:
+        virtual ~Visitor() = default;
+        virtual void visit(const Candidate& candidate) = 0;
     };
 
     explicit AbbreviationIndex(CharacterSet defaultDelimiters);
@@ -59,35 +66,30 @@ class AbbreviationIndex final : public SnippetGroupObserver {
     // Some group expands after this delimiter.
     bool isDelimiter(char16_t unit) const { return delimiters_.contains(unit); }
 
-    // Adds to `candidates` what could end the text, in no particular order.
-    void collectCandidates(Trigger trigger, std::u16string_view text, std::vector<Candidate>& candidates) const;
+    // Shows the visitor each snippet that could end the text, in no particular order.
+    void visitCandidates(Trigger trigger, std::u16string_view text, Visitor& visitor) const;
 
-    void abbreviationChanged(SnippetGroup& group, Snippet& snippet) override;
+    void abbreviationChanged(SnippetGroup& group, Snippet& snippet,
+                             const std::optional<std::u16string>& previous) override;
     void itemsAdded(SnippetGroup& group, std::size_t first, std::size_t count) override;
-    void itemRemoved(SnippetGroup& group, Snippet& snippet) override;
+    void itemRemoved(SnippetGroup& group, Snippet& snippet, std::size_t index) override;
     void matchingSettingsChanged(SnippetGroup& group) override;
 
   private:
     static constexpr std::size_t LongestSuffix = 64;
-    static constexpr std::uint32_t NoRecord = 0xffffffff;
 
-    // One snippet of the library; records under the same key form a list.
+    // One snippet of the library. Where it is filed, the table of the same number of entries knows.
     struct Record {
         std::shared_ptr<Snippet> snippet;
         IndexedGroup* group = nullptr;
-        std::uint64_t key = 0;
-        std::size_t length = 0;  // 0: filed nowhere
+        std::size_t length = 0;  // of prefix and abbreviation; 0: filed nowhere
         std::uint32_t rank = 0;
-        std::uint32_t next = NoRecord;
-        std::uint32_t previous = NoRecord;
     };
 
     struct Table {
         std::uint64_t lengthsInUse = 0;  // bit n-1: some abbreviation is n units long, or longer for the last bit
         std::array<std::size_t, LongestSuffix> lengthCounts{};
-        SuffixFilter filter;
-        std::size_t staleKeys = 0;  // removed, but still admitted by the filter
-        std::unordered_map<std::uint64_t, std::uint32_t> heads;
+        SuffixTable suffixes;
     };
 
     Table& tableOf(const IndexedGroup& group) { return tables_[static_cast<std::size_t>(*group.table)]; }
@@ -98,15 +100,14 @@ class AbbreviationIndex final : public SnippetGroupObserver {
     void refreshSettings(IndexedGroup& group);
     void refreshDelimiters();
 
-    void addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet, std::uint32_t rank);
+    std::uint32_t addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet, std::size_t rank);
     void removeRecord(std::uint32_t index);
     void file(std::uint32_t index);
     void unfile(std::uint32_t index);
-    void reserve(IndexedGroup& group, std::size_t count);
-    static void rebuildFilter(Table& table, std::size_t room);
-    void collectUnderKey(const Table& table, std::uint64_t key, std::size_t textLength,
-                         std::vector<Candidate>& candidates) const;
-    void refreshRanks(IndexedGroup& group) const;
+    std::uint32_t recordFiledUnder(IndexedGroup& group, const Snippet& snippet,
+                                   const std::optional<std::u16string>& abbreviation);
+    std::uint64_t keyOf(const IndexedGroup& group, std::u16string_view abbreviation);
+    void refreshRanks(const IndexedGroup& group) const;
 
     CharacterSet defaultDelimiters_;
     CharacterSet delimiters_;
@@ -114,6 +115,7 @@ class AbbreviationIndex final : public SnippetGroupObserver {
     mutable std::vector<Record> records_;  // ranks are brought up to date when they are asked for
     std::vector<std::uint32_t> freeRecords_;
     std::array<Table, 3> tables_;
+    std::u16string prefixed_;  // kept for its capacity
 };
 
 }  // namespace plume

@@ -1,8 +1,10 @@
 #include "engine/SnippetMatcher.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <tuple>
 #include <utility>
+#include <vector>
 
 #include "Foundation/Strings.h"
 #include "engine/AbbreviationIndex.h"
@@ -17,28 +19,14 @@ using Trigger = AbbreviationIndex::Trigger;
 
 constexpr char16_t ObjectReplacementCharacter = 0xfffc;
 
-// Where the key went, asked at most once for a key.
-class Destination {
-  public:
-    explicit Destination(const MatchContext& context) : context_(context) {}
-
-    bool isAdmittedBy(const PLFunctionAvailability& availability) {
-        if (availability.availability != PLFunctionAvailability::Everywhere) {
-            if (!application_) application_ = context_.bundleIdentifier();
-            if (!availability.admitsApplication(*application_)) return false;
-        }
-        if (availability.inputMethodsOption != PLFunctionAvailability::Everywhere) {
-            if (!inputSource_) inputSource_ = context_.inputSourceIdentifier();
-            if (!availability.admitsInputSource(*inputSource_)) return false;
-        }
-        return true;
+bool isActive(const PLFunctionAvailability& where, const MatchContext& context) {
+    if (where.availability != PLFunctionAvailability::Everywhere &&
+        !where.admitsApplication(context.bundleIdentifier())) {
+        return false;
     }
-
-  private:
-    const MatchContext& context_;
-    std::optional<std::optional<std::u16string>> application_;
-    std::optional<std::optional<std::u16string>> inputSource_;
-};
+    return where.inputMethodsOption == PLFunctionAvailability::Everywhere ||
+           where.admitsInputSource(context.inputSourceIdentifier());
+}
 
 bool standsAt(std::u16string_view text, std::size_t position, std::u16string_view prefix) {
     return equalsIgnoringCase(text.substr(position, prefix.size()), prefix);
@@ -83,11 +71,56 @@ bool matchesPlain(const SnippetMatcher& matcher, const Candidate& candidate, std
     return matcher.checkAbbreviation(*snippet.abbreviation(), text, *candidate.group->group, caseSensitive).has_value();
 }
 
-// Library order; within a group with a prefix the occurrences of the prefix from left to right first.
-auto orderOf(const Candidate& candidate, std::size_t textLength) {
-    const std::size_t occurrence = candidate.group->prefix.empty() ? 0 : textLength - candidate.length;
-    return std::tuple(candidate.group->order, occurrence, candidate.rank);
-}
+// One look through the library for one key: the rules, applied to the index's candidates.
+class Search final : public AbbreviationIndex::Visitor {
+  private:
+    struct Found {
+        Candidate candidate;
+        std::u16string_view typed;
+
+        std::tuple<std::size_t, std::ptrdiff_t, std::uint32_t> place() const {
+            // The longer the typed text, the further to the left its prefix stands.
+            const bool prefixed = !candidate.group->prefix.empty();
+            return {candidate.group->order, prefixed ? -static_cast<std::ptrdiff_t>(typed.size()) : 0, candidate.rank};
+        }
+    };
+
+  public:
+    Search(const SnippetMatcher& matcher, char16_t trigger, const MatchContext& context)
+        : matcher_(matcher), trigger_(trigger), context_(context) {}
+
+    void run(const AbbreviationIndex& index, Trigger way, std::u16string_view text) {
+        way_ = way;
+        text_ = text;
+        index.visitCandidates(way, text, *this);
+    }
+
+    void visit(const Candidate& candidate) override {
+        const SnippetGroup& group = *candidate.group->group;
+        if (way_ == Trigger::Delimiter && !matcher_.delimitersOf(group).contains(trigger_)) return;
+        if (!(*candidate.snippet)->hasContent() || !isActive(group.availability(), context_)) return;
+        const bool matches = candidate.group->prefix.empty() ? matchesPlain(matcher_, candidate, text_)
+                                                             : matchesPrefixed(matcher_, candidate, text_);
+        if (matches) found_.push_back({candidate, text_.substr(text_.size() - candidate.length)});
+    }
+
+    // Library order; within a group with a prefix, the occurrences of the prefix from left to right first.
+    std::vector<SnippetMatcher::Match> matchesInOrder() {
+        std::sort(found_.begin(), found_.end(), [](const Found& a, const Found& b) { return a.place() < b.place(); });
+        std::vector<SnippetMatcher::Match> matches;
+        matches.reserve(found_.size());
+        for (const Found& found : found_) matches.push_back({*found.candidate.snippet, std::u16string(found.typed)});
+        return matches;
+    }
+
+  private:
+    const SnippetMatcher& matcher_;
+    char16_t trigger_;
+    const MatchContext& context_;
+    Trigger way_ = Trigger::Immediately;
+    std::u16string_view text_;
+    std::vector<Found> found_;
+};
 
 }  // namespace
 
@@ -104,39 +137,18 @@ void SnippetMatcher::setSnippetGroups(const Groups& groups) {
 std::vector<SnippetMatcher::Match> SnippetMatcher::findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                                                          std::u16string_view lettersWithoutSeparator,
                                                                          const MatchContext& context) const {
-    std::vector<std::pair<Candidate, std::u16string_view>> found;
-    std::vector<Candidate> candidates;
-    Destination destination(context);
-
-    const auto collect = [&](Trigger way, std::u16string_view text) {
-        candidates.clear();
-        index_->collectCandidates(way, text, candidates);
-        for (const Candidate& candidate : candidates) {
-            const SnippetGroup& group = *candidate.group->group;
-            if (way == Trigger::Delimiter && !group.delimiters().value_or(defaultDelimiters_).contains(trigger))
-                continue;
-            if (!(*candidate.snippet)->hasContent() || !destination.isAdmittedBy(group.availability())) continue;
-            const bool matches = candidate.group->prefix.empty() ? matchesPlain(*this, candidate, text)
-                                                                 : matchesPrefixed(*this, candidate, text);
-            if (matches) found.emplace_back(candidate, text);
-        }
-    };
+    Search search(*this, trigger, context);
     if (trigger == 0) {
-        collect(Trigger::HotKey, lettersWithoutSeparator);
+        search.run(*index_, Trigger::HotKey, lettersWithoutSeparator);
     } else {
-        collect(Trigger::Immediately, letters);
-        if (index_->isDelimiter(trigger)) collect(Trigger::Delimiter, lettersWithoutSeparator);
+        search.run(*index_, Trigger::Immediately, letters);
+        if (index_->isDelimiter(trigger)) search.run(*index_, Trigger::Delimiter, lettersWithoutSeparator);
     }
+    return search.matchesInOrder();
+}
 
-    std::sort(found.begin(), found.end(), [](const auto& a, const auto& b) {
-        return orderOf(a.first, a.second.size()) < orderOf(b.first, b.second.size());
-    });
-    std::vector<Match> matches;
-    matches.reserve(found.size());
-    for (const auto& [candidate, text] : found) {
-        matches.push_back({*candidate.snippet, std::u16string(text.substr(text.size() - candidate.length))});
-    }
-    return matches;
+const CharacterSet& SnippetMatcher::delimitersOf(const SnippetGroup& group) const {
+    return group.delimiters() ? *group.delimiters() : defaultDelimiters_;
 }
 
 bool SnippetMatcher::checkGroup(const SnippetGroup& group, std::u16string_view text, std::size_t index) const {

@@ -19,12 +19,13 @@ namespace plume {
 
 class AbbreviationIndex;
 
-// Where the last key went. Asked only when a snippet limited to applications or input sources could match.
+// Where the last key went. Asked only when a snippet limited to applications or input sources could match. The answers stay
+// valid until the matcher returns.
 class MatchContext {
   public:
     virtual ~MatchContext() = default;
-    virtual std::optional<std::u16string> bundleIdentifier() const = 0;
-    virtual std::optional<std::u16string> inputSourceIdentifier() const = 0;
+    virtual const std::optional<std::u16string>& bundleIdentifier() const = 0;
+    virtual const std::optional<std::u16string>& inputSourceIdentifier() const = 0;
 };
 
 class SnippetMatcher {
@@ -50,6 +51,9 @@ class SnippetMatcher {
     // The typed text at the end of `letters` that matches the abbreviation, which must not be longer than `letters`.
     std::optional<std::u16string_view> checkAbbreviation(std::u16string_view abbreviation, std::u16string_view letters,
                                                          const SnippetGroup& group, bool caseSensitive) const;
+
+    // The characters at which the group expands.
+    const CharacterSet& delimitersOf(const SnippetGroup& group) const;
 
   private:
     CharacterSet defaultDelimiters_;

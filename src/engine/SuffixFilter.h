@@ -19,32 +19,25 @@ class SuffixFilter {
         const std::size_t words = std::bit_ceil(count * BitsPerKey / 64 + 1);
         words_.assign(words, 0);
         shift_ = 64 - std::countr_zero(words);
-        capacity_ = words * 64 / BitsPerKey;
-        added_ = 0;
     }
-    void add(std::uint64_t key) {
-        words_[wordOf(key)] |= bitsOf(key);
-        ++added_;
-    }
+    void add(std::uint64_t key) { words_[wordOf(key)] |= bitsOf(key); }
     bool mayContain(std::uint64_t key) const {
         const std::uint64_t bits = bitsOf(key);
         return (words_[wordOf(key)] & bits) == bits;
     }
-    bool isFull() const { return added_ > capacity_; }
 
   private:
     static constexpr std::size_t BitsPerKey = 16;
 
-    // The upper bits of a key choose the word, the lower ones two bits in it.
+    // The upper bits of a key choose the word, the lower ones four bits in it.
     std::size_t wordOf(std::uint64_t key) const { return shift_ == 64 ? 0 : static_cast<std::size_t>(key >> shift_); }
     static std::uint64_t bitsOf(std::uint64_t key) {
-        return (std::uint64_t{1} << (key & 63)) | (std::uint64_t{1} << ((key >> 6) & 63));
+        return (std::uint64_t{1} << (key & 63)) | (std::uint64_t{1} << (key >> 6 & 63)) |
+               (std::uint64_t{1} << (key >> 12 & 63)) | (std::uint64_t{1} << (key >> 18 & 63));
     }
 
     std::vector<std::uint64_t> words_;
     int shift_ = 64;
-    std::size_t capacity_ = 0;
-    std::size_t added_ = 0;
 };
 
 }  // namespace plume

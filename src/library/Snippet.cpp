@@ -61,12 +61,11 @@ void Snippet::readContent(const KeyedDecoder& coder) {
 }
 
 void Snippet::setAbbreviation(Text abbreviation) {
-    const bool changed = abbreviation != abbreviation_;
-    abbreviation_ = std::move(abbreviation);
-    abbreviationHash_ = hashOfSuffix(abbreviation_ ? std::u16string_view(*abbreviation_) : std::u16string_view());
+    const Text previous = std::exchange(abbreviation_, std::move(abbreviation));
+    abbreviationHash_ = hashOfSuffix(abbreviation_.value_or(u""));
     updateDateModified();
-    if (!changed) return;
-    if (const auto group = parentGroup()) group->snippetAbbreviationChanged(*this);
+    if (abbreviation_ == previous) return;
+    if (const auto group = parentGroup()) group->snippetAbbreviationChanged(*this, previous);
 }
 
 Snippet::Text Snippet::abbreviationWithPrefix() const {

@@ -128,9 +128,13 @@ void SnippetGroup::insertItem(const std::shared_ptr<Snippet>& snippet, std::size
 void SnippetGroup::removeItem(const std::shared_ptr<Snippet>& snippet) {
     // A copy: the caller's reference may be to the element that goes.
     const std::shared_ptr<Snippet> removed = snippet;
-    if (std::erase(items_, removed) == 0) return;
-    if (removed->parentGroup().get() == this) removed->setParentGroup({});
-    notifyObservers([&](SnippetGroupObserver& observer) { observer.itemRemoved(*this, *removed); });
+    const auto place = [&] { return std::find(items_.begin(), items_.end(), removed); };
+    for (auto found = place(); found != items_.end(); found = place()) {
+        const auto index = static_cast<std::size_t>(found - items_.begin());
+        items_.erase(found);
+        if (removed->parentGroup().get() == this) removed->setParentGroup({});
+        notifyObservers([&](SnippetGroupObserver& observer) { observer.itemRemoved(*this, *removed, index); });
+    }
 }
 
 void SnippetGroup::setExpandTrigger(ExpandTrigger value) {
@@ -200,8 +204,8 @@ void SnippetGroup::removeGroupObserver(SnippetGroupObserver* observer) {
     std::erase(observers_, observer);
 }
 
-void SnippetGroup::snippetAbbreviationChanged(Snippet& snippet) {
-    notifyObservers([&](SnippetGroupObserver& observer) { observer.abbreviationChanged(*this, snippet); });
+void SnippetGroup::snippetAbbreviationChanged(Snippet& snippet, const Text& previous) {
+    notifyObservers([&](SnippetGroupObserver& observer) { observer.abbreviationChanged(*this, snippet, previous); });
 }
 
 void SnippetGroup::notifyMatchingSettingsChanged() {

@@ -37,13 +37,15 @@ enum class ExpandTrigger : std::int32_t {
 class SnippetGroupObserver {
   public:
     virtual ~SnippetGroupObserver() = default;
-    // `snippet`, whose parentGroup is the group, has another abbreviation than before. It need not stand in `items`:
-    // duplicates name the group of their original before they are added to one.
-    virtual void abbreviationChanged(SnippetGroup& group, Snippet& snippet) = 0;
+    // `snippet`, whose parentGroup is the group, has another abbreviation than `previous`. It need not stand in
+    // `items`: duplicates name the group of their original before they are added to one.
+    virtual void abbreviationChanged(SnippetGroup& group, Snippet& snippet,
+                                     const std::optional<std::u16string>& previous) = 0;
     // `items` [first, first + count) are new, all others unchanged.
     virtual void itemsAdded(SnippetGroup& group, std::size_t first, std::size_t count) = 0;
-    // `snippet` stands in `items` no more; its parentGroup is set already.
-    virtual void itemRemoved(SnippetGroup& group, Snippet& snippet) = 0;
+    // `snippet` stood in `items` at `index` and is gone from there, all others unchanged; its parentGroup is set
+    // already.
+    virtual void itemRemoved(SnippetGroup& group, Snippet& snippet, std::size_t index) = 0;
     // `abbreviationPrefix`, `expandTrigger` or `delimiters` changed.
     virtual void matchingSettingsChanged(SnippetGroup& group) = 0;
 };
@@ -72,7 +74,8 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     void addItems(const std::vector<std::shared_ptr<Snippet>>& snippets);
     // An index past the end appends.
     void insertItem(const std::shared_ptr<Snippet>& snippet, std::size_t index);
-    // No error when the snippet is not listed. The parentGroup of a listed one is cleared when it is this group.
+    // From every place, should there be several. No error when the snippet is not listed. The parentGroup of a listed
+    // one is cleared when it is this group.
     void removeItem(const std::shared_ptr<Snippet>& snippet);
 
     ExpandAfter expandAfter() const { return expandAfter_; }
@@ -123,7 +126,7 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     void readAvailability(const KeyedDecoder& coder);
     void encodeAvailability(KeyedEncoder& coder) const;
     // From a snippet whose parentGroup this is, whether it is listed or not.
-    void snippetAbbreviationChanged(Snippet& snippet);
+    void snippetAbbreviationChanged(Snippet& snippet, const Text& previous);
     void notifyMatchingSettingsChanged();
     void notifyObservers(const std::function<void(SnippetGroupObserver&)>& tell);
 

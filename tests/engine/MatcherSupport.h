@@ -17,8 +17,8 @@ inline CharacterSet testDelimiters() {
 struct Place final : MatchContext {
     Place(std::optional<std::u16string> anApplication, std::optional<std::u16string> anInputSource)
         : application(std::move(anApplication)), inputSource(std::move(anInputSource)) {}
-    std::optional<std::u16string> bundleIdentifier() const override { return application; }
-    std::optional<std::u16string> inputSourceIdentifier() const override { return inputSource; }
+    const std::optional<std::u16string>& bundleIdentifier() const override { return application; }
+    const std::optional<std::u16string>& inputSourceIdentifier() const override { return inputSource; }
 
     std::optional<std::u16string> application;
     std::optional<std::u16string> inputSource;
