@@ -1,0 +1,32 @@
+// The simulated keyboard: a US layout, under whatever identifier is set.
+#pragma once
+
+#include <string_view>
+
+#include "platform/InputSources.h"
+
+namespace plume {
+
+class SimulatedInputSources final : public InputSources {
+  public:
+    // A key, and whether Shift is held with it.
+    struct Stroke {
+        std::uint16_t keyCode = 0;
+        bool shift = false;
+    };
+
+    static constexpr std::u16string_view US = u"org.example.keylayout.US";
+
+    void setIdentifier(std::optional<std::u16string> identifier) { identifier_ = std::move(identifier); }
+
+    // How a person types this character; nothing when it is on no key. A line feed is Return.
+    static std::optional<Stroke> strokeFor(char16_t character);
+
+    const std::optional<std::u16string>& currentInputSourceIdentifier() const override { return identifier_; }
+    std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override;
+
+  private:
+    std::optional<std::u16string> identifier_{US};
+};
+
+}  // namespace plume
