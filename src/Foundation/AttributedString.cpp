@@ -175,8 +175,8 @@ void AttributedString::replace(Range range, const AttributedString& other) {
     range = clamped(range, length());
     if (range.length == 0 && other.isEmpty()) return;
     if (range.location == length()) return append(other);
-    if (this == &other) return replace(range, AttributedString(other));
     Storage& own = mutableStorage();
+    // `other` may be this very string: the new runs are complete before anything changes.
     RunList list;
     list.append(own.list, {0, range.location});
     list.append(other.storage().list, {0, other.length()});
