@@ -14,6 +14,7 @@ namespace PasteboardType {
 inline constexpr std::string_view String = "NSStringPboardType";
 inline constexpr std::string_view RTF = "NSRTFPboardType";
 inline constexpr std::string_view RTFD = "NSRTFDPboardType";
+inline constexpr std::string_view HTML = "NSHTMLPboardType";
 }  // namespace PasteboardType
 
 // The reading side: what placeholders need. Never waits long for the owner of the content: an owner that does not
@@ -24,6 +25,28 @@ class PasteboardReader {
     virtual std::vector<std::string> types() const = 0;
     virtual std::optional<std::u16string> string() const = 0;
     virtual std::optional<std::string> data(std::string_view type) const = 0;
+};
+
+class Pasteboard;
+
+// Who has promised content and is asked for it when somebody wants it. Not owned by the pasteboard; outlives its promises.
+class PasteboardOwner {
+  public:
+    virtual ~PasteboardOwner() = default;
+    // Writes the content of `type` with setString or setData, at once. Called on the thread that serves the pasteboard.
+    virtual void provideData(Pasteboard& pasteboard, std::string_view type) = 0;
+};
+
+// Reading and writing. Everything here belongs to the tap thread.
+class Pasteboard : public PasteboardReader {
+  public:
+    // Grows with every change of the content, whoever makes it.
+    virtual std::int64_t changeCount() const = 0;
+    // Replaces the content by these types and returns the new change count. With an owner the data is promised;
+    // without one it is written right after. No types at all empty the pasteboard.
+    virtual std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) = 0;
+    virtual void setString(std::u16string_view string, std::string_view type) = 0;
+    virtual void setData(std::string_view bytes, std::string_view type) = 0;
 };
 
 }  // namespace plume
