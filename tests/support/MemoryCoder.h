@@ -28,7 +28,7 @@ class MemoryArchive {
   public:
     struct Entry;
 
-    explicit MemoryArchive(std::string className = "") : className_(std::move(className)) {}
+    explicit MemoryArchive(std::string className = "");
 
     const std::string& className() const { return className_; }
     const MemoryValue* find(std::string_view key) const;
@@ -52,6 +52,8 @@ struct MemoryArchive::Entry {
 
     bool operator==(const Entry&) const = default;
 };
+
+inline MemoryArchive::MemoryArchive(std::string className) : className_(std::move(className)) {}
 
 inline bool MemoryArchive::operator==(const MemoryArchive& other) const {
     return className_ == other.className_ && entries_ == other.entries_;
