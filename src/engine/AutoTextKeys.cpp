@@ -1,0 +1,196 @@
+// What the engine does at each key: the way it takes by its code, the digits that pick from a list, and the buffer.
+#include <utility>
+
+#include "content/PLOutput.h"
+#include "engine/AutoText.h"
+
+namespace plume {
+
+namespace {
+
+bool isSingleUnit(const std::optional<std::u16string>& text) {
+    return text && text->size() == 1;
+}
+
+bool isDigit(char16_t unit) {
+    return unit >= u'0' && unit <= u'9';
+}
+
+}  // namespace
+
+void AutoText::onSystemInputServiceKeyDown(ZDKeyEventArgs& event) {
+    if (!enabled_) return;
+    undoInfo_.reset();
+    if (surroundings_.inputService.isSameProcess()) return;
+    if (snippetQuickSearchWindowVisible()) {
+        if (isSingleUnit(event.s)) processSelectorKey(event);
+        return;
+    }
+    if (routeByKeyCode(event) == Route::Done || !isSingleUnit(event.s)) return;
+    processSelectorKey(event);
+    if (!event.cancel) processNormalKeyDown(event);
+}
+
+AutoText::Route AutoText::routeByKeyCode(ZDKeyEventArgs& event) {
+    switch (event.key) {
+        case KeyCode::Delete:
+            deleteLastLetter();
+            return Route::Done;
+        case KeyCode::Escape:
+            escapePressed(event);
+            return Route::Done;
+        case KeyCode::Return:
+        case KeyCode::KeypadEnter:
+            return returnPressed(event);
+        case KeyCode::Space:
+            return spacePressed(event);
+        case KeyCode::Home:
+        case KeyCode::PageUp:
+        case KeyCode::End:
+        case KeyCode::PageDown:
+        case KeyCode::Left:
+        case KeyCode::Right:
+            clear();
+            return Route::Done;
+        case KeyCode::Down:
+        case KeyCode::Up:
+            verticalArrowPressed(event);
+            return Route::Done;
+        case KeyCode::ForwardDelete:
+            // What was typed before the caret still stands there.
+            return Route::Done;
+        default:
+            return Route::Character;
+    }
+}
+
+void AutoText::deleteLastLetter() {
+    if (letters_.empty()) return;
+    letters_.pop_back();
+    refreshSnippetSuggestionController();
+}
+
+void AutoText::escapePressed(ZDKeyEventArgs& event) {
+    if (snippetSuggestionWindowVisible()) {
+        hideSnippetSuggestion();
+        event.cancel = true;
+    } else {
+        clear();
+    }
+}
+
+void AutoText::verticalArrowPressed(ZDKeyEventArgs& event) {
+    if (!snippetSuggestionWindowVisible()) {
+        clear();
+        return;
+    }
+    if (event.key == KeyCode::Down) {
+        snippetSuggestionController_->nextSuggestion();
+    } else {
+        snippetSuggestionController_->previousSuggestion();
+    }
+    event.cancel = true;
+}
+
+AutoText::Route AutoText::returnPressed(ZDKeyEventArgs& event) {
+    if (!snippetSuggestionWindowVisible()) return spacePressed(event);
+    event.cancel = true;
+    acceptSuggestion();
+    return Route::Done;
+}
+
+AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
+    if (surroundings_.inputService.keyModifier() != KeyModifier::Shift) return Route::Character;
+    // Shift is the way to write an abbreviation out: the text is kept, nothing is looked for.
+    if (event.s) letters_ += *event.s;
+    return Route::Done;
+}
+
+std::optional<std::int32_t> AutoText::selectorModifiers() const {
+    constexpr std::int64_t lastModifier = 31;
+    if (snippetSelectorKeyModifier_ < 0 || snippetSelectorKeyModifier_ > lastModifier) return std::nullopt;
+    if (snippetSelectorKeyModifier_ == 0) return 0;
+    return std::int32_t{1} << (snippetSelectorKeyModifier_ - 1);
+}
+
+void AutoText::processSelectorKey(ZDKeyEventArgs& event) {
+    const InputService& service = surroundings_.inputService;
+    if (selectorModifiers() != service.keyModifier()) return;
+
+    char16_t character = event.c;
+    // These two change what the key produces; the digit is what it would be without them.
+    if ((service.keyModifier() & (KeyModifier::Shift | KeyModifier::Option)) != 0) {
+        const std::optional<std::u16string> plain = service.stringForKeyCode(event.key, 0);
+        character = plain && !plain->empty() ? plain->front() : u'\0';
+    }
+    if (isDigit(character)) event.cancel = processSnippetSelectorHotKey(character);
+}
+
+bool AutoText::processSnippetSelectorHotKey(char16_t digit) {
+    const std::size_t index = digit < u'1' ? 9 : static_cast<std::size_t>(digit - u'1');
+    // One past the end counts as used too: it closes the list instead of typing a digit into the text.
+    if (snippetSuggestionWindowVisible() && index <= suggestions_.size()) {
+        sendSuggestionAtIndex(index, SnippetTrigger::Digit);
+        return true;
+    }
+    if (!snippetQuickSearchWindowVisible()) return false;
+    const std::shared_ptr<Snippet> snippet = snippetQuickSearchController_->snippetAtIndex(index);
+    if (!snippet) return false;
+    snippetQuickSearchController_->close();
+    sendSnippetDirectly(snippet);
+    return true;
+}
+
+void AutoText::onSystemInputServiceUnregisteredHotKeyPressed(ZDUnregisteredHotKeyPressedEventArgs& event) {
+    // Without a modifier the digits arrive as ordinary keys.
+    if (snippetSelectorKeyModifier_ == 0 || selectorModifiers() != event.hotKey.modifiers) return;
+    if (isDigit(event.c)) event.cancel = processSnippetSelectorHotKey(event.c);
+}
+
+void AutoText::processNormalKeyDown(ZDKeyEventArgs& event) {
+    const std::size_t lengthBefore = letters_.size();
+    letters_ += *event.s;
+    const std::u16string_view withKey = letters_;
+    std::vector<Match> matches = findSnippetsInLetters(withKey, event.s->front(), withKey.substr(0, lengthBefore));
+
+    if (matches.empty()) {
+        keyCompletedNothing(event, lengthBefore);
+    } else if (matches.size() == 1) {
+        letters_.resize(lengthBefore);
+        sendTypedMatch(matches.front(), event);
+    } else {
+        offerMatches(std::move(matches));
+    }
+}
+
+void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
+    hideSnippetSuggestion();
+    event.cancel = surroundings_.sender.sendSnippet(*this, match.first, match.second, SnippetTrigger::Typed);
+    // The kept delimiter stands behind the expansion, in the text as in the buffer.
+    const std::shared_ptr<SnippetGroup> group = match.first->parentGroup();
+    if (group && group->expandTrigger() == ExpandTrigger::DelimiterKept) letters_ += *event.s;
+}
+
+void AutoText::offerMatches(std::vector<Match> matches) {
+    hideSnippetSuggestion();
+    for (Match& match : matches) suggestions_.append(std::move(match.first), std::move(match.second));
+    selectingSnippet_ = true;
+    // Not from inside the callback: the application has to get the key first.
+    RunLoop& loop = surroundings_.inputService.runLoop();
+    loop.cancel(scheduledList_);
+    scheduledList_ = loop.performAfterDelay(0, [this] { showSnippetSuggestion(); });
+}
+
+void AutoText::keyCompletedNothing(ZDKeyEventArgs& event, std::size_t lengthBefore) {
+    if (surroundings_.autoCorrector) {
+        const std::u16string_view context = std::u16string_view(letters_).substr(0, lengthBefore);
+        surroundings_.autoCorrector->autoCorrect(*this, event, context);
+    }
+    if (selectingSnippet_) {
+        hideSnippetSuggestion();
+    } else {
+        refreshSnippetSuggestionController();
+    }
+}
+
+}  // namespace plume

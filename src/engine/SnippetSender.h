@@ -1,0 +1,28 @@
+// Turns a chosen snippet into output.
+//
+// Owned by the composition root, outlives the engine. Called on the thread that delivers the key events, often inside
+// the key callback: what takes longer goes on after the call has returned.
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "engine/EngineState.h"
+#include "library/Snippet.h"
+
+namespace plume {
+
+class SnippetSender {
+  public:
+    virtual ~SnippetSender() = default;
+
+    // `abbreviation` is the text that was typed for the snippet and is erased, nothing when it was chosen in another
+    // way; `snippetTrigger` is a set of SnippetTrigger bits. Clears the engine first, and may fill its buffer with what
+    // now stands before the caret. Whether the key that triggered it must be swallowed; false when nothing was sent.
+    virtual bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
+                             const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) = 0;
+};
+
+}  // namespace plume
