@@ -21,6 +21,11 @@ struct Case {
     const char* variables = "";
 };
 
+bool isBold(const AttributedString& text, std::size_t index) {
+    const SharedAttributes attributes = text.attributesAt(index);
+    return attributes && attributes->font && attributes->font->bold;
+}
+
 void expectExpansions(ContentWorld& world, const std::vector<Case>& cases, ContentType type) {
     for (const Case& example : cases) {
         SCOPED_TRACE(example.what);
@@ -137,8 +142,9 @@ TEST(SnippetParser, TakesTheRichestFormOfTheClipboardIntoRichText) {
     const auto content = world.expand("_<【clipboard】>_", ContentType::RichText);
     EXPECT_EQ(content->string(), u"<rtfd>");
     const auto& text = std::get<AttributedString>(content->content);
-    EXPECT_TRUE(text.attributesAt(1)->font->bold);
-    EXPECT_FALSE(text.attributesAt(4)->font && text.attributesAt(4)->font->bold);
+    EXPECT_TRUE(isBold(text, 1));
+    EXPECT_FALSE(isBold(text, 4));
+    ASSERT_NE(text.attributesAt(5), nullptr);
     EXPECT_TRUE(text.attributesAt(5)->font->italic);
 
     const auto optional = world.expand("【clipboard find:d replacement:x optional:1】", ContentType::RichText);
