@@ -85,6 +85,16 @@ TEST(Digits, ThatPickNothingAreTyped) {
     EXPECT_EQ(desk.engine.letters(), u"ab0");
 }
 
+TEST(Digits, ThatNeedNoModifierAreNoShortcuts) {
+    EngineDesk desk;
+    desk.openListOf(3);
+    ZDUnregisteredHotKeyPressedEventArgs event;
+    event.c = u'1';
+    desk.service.unregisteredHotKeyPressedEvent.raise(event);
+    EXPECT_FALSE(event.cancel);
+    EXPECT_THAT(desk.sender.sent, IsEmpty());
+}
+
 TEST(Digits, WithoutAListAreTyped) {
     EngineDesk desk;
     EXPECT_EQ(desk.service.typeText(u"1"), u"1");

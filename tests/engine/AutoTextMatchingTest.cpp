@@ -114,6 +114,16 @@ TEST(SeveralMatches, ReplaceAnOlderOffer) {
     EXPECT_EQ(desk.list.made, 1);
 }
 
+TEST(SeveralMatches, OfferedTwiceBeforeTheListOpensOpenItOnce) {
+    EngineDesk desk;
+    desk.add({u"a", u"a"});
+    desk.add({u"a+b", u"a+b", u"a+b"});
+    desk.service.typeText(u"a+b");
+    desk.loop.runReady();
+    EXPECT_THAT(desk.list.entries, ElementsAre(u"a+b", u"a+b", u"a+b"));
+    EXPECT_EQ(desk.list.shownAtCaret, 1);
+}
+
 TEST(SeveralMatches, GiveWayToASingleOne) {
     EngineDesk desk;
     desk.add({u"a", u"a"});
