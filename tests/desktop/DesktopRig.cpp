@@ -1,0 +1,33 @@
+#include "tests/desktop/DesktopRig.h"
+
+namespace plume::rig {
+
+DesktopRig::DesktopRig(const XServer::Options& options)
+    : server_(directory_, options, privateEnvironment(directory_)),
+      session_(directory_, server_),
+      client_(server_.display()),
+      keyboard_(server_.keyboardSocket(), options),
+      pointer_(server_.pointerSocket(), options) {}
+
+std::unique_ptr<TargetProgram> DesktopRig::startTarget(TargetKind kind) {
+    const auto socket = directory_.path() / ("target" + std::to_string(++targets_));
+    auto target = std::make_unique<TargetProgram>(kind, session_, client_, socket);
+    // A window that has the focus for the server does not have it for its toolkit yet. Once a key has become text, all
+    // that was sent before the key has been dealt with.
+    keyboard_.type("x");
+    if (target->awaitText("x") != "x") throw RigError("the " + nameOf(kind) + " target takes no keys");
+    keyboard_.tap(Key::Backspace);
+    if (!target->awaitText("").empty()) throw RigError("the " + nameOf(kind) + " target takes no Backspace");
+    target->forgetReports();
+    return target;
+}
+
+void DesktopRig::click(int x, int y, int button) {
+    pointer_.moveTo(x, y);
+    pointer_.press(button);
+    pointer_.release(button);
+    pointer_.sync();
+    client_.await("a click", Milliseconds(5'000), [this] { return !client_.isButtonDown(); });
+}
+
+}  // namespace plume::rig
