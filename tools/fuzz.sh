@@ -20,6 +20,6 @@ run_one() {
     fi
 }
 export -f run_one
-targets=("$PWD"/build/fuzz/bin/fuzz_*)
+targets=("$PWD"/build/fuzz/bin/Fuzz*)
 [ -x "${targets[0]}" ] || { echo "no fuzz target is built" >&2; exit 1; }
 printf '%s\n' "${targets[@]}" | xargs -P "$(nproc)" -I{} bash -c 'run_one "$@"' _ {} "$scratch" "$seconds"

@@ -29,7 +29,8 @@ class PasteboardReader {
 
 class Pasteboard;
 
-// Who has promised content and is asked for it when somebody wants it. Not owned by the pasteboard; outlives its promises.
+// Who has promised content and is asked for it when somebody wants it. Not owned by the pasteboard; outlives its
+// promises.
 class PasteboardOwner {
   public:
     virtual ~PasteboardOwner() = default;

@@ -1,0 +1,59 @@
+// Synthesised keys and clicks, and the state of the real ones.
+//
+// Used on the tap thread. Between begin() and end() a port may gather events and send them together; what was posted
+// reaches the program in front in that order, and the tap never reports it as typed.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <string_view>
+
+#include "platform/Accessibility.h"
+
+namespace plume {
+
+// One key going down or up: a key by its code, or, with a text, a key that produces just that text.
+struct SynthesisedKey {
+    std::uint16_t keyCode = 0;
+    std::uint64_t flags = 0;  // event flag bits of the held modifiers
+    bool down = true;
+    std::u16string_view text;
+};
+
+// A key with modifiers that does what a command does.
+struct CommandKeystroke {
+    std::uint16_t keyCode = 0;
+    std::uint64_t flags = 0;
+
+    bool operator==(const CommandKeystroke&) const = default;
+};
+
+class EventPoster {
+  public:
+    virtual ~EventPoster() = default;
+
+    virtual void begin() = 0;
+    virtual void end() = 0;
+    // With `pastTap`, by the way around the tapped stream where the port has two.
+    virtual void post(const SynthesisedKey& key, bool pastTap) = 0;
+
+    // Whether the user holds this key now.
+    virtual bool isKeyDown(std::uint16_t keyCode) const = 0;
+
+    // What pastes and copies in the program in front where that is not the usual keystroke (terminals), else nothing.
+    virtual std::optional<CommandKeystroke> pasteKeystroke() const = 0;
+    virtual std::optional<CommandKeystroke> copyKeystroke() const = 0;
+
+    // From the top left of the main screen.
+    virtual Point pointerLocation() const = 0;
+    // A press and a release of the left button at that place.
+    virtual void click(Point location) = 0;
+
+    // The user's own keys typed from now on wait until the output in flight is complete, and follow in order; a port
+    // that cannot do it does nothing. Never longer than the port's limit.
+    virtual void holdUserKeys() = 0;
+    virtual void releaseUserKeys() = 0;
+};
+
+}  // namespace plume
