@@ -159,7 +159,7 @@ void benchHits() {
         for (const auto& typing : typings) {
             const std::u16string_view letters = typing;
             const auto before = letters.substr(0, letters.size() - 1);
-            found += matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty() ? 0 : 1;
+            found += matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty() ? 0U : 1U;
         }
     });
     if (found != typings.size()) std::abort();

@@ -18,7 +18,7 @@ CSVParser::CSVParser(std::u16string text, std::u16string separator, std::optiona
                      bool hasHeader, std::vector<std::u16string> fieldNames)
     : text_(std::move(text)),
       separator_(std::move(separator)),
-      lineSeparator_(lineSeparator ? std::move(*lineSeparator) : CharacterSet::newlines()),
+      lineSeparator_(lineSeparator ? *lineSeparator : CharacterSet::newlines()),
       hasHeader_(hasHeader),
       fieldNames_(std::move(fieldNames)) {
     const auto forbidden = [&](char16_t unit) { return unit == Quote || lineSeparator_.contains(unit); };

@@ -2,8 +2,8 @@
 
 #include <algorithm>
 #include <array>
+#include <charconv>
 #include <cmath>
-#include <cstdio>
 #include <string_view>
 #include <utility>
 
@@ -71,21 +71,22 @@ std::string escaped(std::u16string_view text) {
 }
 
 std::string number(double value) {
+    constexpr int Digits = 4;
     std::array<char, 32> text{};
-    std::snprintf(text.data(), text.size(), "%.4g", value);
-    std::string result = text.data();
-    std::replace(result.begin(), result.end(), ',', '.');  // whatever the process's locale writes
-    return result;
+    auto* const end =
+        std::to_chars(text.data(), text.data() + text.size(), value, std::chars_format::general, Digits).ptr;
+    return {text.data(), end};
 }
 
 std::string colorOf(const ColorAttribute& color) {
-    const auto component = [](double value) {
-        return static_cast<int>(std::lround(std::clamp(value, 0.0, 1.0) * 255));
-    };
-    std::array<char, 64> text{};
-    std::snprintf(text.data(), text.size(), "#%02x%02x%02x", component(color.red), component(color.green),
-                  component(color.blue));
-    return text.data();
+    constexpr std::string_view Digits = "0123456789abcdef";
+    std::string text = "#";
+    for (const double component : {color.red, color.green, color.blue}) {
+        const auto value = static_cast<std::size_t>(std::lround(std::clamp(component, 0.0, 1.0) * 255));
+        text += Digits[value / 16];
+        text += Digits[value % 16];
+    }
+    return text;
 }
 
 // The style of a run that no element stands for.
@@ -151,7 +152,7 @@ class Exporter {
     Exporter(const AttributedString& text, const std::vector<std::string>& excluded) : text_(text), markup_(excluded) {}
 
     std::string run() {
-        if (markup_.writes("xml")) markup_.html += "<?xml version=\"1.0\" encoding=\"UTF-8\"?>";
+        if (markup_.writes("xml")) markup_.html += R"(<?xml version="1.0" encoding="UTF-8"?>)";
         if (markup_.writes("doctype")) markup_.html += "<!DOCTYPE html>";
         markup_.start("html");
         markup_.start("head");

@@ -393,7 +393,7 @@ void RTFReader::addAttachment(std::u16string_view name) {
 }
 
 Result<AttributedString> attributedStringFromRTFDocument(std::string_view rtf, const RTFFiles& files) {
-    if (!rtf.starts_with(Signature)) return Error{"This is not RTF: expected \"{\\rtf\" at the start."};
+    if (!rtf.starts_with(Signature)) return Error{R"(This is not RTF: expected "{\rtf" at the start.)"};
     return RTFReader(rtf, files).read();
 }
 

@@ -24,9 +24,9 @@ using MatchingOption = SnippetClipboardVariable::MatchingOption;
 
 constexpr auto TimeLimit = std::chrono::milliseconds(100);
 constexpr std::int32_t MatcherStackBytes = 8 * 1024 * 1024;
-constexpr std::size_t LongestPattern = 16 * 1024;
+constexpr std::size_t LongestPattern = std::size_t{16} * 1024;
 // What replacing may let a text grow to, in UTF-16 units.
-constexpr std::size_t LongestResult = 16 * 1024 * 1024;
+constexpr std::size_t LongestResult = std::size_t{16} * 1024 * 1024;
 
 // Called for every replacement, from left to right; false stops.
 using Visitor = std::function<bool(Range, const std::u16string&)>;

@@ -21,7 +21,7 @@ std::vector<PLOutput::Fragment> cut(const SnippetExpandedContent& content, Piece
     }
     for (DeliveryStep& step : deliverySteps(keys, length)) {
         if (step.text.length > 0) fragments.push_back(piece(step.text));
-        if (step.key) fragments.push_back(std::move(step.key));
+        if (step.key) fragments.emplace_back(std::move(step.key));
     }
     return fragments;
 }

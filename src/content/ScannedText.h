@@ -48,7 +48,7 @@ class PlainScannedText {
     // How much is finished: where the rest starts.
     std::size_t location() const { return finished_.size(); }
     // Of the first unit of the rest.
-    SharedAttributes attributes() const { return nullptr; }
+    static SharedAttributes attributes() { return nullptr; }
 
     void keep(std::size_t count);
     void drop(std::size_t count) { pending_.take(count); }

@@ -25,7 +25,7 @@ class SnippetParser {
 
     // One expansion gives up beyond these.
     static constexpr std::size_t MaximumReplacements = 100'000;
-    static constexpr std::size_t MaximumLength = 16 * 1024 * 1024;  // UTF-16 units
+    static constexpr std::size_t MaximumLength = std::size_t{16} * 1024 * 1024;  // UTF-16 units
 
     explicit SnippetParser(ContentEnvironment environment);
 

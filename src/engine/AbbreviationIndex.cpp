@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <bit>
 #include <cstddef>
-#include <utility>
 
 #include "Foundation/Strings.h"
 #include "library/AbbreviationHash.h"
@@ -79,8 +78,7 @@ std::optional<AbbreviationIndex::Trigger> tableFor(ExpandTrigger trigger) {
 
 }  // namespace
 
-AbbreviationIndex::AbbreviationIndex(CharacterSet defaultDelimiters)
-    : defaultDelimiters_(std::move(defaultDelimiters)) {}
+AbbreviationIndex::AbbreviationIndex(const CharacterSet& defaultDelimiters) : defaultDelimiters_(defaultDelimiters) {}
 
 AbbreviationIndex::~AbbreviationIndex() {
     for (const auto& [key, indexed] : groups_) indexed->group->removeGroupObserver(this);
@@ -164,7 +162,7 @@ void AbbreviationIndex::itemsAdded(SnippetGroup& group, std::size_t first, std::
     if (first + count < items.size()) indexed->ranksAreStale = true;
 }
 
-void AbbreviationIndex::itemRemoved(SnippetGroup& group, Snippet&, std::size_t index) {
+void AbbreviationIndex::itemRemoved(SnippetGroup& group, Snippet& /*snippet*/, std::size_t index) {
     IndexedGroup* indexed = find(group);
     if (!indexed) return;
     removeRecord(indexed->records[index]);
@@ -257,7 +255,7 @@ void AbbreviationIndex::unfile(std::uint32_t index) {
 
 void AbbreviationIndex::visitCandidates(Trigger trigger, std::u16string_view text, Visitor& visitor) const {
     const Table& table = tables_[static_cast<std::size_t>(trigger)];
-    const std::size_t longest = static_cast<std::size_t>(std::bit_width(table.lengthsInUse));
+    const auto longest = static_cast<std::size_t>(std::bit_width(table.lengthsInUse));
     const std::size_t walked = std::min(longest, text.size());
     FoldedUnitsFromEnd units(text);
     std::uint64_t hash = EmptySuffixHash;

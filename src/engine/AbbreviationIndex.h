@@ -55,7 +55,7 @@ class AbbreviationIndex final : public SnippetGroupObserver {
         virtual void visit(const Candidate& candidate) = 0;
     };
 
-    explicit AbbreviationIndex(CharacterSet defaultDelimiters);
+    explicit AbbreviationIndex(const CharacterSet& defaultDelimiters);
     ~AbbreviationIndex() override;
     AbbreviationIndex(const AbbreviationIndex&) = delete;
     AbbreviationIndex& operator=(const AbbreviationIndex&) = delete;
@@ -97,7 +97,7 @@ class AbbreviationIndex final : public SnippetGroupObserver {
     IndexedGroup* find(SnippetGroup& group);
     void addGroup(const std::shared_ptr<SnippetGroup>& group);
     void removeGroup(IndexedGroup& group);
-    void refreshSettings(IndexedGroup& group);
+    static void refreshSettings(IndexedGroup& group);
     void refreshDelimiters();
 
     std::uint32_t addRecord(IndexedGroup& group, const std::shared_ptr<Snippet>& snippet, std::size_t rank);

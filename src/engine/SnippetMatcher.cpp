@@ -124,9 +124,8 @@ class Search final : public AbbreviationIndex::Visitor {
 
 }  // namespace
 
-SnippetMatcher::SnippetMatcher(CharacterSet defaultDelimiters)
-    : defaultDelimiters_(std::move(defaultDelimiters)),
-      index_(std::make_unique<AbbreviationIndex>(defaultDelimiters_)) {}
+SnippetMatcher::SnippetMatcher(const CharacterSet& defaultDelimiters)
+    : defaultDelimiters_(defaultDelimiters), index_(std::make_unique<AbbreviationIndex>(defaultDelimiters_)) {}
 
 SnippetMatcher::~SnippetMatcher() = default;
 

@@ -19,8 +19,8 @@ namespace plume {
 
 class AbbreviationIndex;
 
-// Where the last key went. Asked only when a snippet limited to applications or input sources could match. The answers stay
-// valid until the matcher returns.
+// Where the last key went. Asked only when a snippet limited to applications or input sources could match. The answers
+// stay valid until the matcher returns.
 class MatchContext {
   public:
     virtual ~MatchContext() = default;
@@ -34,7 +34,7 @@ class SnippetMatcher {
     using Match = ZDPair<std::shared_ptr<Snippet>, std::u16string>;
     using Groups = std::vector<std::shared_ptr<SnippetGroup>>;
 
-    explicit SnippetMatcher(CharacterSet defaultDelimiters);
+    explicit SnippetMatcher(const CharacterSet& defaultDelimiters);
     ~SnippetMatcher();
 
     // The library, in user order.

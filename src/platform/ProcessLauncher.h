@@ -25,7 +25,7 @@ class ProcessStream {
     // Appends some of what has arrived, at most MaximumRead bytes, and never waits. False when there was nothing.
     virtual bool read(std::string& bytes) = 0;
 
-    static constexpr std::size_t MaximumRead = 64 * 1024;
+    static constexpr std::size_t MaximumRead = std::size_t{64} * 1024;
 };
 
 // A stream that programs open for writing by its path. Nobody else can open it, and the path is gone with it.

@@ -21,7 +21,9 @@ int millisecondsUntil(Moment deadline) {
 }
 
 // The C library's own function for this is missing in older versions and unusable from C++ in others.
-FileDescriptor exitSignalOf(pid_t pid) { return FileDescriptor(static_cast<int>(::syscall(SYS_pidfd_open, pid, 0))); }
+FileDescriptor exitSignalOf(pid_t pid) {
+    return FileDescriptor(static_cast<int>(::syscall(SYS_pidfd_open, pid, 0)));
+}
 
 }  // namespace
 

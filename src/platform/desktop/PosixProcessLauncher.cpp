@@ -130,6 +130,7 @@ int SpawnSettings::spawn(const ProcessRequest& request, pid_t& pid) const {
     std::vector<std::string> words{request.program};
     words.insert(words.end(), request.arguments.begin(), request.arguments.end());
     std::vector<char*> pointers;
+    pointers.reserve(words.size() + 1);
     for (std::string& word : words) pointers.push_back(word.data());
     pointers.push_back(nullptr);
     // A file just written is "busy" for as long as another thread's new child, made while it was open, has not got as
