@@ -8,6 +8,7 @@
 #include <compare>
 #include <list>
 #include <memory>
+#include <optional>
 
 #include "Foundation/Strings.h"
 
@@ -119,19 +120,16 @@ std::optional<std::u16string> formattedDate(Date date, DateTextKind kind, const 
 
 icu::GregorianCalendar& calendarOfNow(const ContentEnvironment& environment) {
     thread_local std::string zone;
-    thread_local std::unique_ptr<icu::GregorianCalendar> calendar;
+    thread_local std::optional<icu::GregorianCalendar> calendar;
     std::string wanted = nameOfZone(environment);
     UErrorCode status = U_ZERO_ERROR;
     if (!calendar || zone != wanted) {
-        calendar =
-            std::make_unique<icu::GregorianCalendar>(zoneNamed(wanted).release(), icu::Locale::getRoot(), status);
+        calendar.emplace(zoneNamed(wanted).release(), icu::Locale::getRoot(), status);
         // A midnight that a change of clocks skips is the first moment of its day; of two, the first.
         calendar->setSkippedWallTimeOption(UCAL_WALLTIME_NEXT_VALID);
         calendar->setRepeatedWallTimeOption(UCAL_WALLTIME_FIRST);
         zone = std::move(wanted);
     }
-    // The analyzer loses sight of the thread's own pointer.
-    // NOLINTNEXTLINE(clang-analyzer-cplusplus.NewDelete)
     calendar->setTime(millisecondsOf(environment.now()), status);
     return *calendar;
 }

@@ -11,7 +11,7 @@
 
 namespace plume {
 
-class ContextInputSetting;
+struct ContextInputSetting;
 
 // Why an output is made: a set of bits.
 namespace SnippetTrigger {
