@@ -24,10 +24,15 @@ std::string quoted(std::string_view text) {
     return result + "'";
 }
 
-void eraseAll(std::string& text, std::string_view pattern) {
-    for (auto at = text.find(pattern); at != std::string::npos; at = text.find(pattern, at)) {
-        text.erase(at, pattern.size());
+std::string without(std::string_view text, std::string_view pattern) {
+    std::string result;
+    result.reserve(text.size());
+    std::size_t position = 0;
+    for (auto at = text.find(pattern); at != std::string_view::npos; at = text.find(pattern, position)) {
+        result.append(text.substr(position, at - position));
+        position = at + pattern.size();
     }
+    return result.append(text.substr(position));
 }
 
 ScriptOutput notStarted(const Error& error) {
@@ -54,7 +59,7 @@ ScriptOutput SharedShell::run(std::string_view script, const ScriptWatch& watch)
     if (const auto handed = hand(task, watch); !handed) return notStarted(handed.error());
     ScriptOutput written = follow(task, watch);
     // The shell names the file in its messages; to the user the script is what was typed.
-    eraseAll(written.error, task.file->path() + ": ");
+    written.error = without(written.error, task.file->path() + ": ");
     return written;
 }
 
