@@ -11,7 +11,7 @@ run_one() {
     local target=$1 name log
     name=$(basename "$target")
     log=$2/$name.log
-    if (cd "$2" && "$target" -max_total_time="$3" -timeout=10 -rss_limit_mb=2048 -print_final_stats=1) >"$log" 2>&1; then
+    if (cd "$2" && "$target" -max_total_time="$3" -timeout=60 -rss_limit_mb=4096 -print_final_stats=1) >"$log" 2>&1; then
         echo "$name: $(grep -o 'number_of_executed_units: .*' "$log" | grep -o '[0-9]*') inputs, no fault"
     else
         tail -n 60 "$log"
