@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "bench/Figures.h"
+#include "engine/AutoText.h"
 #include "engine/SnippetMatcher.h"
 
 namespace {
@@ -74,10 +75,6 @@ class Library {
     }
 };
 
-CharacterSet defaultDelimiters() {
-    return CharacterSet::withCharacters(u" \t\r.!?,;:-\"'(){}[]/\\&+*=<>%^#_@$`|~");
-}
-
 // Words of a person, none of which is an abbreviation: vowels come first in each, and never a digit.
 std::u16string prose(std::size_t length, std::mt19937& random) {
     std::u16string text;
@@ -125,7 +122,7 @@ void benchMisses() {
     std::size_t allocated = 0;
     for (const std::size_t size : {100U, 1'000U, 10'000U, 100'000U}) {
         Library library(size);
-        SnippetMatcher matcher(defaultDelimiters());
+        SnippetMatcher matcher(AutoText::defaultDelimiters());
         matcher.setSnippetGroups(library.groups);
         double slowest = 0;
         for (const std::size_t buffer : {10U, 1'000U, 100'000U}) {
@@ -141,7 +138,7 @@ void benchMisses() {
 // Every 37th snippet typed to its end, with whatever its group wants before and after it.
 void benchHits() {
     Library library(100'000);
-    SnippetMatcher matcher(defaultDelimiters());
+    SnippetMatcher matcher(AutoText::defaultDelimiters());
     matcher.setSnippetGroups(library.groups);
     std::vector<std::u16string> typings;
     std::vector<bool> delimited;
@@ -170,12 +167,12 @@ void benchBuilding() {
     Library library(100'000);
     std::vector<double> builds;
     for (int i = 0; i < 15; ++i) {
-        SnippetMatcher fresh(defaultDelimiters());
+        SnippetMatcher fresh(AutoText::defaultDelimiters());
         builds.push_back(nanosecondsOf([&] { fresh.setSnippetGroups(library.groups); }));
     }
     print("matching.build.100000", median(builds) / 1e6, "ms");
 
-    SnippetMatcher matcher(defaultDelimiters());
+    SnippetMatcher matcher(AutoText::defaultDelimiters());
     matcher.setSnippetGroups(library.groups);
     std::vector<double> times;
     for (int i = 0; i < 20'000; ++i) {

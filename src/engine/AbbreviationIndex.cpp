@@ -1,5 +1,7 @@
 #include "engine/AbbreviationIndex.h"
 
+#include <unicode/utf16.h>
+
 #include <algorithm>
 #include <bit>
 #include <cstddef>
@@ -10,13 +12,6 @@
 namespace plume {
 
 namespace {
-
-constexpr bool isHighSurrogate(char16_t unit) {
-    return (unit & 0xfc00) == 0xd800;
-}
-constexpr bool isLowSurrogate(char16_t unit) {
-    return (unit & 0xfc00) == 0xdc00;
-}
 
 // The key under which a suffix of this hash and length is filed. Mixed, so that all its bits depend on all of the
 // hash's.
@@ -35,18 +30,18 @@ class FoldedUnitsFromEnd {
     char16_t next() {
         const char16_t unit = text_[--position_];
         if (unit < 0x80) return unit >= u'A' && unit <= u'Z' ? static_cast<char16_t>(unit + 0x20) : unit;
-        if (isLowSurrogate(unit) && position_ > 0 && isHighSurrogate(text_[position_ - 1])) {
-            return static_cast<char16_t>(0xdc00 + (foldedPair(position_ - 1) & 0x3ff));
+        if (U16_IS_TRAIL(unit) && position_ > 0 && U16_IS_LEAD(text_[position_ - 1])) {
+            return U16_TRAIL(foldedPair(position_ - 1));
         }
-        if (isHighSurrogate(unit) && position_ + 1 < text_.size() && isLowSurrogate(text_[position_ + 1])) {
-            return static_cast<char16_t>(0xd7c0 + (foldedPair(position_) >> 10));
+        if (U16_IS_LEAD(unit) && position_ + 1 < text_.size() && U16_IS_TRAIL(text_[position_ + 1])) {
+            return U16_LEAD(foldedPair(position_));
         }
         return static_cast<char16_t>(foldedCodePoint(unit));
     }
 
   private:
-    char32_t foldedPair(std::size_t high) const {
-        return foldedCodePoint(0x10000 + ((text_[high] & 0x3ffU) << 10) + (text_[high + 1] & 0x3ffU));
+    char32_t foldedPair(std::size_t lead) const {
+        return foldedCodePoint(static_cast<char32_t>(U16_GET_SUPPLEMENTARY(text_[lead], text_[lead + 1])));
     }
 
     std::u16string_view text_;
@@ -276,7 +271,7 @@ void AbbreviationIndex::visitCandidates(Trigger trigger, std::u16string_view tex
 void AbbreviationIndex::refreshRanks(const IndexedGroup& group) const {
     std::uint32_t rank = 0;
     for (const std::uint32_t record : group.records) records_[record].rank = rank++;
-    records_[group.records.front()].group->ranksAreStale = false;
+    group.ranksAreStale = false;
 }
 
 }  // namespace plume

@@ -39,7 +39,7 @@ class AbbreviationIndex final : public SnippetGroupObserver {
         bool prefixOverlapsItself = false;
         std::optional<Trigger> table;        // where its snippets are filed; nothing for groups that never expand
         std::vector<std::uint32_t> records;  // of its items, in their order
-        bool ranksAreStale = false;
+        mutable bool ranksAreStale = false;  // they are brought up to date when somebody asks
     };
 
     struct Candidate {

@@ -1,6 +1,5 @@
 // A small, fast "certainly not" for the ends of what is typed, so that a key that completes nothing hardly ever touches
-// the tables behind it, whatever their size. It never denies a key that was added; it may admit others (about one in
-// fifty).
+// the tables behind it, whatever their size. It never denies a key that was added; it may admit a few others.
 #pragma once
 
 #include <bit>
