@@ -5,10 +5,13 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <string>
 
 #include "Foundation/ZDEvent.h"
+#include "content/PLOutput.h"
+#include "input/ContextInputSetting.h"
 #include "input/EventArgs.h"
 #include "platform/ProcessManager.h"
 #include "platform/RunLoop.h"
@@ -34,6 +37,17 @@ class InputService {
     virtual ProcessSerialNumber lastProcessReceivedKeyEvent() const = 0;
     // What a key code produces with the modifiers of these event flags.
     virtual std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const = 0;
+    // What the last key produced; nothing when it produced nothing.
+    virtual const std::optional<std::u16string>& lastKeyString() const = 0;
+
+    // The application in front when its setting was last resolved, and resolving it anew; the setting is never null.
+    virtual const std::optional<std::u16string>& contextBundleIdentifier() const = 0;
+    virtual std::shared_ptr<const ContextInputSetting> refreshContextInputSetting() = 0;
+    // Erases and delivers. From any thread: at once on the one that delivers the key events, where `cancelTrigger` and
+    // the content's suffix are decided when it returns, otherwise as soon as that one can.
+    virtual void sendOutput(std::shared_ptr<PLOutput> output) = 0;
+    virtual void bringLastProcessToFront() = 0;
+
     // The loop of the thread that delivers the key events.
     virtual RunLoop& runLoop() = 0;
 };

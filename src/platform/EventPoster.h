@@ -38,6 +38,9 @@ class EventPoster {
     // With `pastTap`, by the way around the tapped stream where the port has two.
     virtual void post(const SynthesisedKey& key, bool pastTap) = 0;
 
+    // Whether post() can produce every character of this text now; otherwise it has to be pasted.
+    virtual bool canType(std::u16string_view text) const = 0;
+
     // Whether the user holds this key now.
     virtual bool isKeyDown(std::uint16_t keyCode) const = 0;
 
@@ -50,8 +53,8 @@ class EventPoster {
     // A press and a release of the left button at that place.
     virtual void click(Point location) = 0;
 
-    // The user's own keys typed from now on wait until the output in flight is complete, and follow in order; a port
-    // that cannot do it does nothing. Never longer than the port's limit.
+    // The user's own keys from now on, with the one being decided about if it is passed on, wait until the output in
+    // flight is complete, and follow in order; a port that cannot do it does nothing. They wait 2 seconds at most.
     virtual void holdUserKeys() = 0;
     virtual void releaseUserKeys() = 0;
 };

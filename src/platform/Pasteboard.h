@@ -36,6 +36,8 @@ class PasteboardOwner {
     virtual ~PasteboardOwner() = default;
     // Writes the content of `type` with setString or setData, at once. Called on the thread that serves the pasteboard.
     virtual void provideData(Pasteboard& pasteboard, std::string_view type) = 0;
+    // The program in front has taken what it asked for. Called only by a pasteboard that tellsWhenTaken().
+    virtual void dataWasTaken(std::string_view /*type*/) {}
 };
 
 // Reading and writing. Everything here belongs to the tap thread.
@@ -43,6 +45,9 @@ class Pasteboard : public PasteboardReader {
   public:
     // Grows with every change of the content, whoever makes it.
     virtual std::int64_t changeCount() const = 0;
+    // Whether owners hear when the program in front has taken their content. Where they do, a paste goes on after the
+    // keystroke, and others (a clipboard manager) may read promised content too.
+    virtual bool tellsWhenTaken() const = 0;
     // Replaces the content by these types and returns the new change count. With an owner the data is promised;
     // without one it is written right after. No types at all empty the pasteboard.
     virtual std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) = 0;

@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace plume {
 
@@ -21,6 +22,13 @@ struct RunningApplication {
     std::int64_t processIdentifier = 0;
     std::optional<std::u16string> bundleIdentifier;
     std::optional<std::u16string> localizedName;
+    std::optional<std::u16string> executableURL;  // where its program lies, as a path
+};
+
+// A program that listens to the keyboard.
+struct EventTapInformation {
+    bool isActiveFilter = false;  // it can swallow keys
+    RunningApplication tappingProcess;
 };
 
 // Called on the tap thread for every key, so answers come from what is already known and never wait for a program.
@@ -32,6 +40,10 @@ class ProcessManager {
     virtual std::optional<ProcessSerialNumber> frontProcess() const = 0;
     // Nothing when the process is gone or is no application.
     virtual std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const = 0;
+    // Asks for the process to be brought to the front; a port may take a moment to do it.
+    virtual void bringToFront(ProcessSerialNumber process) = 0;
+    // Who else listens to the keyboard, as far as the system tells; at most 10.
+    virtual std::vector<EventTapInformation> eventTaps() const = 0;
 };
 
 }  // namespace plume

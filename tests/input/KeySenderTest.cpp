@@ -28,6 +28,7 @@ class RecordingPoster final : public EventPoster {
         if (pastTap) event += "!";
         events.push_back(event);
     }
+    bool canType(std::u16string_view) const override { return true; }
     bool isKeyDown(std::uint16_t keyCode) const override { return held.contains(keyCode); }
     std::optional<CommandKeystroke> pasteKeystroke() const override { return own; }
     std::optional<CommandKeystroke> copyKeystroke() const override { return own; }

@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "input/BundleIdentifierResolver.h"
 #include "platform/simulated/SimulatedInputSources.h"
 
 namespace plume {
@@ -24,6 +25,7 @@ bool SimulatedInputService::pressKeyProducing(std::uint16_t keyCode, std::option
     event.key = keyCode;
     event.s = std::move(text);
     if (event.s && !event.s->empty()) event.c = event.s->front();
+    lastKeyString_ = event.s;
 
     const bool shortcut = (modifiers & (KeyModifier::Control | KeyModifier::Command)) != 0;
     const bool backspaceOfWord = (modifiers & KeyModifier::Option) != 0 && event.c == u'\b';
@@ -65,6 +67,12 @@ bool SimulatedInputService::isSameProcess() const {
 std::optional<std::u16string> SimulatedInputService::stringForKeyCode(std::uint16_t keyCode,
                                                                       std::uint64_t flags) const {
     return inputSources_.translateKey(keyCode, flags);
+}
+
+std::shared_ptr<const ContextInputSetting> SimulatedInputService::refreshContextInputSetting() {
+    const auto front = foregroundApplication(processManager_);
+    contextBundleIdentifier_ = front ? front->bundleIdentifier : std::nullopt;
+    return setting_.copy();
 }
 
 // The keyboard's new owner is noticed at its first key.

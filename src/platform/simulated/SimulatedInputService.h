@@ -3,7 +3,9 @@
 // For trying out listeners without a tap, hot keys or delivery. Works on its caller's thread.
 #pragma once
 
+#include <memory>
 #include <string_view>
+#include <vector>
 
 #include "input/InputService.h"
 #include "platform/InputSources.h"
@@ -30,7 +32,18 @@ class SimulatedInputService final : public InputService {
     bool isSameProcess() const override;
     ProcessSerialNumber lastProcessReceivedKeyEvent() const override { return lastProcess_; }
     std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const override;
+    const std::optional<std::u16string>& lastKeyString() const override { return lastKeyString_; }
+    const std::optional<std::u16string>& contextBundleIdentifier() const override { return contextBundleIdentifier_; }
+    std::shared_ptr<const ContextInputSetting> refreshContextInputSetting() override;
+    void sendOutput(std::shared_ptr<PLOutput> output) override { outputs_.push_back(std::move(output)); }
+    void bringLastProcessToFront() override { ++broughtToFront_; }
     RunLoop& runLoop() override { return runLoop_; }
+
+    // What was ordered, in order; nothing is delivered.
+    const std::vector<std::shared_ptr<PLOutput>>& outputs() const { return outputs_; }
+    int broughtToFront() const { return broughtToFront_; }
+    // What the next resolution finds.
+    void setContextInputSetting(ContextInputSetting setting) { setting_ = std::move(setting); }
 
   private:
     void followFrontProcess();
@@ -42,6 +55,11 @@ class SimulatedInputService final : public InputService {
     std::int32_t keyModifier_ = 0;
     bool receivedKey_ = false;
     ProcessSerialNumber lastProcess_;
+    std::optional<std::u16string> lastKeyString_;
+    std::optional<std::u16string> contextBundleIdentifier_;
+    ContextInputSetting setting_;
+    std::vector<std::shared_ptr<PLOutput>> outputs_;
+    int broughtToFront_ = 0;
 };
 
 }  // namespace plume

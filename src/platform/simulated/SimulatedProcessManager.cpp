@@ -11,7 +11,7 @@ ProcessSerialNumber SimulatedProcessManager::launch(std::optional<std::u16string
     ++launched_;
     const ProcessSerialNumber process{0, launched_};
     running_[process] = {1000 + static_cast<std::int64_t>(launched_), std::move(bundleIdentifier),
-                         std::move(localizedName)};
+                         std::move(localizedName), std::nullopt};
     return process;
 }
 

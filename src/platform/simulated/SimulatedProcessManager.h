@@ -2,6 +2,8 @@
 #pragma once
 
 #include <map>
+#include <utility>
+#include <vector>
 
 #include "platform/ProcessManager.h"
 
@@ -18,18 +20,23 @@ class SimulatedProcessManager final : public ProcessManager {
     void terminate(ProcessSerialNumber process);
     void setFrontProcess(std::optional<ProcessSerialNumber> process) { front_ = process; }
 
+    void setEventTaps(std::vector<EventTapInformation> taps) { eventTaps_ = std::move(taps); }
+
     // How often somebody asked what a process is.
     int queries() const { return queries_; }
 
     ProcessSerialNumber currentProcess() const override { return own_; }
     std::optional<ProcessSerialNumber> frontProcess() const override { return front_; }
     std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
+    void bringToFront(ProcessSerialNumber process) override { front_ = process; }
+    std::vector<EventTapInformation> eventTaps() const override { return eventTaps_; }
 
   private:
     std::map<ProcessSerialNumber, RunningApplication> running_;
     std::uint32_t launched_ = 0;
     ProcessSerialNumber own_;
     std::optional<ProcessSerialNumber> front_;
+    std::vector<EventTapInformation> eventTaps_;
     mutable int queries_ = 0;
 };
 

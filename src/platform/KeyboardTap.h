@@ -1,0 +1,49 @@
+// Hearing every key of the session before any program does, and deciding whether a program gets it.
+//
+// The tap belongs to the tap thread: it is created there, and the listener is called there, synchronously, while the
+// key waits. A port that loses the tap because an answer took too long says so and leaves the keys alone until
+// enable().
+#pragma once
+
+#include <cstdint>
+#include <string_view>
+
+#include "Foundation/Result.h"
+
+namespace plume {
+
+// What the user did to one key. Keys that Plume posts itself are never reported.
+struct TapEvent {
+    enum class Type { KeyDown, KeyUp, FlagsChanged };
+
+    Type type = Type::KeyDown;
+    std::uint16_t keyCode = 0;
+    std::uint64_t flags = 0;     // event flag bits of the modifiers held; for FlagsChanged: from now on
+    std::u16string_view string;  // what the key produces, at most 10 units; valid during the call
+};
+
+class KeyboardTapListener {
+  public:
+    virtual ~KeyboardTapListener() = default;
+    // True swallows the event: no program gets it.
+    virtual bool keyboardEvent(const TapEvent& event) = 0;
+    virtual void tapDisabledByTimeout() = 0;
+    virtual void tapDisabledByUserInput() = 0;
+};
+
+class KeyboardTap {
+  public:
+    virtual ~KeyboardTap() = default;
+    // Starts hearing keys. The listener is not owned and is called until remove(). With `annotatedSession`, at the
+    // later of the two places in the event stream where the port has two. The error says what is missing.
+    virtual Result<void> create(KeyboardTapListener& listener, bool annotatedSession) = 0;
+    virtual bool exists() const = 0;
+    // Again after tapDisabledByTimeout.
+    virtual void enable() = 0;
+    // Keys reach programs without Plume from now on.
+    virtual void remove() = 0;
+    // Whether a tap could be created at all; creates none. From any thread.
+    virtual Result<void> check() const = 0;
+};
+
+}  // namespace plume
