@@ -16,10 +16,17 @@ MAY_SEE = {
     "engine": {"Foundation", "platform", "library", "content", "input"},
     "platform/simulated": {"Foundation", "platform", "input"},
     "platform/desktop": {"Foundation", "platform"},
+    "platform/x11": {"Foundation", "platform", "platform/desktop", "input"},
 }
 # Foreign headers by folder; everything else that is included with <…> is the standard library's or the system's.
-FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib)")
-MAY_USE = {"unicode/"}
+FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib|nlohmann/|canberra)")
+# Folder -> what of these it may include; the first entry holds everywhere.
+MAY_USE = {
+    "": ("unicode/",),
+    "platform/x11": ("xcb/", "X11/", "xkbcommon/"),
+    "platform/desktop": ("atspi", "glib", "canberra"),
+    "app": ("CLI/", "nlohmann/"),
+}
 
 INCLUDE = re.compile(r'^\s*#\s*include\s+(["<])([^">]+)[">]')
 
@@ -43,7 +50,7 @@ def faults_in(file: pathlib.Path):
         kind, target = found.groups()
         where = f"{file.relative_to(ROOT.parent)}:{number}"
         if kind == "<":
-            if FOREIGN.match(target) and not any(target.startswith(use) for use in MAY_USE):
+            if FOREIGN.match(target) and not target.startswith(MAY_USE[""] + MAY_USE.get(own, ())):
                 yield f"{where}: <{target}> belongs to the ports and the application"
             continue
         seen = folder_of(target)
