@@ -56,13 +56,16 @@ class SimulatedAccessibility final : public Accessibility {
   public:
     // Null: no application in front, or no permission to ask.
     void setFrontApplicationElement(std::shared_ptr<UIElement> element) { front_ = std::move(element); }
+    // Asked for it whenever somebody wants to know, in place of a fixed one.
+    void setFrontApplicationSource(std::function<std::shared_ptr<UIElement>()> source) { source_ = std::move(source); }
     void setMainScreenHeight(double height) { screenHeight_ = height; }
 
-    std::shared_ptr<UIElement> frontApplicationElement() const override { return front_; }
+    std::shared_ptr<UIElement> frontApplicationElement() const override { return source_ ? source_() : front_; }
     double mainScreenHeight() const override { return screenHeight_; }
 
   private:
     std::shared_ptr<UIElement> front_;
+    std::function<std::shared_ptr<UIElement>()> source_;
     double screenHeight_ = 1080;
 };
 
