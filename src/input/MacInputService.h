@@ -1,0 +1,175 @@
+// The program's ears and hands: hears every key of the session before any program does, tells the engine, the hot keys'
+// owner and others about it, swallows what they decide to swallow, and delivers output.
+//
+// Owned by the composition root, which also owns the tap thread and runs its loop. Everything belongs to the tap thread
+// unless it says otherwise. The service is destroyed when neither loop runs calls any more. Nothing fails to its
+// listeners: what goes wrong is logged in one sentence, without anything that was typed.
+#pragma once
+
+#include <atomic>
+#include <cstdint>
+#include <deque>
+#include <functional>
+#include <limits>
+#include <memory>
+#include <optional>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "input/AclExport.h"
+#include "input/HotKeyTable.h"
+#include "input/InputService.h"
+#include "input/OutputDelivery.h"
+#include "input/SRKeyCodeTransformer.h"
+#include "input/SecureInputWatch.h"
+#include "input/VMHelperController.h"
+#include "platform/KeyboardTap.h"
+#include "platform/MouseTap.h"
+#include "platform/SystemHotKeys.h"
+
+namespace plume {
+
+class MacInputService;
+
+// The tap was lost three times within a minute and stays off.
+struct KeyboardTapGivenUp {};
+
+class MacInputService final : public InputService, private KeyboardTapListener {
+  public:
+    // Nothing is owned; all of it outlives the service. `log` is called on either thread.
+    struct Surroundings {
+        KeyboardTap& keyboardTap;
+        MouseTap& mouseTap;
+        EventPoster& poster;
+        Pasteboard& pasteboard;
+        ProcessManager& processManager;
+        InputSources& inputSources;
+        Accessibility& accessibility;
+        SecureInput& secureInput;
+        SystemHotKeys& systemHotKeys;
+        BundleIdentifierResolver& bundleIdentifierResolver;
+        RunLoop& tapLoop;
+        RunLoop& mainLoop;  // may be the same loop as tapLoop
+        std::function<void(const std::string&)> log;
+        VMHelperController* vmHelper = nullptr;  // null: no window
+    };
+
+    explicit MacInputService(const Surroundings& surroundings);
+    ~MacInputService() override;
+    MacInputService(const MacInputService&) = delete;
+    MacInputService& operator=(const MacInputService&) = delete;
+
+    // Raised on the main thread, where observers register before enableEvents(); nobody's answer is waited for.
+    ZDEvent<ZDKeyEventArgs> keyUpEvent;
+    // Raised on the main thread, where observers register.
+    ZDEvent<MacInputService> secureInputChangedEvent;
+    ZDEvent<KeyboardTapGivenUp> keyboardTapGivenUpEvent;
+    // Raised on the tap thread; `cancel` swallows the key.
+    ZDEvent<ZDHotKeysPressedEventArgs> hotKeysPressed;
+
+    // From any thread: start and stop hearing keys, as soon as the tap thread can (at once on it). A tap that cannot be
+    // created is logged, and nothing is heard.
+    void enableEvents();
+    void disableEvents();
+    // Whether the keyboard tap exists.
+    bool evenTapCreated() const { return around_.keyboardTap.exists(); }
+    // From any thread: whether a keyboard tap could be created at all, and what is in the way.
+    Result<void> testFunction() const { return around_.keyboardTap.check(); }
+
+    // At once when the service is active.
+    void setListenMouseDownEvents(bool listen);
+    // From the next start on.
+    void setListenAtAnnotatedSession(bool annotated) { resolver_.listenAtAnnotatedSession = annotated; }
+
+    void registerHotKey(const GeneralHotKey& hotKey) { hotKeys_.registerHotKey(hotKey); }
+    void unregisterHotKey(const GeneralHotKey& hotKey) { hotKeys_.unregisterHotKey(hotKey); }
+    // The release of the modifiers held now is no hot key.
+    void ignoreNextHotKey() { hotKeys_.ignoreNextHotKey(); }
+    // Whether to swallow the key; KeyCode::None checks the held modifiers alone.
+    bool checkHotKeys(std::uint16_t keyCode) { return hotKeys_.checkHotKeys(keyCode); }
+    // A hot key that the system recognises, in place of the previous one under this id; one without a key is none. The
+    // error says what is in the way.
+    Result<void> registerSystemHotKey(SystemHotKeys::Id id, const GeneralHotKey& hotKey, std::function<void()> pressed);
+
+    // The user's settings of delivery, in force from the next output on.
+    DeliveryPreferences& preferences() { return resolver_.preferences; }
+    // Seconds from the end of a pasted output to the restore of the clipboard.
+    void setRestoreClipboardDelay(double seconds);
+    // Replaces or adds the setting of one application.
+    void setCustomApplicationSetting(const std::u16string& bundleIdentifier,
+                                     std::shared_ptr<const ContextInputSetting> setting);
+
+    // State from any thread; the name on the main thread, nothing when it is not known or secure input is off.
+    bool secureInput() const { return secureInputWatch_.state(); }
+    const std::optional<std::u16string>& lastAppEnabledSecureInput() const {
+        return secureInputWatch_.lastAppEnabledSecureInput();
+    }
+    // Main thread.
+    void checkSecureInput() { secureInputWatch_.checkSecureInput(); }
+
+    // Other programs that can swallow keys.
+    std::vector<RunningApplication> tappingProcesses() const;
+
+    // Presses what copies in the application in front.
+    void sendCopyCommand();
+    // Copies the rows of the list in the application in front, from the selected row down, until a row repeats.
+    void exportACLs();
+
+    // What the user has on the clipboard, also while an expansion stands there.
+    const PasteboardReader& userPasteboard() const { return userPasteboard_; }
+    const SRKeyCodeTransformer& keyCodeTransformer() const { return keyCodeTransformer_; }
+    // Every output has been delivered.
+    bool isIdle() const { return delivery_.isIdle(); }
+
+    std::int32_t keyModifier() const override { return hotKeys_.keyModifier(); }
+    bool isSameProcess() const override;
+    ProcessSerialNumber lastProcessReceivedKeyEvent() const override { return lastProcessReceivedKeyEvent_; }
+    std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const override;
+    const std::optional<std::u16string>& lastKeyString() const override { return lastKeyString_; }
+    const std::optional<std::u16string>& contextBundleIdentifier() const override;
+    std::shared_ptr<const ContextInputSetting> refreshContextInputSetting() override;
+    void sendOutput(std::shared_ptr<PLOutput> output) override;
+    void bringLastProcessToFront() override;
+    RunLoop& runLoop() override { return around_.tapLoop; }
+
+  private:
+    bool keyboardEvent(const TapEvent& event) override;
+    void tapDisabledByTimeout() override;
+    void tapDisabledByUserInput() override;
+
+    void onTapThread(std::function<void()> call);
+    void enableEventsInternal();
+    void disableEventsInternal();
+    void enableMouseEventTap();
+
+    bool keyEvent(const TapEvent& event);
+    bool keyDown(ZDKeyEventArgs& key);
+    bool keyUp(const ZDKeyEventArgs& key);
+    bool unregisteredHotKey(const ZDKeyEventArgs& key);
+    void followFrontProcess();
+    void readKey(const TapEvent& event, ZDKeyEventArgs& key) const;
+    void layoutChanged();
+
+    Surroundings around_;
+    HotKeyTable hotKeys_;
+    SRKeyCodeTransformer keyCodeTransformer_;
+    ContextInputResolver resolver_;
+    OutputDelivery delivery_;
+    AclExport aclExport_;
+    UserPasteboard userPasteboard_;
+    SecureInputWatch secureInputWatch_;
+
+    std::atomic<std::thread::id> eventTapThread_;
+    std::atomic<bool> keyUpObserved_ = false;
+    bool active_ = false;
+    bool listenMouseDownEvents_ = false;
+    std::optional<std::uint16_t> lastKeyCode_;
+    std::optional<std::u16string> lastKeyString_;
+    std::uint16_t canceledKeyCode_ = KeyCode::None;  // its key down was swallowed, its key up will be
+    ProcessSerialNumber lastProcessReceivedKeyEvent_;
+    bool isLastProcessReceivedKeyEventNull_ = true;
+    std::deque<double> timeouts_;  // when the tap was lost, within the last minute
+};
+
+}  // namespace plume

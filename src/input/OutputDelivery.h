@@ -1,0 +1,108 @@
+// Delivers outputs to the application in front, one after the other: erases, types or pastes piece by piece, presses
+// keys, moves the caret back, and has the user's clipboard restored.
+//
+// Owned by the input service; belongs to the tap thread. What is sent without a pause goes out inside send(), the rest
+// in batches on the tap thread's run loop. Nothing here waits or fails: an application that never takes what was pasted
+// delays what follows by a second. The user's own keys are held while an output is on its way, where the port can.
+#pragma once
+
+#include <cstdint>
+#include <deque>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "content/PLOutput.h"
+#include "input/ClipboardDataProvider.h"
+#include "input/ContextInputResolver.h"
+#include "input/KeySender.h"
+#include "input/OutputBatch.h"
+#include "input/OutputPreparation.h"
+#include "input/VMPasting.h"
+#include "platform/EventPoster.h"
+#include "platform/Pasteboard.h"
+#include "platform/ProcessManager.h"
+#include "platform/RunLoop.h"
+
+namespace plume {
+
+class OutputDelivery {
+  public:
+    // What delivery works on. Nothing is owned; all of it outlives the delivery, and no call of the loops runs once
+    // the delivery is gone.
+    struct Means {
+        EventPoster& poster;
+        Pasteboard& pasteboard;
+        const Accessibility& accessibility;
+        ProcessManager& processManager;
+        ContextInputResolver& resolver;
+        RunLoop& tapLoop;
+        RunLoop& mainLoop;
+        VMHelperController* vmHelper;  // null: no window
+    };
+
+    explicit OutputDelivery(const Means& means);
+    ~OutputDelivery();
+    OutputDelivery(const OutputDelivery&) = delete;
+    OutputDelivery& operator=(const OutputDelivery&) = delete;
+
+    // Decides how the output is delivered (its `cancelTrigger` and its content's suffix are final when this returns)
+    // and starts, behind the outputs that are still on their way. `target` is the process that received the last key.
+    void send(std::shared_ptr<PLOutput> output, const TriggerKey& triggerKey, ProcessSerialNumber target);
+    // Resolves the setting of the application in front.
+    const std::shared_ptr<ContextInputSetting>& refreshContextInputSetting();
+
+    // The tap lets every event pass, unseen.
+    bool letsEverythingPass() const { return sender_.isSending() || pasting_; }
+    // Every output has been delivered.
+    bool isIdle() const { return !current_ && queue_.empty(); }
+
+    KeySender& sender() { return sender_; }
+    ClipboardDataProvider& clipboardDataProvider() { return provider_; }
+    const ClipboardDataProvider& clipboardDataProvider() const { return provider_; }
+
+  private:
+    // One output on its way, with what belongs to it alone.
+    struct Delivery {
+        std::shared_ptr<PLOutput> output;
+        std::shared_ptr<ContextInputSetting> setting;
+        ProcessSerialNumber target;
+        std::uint64_t heldBackspaces = 0;  // sent when the virtual machine is active again
+        bool restoresClipboard = false;    // the user's preference when it was prepared
+        bool tookOverRestore = false;      // a pending restore was cancelled for it
+        bool pasted = false;
+        bool allSent = false;  // but for paste keystrokes that are still to come
+    };
+
+    void startNext();
+    void start();
+    void sendBatch();
+    void continueBatch();
+    void perform(const OutputStep& step);
+    void later(double delay, void (OutputDelivery::*step)());
+    void finish();
+    void completeIfDone();
+
+    bool paste(const PLOutput::Fragment& fragment);
+    void sendPasteCommand();
+    void waitUntilTaken();
+    void taken();
+
+    Means means_;
+    ClipboardDataProvider provider_;
+    KeySender sender_;
+    VMPasting vmPasting_;
+    std::deque<Delivery> queue_;
+    std::optional<Delivery> current_;
+    OutputBatch batch_;           // of the current delivery
+    std::size_t nextStep_ = 0;    // in batch_
+    bool pasting_ = false;        // a delayed paste keystroke is to come
+    int keystrokesToCome_ = 0;    // paste keystrokes that are scheduled
+    bool awaitsTaking_ = false;   // nothing goes on before the paste was taken
+    bool keystrokeSent_ = false;  // the paste that is awaited was asked for
+    bool startsNext_ = false;     // inside startNext()
+    RunLoop::CallId pendingCall_ = 0;
+    RunLoop::CallId takingLimit_ = 0;
+};
+
+}  // namespace plume
