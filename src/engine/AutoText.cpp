@@ -58,6 +58,7 @@ AutoText::~AutoText() {
     service.mouseDownEvent.removeObservers(this);
     service.unregisteredHotKeyPressedEvent.removeObservers(this);
     service.runLoop().cancel(scheduledList_);
+    service.runLoop().cancel(scheduledSuggestion_);
 }
 
 const CharacterSet& AutoText::defaultDelimiters() {

@@ -85,6 +85,8 @@ class AutoText final : public EngineState {
 
     // Sends a snippet that was chosen without typing.
     void sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet);
+    // Takes the last expansion back, for the hot keys that do that. False when there is nothing to take back.
+    bool undo(bool withTrigger) { return surroundings_.sender.undo(*this, withTrigger); }
 
     // ---- The list at the caret ----
     const SuggestionList& suggestions() const { return suggestions_; }
@@ -151,6 +153,7 @@ class AutoText final : public EngineState {
     std::unique_ptr<SuggestionController> snippetSuggestionController_;
     std::unique_ptr<QuickSearchController> snippetQuickSearchController_;
     RunLoop::CallId scheduledList_ = 0;
+    RunLoop::CallId scheduledSuggestion_ = 0;
 };
 
 }  // namespace plume

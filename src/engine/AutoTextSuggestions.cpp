@@ -3,6 +3,7 @@
 
 #include "content/PLOutput.h"
 #include "engine/AutoText.h"
+#include "engine/SlowActivation.h"
 
 namespace plume {
 
@@ -68,7 +69,13 @@ void AutoText::sendSuggestionAtIndex(std::size_t index, std::uint32_t snippetTri
     const std::shared_ptr<Snippet> snippet = std::move(suggestions_.suggestions[index]);
     const std::u16string typed = std::move(suggestions_.suggestionFilters[index]);
     hideSnippetSuggestion();
-    surroundings_.sender.sendSnippet(*this, snippet, typed, snippetTrigger);
+    const auto send = [this, snippet, typed, snippetTrigger] {
+        surroundings_.sender.sendSnippet(*this, snippet, typed, snippetTrigger);
+    };
+    InputService& service = surroundings_.inputService;
+    if (!losesKeysWhileActivated(service.contextBundleIdentifier())) return send();
+    service.bringLastProcessToFront();
+    scheduledSuggestion_ = service.runLoop().performAfterDelay(ActivationDelay, send);
 }
 
 bool AutoText::snippetQuickSearchWindowVisible() const {

@@ -23,6 +23,10 @@ class SnippetSender {
     // now stands before the caret. Whether the key that triggered it must be swallowed; false when nothing was sent.
     virtual bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
                              const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) = 0;
+
+    // Takes the last expansion back, as the engine's record tells, and types what stood there before; with or without
+    // the key that triggered it. False when there is no record.
+    virtual bool undo(EngineState& engine, bool withTrigger) = 0;
 };
 
 }  // namespace plume

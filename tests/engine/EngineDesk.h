@@ -30,6 +30,7 @@ class RecordingSender final : public SnippetSender {
 
     bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
                      const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) override;
+    bool undo(EngineState& /*engine*/, bool /*withTrigger*/) override { return false; }
 
     std::vector<Sent> sent;
     bool swallows = true;
