@@ -1,0 +1,92 @@
+// What a port has to show for the contract suites to be run on it: its interfaces, and hands to play the user and other
+// programs with.
+//
+// A port adds itself with one file that implements these and instantiates the suites.
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <ostream>
+#include <string>
+
+#include "platform/Accessibility.h"
+#include "platform/EventPoster.h"
+#include "platform/InputSources.h"
+#include "platform/KeyboardTap.h"
+#include "platform/Pasteboard.h"
+#include "platform/ProcessManager.h"
+#include "platform/RunLoop.h"
+
+namespace plume {
+
+// A run loop on the test's own thread.
+class ContractLoop {
+  public:
+    virtual ~ContractLoop() = default;
+    virtual RunLoop& runLoop() = 0;
+    // Lets this time pass on the loop, running what is due.
+    virtual void run(double seconds) = 0;
+};
+
+// A desktop with two programs, each with an empty text field that has the focus, the first in front. The keyboard has a
+// US layout.
+class ContractDesk {
+  public:
+    enum class Program { First, Second };
+
+    virtual ~ContractDesk() = default;
+    virtual Pasteboard& pasteboard() = 0;
+    virtual KeyboardTap& keyboardTap() = 0;
+    virtual EventPoster& poster() = 0;
+    virtual ProcessManager& processManager() = 0;
+    virtual InputSources& inputSources() = 0;
+    virtual Accessibility& accessibility() = 0;
+
+    // Lets the port and the programs work until the condition holds; false when it does not in good time.
+    virtual bool runUntil(const std::function<bool()>& condition) = 0;
+    // Lets them work for as long as a key takes to arrive anywhere.
+    virtual void settle() = 0;
+
+    virtual void press(std::uint16_t keyCode) = 0;
+    virtual void release(std::uint16_t keyCode) = 0;
+    virtual void activate(Program program) = 0;
+    // What stands in the program's field.
+    virtual std::u16string text(Program program) = 0;
+    // Another program than Plume puts this on the clipboard, or reads the clipboard's text.
+    virtual void copyElsewhere(const std::u16string& text) = 0;
+    virtual std::optional<std::u16string> readElsewhere() = 0;
+};
+
+template <typename Bench>
+struct ContractPort {
+    const char* name;
+    std::function<std::unique_ptr<Bench>()> make;
+};
+
+template <typename Bench>
+void PrintTo(const ContractPort<Bench>& port, std::ostream* stream) {
+    *stream << port.name;
+}
+
+class RunLoopContract : public testing::TestWithParam<ContractPort<ContractLoop>> {
+  protected:
+    std::unique_ptr<ContractLoop> bench_ = GetParam().make();
+    RunLoop& loop_ = bench_->runLoop();
+};
+
+class DeskContract : public testing::TestWithParam<ContractPort<ContractDesk>> {
+  protected:
+    using Program = ContractDesk::Program;
+    std::unique_ptr<ContractDesk> desk_ = GetParam().make();
+};
+
+class PasteboardContract : public DeskContract {};
+class KeyboardContract : public DeskContract {};
+class ProcessManagerContract : public DeskContract {};
+class InputSourcesContract : public DeskContract {};
+class AccessibilityContract : public DeskContract {};
+
+}  // namespace plume

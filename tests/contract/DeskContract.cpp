@@ -1,0 +1,85 @@
+// What a port knows about programs, the keyboard layout and the focused text.
+#include <string>
+
+#include "input/KeyCodes.h"
+#include "tests/contract/ContractDesk.h"
+
+namespace plume {
+
+TEST_P(ProcessManagerContract, NamesTheProgramThatHasTheKeyboard) {
+    ProcessManager& processes = desk_->processManager();
+    const auto first = processes.frontProcess();
+    ASSERT_TRUE(first.has_value());
+    const auto running = processes.runningApplication(*first);
+    ASSERT_TRUE(running.has_value());
+    EXPECT_TRUE(running->bundleIdentifier.has_value());
+
+    desk_->activate(Program::Second);
+    EXPECT_TRUE(desk_->runUntil([&] { return processes.frontProcess() && processes.frontProcess() != first; }));
+    const auto other = processes.runningApplication(*processes.frontProcess());
+    ASSERT_TRUE(other.has_value());
+    EXPECT_NE(other->processIdentifier, running->processIdentifier);
+}
+
+TEST_P(ProcessManagerContract, BringsAProgramBackToTheFront) {
+    ProcessManager& processes = desk_->processManager();
+    const auto first = processes.frontProcess();
+    ASSERT_TRUE(first.has_value());
+    desk_->activate(Program::Second);
+    ASSERT_TRUE(desk_->runUntil([&] { return processes.frontProcess() != first; }));
+    processes.bringToFront(*first);
+    EXPECT_TRUE(desk_->runUntil([&] { return processes.frontProcess() == first; }));
+}
+
+TEST_P(ProcessManagerContract, KnowsNothingOfProcessesThatAreNone) {
+    ProcessManager& processes = desk_->processManager();
+    EXPECT_EQ(processes.runningApplication({}).has_value(), false);
+    EXPECT_EQ(processes.runningApplication({77, 4'000'000'000U}).has_value(), false);
+    EXPECT_NE(processes.currentProcess(), ProcessSerialNumber{});
+    EXPECT_NE(processes.currentProcess(), processes.frontProcess());
+}
+
+TEST_P(InputSourcesContract, TranslatesKeysOfTheUSLayout) {
+    struct Case {
+        std::uint16_t keyCode;
+        std::uint64_t flags;
+        std::u16string produced;
+    };
+    const Case cases[] = {{0, 0, u"a"},
+                          {0, EventFlag::Shift, u"A"},
+                          {18, 0, u"1"},
+                          {18, EventFlag::Shift, u"!"},
+                          {KeyCode::Space, 0, u" "},
+                          {KeyCode::Return, 0, u"\r"},
+                          {KeyCode::Tab, 0, u"\t"},
+                          {KeyCode::Delete, 0, u"\b"},
+                          {83, 0, u"1"}};
+    for (const Case& c : cases) {
+        EXPECT_EQ(desk_->inputSources().translateKey(c.keyCode, c.flags), c.produced) << c.keyCode << ' ' << c.flags;
+    }
+    EXPECT_EQ(desk_->inputSources().translateKey(KeyCode::None, 0), std::nullopt);
+}
+
+TEST_P(InputSourcesContract, HasANameForTheLayout) {
+    const auto& identifier = desk_->inputSources().currentInputSourceIdentifier();
+    ASSERT_TRUE(identifier.has_value());
+    EXPECT_FALSE(identifier->empty());
+}
+
+TEST_P(AccessibilityContract, TellsTheSelectionAndTheTextBeforeIt) {
+    for (const std::uint16_t key : {std::uint16_t{0}, std::uint16_t{11}, std::uint16_t{8}}) {
+        desk_->press(key);
+        desk_->release(key);
+    }
+    ASSERT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"abc"; }));
+    const auto application = desk_->accessibility().frontApplicationElement();
+    ASSERT_NE(application, nullptr);
+    const auto focused = application->elementAttribute("AXFocusedUIElement");
+    ASSERT_NE(focused, nullptr);
+    EXPECT_TRUE(desk_->runUntil([&] { return focused->rangeAttribute("AXSelectedTextRange") == TextRange{3, 0}; }));
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {1, 2}), u"bc");
+    EXPECT_EQ(focused->stringAttribute("AXNoSuchAttribute"), std::nullopt);
+    EXPECT_EQ(focused->elementAttribute("AXNoSuchAttribute"), nullptr);
+}
+
+}  // namespace plume

@@ -1,0 +1,138 @@
+// The tap and the poster, which have to know of each other.
+#include <string>
+#include <vector>
+
+#include "input/KeyCodes.h"
+#include "tests/contract/ContractDesk.h"
+
+namespace plume {
+
+namespace {
+
+constexpr std::uint16_t KeyA = 0;
+constexpr std::uint16_t KeyB = 11;
+constexpr std::uint16_t ShiftKey = 56;
+
+// Writes down what it hears, and swallows one key.
+class Listener final : public KeyboardTapListener {
+  public:
+    struct Heard {
+        TapEvent::Type type;
+        std::uint16_t keyCode;
+        std::uint64_t flags;
+        std::u16string string;
+        bool operator==(const Heard&) const = default;
+    };
+
+    bool keyboardEvent(const TapEvent& event) override {
+        heard.push_back({event.type, event.keyCode, event.flags, std::u16string(event.string)});
+        return event.keyCode == swallowed;
+    }
+    void tapDisabledByTimeout() override { ADD_FAILURE() << "nothing took long"; }
+    void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody switched the tap off"; }
+
+    std::vector<Heard> heard;
+    std::uint16_t swallowed = KeyCode::None;
+};
+
+using Type = TapEvent::Type;
+
+}  // namespace
+
+TEST_P(KeyboardContract, HearsKeysWithTheirTextAndModifiers) {
+    Listener listener;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    desk_->press(ShiftKey);
+    desk_->press(KeyA);
+    desk_->release(KeyA);
+    desk_->release(ShiftKey);
+    EXPECT_TRUE(desk_->runUntil([&] { return listener.heard.size() == 4; }));
+    const std::vector<Listener::Heard> expected{{Type::FlagsChanged, ShiftKey, EventFlag::Shift, u""},
+                                                {Type::KeyDown, KeyA, EventFlag::Shift, u"A"},
+                                                {Type::KeyUp, KeyA, EventFlag::Shift, u"A"},
+                                                {Type::FlagsChanged, ShiftKey, 0, u""}};
+    EXPECT_EQ(listener.heard, expected);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"A"; }));
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(KeyboardContract, KeepsSwallowedKeysFromPrograms) {
+    Listener listener;
+    listener.swallowed = KeyA;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    for (const std::uint16_t key : {KeyA, KeyB, KeyA}) {
+        desk_->press(key);
+        desk_->release(key);
+    }
+    EXPECT_TRUE(desk_->runUntil([&] { return listener.heard.size() == 6; }));
+    desk_->settle();
+    EXPECT_EQ(desk_->text(Program::First), u"b");
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(KeyboardContract, LeavesKeysAloneOnceRemoved) {
+    Listener listener;
+    listener.swallowed = KeyA;
+    EXPECT_FALSE(desk_->keyboardTap().exists());
+    EXPECT_TRUE(desk_->keyboardTap().check().ok());
+    EXPECT_FALSE(desk_->keyboardTap().exists()) << "checking creates no tap";
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    EXPECT_TRUE(desk_->keyboardTap().exists());
+    desk_->keyboardTap().remove();
+    EXPECT_FALSE(desk_->keyboardTap().exists());
+    desk_->press(KeyA);
+    desk_->release(KeyA);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"a"; }));
+    EXPECT_TRUE(listener.heard.empty());
+}
+
+TEST_P(KeyboardContract, PostsKeysAndTextsInOrderAndUnheard) {
+    Listener listener;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    EventPoster& poster = desk_->poster();
+    const std::u16string text = u"x na\u00EFve \u65E5\u672C";
+    ASSERT_TRUE(poster.canType(text));
+    poster.begin();
+    for (const bool down : {true, false}) poster.post({0, 0, down, text}, false);
+    for (const bool down : {true, false}) poster.post({KeyCode::Delete, 0, down, {}}, false);
+    for (const bool down : {true, false}) poster.post({KeyA, EventFlag::Shift, down, {}}, false);
+    poster.end();
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"x na\u00EFve \u65E5A"; }));
+    desk_->settle();
+    EXPECT_TRUE(listener.heard.empty());
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(KeyboardContract, LetsAPassedKeyFollowWhatWasPostedDuringTheDecision) {
+    struct Posting final : KeyboardTapListener {
+        explicit Posting(EventPoster& aPoster) : poster(aPoster) {}
+        bool keyboardEvent(const TapEvent& event) override {
+            if (event.type != Type::KeyDown) return false;
+            poster.begin();
+            for (const bool down : {true, false}) poster.post({0, 0, down, u"12"}, false);
+            poster.end();
+            return false;
+        }
+        void tapDisabledByTimeout() override {}
+        void tapDisabledByUserInput() override {}
+        EventPoster& poster;
+    } listener(desk_->poster());
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    desk_->press(KeyA);
+    desk_->release(KeyA);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"12a"; }));
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(KeyboardContract, KnowsWhichKeysTheUserHolds) {
+    Listener listener;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    desk_->press(KeyB);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->poster().isKeyDown(KeyB); }));
+    EXPECT_FALSE(desk_->poster().isKeyDown(KeyA));
+    desk_->release(KeyB);
+    EXPECT_TRUE(desk_->runUntil([&] { return !desk_->poster().isKeyDown(KeyB); }));
+    desk_->keyboardTap().remove();
+}
+
+}  // namespace plume

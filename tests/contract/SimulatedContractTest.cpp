@@ -1,0 +1,62 @@
+// The simulated desktop keeps what the platform's headers promise.
+#include "platform/simulated/SimulatedDesktop.h"
+#include "tests/contract/ContractDesk.h"
+
+namespace plume {
+
+namespace {
+
+class SimulatedLoop final : public ContractLoop {
+  public:
+    RunLoop& runLoop() override { return loop_; }
+    void run(double seconds) override { loop_.advance(seconds); }
+
+  private:
+    SimulatedRunLoop loop_;
+};
+
+class SimulatedDesk final : public ContractDesk {
+  public:
+    SimulatedDesk() { activate(Program::First); }
+
+    Pasteboard& pasteboard() override { return desktop_.pasteboard(); }
+    KeyboardTap& keyboardTap() override { return desktop_.keyboardTap(); }
+    EventPoster& poster() override { return desktop_.poster(); }
+    ProcessManager& processManager() override { return desktop_.processManager(); }
+    InputSources& inputSources() override { return desktop_.inputSources(); }
+    Accessibility& accessibility() override { return desktop_.accessibility(); }
+
+    bool runUntil(const std::function<bool()>& condition) override {
+        settle();
+        return condition();
+    }
+    void settle() override { desktop_.runLoop().advance(1); }
+
+    void press(std::uint16_t keyCode) override { desktop_.keyboard().press(keyCode); }
+    void release(std::uint16_t keyCode) override { desktop_.keyboard().release(keyCode); }
+    void activate(Program program) override { desktop_.activate(nameOf(program)); }
+    std::u16string text(Program program) override { return desktop_.application(nameOf(program)).field().text(); }
+    void copyElsewhere(const std::u16string& text) override { desktop_.pasteboard().copyFromProgram(text); }
+    std::optional<std::u16string> readElsewhere() override { return desktop_.pasteboard().string(); }
+
+  private:
+    static std::u16string nameOf(Program program) {
+        return program == Program::First ? u"org.example.first" : u"org.example.second";
+    }
+
+    SimulatedDesktop desktop_;
+};
+
+const ContractPort<ContractLoop> Loop{"Simulated", [] { return std::make_unique<SimulatedLoop>(); }};
+const ContractPort<ContractDesk> Desk{"Simulated", [] { return std::make_unique<SimulatedDesk>(); }};
+
+}  // namespace
+
+INSTANTIATE_TEST_SUITE_P(Simulated, RunLoopContract, testing::Values(Loop));
+INSTANTIATE_TEST_SUITE_P(Simulated, PasteboardContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, KeyboardContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, ProcessManagerContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, InputSourcesContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, AccessibilityContract, testing::Values(Desk));
+
+}  // namespace plume
