@@ -3,8 +3,8 @@
 #include <fcntl.h>
 #include <poll.h>
 #include <spawn.h>
-#include <sys/pidfd.h>
 #include <sys/socket.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 
 #include <cerrno>
@@ -120,7 +120,7 @@ void Watchdog::replace() {
 
 void Watchdog::reap() {
     if (process_ == 0) return;
-    const FileDescriptor exit(pidfd_open(process_, 0));
+    const FileDescriptor exit(static_cast<int>(syscall(SYS_pidfd_open, process_, 0)));
     pollfd entry{exit.get(), POLLIN, 0};
     if (!exit.isOpen() || poll(&entry, 1, EndBoundInMilliseconds) <= 0) kill(process_, SIGKILL);
     while (waitpid(process_, nullptr, 0) < 0 && errno == EINTR) {
