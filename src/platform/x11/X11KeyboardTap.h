@@ -1,0 +1,57 @@
+// The keyboard tap on X11: takes the hardware keyboards from the server and gives their keys back through XTEST.
+//
+// Each hardware keyboard is grabbed by itself, so that its keys reach nobody, the window with the focus keeps the
+// focus, and no program notices; a key that passes is pressed again on the XTEST keyboard, which stands in for the
+// hardware with the window manager, with grabs and with auto-repeat. Keys are decoded here, without asking the server.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "platform/KeyboardTap.h"
+#include "platform/desktop/PollRunLoop.h"
+#include "platform/x11/TapConnection.h"
+#include "platform/x11/XkbKeyboard.h"
+
+namespace plume {
+
+class X11KeyboardTap final : public KeyboardTap {
+  public:
+    // All of them outlive the tap. Nothing happens before create().
+    X11KeyboardTap(PollRunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard);
+    ~X11KeyboardTap() override;
+    X11KeyboardTap(const X11KeyboardTap&) = delete;
+    X11KeyboardTap& operator=(const X11KeyboardTap&) = delete;
+
+    // Whether what has the focus now takes a password; asked for every key, so it must be quick. Then, and while
+    // another program holds the keyboard, keys pass unheard.
+    void setFocusIsPassword(std::function<bool()> focusIsPassword);
+
+    Result<void> create(KeyboardTapListener& listener, bool annotatedSession) override;
+    bool exists() const override;
+    void enable() override;
+    void remove() override;
+    Result<void> check() const override;
+
+    // From hold() to release(), at most 2 seconds, the user's keys wait, with the one that the listener is deciding
+    // about if it passes; then they follow in order.
+    void hold();
+    void release();
+
+  private:
+    class Session;
+    void lost();
+
+    PollRunLoop& loop_;
+    TapConnection& connection_;
+    XkbKeyboard& keyboard_;
+    std::function<bool()> focusIsPassword_;
+    KeyboardTapListener* listener_ = nullptr;
+    std::unique_ptr<Session> session_;  // while the keyboards are taken
+    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
+};
+
+}  // namespace plume
