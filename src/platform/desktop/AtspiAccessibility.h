@@ -1,0 +1,68 @@
+// What the focused program tells of its user interface, by AT-SPI.
+//
+// Programs may be slow or hang, so none is ever asked on a caller's thread: a thread of its own, on which libatspi
+// runs, follows the focus and asks. A caller waits for an answer for 15 ms at most, and after an answer that did not
+// come nobody waits for another one for a second. One object a process: libatspi has one connection.
+//
+// libatspi puts some of its connections into GLib's default main context. No other thread may run that context: a
+// program with a Qt main loop sets QT_NO_GLIB before it makes its application object.
+#pragma once
+
+#include <sys/types.h>
+
+#include <atomic>
+#include <future>
+#include <memory>
+#include <string_view>
+#include <thread>
+
+#include "platform/Accessibility.h"
+
+namespace plume {
+
+class AtspiSession;
+
+enum class AccessibilityStatus {
+    Starting,
+    Working,
+    // Works, but only with those programs that always tell of their user interface.
+    SwitchedOff,
+    NotInstalled,  // the session cannot start its accessibility bus
+    NoSession,     // no D-Bus session at all
+    Failed,        // the accessibility bus is there and cannot be used
+};
+
+// In English: what is the matter and what to do about it.
+std::string_view sentenceOf(AccessibilityStatus status);
+
+class AtspiAccessibility final : public Accessibility {
+  public:
+    // Returns at once; until the accessibility bus is found everything answers nothing.
+    AtspiAccessibility();
+    // Waits for its thread a few hundredths of a second at most; a thread that hangs in a program is left behind.
+    ~AtspiAccessibility() override;
+    AtspiAccessibility(const AtspiAccessibility&) = delete;
+    AtspiAccessibility& operator=(const AtspiAccessibility&) = delete;
+
+    // The program that has the focus, when it tells so. Never waits; its elements' attributes do. An element belongs to
+    // the thread that it was made for.
+    std::shared_ptr<UIElement> frontApplicationElement() const override;
+    double mainScreenHeight() const override { return screenHeight_; }
+    // In the pixels in which programs tell of their places. From any thread.
+    void setMainScreenHeight(double height) { screenHeight_ = height; }
+
+    // Whether a password is typed into what has the focus. From any thread, never waits.
+    bool focusIsPassword() const;
+    // The process that has the focus; 0 when it is not known. From any thread, never waits.
+    pid_t focusedProcess() const;
+    // From any thread, never waits.
+    AccessibilityStatus status() const;
+
+  private:
+    std::shared_ptr<AtspiSession> session_;  // shared with the thread, which may outlive this object
+    std::atomic<double> screenHeight_ = 0;
+    std::future<void> ended_;
+    std::thread thread_;
+};
+
+}  // namespace plume
