@@ -120,16 +120,22 @@ void SendingPipeline::performAfterDelay(double delay, std::function<void()> call
 void SendingPipeline::performInBackground(std::function<void()> work, std::function<void()> finish) {
     const std::weak_ptr<const bool> alive = alive_;
     RunLoop& loop = surroundings_.inputService.runLoop();
-    const bool begins =
-        backgroundTasks_.run([&loop, alive, work = std::move(work), finish = std::move(finish)]() mutable {
+    const auto begun =
+        backgroundTasks_.run([this, &loop, alive, work = std::move(work), finish = std::move(finish)]() mutable {
             work();
             // What the work shares with the finish belongs to the loop's thread from here on, to the last reference.
             work = nullptr;
-            loop.perform([alive, finish = std::exchange(finish, nullptr)] {
-                if (!alive.expired()) finish();
+            loop.perform([this, alive, finish = std::exchange(finish, nullptr)] {
+                if (alive.expired()) return;
+                --pendingScripts_;
+                finish();
             });
         });
-    if (!begins) surroundings_.report("A script could not be run: the system gives no further thread.");
+    if (begun) {
+        ++pendingScripts_;
+    } else {
+        surroundings_.report("A script could not be run: the system gives no further thread.");
+    }
 }
 
 }  // namespace plume

@@ -7,6 +7,7 @@
 // waits for scripts that run, so whoever does it stops the script runner first.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -55,9 +56,9 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     const std::string& feedbackSound() const { return feedbackSound_; }
     void setFeedbackSound(std::string name) { feedbackSound_ = std::move(name); }
 
-    // Scripts are at work. Their results arrive through the run loop after they have ended.
-    bool hasRunningScripts() const { return !backgroundTasks_.isIdle(); }
-    // Blocks until none is; their results are with the run loop then.
+    // Scripts were begun whose results have not been dealt with: they run, or their results wait in the run loop.
+    bool hasPendingScripts() const { return pendingScripts_ > 0; }
+    // Blocks until no script runs; the results are with the run loop then, and may begin further scripts there.
     void waitForScripts() const { backgroundTasks_.waitUntilIdle(); }
 
   private:
@@ -98,6 +99,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     bool playFeedbackSound_ = false;
     std::string feedbackSound_;
     std::vector<OpenForm> forms_;
+    std::size_t pendingScripts_ = 0;
     const std::shared_ptr<const bool> alive_ = std::make_shared<const bool>(true);
     BackgroundTasks backgroundTasks_;
 };

@@ -75,6 +75,14 @@ class RecordedSearch final : public QuickSearchController {
 
 }  // namespace
 
+std::unique_ptr<SuggestionController> makeRecordedList(ListWindow& window) {
+    return std::make_unique<RecordedList>(window);
+}
+
+std::unique_ptr<QuickSearchController> makeRecordedSearch(SearchWindow& window) {
+    return std::make_unique<RecordedSearch>(window);
+}
+
 bool RecordingSender::sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
                                   const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) {
     sent.push_back({*snippet->abbreviation(), abbreviation, snippetTrigger, engine.letters(), *listVisible});
@@ -100,8 +108,7 @@ void PrefixSuggestions::appendSuggestions(std::u16string_view letters, const Eng
 EngineDesk::EngineDesk()
     : editor(processes.launch(u"org.example.editor")),
       engine({service, resolver, sources, defaults, sender, suggestionSource, &corrector,
-              [this] { return std::make_unique<RecordedList>(list); },
-              [this] { return std::make_unique<RecordedSearch>(search); }}) {
+              [this] { return makeRecordedList(list); }, [this] { return makeRecordedSearch(search); }}) {
     sender.listVisible = &list.visible;
     processes.setFrontProcess(editor);
     engine.setEnabled(true);

@@ -84,6 +84,10 @@ struct SearchWindow {
     std::function<void()> choose;
 };
 
+// Windows that write down what becomes of them.
+std::unique_ptr<SuggestionController> makeRecordedList(ListWindow& window);
+std::unique_ptr<QuickSearchController> makeRecordedSearch(SearchWindow& window);
+
 class EngineDesk {
   public:
     // An enabled engine with an editor in front of it.

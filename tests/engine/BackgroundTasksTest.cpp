@@ -1,0 +1,80 @@
+#include "engine/BackgroundTasks.h"
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <future>
+#include <memory>
+
+namespace plume {
+namespace {
+
+TEST(BackgroundTasks, RunAsManySideBySideAsAllowedAndTheRestAfterThem) {
+    BackgroundTasks tasks;
+    std::atomic<std::size_t> running = 0;
+    std::atomic<std::size_t> most = 0;
+    std::atomic<std::size_t> done = 0;
+    std::promise<void> full;
+    std::promise<void> gate;
+    const std::shared_future<void> opened = gate.get_future().share();
+    constexpr std::size_t count = BackgroundTasks::MaximumThreads * 3;
+    for (std::size_t i = 0; i < count; ++i) {
+        ASSERT_TRUE(tasks.run([&] {
+            const std::size_t now = ++running;
+            if (now > most) most = now;
+            if (now == BackgroundTasks::MaximumThreads) full.set_value();
+            opened.wait();
+            ++done;
+        }));
+    }
+    full.get_future().wait();
+    EXPECT_FALSE(tasks.isIdle());
+    EXPECT_EQ(done, 0U);
+    EXPECT_EQ(running, BackgroundTasks::MaximumThreads);
+    gate.set_value();
+    tasks.waitUntilIdle();
+    EXPECT_EQ(done, count);
+    EXPECT_TRUE(tasks.isIdle());
+}
+
+TEST(BackgroundTasks, LetGoOfATaskBeforeTheyAreIdle) {
+    BackgroundTasks tasks;
+    auto held = std::make_shared<int>(1);
+    const std::weak_ptr<int> watched = held;
+    ASSERT_TRUE(tasks.run([held = std::move(held)] {}));
+    tasks.waitUntilIdle();
+    EXPECT_TRUE(watched.expired());
+}
+
+TEST(BackgroundTasks, AtTheEndFinishWhatRunsAndDropTheRest) {
+    std::atomic<std::size_t> done = 0;
+    std::promise<void> gate;
+    const std::shared_future<void> opened = gate.get_future().share();
+    std::atomic<std::size_t> begun = 0;
+    std::promise<void> full;
+    std::thread opener;
+    {
+        BackgroundTasks tasks;
+        for (std::size_t i = 0; i < BackgroundTasks::MaximumThreads; ++i) {
+            ASSERT_TRUE(tasks.run([&] {
+                if (++begun == BackgroundTasks::MaximumThreads) full.set_value();
+                opened.wait();
+                ++done;
+            }));
+        }
+        full.get_future().wait();
+        auto waits = std::make_shared<std::promise<void>>();
+        const std::shared_future<void> dropped = waits->get_future().share();
+        ASSERT_TRUE(tasks.run([&done, waits = std::move(waits)] { done += 1000; }));
+        // The tasks that run may end only once the waiting one was dropped, which breaks its promise.
+        opener = std::thread([dropped, &gate] {
+            dropped.wait();
+            gate.set_value();
+        });
+    }
+    opener.join();
+    EXPECT_EQ(done, BackgroundTasks::MaximumThreads);
+}
+
+}  // namespace
+}  // namespace plume
