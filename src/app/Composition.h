@@ -1,0 +1,101 @@
+// Puts the program together: from a platform's ports, the settings and a library to an engine that expands.
+//
+// Owned by whoever runs the program (the command line, the scenario player). Everything belongs to the tap thread,
+// where it is made and destroyed too, except for report and log, which may be called from any thread. The loops run no
+// more calls once it is being destroyed.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+
+#include "app/HotKeyDispatch.h"
+#include "content/ShellScriptRunner.h"
+#include "content/SnippetParser.h"
+#include "engine/AutoCorrection.h"
+#include "engine/AutoText.h"
+#include "engine/SendingPipeline.h"
+#include "input/BundleIdentifierResolver.h"
+#include "input/MacInputService.h"
+#include "platform/ProcessLauncher.h"
+#include "platform/Sounds.h"
+#include "platform/UserDefaults.h"
+
+namespace plume {
+
+class Composition {
+  public:
+    // A platform's ports. Nothing is owned; all of it outlives the composition.
+    struct Ports {
+        KeyboardTap& keyboardTap;
+        MouseTap& mouseTap;
+        EventPoster& poster;
+        Pasteboard& pasteboard;
+        ProcessManager& processManager;
+        InputSources& inputSources;
+        Accessibility& accessibility;
+        SecureInput& secureInput;
+        SystemHotKeys& systemHotKeys;
+        Sounds& sounds;
+        ProcessLauncher& processLauncher;
+        RunLoop& tapLoop;
+        RunLoop& mainLoop;  // may be the same loop as tapLoop
+    };
+
+    // What the program around it gives; what is empty or null is done without.
+    struct Surroundings {
+        // Outlives the composition.
+        const UserDefaults& settings;
+        // Tells the user, in one sentence. Never empty.
+        std::function<void(const std::string&)> report;
+        // Writes one line to the log. Never empty.
+        std::function<void(const std::string&)> log;
+        // Where dates are written: see ContentEnvironment.
+        std::string timeZone;
+        std::string locale;
+        // Windows. Without a form the user is told that the snippet needs one; without a list several matches cannot
+        // be chosen from.
+        FieldsEditor::Factory makeFieldsEditor;
+        std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController;
+        std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController;
+        const SuggestionSource* suggestionSource = nullptr;
+        VMHelperController* vmHelper = nullptr;
+        // The switch hot key has enabled or disabled the engine.
+        std::function<void(bool enabled)> enabledChanged;
+    };
+
+    Composition(const Ports& ports, Surroundings surroundings);
+    // Ends scripts that run.
+    ~Composition();
+    Composition(const Composition&) = delete;
+    Composition& operator=(const Composition&) = delete;
+
+    void setSnippetGroups(AutoText::Groups groups) { engine_->setSnippetGroups(std::move(groups)); }
+    // Gives every setting to whom it concerns; again whenever settings have changed.
+    void loadPreferences();
+    // Hot keys, then keys: from now on the user is heard.
+    void start();
+    void stop();
+
+    AutoText& engine() { return *engine_; }
+    MacInputService& inputService() { return *inputService_; }
+    SendingPipeline& sender() { return *sender_; }
+    AutoCorrection& corrector() { return *corrector_; }
+    SnippetParser& parser() { return *parser_; }
+
+  private:
+    void makeParts();
+
+    const Ports ports_;
+    const Surroundings surroundings_;
+    BundleIdentifierResolver identifiers_;
+    ShellScriptRunner scriptRunner_;
+    std::unique_ptr<MacInputService> inputService_;
+    std::unique_ptr<SnippetParser> parser_;
+    std::unique_ptr<SendingPipeline> sender_;
+    std::unique_ptr<AutoCorrection> corrector_;
+    std::unique_ptr<AutoText> engine_;
+    std::unique_ptr<HotKeyDispatch> hotKeys_;
+};
+
+}  // namespace plume
