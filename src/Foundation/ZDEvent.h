@@ -49,6 +49,8 @@ class ZDEvent {
         dropRemoved();
     }
 
+    bool isObserved() const { return !handlers_.empty(); }
+
     // Calls every handler, on the caller's thread. Allocates nothing.
     void raise(Argument& argument) {
         ++raising_;

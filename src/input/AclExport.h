@@ -19,7 +19,8 @@ class AclExport {
     // Nothing is owned. `copy` presses what copies.
     AclExport(KeySender& sender, const Pasteboard& pasteboard, RunLoop& runLoop, std::function<void()> copy);
 
-    // From the selected row down until a row's first cell is that of the row before. Does nothing while it runs.
+    // From the selected row down until a row's first cell is that of the row before or cannot be read. Does nothing
+    // while it runs.
     void start();
     // One cell a line; nothing before the end.
     const std::optional<std::u16string>& text() const { return text_; }
@@ -27,7 +28,9 @@ class AclExport {
   private:
     void copyFirstCell();
     void readFirstCell();
+    void copySecondCell();
     void readSecondCell();
+    void nextRow();
     void after(void (AclExport::*next)());
 
     KeySender& sender_;

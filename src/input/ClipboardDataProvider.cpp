@@ -44,7 +44,15 @@ void ClipboardDataProvider::provideData(Pasteboard& pasteboard, std::string_view
         return;
     }
     provideExpansion(pasteboard, type);
+    // Where takers are named, whoever else reads (a clipboard manager) does not count.
+    if (!pasteboard.tellsWhenTaken()) providedData_ = true;
+}
+
+void ClipboardDataProvider::dataWasTaken(std::string_view /*type*/) {
+    if (provideBackupData_) return;
     providedData_ = true;
+    if (restoresWhenTaken_) restoreAfterDelay();
+    if (onTaken) onTaken();
 }
 
 void ClipboardDataProvider::provideExpansion(Pasteboard& pasteboard, std::string_view type) const {
@@ -80,7 +88,11 @@ void ClipboardDataProvider::restore() {
     // Somebody has copied something since: that is what the user wants to find there.
     if (pasteboard_.changeCount() != changeCount_) return;
     if (!providedData_) {
-        restoreAfterDelay();
+        if (pasteboard_.tellsWhenTaken()) {
+            restoresWhenTaken_ = true;
+        } else {
+            restoreAfterDelay();
+        }
         return;
     }
     provideBackupData_ = true;
@@ -93,10 +105,11 @@ void ClipboardDataProvider::restoreAfterDelay() {
 }
 
 bool ClipboardDataProvider::cancelRestore() {
-    if (pendingRestore_ == 0) return false;
+    const bool wasPending = pendingRestore_ != 0 || restoresWhenTaken_;
     runLoop_.cancel(pendingRestore_);
     pendingRestore_ = 0;
-    return true;
+    restoresWhenTaken_ = false;
+    return wasPending;
 }
 
 bool ClipboardDataProvider::isOffering() const {

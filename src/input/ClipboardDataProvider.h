@@ -2,10 +2,12 @@
 // read the expansion.
 //
 // Owned by the input service for its whole life; runs on the tap thread, its delayed restores on that thread's run
-// loop. A restore is never forced: content that nobody reads stays, and the restore tries again every restoreDelay.
+// loop. A restore is never forced: content that nobody reads stays, and the restore tries again every restoreDelay, or,
+// where the pasteboard tells when content was taken, restoreDelay after that.
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <limits>
 #include <map>
 #include <optional>
@@ -28,6 +30,8 @@ class ClipboardDataProvider final : public PasteboardOwner {
     bool includeHTMLData = false;      // offer HTML besides RTFD and RTF for rich content
     bool excludeParagraphTag = false;  // and that without paragraph elements
     double restoreDelay = 0.3;         // seconds
+    // The program in front has taken the expansion; called inside the pasteboard's own call. Only where that tells.
+    std::function<void()> onTaken;
 
     void setString(std::u16string string);
     void setAttributedString(AttributedString string);
@@ -48,6 +52,7 @@ class ClipboardDataProvider final : public PasteboardOwner {
     std::optional<std::string> backupDataForType(std::string_view type) const;
 
     void provideData(Pasteboard& pasteboard, std::string_view type) override;
+    void dataWasTaken(std::string_view type) override;
 
   private:
     void prepareSetData();
@@ -60,7 +65,8 @@ class ClipboardDataProvider final : public PasteboardOwner {
     std::int64_t changeCount_ = std::numeric_limits<std::int64_t>::max();
     std::map<std::string, std::string, std::less<>> backupData_;
     std::optional<std::vector<std::string>> types_;
-    bool providedData_ = false;
+    bool providedData_ = false;       // the expansion was read
+    bool restoresWhenTaken_ = false;  // a restore is due as soon as it was
     bool provideBackupData_ = false;
     RunLoop::CallId pendingRestore_ = 0;
 };

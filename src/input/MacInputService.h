@@ -143,11 +143,13 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     void disableEventsInternal();
     void enableMouseEventTap();
 
-    bool keyEvent(const TapEvent& event);
+    void mouseDown(Point location);
+    void forgetLastKey();
     bool keyDown(ZDKeyEventArgs& key);
     bool keyUp(const ZDKeyEventArgs& key);
     bool unregisteredHotKey(const ZDKeyEventArgs& key);
     void followFrontProcess();
+    void raiseInputContextChanged();
     void readKey(const TapEvent& event, ZDKeyEventArgs& key) const;
     void layoutChanged();
 

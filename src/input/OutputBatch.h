@@ -28,13 +28,15 @@ struct OutputBatch {
 // Takes the next batch out of the output's backspaces, fragments and arrows.
 OutputBatch takeBatch(PLOutput& output, const ContextInputSetting& setting);
 
-// Whether everything but a pause for nothing is in the first batch, so that a key passed on now comes after it.
+// Whether everything is sent with the first batch, so that a key passed on behind it comes after the whole output.
 bool isSentInOneBatch(const PLOutput& output, const ContextInputSetting& setting);
 
 // When a paste keystroke is sent, in seconds from the moment the content is offered.
 double pasteKeystrokeDelay(const ContextInputSetting& setting);
-// What has to pass before the batch after a paste.
+// What has to pass before the batch after a paste, in seconds from the same moment.
 double pauseAfterPaste(const ContextInputSetting& setting);
+// The same in seconds from the moment at which the target is known to have taken the content.
+double pauseAfterTaking(const ContextInputSetting& setting);
 
 // The paste goes by way of activating Plume and then the target again.
 bool pastesByActivation(const ContextInputSetting& setting);

@@ -6,6 +6,7 @@
 // delays what follows by a second. The user's own keys are held while an output is on its way, where the port can.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <deque>
 #include <memory>
@@ -42,16 +43,12 @@ class OutputDelivery {
     };
 
     explicit OutputDelivery(const Means& means);
-    ~OutputDelivery();
     OutputDelivery(const OutputDelivery&) = delete;
     OutputDelivery& operator=(const OutputDelivery&) = delete;
 
     // Decides how the output is delivered (its `cancelTrigger` and its content's suffix are final when this returns)
     // and starts, behind the outputs that are still on their way. `target` is the process that received the last key.
     void send(std::shared_ptr<PLOutput> output, const TriggerKey& triggerKey, ProcessSerialNumber target);
-    // Resolves the setting of the application in front.
-    const std::shared_ptr<ContextInputSetting>& refreshContextInputSetting();
-
     // The tap lets every event pass, unseen.
     bool letsEverythingPass() const { return sender_.isSending() || pasting_; }
     // Every output has been delivered.
@@ -65,7 +62,7 @@ class OutputDelivery {
     // One output on its way, with what belongs to it alone.
     struct Delivery {
         std::shared_ptr<PLOutput> output;
-        std::shared_ptr<ContextInputSetting> setting;
+        std::shared_ptr<const ContextInputSetting> setting;  // as it was when the output was prepared
         ProcessSerialNumber target;
         std::uint64_t heldBackspaces = 0;  // sent when the virtual machine is active again
         bool restoresClipboard = false;    // the user's preference when it was prepared
@@ -79,14 +76,15 @@ class OutputDelivery {
     void sendBatch();
     void continueBatch();
     void perform(const OutputStep& step);
-    void later(double delay, void (OutputDelivery::*step)());
     void finish();
     void completeIfDone();
 
-    bool paste(const PLOutput::Fragment& fragment);
+    void paste(const PLOutput::Fragment& fragment);
+    void offer(const PLOutput::Fragment& fragment);
+    void pasteByActivation();
     void sendPasteCommand();
-    void waitUntilTaken();
-    void taken();
+    void wasTaken();
+    void goOnBehindPaste();
 
     Means means_;
     ClipboardDataProvider provider_;
@@ -94,14 +92,13 @@ class OutputDelivery {
     VMPasting vmPasting_;
     std::deque<Delivery> queue_;
     std::optional<Delivery> current_;
-    OutputBatch batch_;           // of the current delivery
-    std::size_t nextStep_ = 0;    // in batch_
-    bool pasting_ = false;        // a delayed paste keystroke is to come
-    int keystrokesToCome_ = 0;    // paste keystrokes that are scheduled
-    bool awaitsTaking_ = false;   // nothing goes on before the paste was taken
-    bool keystrokeSent_ = false;  // the paste that is awaited was asked for
-    bool startsNext_ = false;     // inside startNext()
-    RunLoop::CallId pendingCall_ = 0;
+    OutputBatch batch_;              // of the current delivery
+    std::size_t nextStep_ = 0;       // in batch_
+    bool startsNext_ = false;        // inside startNext()
+    bool pasting_ = false;           // a delayed paste keystroke is to come
+    int keystrokesToCome_ = 0;       // paste keystrokes, delayed ones and those to virtual machines
+    bool awaitsTaking_ = false;      // nothing goes on before the last paste was taken
+    bool hasAskedForPaste_ = false;  // its keystroke was sent
     RunLoop::CallId takingLimit_ = 0;
 };
 

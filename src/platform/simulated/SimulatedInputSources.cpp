@@ -117,6 +117,11 @@ char16_t unitOf(const Key& key, std::uint64_t flags) {
 
 }  // namespace
 
+void SimulatedInputSources::setIdentifier(std::optional<std::u16string> identifier) {
+    identifier_ = std::move(identifier);
+    if (listener_) listener_();
+}
+
 std::optional<SimulatedInputSources::Stroke> SimulatedInputSources::strokeFor(char16_t character) {
     const char16_t wanted = character == u'\n' ? u'\r' : character;
     const Key* key = findKey([&](const Key& k) { return k.plain == wanted || k.shifted == wanted; });

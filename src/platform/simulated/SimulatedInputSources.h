@@ -2,6 +2,7 @@
 #pragma once
 
 #include <string_view>
+#include <utility>
 
 #include "platform/InputSources.h"
 
@@ -17,16 +18,19 @@ class SimulatedInputSources final : public InputSources {
 
     static constexpr std::u16string_view US = u"org.example.keylayout.US";
 
-    void setIdentifier(std::optional<std::u16string> identifier) { identifier_ = std::move(identifier); }
+    // Tells the change listener.
+    void setIdentifier(std::optional<std::u16string> identifier);
 
     // How a person types this character; nothing when it is on no key. A line feed is Return.
     static std::optional<Stroke> strokeFor(char16_t character);
 
     const std::optional<std::u16string>& currentInputSourceIdentifier() const override { return identifier_; }
     std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override;
+    void setChangeListener(std::function<void()> listener) override { listener_ = std::move(listener); }
 
   private:
     std::optional<std::u16string> identifier_{US};
+    std::function<void()> listener_;
 };
 
 }  // namespace plume

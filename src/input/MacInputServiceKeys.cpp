@@ -1,0 +1,101 @@
+// What the input service does with each key and click.
+#include "input/MacInputService.h"
+
+#include <utility>
+
+namespace plume {
+
+bool MacInputService::keyboardEvent(const TapEvent& event) {
+    if (!active_ || delivery_.letsEverythingPass()) return false;
+    forgetLastKey();
+    if (event.type == TapEvent::Type::FlagsChanged) return hotKeys_.modifiersChanged(modifiersFromFlags(event.flags));
+    secureInputWatch_.keysArrive();
+    followFrontProcess();
+
+    ZDKeyEventArgs key;
+    readKey(event, key);
+    lastKeyString_ = key.s;
+    lastKeyCode_ = key.key;
+    return event.type == TapEvent::Type::KeyUp ? keyUp(key) : keyDown(key);
+}
+
+void MacInputService::mouseDown(Point location) {
+    if (delivery_.letsEverythingPass()) return;
+    forgetLastKey();
+    ZDMouseEventArgs click;
+    click.x = location.x;
+    click.y = location.y;
+    mouseDownEvent.raise(click);
+}
+
+void MacInputService::forgetLastKey() {
+    if (!lastKeyString_) return;
+    lastKeyString_.reset();
+    lastKeyCode_.reset();
+}
+
+// The keyboard's new owner is noticed at its first key.
+void MacInputService::followFrontProcess() {
+    const ProcessSerialNumber front = around_.processManager.frontProcess().value_or(ProcessSerialNumber{});
+    const bool changed = !isLastProcessReceivedKeyEventNull_ && front != lastProcessReceivedKeyEvent_;
+    isLastProcessReceivedKeyEventNull_ = false;
+    lastProcessReceivedKeyEvent_ = front;
+    if (changed) raiseInputContextChanged();
+}
+
+void MacInputService::raiseInputContextChanged() {
+    InputContextChange change;
+    inputContextChangedEvent.raise(change);
+}
+
+void MacInputService::readKey(const TapEvent& event, ZDKeyEventArgs& key) const {
+    key.key = event.keyCode;
+    if (!event.string.empty()) {
+        key.s.emplace(event.string);
+    } else {
+        key.s = stringForKeyCode(event.keyCode, event.flags);
+    }
+    if (key.s && !key.s->empty()) key.c = key.s->front();
+}
+
+bool MacInputService::keyUp(const ZDKeyEventArgs& key) {
+    if (canceledKeyCode_ != KeyCode::None && canceledKeyCode_ == key.key) {
+        canceledKeyCode_ = KeyCode::None;
+        return true;
+    }
+    if (keyUpObserved_) around_.mainLoop.perform([this, copy = key]() mutable { keyUpEvent.raise(copy); });
+    return false;
+}
+
+bool MacInputService::keyDown(ZDKeyEventArgs& key) {
+    bool swallow = hotKeys_.keyDown(key.key);
+    if (!swallow) {
+        const std::int32_t held = keyModifier();
+        const bool isShortcut = (held & (KeyModifier::Control | KeyModifier::Command)) != 0;
+        const bool deletesWord = (held & KeyModifier::Option) != 0 && key.c == u'\b';
+        if (isShortcut || deletesWord) {
+            swallow = unregisteredHotKey(key);
+        } else {
+            keyDownEvent.raise(key);
+            swallow = key.cancel;
+        }
+    }
+    if (swallow) canceledKeyCode_ = key.key;
+    return swallow;
+}
+
+bool MacInputService::unregisteredHotKey(const ZDKeyEventArgs& key) {
+    ZDUnregisteredHotKeyPressedEventArgs event;
+    event.hotKey = {keyModifier(), key.key};
+    event.c = key.c;
+    event.key = key.key;
+    unregisteredHotKeyPressedEvent.raise(event);
+    if (event.cancel) {
+        ignoreNextHotKey();
+    } else {
+        raiseInputContextChanged();
+    }
+    return event.cancel;
+}
+
+}  // namespace plume

@@ -1,0 +1,177 @@
+#include "input/OutputDelivery.h"
+
+#include <utility>
+#include <variant>
+
+namespace plume {
+
+namespace {
+// An application that has not taken what was pasted by then is not waited for.
+constexpr double TakingLimit = 1.0;  // seconds from the keystroke
+}  // namespace
+
+OutputDelivery::OutputDelivery(const Means& means)
+    : means_(means),
+      provider_(means.pasteboard, means.tapLoop),
+      sender_(means.poster, means.accessibility),
+      vmPasting_(means.poster, means.processManager, means.tapLoop, means.mainLoop, means.vmHelper) {
+    provider_.onTaken = [this] { wasTaken(); };
+}
+
+void OutputDelivery::send(std::shared_ptr<PLOutput> output, const TriggerKey& triggerKey, ProcessSerialNumber target) {
+    ContextInputResolver& resolver = means_.resolver;
+    resolver.prepareSending(output->snippetExpandedContent.get());
+    output->contextInputSetting = resolver.setting();
+    prepareOutput(*output, *resolver.setting(), triggerKey, !isIdle());
+
+    Delivery delivery;
+    delivery.setting = std::make_shared<const ContextInputSetting>(*resolver.setting());
+    delivery.target = target;
+    delivery.restoresClipboard =
+        resolver.preferences.restoreClipboard && !delivery.setting->has(InputFlag::DoNotRestoreClipboard);
+    if (delivery.setting->has(InputFlag::DeleteAfterActivateVM)) {
+        delivery.heldBackspaces = std::exchange(output->backspaceCount, 0);
+    }
+    delivery.output = std::move(output);
+    queue_.push_back(std::move(delivery));
+    startNext();
+}
+
+// Keys that are let go at the end of an output may order the next one: that takes its place in the queue.
+void OutputDelivery::startNext() {
+    if (startsNext_) return;
+    startsNext_ = true;
+    while (!current_ && !queue_.empty()) {
+        current_ = std::move(queue_.front());
+        queue_.pop_front();
+        start();
+    }
+    startsNext_ = false;
+}
+
+void OutputDelivery::start() {
+    means_.poster.holdUserKeys();
+    current_->tookOverRestore = provider_.cancelRestore();
+    // A backup may have to read megabytes from a program: only for what goes through the clipboard.
+    if (current_->restoresClipboard && current_->setting->has(InputFlag::UseClipboard)) provider_.backup();
+    sendBatch();
+}
+
+void OutputDelivery::sendBatch() {
+    sender_.setContextInputSetting(current_->setting);
+    batch_ = takeBatch(*current_->output, *current_->setting);
+    nextStep_ = 0;
+    continueBatch();
+}
+
+void OutputDelivery::continueBatch() {
+    while (nextStep_ < batch_.steps.size()) {
+        perform(batch_.steps[nextStep_++]);
+        if (awaitsTaking_) return;
+    }
+    if (!batch_.pause) return finish();
+    means_.tapLoop.performAfterDelay(*batch_.pause, [this] { sendBatch(); });
+}
+
+void OutputDelivery::perform(const OutputStep& step) {
+    switch (step.kind) {
+        case OutputStep::Kind::Backspaces:
+            return sender_.sendBackspaces(step.count);
+        case OutputStep::Kind::LeftArrows:
+            return sender_.sendLeftArrowKeys(step.count);
+        case OutputStep::Kind::Text:
+            return sender_.sendPlainText(std::get<std::u16string>(step.fragment));
+        case OutputStep::Kind::Paste:
+            return paste(step.fragment);
+        case OutputStep::Kind::Key: {
+            const auto& key = *std::get<std::shared_ptr<SnippetKeyVariable>>(step.fragment);
+            if (key.keyCode != SnippetKeyVariable::NoKey) sender_.sendKey(key.keyCode, key.modifiers, step.count);
+            return;
+        }
+    }
+}
+
+void OutputDelivery::finish() {
+    const bool pastes = current_->setting->has(InputFlag::UseClipboard);
+    const bool restores = pastes && current_->restoresClipboard;
+    // A restore that was put off for an output without a paste of its own is still owed.
+    const bool owesRestore = current_->tookOverRestore && !current_->pasted;
+    if (restores || owesRestore) provider_.restoreAfterDelay();
+    current_->allSent = true;
+    completeIfDone();
+}
+
+void OutputDelivery::completeIfDone() {
+    if (!current_ || !current_->allSent || keystrokesToCome_ > 0) return;
+    current_.reset();
+    means_.poster.releaseUserKeys();
+    startNext();
+}
+
+void OutputDelivery::paste(const PLOutput::Fragment& fragment) {
+    const bool tells = means_.pasteboard.tellsWhenTaken();
+    const auto* text = std::get_if<std::u16string>(&fragment);
+    // Nobody takes nothing, and it would be waited for.
+    if (tells && text && text->empty()) return;
+    offer(fragment);
+    current_->pasted = true;
+    awaitsTaking_ = tells;
+    hasAskedForPaste_ = false;
+    ++keystrokesToCome_;
+
+    const ContextInputSetting& setting = *current_->setting;
+    if (pastesByActivation(setting)) return pasteByActivation();
+    if (!setting.has(InputFlag::DelayPasting)) return sendPasteCommand();
+    pasting_ = true;
+    means_.tapLoop.performAfterDelay(pasteKeystrokeDelay(setting), [this] { sendPasteCommand(); });
+}
+
+void OutputDelivery::offer(const PLOutput::Fragment& fragment) {
+    if (const auto* text = std::get_if<std::u16string>(&fragment)) {
+        provider_.setString(*text);
+    } else if (const auto* rich = std::get_if<AttributedString>(&fragment)) {
+        provider_.includeHTMLData = current_->setting->has(InputFlag::IncludeHTMLData);
+        provider_.excludeParagraphTag = current_->setting->has(InputFlag::ExcludeParagraphTag);
+        provider_.setAttributedString(*rich);
+    }
+}
+
+void OutputDelivery::pasteByActivation() {
+    VMPasting::Order order;
+    order.setting = current_->setting;
+    order.target = current_->target;
+    // The output is on its way until its last paste keystroke is sent.
+    order.sendBackspaces = [this] { sender_.sendBackspaces(std::exchange(current_->heldBackspaces, 0)); };
+    order.sendPasteCommand = [this] { sendPasteCommand(); };
+    vmPasting_.start(std::move(order));
+}
+
+void OutputDelivery::sendPasteCommand() {
+    pasting_ = false;
+    --keystrokesToCome_;
+    hasAskedForPaste_ = true;
+    sender_.sendPasteCommand(*current_->setting);
+    if (awaitsTaking_ && hasAskedForPaste_) {
+        takingLimit_ = means_.tapLoop.performAfterDelay(TakingLimit, [this] { goOnBehindPaste(); });
+    }
+    completeIfDone();
+}
+
+// Inside the pasteboard's call, perhaps inside the keystroke's: goes on from the loop.
+void OutputDelivery::wasTaken() {
+    if (!awaitsTaking_ || !hasAskedForPaste_) return;
+    hasAskedForPaste_ = false;
+    means_.tapLoop.cancel(std::exchange(takingLimit_, 0));
+    means_.tapLoop.performAfterDelay(0, [this] { goOnBehindPaste(); });
+}
+
+void OutputDelivery::goOnBehindPaste() {
+    awaitsTaking_ = false;
+    hasAskedForPaste_ = false;
+    takingLimit_ = 0;
+    const bool pausesForPaste = pauseAfterPaste(*current_->setting) > 0;
+    if (pausesForPaste) batch_.pause = pauseAfterTaking(*current_->setting);
+    continueBatch();
+}
+
+}  // namespace plume
