@@ -45,7 +45,7 @@ void ClipboardDataProvider::provideData(Pasteboard& pasteboard, std::string_view
     }
     provideExpansion(pasteboard, type);
     // Where takers are named, whoever else reads (a clipboard manager) does not count.
-    if (!pasteboard.tellsWhenTaken()) providedData_ = true;
+    if (!pasteboard_.tellsWhenTaken()) providedData_ = true;
 }
 
 void ClipboardDataProvider::dataWasTaken(std::string_view /*type*/) {

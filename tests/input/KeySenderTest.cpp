@@ -5,45 +5,15 @@
 
 #include <set>
 
-#include "Foundation/Strings.h"
 #include "input/KeyCodes.h"
 #include "platform/simulated/SimulatedAccessibility.h"
+#include "tests/input/RecordingPoster.h"
 
 namespace plume {
 namespace {
 
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
-
-// Writes down what is posted: "v51" a key going down, "^51" up, with flags behind a slash, or the text.
-class RecordingPoster final : public EventPoster {
-  public:
-    void begin() override { ++open; }
-    void end() override { --open; }
-    void post(const SynthesisedKey& key, bool pastTap) override {
-        EXPECT_EQ(open, 1) << "outside of begin and end";
-        std::string event = key.down ? "v" : "^";
-        event += key.text.empty() ? std::to_string(key.keyCode) : toUtf8(key.text);
-        if (key.flags != 0) event += "/" + std::to_string(key.flags >> 17);
-        if (pastTap) event += "!";
-        events.push_back(event);
-    }
-    bool canType(std::u16string_view) const override { return true; }
-    bool isKeyDown(std::uint16_t keyCode) const override { return held.contains(keyCode); }
-    std::optional<CommandKeystroke> pasteKeystroke() const override { return own; }
-    std::optional<CommandKeystroke> copyKeystroke() const override { return own; }
-    Point pointerLocation() const override { return {}; }
-    void click(Point) override {}
-    void holdUserKeys() override {}
-    void releaseUserKeys() override {}
-
-    std::vector<std::string> take() { return std::exchange(events, {}); }
-
-    int open = 0;
-    std::vector<std::string> events;
-    std::set<std::uint16_t> held;
-    std::optional<CommandKeystroke> own;
-};
 
 class KeySenderTest : public ::testing::Test {
   protected:

@@ -1,0 +1,310 @@
+#include "input/MacInputService.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "library/Snippet.h"
+#include "library/SnippetGroup.h"
+#include "tests/input/InputDesk.h"
+
+namespace plume {
+namespace {
+
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+using Type = TapEvent::Type;
+
+// Writes down what the service announces: "key 8 c", "up 8", "context", "shortcut 8/2", "hot 8/2".
+struct Listener {
+    explicit Listener(MacInputService& aService) : service(aService) {
+        service.keyDownEvent.addObserver(this, &Listener::keyDown);
+        service.keyUpEvent.addObserver(this, &Listener::keyUp);
+        service.inputContextChangedEvent.addObserver(this, &Listener::contextChanged);
+        service.unregisteredHotKeyPressedEvent.addObserver(this, &Listener::shortcut);
+        service.hotKeysPressed.addObserver(this, &Listener::hotKeys);
+        service.mouseDownEvent.addObserver(this, &Listener::clicked);
+        service.secureInputChangedEvent.addObserver(this, &Listener::secureInputChanged);
+        service.keyboardTapGivenUpEvent.addObserver(this, &Listener::givenUp);
+    }
+    static std::string name(const GeneralHotKey& hotKey) {
+        return std::to_string(hotKey.keyCode) + "/" + std::to_string(hotKey.modifiers);
+    }
+    void keyDown(ZDKeyEventArgs& event) {
+        heard.push_back("key " + std::to_string(event.key) + " " + toUtf8(event.s.value_or(u"-")));
+        EXPECT_EQ(event.c, event.s && !event.s->empty() ? event.s->front() : u'\0');
+        EXPECT_EQ(service.lastKeyString(), event.s);
+        event.cancel = swallows;
+    }
+    void keyUp(ZDKeyEventArgs& event) { heard.push_back("up " + std::to_string(event.key)); }
+    void contextChanged(InputContextChange&) { heard.emplace_back("context"); }
+    void shortcut(ZDUnregisteredHotKeyPressedEventArgs& event) {
+        heard.push_back("shortcut " + name(event.hotKey));
+        EXPECT_EQ(event.key, event.hotKey.keyCode);
+        event.cancel = swallows;
+    }
+    void hotKeys(ZDHotKeysPressedEventArgs& event) {
+        for (const auto& hotKey : event.hotKeys) heard.push_back("hot " + name(hotKey));
+        event.cancel = swallows;
+    }
+    void clicked(ZDMouseEventArgs& event) { heard.push_back("click " + std::to_string(static_cast<int>(event.x))); }
+    void secureInputChanged(MacInputService& raiser) {
+        heard.emplace_back(raiser.secureInput() ? "secure" : "not secure");
+    }
+    void givenUp(KeyboardTapGivenUp&) { heard.emplace_back("given up"); }
+
+    std::vector<std::string> take() { return std::exchange(heard, {}); }
+
+    MacInputService& service;
+    std::vector<std::string> heard;
+    bool swallows = false;
+};
+
+struct MacInputServiceTest : ::testing::Test {
+    MacInputServiceTest() {
+        // Observers of key ups are there before the start.
+        desk.service.disableEvents();
+        desk.service.enableEvents();
+        desk.loop.runReady();
+    }
+    std::vector<std::string> heard() {
+        desk.loop.runReady();
+        return listener.take();
+    }
+
+    InputDesk desk;
+    Listener listener{desk.service};
+};
+
+TEST_F(MacInputServiceTest, ReadsWhatAKeyTypes) {
+    desk.keyDown(8, u"c");
+    desk.keyDown(8, u"ch");
+    desk.keyDown(8);
+    desk.heldFlags = EventFlag::Shift | 0x10000;
+    desk.keyDown(8);
+    desk.keyDown(10);
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "key 8 ch", "key 8 c", "key 8 C", "key 10 -"));
+}
+
+TEST_F(MacInputServiceTest, ForgetsTheLastKeyAtTheNextEvent) {
+    desk.keyDown(8, u"c");
+    EXPECT_EQ(desk.service.lastKeyString(), u"c");
+    desk.hold(1);
+    EXPECT_EQ(desk.service.lastKeyString(), std::nullopt);
+}
+
+TEST_F(MacInputServiceTest, ASwallowedKeyIsSwallowedWithItsRelease) {
+    EXPECT_FALSE(desk.keyDown(8, u"c"));
+    EXPECT_FALSE(desk.keyUp(8));
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "up 8"));
+    listener.swallows = true;
+    EXPECT_TRUE(desk.keyDown(8, u"c"));
+    EXPECT_FALSE(desk.keyUp(9)) << "another key";
+    EXPECT_TRUE(desk.keyUp(8));
+    EXPECT_FALSE(desk.keyUp(8)) << "once";
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "up 9", "up 8"));
+}
+
+TEST_F(MacInputServiceTest, ShortcutsAreNoText) {
+    desk.hold(KeyModifier::Command);
+    EXPECT_FALSE(desk.keyDown(8, u"c"));
+    EXPECT_THAT(heard(), ElementsAre("shortcut 8/8", "context"));
+    listener.swallows = true;
+    EXPECT_TRUE(desk.keyDown(8, u"c"));
+    EXPECT_TRUE(desk.keyUp(8));
+    EXPECT_THAT(heard(), ElementsAre("shortcut 8/8"));
+    listener.swallows = false;
+    desk.hold(KeyModifier::Option);
+    desk.keyDown(8, u"ç");
+    desk.keyDown(51, u"\b");
+    EXPECT_THAT(heard(), ElementsAre("key 8 ç", "shortcut 51/4", "context"));
+}
+
+TEST_F(MacInputServiceTest, HotKeysComeBeforeTheEngine) {
+    desk.service.registerHotKey({KeyModifier::Control, 40});
+    desk.service.registerHotKey({KeyModifier::Control, 40});
+    desk.hold(KeyModifier::Control);
+    EXPECT_FALSE(desk.keyDown(40, u"k"));
+    EXPECT_THAT(heard(), ElementsAre("hot 40/2", "hot 40/2", "shortcut 40/2", "context"));
+    listener.swallows = true;
+    EXPECT_TRUE(desk.keyDown(40, u"k"));
+    EXPECT_TRUE(desk.keyUp(40));
+    EXPECT_THAT(heard(), ElementsAre("hot 40/2", "hot 40/2"));
+    desk.service.unregisterHotKey({KeyModifier::Control, 40});
+    desk.service.unregisterHotKey({KeyModifier::Control, 40});
+    desk.service.unregisterHotKey({KeyModifier::Control, 40});
+    desk.keyDown(40, u"k");
+    EXPECT_THAT(heard(), ElementsAre("shortcut 40/2"));
+}
+
+TEST_F(MacInputServiceTest, ModifiersAloneAreAHotKey) {
+    constexpr std::int32_t Both = KeyModifier::Control | KeyModifier::Option;
+    desk.service.registerHotKey({Both, KeyCode::None});
+    desk.hold(KeyModifier::Control);
+    desk.hold(Both);
+    desk.hold(KeyModifier::Option);
+    desk.hold(0);
+    EXPECT_THAT(heard(), ElementsAre("hot 65535/6"));
+
+    desk.hold(Both);
+    desk.keyDown(40, u"k");
+    heard();
+    desk.hold(0);
+    EXPECT_THAT(heard(), IsEmpty()) << "they were held for the key";
+
+    desk.hold(Both);
+    desk.service.ignoreNextHotKey();
+    desk.hold(0);
+    EXPECT_THAT(heard(), IsEmpty());
+}
+
+TEST_F(MacInputServiceTest, NoticesAnotherProgramBeforeItsFirstKey) {
+    desk.keyDown(8, u"c");
+    const auto other = desk.activate(u"other");
+    desk.keyDown(8, u"c");
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "context", "key 8 c"));
+    EXPECT_EQ(desk.service.lastProcessReceivedKeyEvent(), other);
+    EXPECT_FALSE(desk.service.isSameProcess());
+    desk.processes.setFrontProcess(desk.processes.currentProcess());
+    desk.keyUp(8);
+    EXPECT_THAT(heard(), ElementsAre("context", "up 8"));
+    EXPECT_TRUE(desk.service.isSameProcess());
+}
+
+TEST_F(MacInputServiceTest, ReportsClicksWhenAskedTo) {
+    EXPECT_FALSE(desk.mouse.exists());
+    desk.service.setListenMouseDownEvents(true);
+    desk.mouse.listener({30, 40});
+    EXPECT_THAT(heard(), ElementsAre("click 30"));
+    desk.service.setListenMouseDownEvents(false);
+    EXPECT_FALSE(desk.mouse.exists());
+    desk.service.setListenMouseDownEvents(true);
+    desk.service.disableEvents();
+    EXPECT_FALSE(desk.mouse.exists());
+    EXPECT_FALSE(desk.tap.exists());
+}
+
+TEST_F(MacInputServiceTest, FollowsSecureInput) {
+    desk.processes.setFrontProcess(desk.processes.launch(u"org.example.bank", u"Bank"));
+    desk.secure.on = true;
+    desk.loop.advance(2.9);
+    EXPECT_THAT(heard(), IsEmpty());
+    desk.loop.advance(0.2);
+    EXPECT_THAT(heard(), ElementsAre("secure"));
+    EXPECT_EQ(desk.service.lastAppEnabledSecureInput(), u"Bank");
+    desk.loop.advance(6);
+    EXPECT_THAT(heard(), IsEmpty()) << "unchanged";
+    desk.secure.on = false;
+    desk.loop.advance(3);
+    EXPECT_THAT(heard(), ElementsAre("not secure"));
+    EXPECT_EQ(desk.service.lastAppEnabledSecureInput(), std::nullopt);
+
+    desk.secure.on = true;
+    desk.service.checkSecureInput();
+    EXPECT_THAT(heard(), ElementsAre("secure"));
+    desk.hold(1);
+    EXPECT_THAT(heard(), IsEmpty());
+    desk.keyDown(8, u"c");
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "not secure"));
+    desk.service.disableEvents();
+    desk.loop.runReady();
+    EXPECT_FALSE(desk.loop.nextDue()) << "nothing wakes up any more";
+}
+
+TEST_F(MacInputServiceTest, TakesTheTapAgainTwiceAMinute) {
+    desk.tap.listener->tapDisabledByTimeout();
+    desk.loop.advance(40);
+    desk.tap.listener->tapDisabledByTimeout();
+    desk.loop.advance(21);
+    desk.tap.listener->tapDisabledByTimeout();
+    EXPECT_EQ(desk.tap.enabled, 3) << "the first is more than a minute ago";
+    EXPECT_THAT(heard(), IsEmpty());
+    desk.loop.advance(1);
+    desk.tap.listener->tapDisabledByTimeout();
+    EXPECT_EQ(desk.tap.enabled, 3);
+    EXPECT_THAT(heard(), ElementsAre("given up"));
+    EXPECT_EQ(desk.log.size(), 5U);
+    EXPECT_EQ(desk.log.front(), "Event tap was disabled by timeout");
+    desk.log.clear();
+    desk.tap.listener->tapDisabledByUserInput();
+    EXPECT_THAT(desk.log, ElementsAre("Event tap was disabled by user input"));
+}
+
+TEST_F(MacInputServiceTest, SaysThatATapCannotBeCreated) {
+    desk.service.disableEvents();
+    desk.loop.runReady();
+    desk.tap.error.message = "The X server has no XInput 2.";
+    desk.service.enableEvents();
+    desk.loop.runReady();
+    EXPECT_THAT(desk.log, ElementsAre("The event tap could not be created to monitor key events",
+                                      "The X server has no XInput 2."));
+    EXPECT_FALSE(desk.service.evenTapCreated());
+    EXPECT_FALSE(desk.loop.nextDue());
+
+    desk.tap.error.message.clear();
+    desk.service.setListenAtAnnotatedSession(true);
+    desk.service.enableEvents();
+    desk.loop.runReady();
+    EXPECT_TRUE(desk.tap.annotated);
+}
+
+TEST_F(MacInputServiceTest, TheSystemsHotKeyIsNoHotKeyOfModifiers) {
+    int pressed = 0;
+    desk.service.registerHotKey({KeyModifier::Command, KeyCode::None});
+    const auto registered = [&](const GeneralHotKey& hotKey) {
+        EXPECT_TRUE(desk.service.registerSystemHotKey(1, hotKey, [&] { ++pressed; }));
+        return desk.systemHotKeys.registered.size();
+    };
+    ASSERT_EQ(registered({KeyModifier::Command, 49}), 1U);
+    EXPECT_EQ(desk.systemHotKeys.registered[1].first, (GeneralHotKey{KeyModifier::Command, 49}));
+    desk.hold(KeyModifier::Command);
+    desk.systemHotKeys.registered[1].second();
+    desk.hold(0);
+    EXPECT_EQ(pressed, 1);
+    EXPECT_THAT(heard(), IsEmpty());
+    EXPECT_EQ(registered({KeyModifier::Command, KeyCode::None}), 0U) << "without a key there is none";
+}
+
+TEST_F(MacInputServiceTest, NamesOtherProgramsThatCanSwallowKeys) {
+    const auto own = desk.processes.runningApplication(desk.processes.currentProcess());
+    desk.processes.setEventTaps({{true, {7, u"org.example.remapper", u"Remapper", u"/bin/remapper"}},
+                                 {false, {8, u"org.example.logger", u"Logger", std::nullopt}},
+                                 {true, {9, u"com.apple.dock", u"Dock", std::nullopt}},
+                                 {true, *own}});
+    const auto processes = desk.service.tappingProcesses();
+    ASSERT_EQ(processes.size(), 1U);
+    EXPECT_EQ(processes[0].processIdentifier, 7);
+}
+
+TEST_F(MacInputServiceTest, CopiesAsTheApplicationInFrontWantsIt) {
+    desk.service.refreshContextInputSetting();
+    desk.service.sendCopyCommand();
+    EXPECT_THAT(desk.poster.take(), ElementsAre("v8/8", "^8"));
+    desk.activate(u"org.macosforge.xquartz.X11");
+    desk.service.sendCopyCommand();
+    EXPECT_THAT(desk.poster.take(), ElementsAre("v8/2", "^8"));
+    desk.activate(u"wine");
+    EXPECT_TRUE(desk.service.refreshContextInputSetting()->has(InputFlag::UseControlKey));
+    desk.service.sendCopyCommand();
+    EXPECT_THAT(desk.poster.take(), ElementsAre("v8/2", "^8"));
+    EXPECT_EQ(desk.service.contextBundleIdentifier(), u"wine");
+}
+
+TEST_F(MacInputServiceTest, TheTriggerKeyIsTypedAgainBehindLongOutput) {
+    desk.keyDown(36, u"\r");
+    auto group = SnippetGroup::make();
+    group->setExpandTrigger(ExpandTrigger::DelimiterKept);
+    auto snippet = std::make_shared<Snippet>();
+    group->addItem(snippet);
+    const auto output = InputDesk::output(u"text", 20);
+    output->cancelTrigger = false;
+    output->backspaceCount = 25;
+    output->trigger = SnippetTrigger::Typed;
+    output->snippetExpandedContent->originalSnippet = snippet;
+    desk.service.sendOutput(output);
+    EXPECT_TRUE(output->cancelTrigger);
+    desk.loop.advance(1);
+    EXPECT_THAT(desk.poster.timesOf("vtext\r"), ElementsAre(40));
+}
+
+}  // namespace
+}  // namespace plume
