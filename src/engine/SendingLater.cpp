@@ -46,7 +46,7 @@ void SendingPipeline::fieldsEditorAction(FieldsEditor& editor) {
     const auto form = formOf(editor);
     if (form == forms_.end()) return;
     EngineState& engine = *form->engine;
-    const Expansion content = editor.content();
+    const Expansion& content = editor.content();
     InputService& service = surroundings_.inputService;
     if (!losesKeysWhileActivated(service.contextBundleIdentifier())) return fieldsEditorDidClose(engine, content);
     service.bringLastProcessToFront();
@@ -66,7 +66,7 @@ void SendingPipeline::fieldsEditorDidClose(EngineState& engine, const Expansion&
 
 // ---- Scripts ----
 
-void SendingPipeline::executeScripts(EngineState& engine, Expansion content) {
+void SendingPipeline::executeScripts(EngineState& engine, const Expansion& content) {
     performInBackground(
         [&runner = surroundings_.scriptRunner, content] {
             for (const auto& script : content->scripts) script->execute(runner);

@@ -172,7 +172,7 @@ bool SendingPipeline::undo(EngineState& engine, bool withTrigger) {
     return true;
 }
 
-void SendingPipeline::playFeedback(const std::string& name) {
+void SendingPipeline::playFeedback(const std::string& name) const {
     if (playFeedbackSound_ && surroundings_.sounds) surroundings_.sounds->play(name);
 }
 

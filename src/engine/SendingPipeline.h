@@ -39,7 +39,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     };
 
     explicit SendingPipeline(Surroundings surroundings);
-    ~SendingPipeline();
+    ~SendingPipeline() override;
     SendingPipeline(const SendingPipeline&) = delete;
     SendingPipeline& operator=(const SendingPipeline&) = delete;
 
@@ -80,7 +80,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     void sendText(EngineState& engine, const Expansion& content, Output output);
     void runScriptSnippet(EngineState& engine, const Snippet& snippet, const Expansion& content, const Output& output);
     void onScriptExecuted(EngineState& engine, const PLScript& script);
-    void executeScripts(EngineState& engine, Expansion content);
+    void executeScripts(EngineState& engine, const Expansion& content);
 
     void showFieldsEditor(EngineState& engine, const Expansion& content);
     void fieldsEditorWillClose(FieldsEditor& editor) override;
@@ -88,7 +88,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     void fieldsEditorDidClose(EngineState& engine, const Expansion& content);
     std::vector<OpenForm>::iterator formOf(const FieldsEditor& editor);
 
-    void playFeedback(const std::string& name);
+    void playFeedback(const std::string& name) const;
     // On the run loop, unless the pipeline is gone by then.
     void performAfterDelay(double delay, std::function<void()> call);
     // On a thread of its own: `work`, then on the run loop, unless the pipeline is gone by then, `finish`.

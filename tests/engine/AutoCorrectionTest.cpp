@@ -11,7 +11,6 @@
 namespace plume {
 namespace {
 
-using ::testing::IsEmpty;
 using ::testing::SizeIs;
 
 struct CorrectionCase {
