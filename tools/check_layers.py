@@ -17,6 +17,8 @@ MAY_SEE = {
     "platform/simulated": {"Foundation", "platform", "input"},
     "platform/desktop": {"Foundation", "platform"},
     "platform/x11": {"Foundation", "platform", "platform/desktop", "input"},
+    "app": {"Foundation", "platform", "library", "content", "input", "engine", "platform/simulated",
+            "platform/desktop", "platform/x11"},
 }
 # Foreign headers by folder; everything else that is included with <…> is the standard library's or the system's.
 FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib|nlohmann/|canberra)")
@@ -24,8 +26,8 @@ FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|s
 MAY_USE = {
     "": ("unicode/",),
     "platform/x11": ("xcb/", "X11/", "xkbcommon/"),
-    "platform/desktop": ("atspi", "glib", "canberra"),
-    "app": ("CLI/", "nlohmann/"),
+    "platform/desktop": ("atspi", "canberra", "dbus", "glib"),
+    "app": ("CLI/", "nlohmann/", "xcb/"),
 }
 
 INCLUDE = re.compile(r'^\s*#\s*include\s+(["<])([^">]+)[">]')

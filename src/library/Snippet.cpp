@@ -24,6 +24,10 @@ Snippet::Snippet(Text abbreviation, Text plainTextContent) : uuid_(Uuid::random(
     initialized_ = true;
 }
 
+Snippet::Snippet(const Uuid& uuid) : Snippet() {
+    uuid_ = uuid;
+}
+
 Snippet::Snippet(const KeyedDecoder& coder) {
     if (coder.containsValueForKey("UUID")) {
         const Text text = coder.decodeString("UUID");

@@ -30,6 +30,8 @@ class Snippet final : public KeyedCodable {
 
     Snippet();
     Snippet(Text abbreviation, Text plainTextContent);
+    // Empty, with an identity that it had before.
+    explicit Snippet(const Uuid& uuid);
     // Reads an archived snippet; nothing that the archive holds or lacks makes it fail. A date that is missing stays
     // missing; an unreadable content is none.
     explicit Snippet(const KeyedDecoder& coder);

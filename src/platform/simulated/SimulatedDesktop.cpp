@@ -57,11 +57,17 @@ SimulatedApplication* SimulatedDesktop::front() {
 }
 
 void SimulatedDesktop::pressAndRelease(std::uint16_t keyCode, std::int32_t modifiers) {
+    pressCombination(modifiers, keyCode);
+}
+
+void SimulatedDesktop::pressCombination(std::int32_t modifiers, std::optional<std::uint16_t> keyCode) {
     for (const ModifierKey& key : ModifierKeys) {
         if ((modifiers & key.modifier) != 0) keyboard_.press(key.keyCode);
     }
-    keyboard_.press(keyCode);
-    keyboard_.release(keyCode);
+    if (keyCode) {
+        keyboard_.press(*keyCode);
+        keyboard_.release(*keyCode);
+    }
     for (auto key = ModifierKeys.rbegin(); key != ModifierKeys.rend(); ++key) {
         if ((modifiers & key->modifier) != 0) keyboard_.release(key->keyCode);
     }

@@ -7,6 +7,7 @@
 
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -55,6 +56,8 @@ class SimulatedDesktop {
 
     // The user presses and releases a key while these modifiers are held (KeyModifier bits), which takes no time.
     void pressAndRelease(std::uint16_t keyCode, std::int32_t modifiers = 0);
+    // The same, also for modifiers alone.
+    void pressCombination(std::int32_t modifiers, std::optional<std::uint16_t> keyCode);
     // The user types one character: its key, with Shift where it needs it, or a key of its own.
     void typeCharacter(std::u16string_view character);
     // The user clicks where the pointer is.
