@@ -1,0 +1,136 @@
+#include "app/cli/CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <array>
+#include <utility>
+
+#include "app/cli/Version.h"
+
+namespace plume {
+
+namespace {
+
+// A command, and how it is written down.
+struct CommandForm {
+    Command command;
+    const char* name;
+    const char* form;
+    const char* purpose;
+};
+
+constexpr std::array Forms = {
+    CommandForm{Command::Run, "run", "plume run [--library FILE.json|FILE.csv] [--settings FILE.json]",
+                "Expand abbreviations in every program, until Ctrl+C"},
+    CommandForm{Command::List, "list", "plume list [--library FILE.json|FILE.csv]", "Show all snippets"},
+    CommandForm{Command::Search, "search", "plume search TEXT [--library FILE.json|FILE.csv]",
+                "Show the snippets whose abbreviation, label, content or note holds every word of TEXT"},
+    CommandForm{Command::Expand, "expand", "plume expand ABBREVIATION [--library FILE.json|FILE.csv]",
+                "Print what an abbreviation expands to; its scripts are run"},
+    CommandForm{Command::Doctor, "doctor", "plume doctor",
+                "Check what Plume needs of this desktop, and say what to do about what is missing"},
+    CommandForm{Command::Simulate, "simulate", "plume simulate FILE...",
+                "Play stories of typing on a simulated desktop and compare what comes out"},
+};
+
+constexpr const char* GeneralForm = "plume run|list|search|expand|doctor|simulate ...";
+
+constexpr const char* Examples = R"(
+Examples:
+  plume run                         expand your library, or the sample library while you have none
+  plume run --library mine.json     expand the snippets of this file
+  plume list                        what there is to type
+  plume search arrow                find a snippet
+  plume expand ;date                print an expansion
+  plume doctor                      why does nothing happen?
+
+Without --library, the library is $XDG_CONFIG_HOME/plume/library.json (or ~/.config/plume/library.json) when it is
+there, else the sample library that comes with Plume.
+A library in CSV has an abbreviation, a text and a label on each line, without a heading.
+
+Exit status: 0 all is well, 1 it did not work, 2 wrong arguments or a file with a mistake, 3 the desktop lacks
+something that Plume needs.)";
+
+class Parser {
+  public:
+    Parser() : app_("Plume expands abbreviations into texts wherever you type.", "plume") {
+        app_.set_version_flag("--version", std::string("plume ") + Version, "Print the version");
+        app_.set_help_flag("-h,--help", "Print this help");
+        app_.footer(Examples);
+        app_.require_subcommand(1);
+        for (const CommandForm& form : Forms) addCommand(form);
+    }
+
+    std::variant<CommandLine, Farewell> parse(int argc, const char* const* argv) {
+        try {
+            app_.parse(argc, argv);
+        } catch (const CLI::CallForHelp&) {
+            return Farewell{app_.help(), "", ExitStatus::Success};
+        } catch (const CLI::CallForVersion& version) {
+            return Farewell{std::string(version.what()) + "\n", "", ExitStatus::Success};
+        } catch (const CLI::ParseError& mistake) {
+            return refusal(mistake);
+        }
+        result_.command = formInUse()->command;
+        return result_;
+    }
+
+  private:
+    void addCommand(const CommandForm& form) {
+        CLI::App* command = app_.add_subcommand(form.name, form.purpose);
+        command->footer(std::string("Form: ") + form.form);
+        switch (form.command) {
+            case Command::Run:
+                addLibrary(*command);
+                command->add_option("--settings", result_.settings, "Settings to use")->type_name("FILE.json");
+                break;
+            case Command::List:
+                addLibrary(*command);
+                break;
+            case Command::Search:
+                addLibrary(*command);
+                command->add_option("TEXT", result_.text, "What to look for")->required();
+                break;
+            case Command::Expand:
+                addLibrary(*command);
+                command->add_option("ABBREVIATION", result_.text, "With its group's prefix, or without")->required();
+                break;
+            case Command::Simulate:
+                command->add_option("FILE", result_.files, "Scenarios")->required();
+                break;
+            case Command::Doctor:
+                break;
+        }
+    }
+
+    void addLibrary(CLI::App& command) {
+        command.add_option("--library", result_.library, "Snippets to use")->type_name("FILE.json|FILE.csv");
+    }
+
+    const CommandForm* formInUse() const {
+        for (const CommandForm& form : Forms) {
+            if (app_.got_subcommand(form.name)) return &form;
+        }
+        return nullptr;
+    }
+
+    Farewell refusal(const CLI::ParseError& mistake) const {
+        const CommandForm* form = formInUse();
+        std::string reason = mistake.what();
+        for (char& c : reason) {
+            if (c == '\n') c = ' ';
+        }
+        return {"", "plume: " + reason + " (right: " + (form ? form->form : GeneralForm) + ")\n",
+                ExitStatus::WrongInput};
+    }
+
+    CLI::App app_;
+    CommandLine result_;
+};
+
+}  // namespace
+
+std::variant<CommandLine, Farewell> parseCommandLine(int argc, const char* const* argv) {
+    return Parser().parse(argc, argv);
+}
+
+}  // namespace plume

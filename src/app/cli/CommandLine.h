@@ -1,0 +1,38 @@
+// What the user asked for on the command line.
+#pragma once
+
+#include <optional>
+#include <string>
+#include <variant>
+#include <vector>
+
+namespace plume {
+
+// Exit statuses of the program.
+namespace ExitStatus {
+inline constexpr int Success = 0;
+inline constexpr int Failure = 1;
+inline constexpr int WrongInput = 2;     // wrong arguments, or a file that does not say what it should
+inline constexpr int MissingSystem = 3;  // the desktop lacks what a text expander needs
+}  // namespace ExitStatus
+
+enum class Command { Run, Simulate, List, Search, Expand, Doctor };
+
+struct CommandLine {
+    Command command = Command::Run;
+    std::optional<std::string> library;   // for Run, List, Search and Expand
+    std::optional<std::string> settings;  // for Run
+    std::vector<std::string> files;       // for Simulate
+    std::string text;                     // what to search for, or the abbreviation to expand
+};
+
+// Nothing is left to do but to print this and to end.
+struct Farewell {
+    std::string output;
+    std::string error;  // one line
+    int status = ExitStatus::Success;
+};
+
+std::variant<CommandLine, Farewell> parseCommandLine(int argc, const char* const* argv);
+
+}  // namespace plume

@@ -1,0 +1,220 @@
+#include "app/cli/Doctor.h"
+
+#include <xcb/xinput.h>
+#include <xcb/xtest.h>
+
+#include <algorithm>
+#include <array>
+#include <chrono>
+#include <cstdlib>
+#include <filesystem>
+#include <memory>
+#include <ostream>
+#include <set>
+#include <string>
+#include <system_error>
+#include <thread>
+
+#include "app/cli/CommandLine.h"
+#include "app/cli/Files.h"
+#include "app/cli/InstanceLock.h"
+#include "app/cli/LibraryChoice.h"
+#include "app/cli/Version.h"
+#include "platform/desktop/AtspiAccessibility.h"
+#include "platform/desktop/PollRunLoop.h"
+#include "platform/x11/TapConnection.h"
+#include "platform/x11/X11Pasteboard.h"
+#include "platform/x11/X11SecureInput.h"
+#include "platform/x11/X11Session.h"
+
+namespace plume {
+
+namespace {
+
+std::string environment(const char* name) {
+    const char* const value = std::getenv(name);
+    return value ? value : "";
+}
+
+// Other programs that take keys for themselves, by the names of their processes, and what they are.
+struct Conflict {
+    const char* program;
+    const char* what;
+};
+constexpr std::array Conflicts = {
+    Conflict{"autokey-gtk", "expands abbreviations, too"},
+    Conflict{"autokey-qt", "expands abbreviations, too"},
+    Conflict{"espanso", "expands abbreviations, too"},
+    Conflict{"keyd", "rewrites keys"},
+    Conflict{"kmonad", "rewrites keys"},
+    Conflict{"kanata", "rewrites keys"},
+    Conflict{"xremap", "rewrites keys"},
+    Conflict{"xkeysnail", "rewrites keys"},
+    Conflict{"input-remapper", "rewrites keys"},
+    Conflict{"xcape", "presses keys by itself"},
+};
+
+// The names of all processes, cut off after 15 characters as the system keeps them.
+std::set<std::string> runningPrograms() {
+    std::set<std::string> names;
+    std::error_code problem;
+    for (const auto& entry : std::filesystem::directory_iterator("/proc", problem)) {
+        if (const auto name = readWholeFile(entry.path() / "comm")) {
+            names.insert(name.value().substr(0, name.value().find('\n')));
+        }
+    }
+    return names;
+}
+
+class Examination {
+  public:
+    explicit Examination(std::ostream& output) : output_(output) {}
+
+    int run() {
+        output_ << "plume " << Version << '\n';
+        if (examineDisplay()) {
+            examineKeyboard();
+            examineClipboard();
+            examineSecureInput();
+        }
+        examineAccessibility();
+        examineSounds();
+        examineWatchdog();
+        examineScripts();
+        examineConflicts();
+        examineLibrary();
+        output_ << (canRun_ ? "Plume can work here.\n" : "Plume cannot work here yet.\n");
+        return canRun_ ? ExitStatus::Success : ExitStatus::MissingSystem;
+    }
+
+  private:
+    void good(const char* part, const std::string& finding) { line("ok      ", part, finding); }
+    // It works without, but not as well.
+    void warn(const char* part, const std::string& finding) { line("warning ", part, finding); }
+    void bad(const char* part, const std::string& finding) {
+        canRun_ = false;
+        line("MISSING ", part, finding);
+    }
+    void line(const char* mark, const char* part, const std::string& finding) {
+        output_ << mark << part << ": " << finding << '\n';
+    }
+
+    bool examineDisplay() {
+        auto opened = X11Session::open({}, loop_);
+        if (!opened) {
+            bad("display", opened.error().message);
+            return false;
+        }
+        session_ = std::move(opened).value();
+        good("display", session_->connection().displayName());
+        if (!environment("WAYLAND_DISPLAY").empty()) {
+            warn("session",
+                 "this is a Wayland session: Plume hears only programs that run on its X server; choose a session "
+                 "\"on Xorg\" when you log in to use it everywhere.");
+        }
+        return true;
+    }
+
+    void examineKeyboard() {
+        const bool hears = session_->connection().extension(xcb_input_id) != nullptr;
+        const bool types = session_->connection().extension(xcb_test_id) != nullptr;
+        if (types) {
+            good("synthesiser", "the XTEST extension is on");
+        } else {
+            bad("synthesiser", "the X server's XTEST extension is off; switch it on in its configuration.");
+        }
+        if (!hears) return bad("tap", "the X server's XInputExtension is off; switch it on in its configuration.");
+        const auto checked = TapConnection::check({});
+        if (checked) {
+            good("tap", "the keyboard can be heard before other programs get its keys");
+        } else if (types) {
+            bad("tap", checked.error().message);
+        }
+    }
+
+    void examineClipboard() {
+        const auto pasteboard = X11Pasteboard::open(*session_);
+        if (!pasteboard) return bad("clipboard", pasteboard.error().message);
+        const auto types = pasteboard.value()->types();
+        good("clipboard", types.empty() ? "works, and is empty" : "works, and its content can be read and given back");
+    }
+
+    void examineSecureInput() {
+        const auto secureInput = X11SecureInput::open({}, [] { return false; });
+        if (secureInput && secureInput.value()->isSecureEventInputEnabled()) {
+            warn("keyboard",
+                 "another program holds the keyboard just now: a menu, a password prompt, a lock screen. "
+                 "Nothing expands while it does.");
+        }
+    }
+
+    void examineAccessibility() {
+        const AtspiAccessibility accessibility;
+        constexpr int tries = 75;
+        for (int i = 0; i < tries && accessibility.status() == AccessibilityStatus::Starting; ++i) {
+            std::this_thread::sleep_for(std::chrono::milliseconds(20));
+        }
+        const AccessibilityStatus status = accessibility.status();
+        const std::string sentence(sentenceOf(status));
+        if (status == AccessibilityStatus::Working) return good("accessibility", sentence);
+        warn("accessibility", sentence);
+    }
+
+    void examineSounds() {
+        for (const char* folder : {"/usr/share/sounds/freedesktop", "/usr/local/share/sounds/freedesktop"}) {
+            std::error_code problem;
+            if (std::filesystem::is_directory(folder, problem)) return good("sounds", "the sound theme is installed");
+        }
+        warn("sounds", "there is no sound theme, so expansions are silent; install sound-theme-freedesktop.");
+    }
+
+    void examineWatchdog() {
+        const std::filesystem::path program = programFolder() / "plume-watchdog";
+        std::error_code problem;
+        if (std::filesystem::exists(program, problem)) {
+            return good("watchdog", "frees the keyboard should Plume hang");
+        }
+        bad("watchdog", program.string() + " is not there; install Plume again.");
+    }
+
+    void examineScripts() {
+        std::error_code problem;
+        if (std::filesystem::exists("/bin/bash", problem)) return good("scripts", "shell scripts can run");
+        warn("scripts", "there is no /bin/bash, so snippets that are shell scripts do not work; install bash.");
+    }
+
+    void examineConflicts() {
+        const std::set<std::string> running = runningPrograms();
+        bool any = false;
+        for (const Conflict& conflict : Conflicts) {
+            constexpr std::size_t keptLength = 15;
+            if (!running.contains(std::string(conflict.program).substr(0, keptLength))) continue;
+            any = true;
+            warn("other programs", std::string(conflict.program) + " is running and " + conflict.what +
+                                       "; when keys get lost or come twice, end one of the two.");
+        }
+        if (!any) good("other programs", "none that is known to get in the way");
+        const auto lock = InstanceLock::take({});
+        if (!lock) warn("instance", lock.error().message);
+    }
+
+    void examineLibrary() {
+        const auto library = openLibrary(std::nullopt);
+        if (!library) return bad("library", library.error().message);
+        good("library",
+             std::to_string(library.value().snippetCount()) + " snippets in " + library.value().file.string());
+    }
+
+    std::ostream& output_;
+    bool canRun_ = true;
+    PollRunLoop loop_;
+    std::unique_ptr<X11Session> session_;
+};
+
+}  // namespace
+
+int examineDesktop(std::ostream& output) {
+    return Examination(output).run();
+}
+
+}  // namespace plume

@@ -1,0 +1,21 @@
+// Files and folders that the command line works with.
+#pragma once
+
+#include <filesystem>
+#include <string>
+
+#include "Foundation/Result.h"
+
+namespace plume {
+
+// The whole file. The error names it, and says what is wrong with it; no file larger than 256 MiB is read.
+Result<std::string> readWholeFile(const std::filesystem::path& path);
+
+// Where the user's settings and library are: $XDG_CONFIG_HOME/plume, or ~/.config/plume. Empty without a home.
+std::filesystem::path configurationFolder();
+// What came with this program, found from where the program lies: ../share/plume beside its folder.
+std::filesystem::path dataFolder();
+// Where this program lies; empty when the system does not tell.
+std::filesystem::path programFolder();
+
+}  // namespace plume

@@ -1,0 +1,160 @@
+#include "app/cli/RunCommand.h"
+
+#include <sys/signalfd.h>
+
+#include <atomic>
+#include <csignal>
+#include <memory>
+#include <mutex>
+#include <ostream>
+#include <thread>
+#include <utility>
+
+#include "app/Composition.h"
+#include "app/LinuxPort.h"
+#include "app/cli/CommandLine.h"
+#include "app/cli/Files.h"
+#include "app/cli/InstanceLock.h"
+#include "app/json/SettingsFile.h"
+
+namespace plume {
+
+namespace {
+
+using Settings = std::shared_ptr<const UserDefaults>;
+
+Result<Settings> readSettings(const std::optional<std::string>& file) {
+    if (!file) return SettingsFile::registeredDefaults();
+    const Result<std::string> text = readWholeFile(*file);
+    if (!text) return text.error();
+    return SettingsFile::read(text.value(), *file);
+}
+
+// Writes sentences for the user, from any thread.
+class Voice {
+  public:
+    explicit Voice(std::ostream& stream) : stream_(stream) {}
+    void say(const std::string& sentence) {
+        const std::lock_guard lock(mutex_);
+        stream_ << "plume: " << sentence << std::endl;
+    }
+
+  private:
+    std::mutex mutex_;
+    std::ostream& stream_;
+};
+
+// The signals that end the program, as a descriptor. Made before other threads are, so that none of them gets one.
+FileDescriptor endSignals() {
+    sigset_t signals;
+    sigemptyset(&signals);
+    for (const int number : {SIGINT, SIGTERM, SIGHUP}) sigaddset(&signals, number);
+    pthread_sigmask(SIG_BLOCK, &signals, nullptr);
+    // A program that went away while it was written to is no reason to end.
+    std::signal(SIGPIPE, SIG_IGN);
+    return FileDescriptor(signalfd(-1, &signals, SFD_CLOEXEC | SFD_NONBLOCK));
+}
+
+class Run {
+  public:
+    Run(LinuxPort& port, const ChosenLibrary& library, const UserDefaults& settings, std::ostream& output, Voice& voice)
+        : port_(port), library_(library), settings_(settings), output_(output), voice_(voice) {}
+
+    int untilAskedToEnd(int signals) {
+        port_.mainLoop().addSource(signals, [this, signals] {
+            signalfd_siginfo signal{};
+            if (read(signals, &signal, sizeof signal) == sizeof signal) end(ExitStatus::Success);
+        });
+        port_.setServerGone([this] {
+            voice_.say("The X server is gone.");
+            end(ExitStatus::Failure);
+        });
+        std::thread tapThread([this] { expand(); });
+        port_.mainLoop().run();
+        port_.tapLoop().stop();
+        tapThread.join();
+        port_.mainLoop().removeSource(signals);
+        return status_;
+    }
+
+  private:
+    void end(int status) {
+        status_ = status;
+        port_.mainLoop().stop();
+    }
+
+    // The tap thread.
+    void expand() {
+        {
+            Composition composition(port_.ports(), surroundings());
+            composition.setSnippetGroups(library_.groups);
+            composition.loadPreferences();
+            MacInputService& service = composition.inputService();
+            port_.mainLoop().perform(
+                [this, &service] { service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost); });
+            composition.start();
+            if (service.evenTapCreated()) {
+                output_ << "Plume is ready: " << library_.snippetCount() << " snippets from " << library_.file.string()
+                        << ". Ctrl+C ends it." << std::endl;
+            } else {
+                // What is missing was told already.
+                end(ExitStatus::MissingSystem);
+            }
+            port_.tapLoop().run();
+        }
+        port_.leave();
+    }
+
+    Composition::Surroundings surroundings() {
+        const auto say = [this](const std::string& sentence) { voice_.say(sentence); };
+        return {.settings = settings_,
+                .report = say,
+                .log = say,
+                .timeZone = {},
+                .locale = {},
+                .makeFieldsEditor = {},
+                .makeSuggestionController = {},
+                .makeQuickSearchController = {},
+                .suggestionSource = nullptr,
+                .vmHelper = nullptr,
+                .enabledChanged = {}};
+    }
+
+    void keyboardLost(KeyboardTapGivenUp& /*event*/) {
+        voice_.say(
+            "Listening to the keyboard was ended three times within a minute, because Plume did not answer in "
+            "time. It stays off until Plume is started again.");
+    }
+
+    LinuxPort& port_;
+    const ChosenLibrary& library_;
+    const UserDefaults& settings_;
+    std::ostream& output_;
+    Voice& voice_;
+    std::atomic<int> status_ = ExitStatus::Success;
+};
+
+}  // namespace
+
+int runInSession(const ChosenLibrary& library, const std::optional<std::string>& settingsFile, std::ostream& output,
+                 std::ostream& error) {
+    Voice voice(error);
+    const auto refuse = [&voice](const Error& reason, int status) {
+        voice.say(reason.message);
+        return status;
+    };
+    const Result<Settings> settings = readSettings(settingsFile);
+    if (!settings) return refuse(settings.error(), ExitStatus::WrongInput);
+
+    const FileDescriptor signals = endSignals();
+    const auto port = LinuxPort::open({});
+    if (!port) return refuse(port.error(), ExitStatus::MissingSystem);
+    const Result<InstanceLock> lock = InstanceLock::take({});
+    if (!lock) return refuse(lock.error(), ExitStatus::Failure);
+    if (const auto watched = port.value()->startWatchdog(); !watched) {
+        return refuse(watched.error(), ExitStatus::MissingSystem);
+    }
+    return Run(*port.value(), library, *settings.value(), output, voice).untilAskedToEnd(signals.get());
+}
+
+}  // namespace plume
