@@ -55,7 +55,7 @@ class MacInputService final : public InputService, private KeyboardTapListener {
         VMHelperController* vmHelper = nullptr;  // null: no window
     };
 
-    explicit MacInputService(const Surroundings& surroundings);
+    explicit MacInputService(Surroundings surroundings);
     ~MacInputService() override;
     MacInputService(const MacInputService&) = delete;
     MacInputService& operator=(const MacInputService&) = delete;

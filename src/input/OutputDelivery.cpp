@@ -65,12 +65,18 @@ void OutputDelivery::sendBatch() {
 }
 
 void OutputDelivery::continueBatch() {
-    while (nextStep_ < batch_.steps.size()) {
-        perform(batch_.steps[nextStep_++]);
-        if (awaitsTaking_) return;
-    }
+    performSteps();
+    if (awaitsTaking_) return;
     if (!batch_.pause) return finish();
     means_.tapLoop.performAfterDelay(*batch_.pause, [this] { sendBatch(); });
+}
+
+// All in one, so that the port can send it together.
+void OutputDelivery::performSteps() {
+    if (nextStep_ == batch_.steps.size()) return;
+    means_.poster.begin();
+    while (nextStep_ < batch_.steps.size() && !awaitsTaking_) perform(batch_.steps[nextStep_++]);
+    means_.poster.end();
 }
 
 void OutputDelivery::perform(const OutputStep& step) {

@@ -75,6 +75,7 @@ class OutputDelivery {
     void start();
     void sendBatch();
     void continueBatch();
+    void performSteps();
     void perform(const OutputStep& step);
     void finish();
     void completeIfDone();

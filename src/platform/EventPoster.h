@@ -1,7 +1,7 @@
 // Synthesised keys and clicks, and the state of the real ones.
 //
-// Used on the tap thread. Between begin() and end() a port may gather events and send them together; what was posted
-// reaches the program in front in that order, and the tap never reports it as typed.
+// Used on the tap thread. Between begin() and end(), which nest, a port may gather events and send them together; what
+// was posted reaches the program in front in that order, and the tap never reports it as typed.
 #pragma once
 
 #include <cstdint>

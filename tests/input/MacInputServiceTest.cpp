@@ -5,6 +5,7 @@
 
 #include "library/Snippet.h"
 #include "library/SnippetGroup.h"
+#include "tests/engine/AllocationCounter.h"
 #include "tests/input/InputDesk.h"
 
 namespace plume {
@@ -304,6 +305,30 @@ TEST_F(MacInputServiceTest, TheTriggerKeyIsTypedAgainBehindLongOutput) {
     EXPECT_TRUE(output->cancelTrigger);
     desk.loop.advance(1);
     EXPECT_THAT(desk.poster.timesOf("vtext\r"), ElementsAre(40));
+}
+
+TEST(MacInputService, APlainKeyAllocatesNothing) {
+    InputDesk desk;
+    struct Engine {
+        void key(ZDKeyEventArgs& event) { keys += event.c; }
+        int keys = 0;
+    } engine;
+    desk.service.keyDownEvent.addObserver(&engine, &Engine::key);
+    const auto typeAll = [&] {
+        for (int i = 0; i < 10; ++i) {
+            desk.hold(KeyModifier::Shift);
+            desk.keyDown(8, u"C");
+            desk.keyUp(8);
+            desk.hold(0);
+            desk.keyDown(8);
+            desk.keyUp(8);
+        }
+    };
+    typeAll();
+    const std::size_t before = allocationCount();
+    typeAll();
+    EXPECT_EQ(allocationCount(), before);
+    EXPECT_EQ(engine.keys, 2 * 10 * ('C' + 'c'));
 }
 
 }  // namespace
