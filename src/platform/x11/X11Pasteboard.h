@@ -15,14 +15,13 @@
 #include <vector>
 
 #include "platform/Pasteboard.h"
+#include "platform/x11/X11PasteboardContent.h"
+#include "platform/x11/X11SelectionOwner.h"
+#include "platform/x11/X11SelectionReader.h"
+#include "platform/x11/X11SelectionTransfers.h"
 #include "platform/x11/X11Session.h"
 
 namespace plume {
-
-class X11PasteboardContent;
-class X11SelectionOwner;
-class X11SelectionReader;
-class X11SelectionTransfers;
 
 class X11Pasteboard final : public Pasteboard {
   public:
@@ -53,16 +52,21 @@ class X11Pasteboard final : public Pasteboard {
 
   private:
     explicit X11Pasteboard(X11Session& session);
-    void offerPrimary(bool isExpansion);
-    bool isTakenByFront(xcb_window_t requestor);
-    void noteChange();
+    void noteChange(bool ours);
+    void offerPrimary();
+    std::shared_ptr<X11PasteboardContent> selectedText();
+    bool isInFront(xcb_window_t requestor) const;
 
     X11Session& session_;
     std::int64_t changeCount_ = 0;
-    std::unique_ptr<X11SelectionTransfers> transfers_;
+    std::int64_t declaredCount_ = 0;  // of the last declaration
+    // What programs gave along with their data: a backup of it is given back alike.
+    mutable X11ValueForms forms_;
+    const std::unique_ptr<X11SelectionTransfers> transfers_;
+    const std::unique_ptr<X11SelectionReader> reader_;  // of the clipboard
+    const std::unique_ptr<X11SelectionReader> primaryReader_;
     std::unique_ptr<X11SelectionOwner> clipboard_;
     std::unique_ptr<X11SelectionOwner> primary_;
-    std::unique_ptr<X11SelectionReader> reader_;            // of the clipboard
     std::shared_ptr<X11PasteboardContent> content_;         // what was declared last
     std::shared_ptr<X11PasteboardContent> selectedBefore_;  // what PRIMARY held before an expansion was offered there
 };

@@ -39,24 +39,31 @@ class X11ProcessManager final : public ProcessManager {
         xcb_window_t window = XCB_WINDOW_NONE;  // where it was seen last
     };
 
+    struct Watched {
+        xcb_window_t window = XCB_WINDOW_NONE;
+        std::uint32_t eventMask = 0;
+    };
+
     void hear(const xcb_generic_event_t& event);
     void lookUp();
     xcb_window_t activeWindow();
+    xcb_window_t focusedWindow();
     xcb_window_t focusedApplicationWindow();
-    void watch(xcb_window_t& watched, xcb_window_t window, std::uint32_t eventMask);
+    void watch(Watched& watched, Watched wanted);
     std::optional<ProcessSerialNumber> processOf(xcb_window_t window);
     ProcessSerialNumber numberOf(const RunningApplication& application, xcb_window_t window);
+    std::uint32_t clientOf(xcb_window_t window) const;
     xcb_window_t windowOf(ProcessSerialNumber process);
 
     X11Session& session_;
     const std::shared_ptr<const DesktopFiles> desktopFiles_;
     const std::string hostName_;
     std::vector<X11Session::HandlerId> observers_;
-    bool isKnown_ = false;  // what follows is up to date
-    std::optional<ProcessSerialNumber> front_;
-    xcb_window_t watchedManager_ = XCB_WINDOW_NONE;
-    xcb_window_t watchedFront_ = XCB_WINDOW_NONE;
-    xcb_window_t watchedFocus_ = XCB_WINDOW_NONE;
+    bool isKnown_ = false;  // frontProcess_ is up to date
+    std::optional<ProcessSerialNumber> frontProcess_;
+    Watched manager_;  // the window manager's own window
+    Watched front_;    // the active window
+    Watched focus_;    // the focused window, when there is no active one
     mutable std::map<ProcessSerialNumber, Application> applications_;
     int lookUps_ = 0;
 };

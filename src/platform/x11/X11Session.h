@@ -31,6 +31,7 @@ class X11Session {
     X11Session& operator=(const X11Session&) = delete;
 
     XcbConnection& connection() { return *connection_; }
+    RunLoop& runLoop() { return runLoop_; }
     xcb_connection_t* get() const { return connection_->get(); }
     // A window of ours that is never shown: for owning selections and for the answers to requests.
     xcb_window_t window() const { return window_; }
@@ -82,6 +83,7 @@ class X11Session {
     std::map<xcb_window_t, std::map<std::uint32_t, int>> masks_;  // how often each mask was asked for
     std::deque<XcbOwned<xcb_generic_event_t>> collected_;
     xcb_timestamp_t noticedTime_ = 0;
+    bool serverIsGone_ = false;
 };
 
 }  // namespace plume
