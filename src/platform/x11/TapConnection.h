@@ -34,7 +34,7 @@ class TapConnection {
     Result<void> reopen();
 
     // Until reopen().
-    XcbConnection& connection() { return *connection_; }
+    XcbConnection& connection() const { return *connection_; }
     // Never mapped. For the watchdog, which ends the connection by it, and for questions that need a window.
     xcb_window_t window() const { return window_; }
     // Called with the new window after every reopen(), before the tap takes the keyboard.

@@ -1,8 +1,12 @@
 // The keyboard layout in force on X11.
 #pragma once
 
+#include <cstdint>
+#include <functional>
+#include <memory>
 #include <optional>
 #include <string>
+#include <utility>
 
 #include "platform/InputSources.h"
 #include "platform/x11/XkbKeyboard.h"
@@ -21,12 +25,16 @@ class X11InputSources final : public InputSources {
     // Option changes no text on X11: what types third-level characters is no modifier but a level chooser. Keypad keys
     // type digits.
     std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override;
+    void setChangeListener(std::function<void()> listener) override { listener_ = std::move(listener); }
 
   private:
     void readIdentifier();
+    void changed();
 
     const XkbKeyboard& keyboard_;
     std::optional<std::u16string> identifier_;
+    std::function<void()> listener_;
+    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
 };
 
 }  // namespace plume

@@ -5,15 +5,14 @@
 // hardware with the window manager, with grabs and with auto-repeat. Keys are decoded here, without asking the server.
 #pragma once
 
-#include <cstdint>
 #include <functional>
 #include <memory>
 #include <string>
-#include <vector>
 
 #include "platform/KeyboardTap.h"
 #include "platform/desktop/PollRunLoop.h"
 #include "platform/x11/TapConnection.h"
+#include "platform/x11/TapSession.h"
 #include "platform/x11/XkbKeyboard.h"
 
 namespace plume {
@@ -42,15 +41,15 @@ class X11KeyboardTap final : public KeyboardTap {
     void release();
 
   private:
-    class Session;
     void lost();
 
     PollRunLoop& loop_;
     TapConnection& connection_;
     XkbKeyboard& keyboard_;
+    const std::string display_;
     std::function<bool()> focusIsPassword_;
     KeyboardTapListener* listener_ = nullptr;
-    std::unique_ptr<Session> session_;  // while the keyboards are taken
+    std::shared_ptr<TapSession> session_;  // while the keyboards are taken
     std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
 };
 

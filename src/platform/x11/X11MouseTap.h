@@ -2,14 +2,14 @@
 #pragma once
 
 #include "platform/MouseTap.h"
-#include "platform/x11/XcbConnection.h"
+#include "platform/x11/X11Session.h"
 
 namespace plume {
 
-// On the tap thread, with the session connection, whose reader hands it every event; the connection outlives it.
+// On the tap thread; the session outlives it.
 class X11MouseTap final : public MouseTap {
   public:
-    explicit X11MouseTap(XcbConnection& connection) : connection_(connection) {}
+    explicit X11MouseTap(X11Session& session) : session_(session) {}
     ~X11MouseTap() override { remove(); }
     X11MouseTap(const X11MouseTap&) = delete;
     X11MouseTap& operator=(const X11MouseTap&) = delete;
@@ -18,14 +18,13 @@ class X11MouseTap final : public MouseTap {
     bool exists() const override { return listener_ != nullptr; }
     void remove() override;
 
-    // Every event of the connection; false for one that is no click.
-    bool handleEvent(const xcb_generic_event_t& event);
-
   private:
     void select(std::uint32_t events) const;
+    void handleEvent(const xcb_generic_event_t& event);
 
-    XcbConnection& connection_;
-    Listener listener_;
+    X11Session& session_;
+    X11Session::HandlerId handler_ = 0;
+    Listener listener_;  // while it exists
     std::uint8_t inputOpcode_ = 0;
 };
 

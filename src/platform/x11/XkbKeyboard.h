@@ -1,6 +1,6 @@
 // The core keyboard of the X server as it is now: its layout, which of its groups is in force, what is locked.
 //
-// Belongs to the tap thread and works on the session connection, whose reader hands it every event.
+// Belongs to the tap thread, and asks over the session connection.
 #pragma once
 
 #include <xcb/xcb.h>
@@ -16,6 +16,7 @@
 #include <vector>
 
 #include "Foundation/Result.h"
+#include "platform/x11/X11Session.h"
 #include "platform/x11/XcbConnection.h"
 #include "platform/x11/XkbKeymap.h"
 
@@ -35,7 +36,7 @@ class XkbKeyboard {
   public:
     enum class Change {
         Keymap,  // another layout, or a key that does something else
-        Group,   // another group of the same layout
+        Group,   // another group of the same layout, or another name for it
         Locks,   // modifiers or a group were locked or latched by a program, not by a key
     };
     using Listener = std::function<void(Change)>;
@@ -49,14 +50,16 @@ class XkbKeyboard {
     const std::shared_ptr<const XkbKeymap>& keymap() const { return keymap_; }
     xkb_layout_index_t group() const { return group_; }
     const XkbLocks& locks() const { return locks_; }
-    // "us", "de(nodeadkeys)" as the layout rules of the server name the group in force; empty when they do not.
+    // "us", "de(nodeadkeys)" as the server's layout rules name the group in force; without rules, the name in the
+    // layout itself, or empty.
     const std::string& layoutName() const { return layoutName_; }
 
     // Called after the change, in the order of adding, as long as the keyboard lives.
     void addListener(Listener listener) { listeners_.push_back(std::move(listener)); }
 
-    // Every event of the connection; false for one that is not the keyboard's.
-    bool handleEvent(const xcb_generic_event_t& event);
+    // Follows changes from now on, by the events of this session, whose connection it was opened with. The keyboard
+    // outlives the session's run.
+    void listenTo(X11Session& session);
 
     // Whoever gives key codes symbols of Plume's own tells it before: `symbols[i]` comes to `first + i`, and
     // XKB_KEY_NoSymbol stands for a key code that is written as it is. The server's word of that change is then no
@@ -72,6 +75,7 @@ class XkbKeyboard {
     KeycodeSet foreignKeycodes(xkb_keymap* keymap) const;
     void readState();
     void readLayoutName();
+    void handleEvent(const xcb_generic_event_t& event);
     void keymapChanged();
     void stateChanged(const xcb_generic_event_t& event);
     bool isOwnChange(xcb_keycode_t first, std::uint8_t count);
@@ -92,6 +96,7 @@ class XkbKeyboard {
     std::string layoutName_;
     std::array<xkb_keysym_t, 256> ownSymbols_{};
     std::deque<Written> expected_;
+    unsigned lastRead_ = 0;  // the request before the latest reading of the keymap
     std::vector<Listener> listeners_;
 };
 

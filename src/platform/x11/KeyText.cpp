@@ -1,0 +1,29 @@
+#include "platform/x11/KeyText.h"
+
+#include "Foundation/Strings.h"
+
+namespace plume {
+
+void KeyText::assignKey(xkb_state& state, xcb_keycode_t keycode, bool alt) {
+    clear();
+    const char32_t character = xkb_state_key_get_utf32(&state, keycode);
+    const bool control = character < U' ' || character == 0x7F;
+    if (character != 0 && (control || !alt)) append(character);
+}
+
+void KeyText::assign(std::string_view utf8) {
+    clear();
+    const std::u16string text = fromUtf8(utf8);
+    length_ = text.copy(units_.data(), units_.size());
+}
+
+void KeyText::append(char32_t character) {
+    if (character <= 0xFFFF) {
+        units_[length_++] = static_cast<char16_t>(character);
+        return;
+    }
+    units_[length_++] = static_cast<char16_t>(0xD7C0 + (character >> 10));
+    units_[length_++] = static_cast<char16_t>(0xDC00 + (character & 0x3FF));
+}
+
+}  // namespace plume

@@ -1,0 +1,91 @@
+// The time in which the tap has the keyboards: from taking them to giving them back, or to losing the connection.
+//
+// Every key of theirs comes here, is decoded, told to the listener, and pressed again on the XTEST keyboard unless the
+// listener swallowed it. What is down there comes up again in any case: a release follows every press that was passed
+// on, whatever the listener says, and releases of keys that were down before the tap are passed on, too. Belongs to the
+// tap thread.
+#pragma once
+
+#include <xcb/xinput.h>
+
+#include <array>
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+
+#include "platform/KeyboardTap.h"
+#include "platform/desktop/PollRunLoop.h"
+#include "platform/x11/HardwareKeyboards.h"
+#include "platform/x11/KeyDecoder.h"
+#include "platform/x11/KeyboardHeld.h"
+#include "platform/x11/TapConnection.h"
+#include "platform/x11/XkbKeyboard.h"
+
+namespace plume {
+
+class TapSession : public std::enable_shared_from_this<TapSession> {
+  public:
+    struct Parts {
+        PollRunLoop& loop;
+        TapConnection& connection;
+        const XkbKeyboard& keyboard;
+        KeyboardTapListener& listener;
+        const std::function<bool()>& focusIsPassword;  // may be empty
+        std::function<void()> lost;                    // the connection is gone
+    };
+
+    explicit TapSession(Parts parts);
+    TapSession(const TapSession&) = delete;
+    TapSession& operator=(const TapSession&) = delete;
+
+    // Takes the keyboards; the error says why there is none to take.
+    Result<void> begin();
+    // Gives them back; nothing is down on the XTEST keyboard afterwards. Nobody is called any more.
+    void end();
+
+    void keyboardChanged(XkbKeyboard::Change change);
+    void hold();
+    void release();
+
+  private:
+    struct Injection {
+        xcb_keycode_t keycode;
+        bool down;
+    };
+
+    void mirrorAtStart();
+    void selectHierarchyEvents();
+    void addSource();
+    void passOnUnheard();
+    void drain();
+    bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;
+    bool isKey(const xcb_generic_event_t& event) const;
+    void handle(const xcb_generic_event_t& event);
+    void handleHierarchy(const xcb_input_hierarchy_event_t& event);
+    void press(xcb_keycode_t keycode, bool repeated);
+    void release(xcb_keycode_t keycode);
+    void releaseKeysOf(std::uint16_t device);
+    bool mayTell();
+    void tellMissedModifiers(std::uint64_t flags);
+    bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
+    void inject(Injection injection);
+
+    Parts parts_;
+    HardwareKeyboards keyboards_;
+    KeyDecoder decoder_;
+    std::unique_ptr<KeyboardHeld> keyboardHeld_;
+    int descriptor_ = -1;
+    bool ended_ = false;
+
+    KeycodeSet swallowed_;                      // keys that are down with their press swallowed
+    KeycodeSet told_;                           // keys that are down with their press told
+    std::array<std::uint16_t, 256> devices_{};  // that a key went down on
+    std::uint64_t toldFlags_ = 0;
+
+    bool held_ = false;
+    std::optional<Injection> waiting_;
+    RunLoop::CallId holdLimit_ = 0;
+};
+
+}  // namespace plume

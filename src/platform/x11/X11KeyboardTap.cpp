@@ -1,0 +1,70 @@
+#include "platform/x11/X11KeyboardTap.h"
+
+#include <utility>
+
+namespace plume {
+
+X11KeyboardTap::X11KeyboardTap(PollRunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard)
+    : loop_(loop), connection_(connection), keyboard_(keyboard), display_(connection.connection().displayName()) {
+    keyboard.addListener([this, alive = std::weak_ptr<bool>(alive_)](XkbKeyboard::Change change) {
+        if (!alive.expired() && session_) session_->keyboardChanged(change);
+    });
+}
+
+X11KeyboardTap::~X11KeyboardTap() {
+    remove();
+}
+
+void X11KeyboardTap::setFocusIsPassword(std::function<bool()> focusIsPassword) {
+    focusIsPassword_ = std::move(focusIsPassword);
+}
+
+Result<void> X11KeyboardTap::create(KeyboardTapListener& listener, bool /*annotatedSession*/) {
+    remove();
+    if (connection_.isBroken()) {
+        if (auto reopened = connection_.reopen(); !reopened) return reopened;
+    }
+    auto session = std::make_shared<TapSession>(TapSession::Parts{.loop = loop_,
+                                                                  .connection = connection_,
+                                                                  .keyboard = keyboard_,
+                                                                  .listener = listener,
+                                                                  .focusIsPassword = focusIsPassword_,
+                                                                  .lost = [this] { lost(); }});
+    if (auto begun = session->begin(); !begun) return begun;
+    listener_ = &listener;
+    session_ = std::move(session);
+    return {};
+}
+
+bool X11KeyboardTap::exists() const {
+    return session_ != nullptr;
+}
+
+void X11KeyboardTap::lost() {
+    std::exchange(session_, nullptr)->end();
+    listener_->tapDisabledByTimeout();
+}
+
+void X11KeyboardTap::enable() {
+    // When the server is gone, there is nothing to take, and no tap exists.
+    if (!session_ && listener_) static_cast<void>(create(*listener_, false).ok());
+}
+
+void X11KeyboardTap::remove() {
+    listener_ = nullptr;
+    if (session_) std::exchange(session_, nullptr)->end();
+}
+
+Result<void> X11KeyboardTap::check() const {
+    return TapConnection::check(display_);
+}
+
+void X11KeyboardTap::hold() {
+    if (session_) session_->hold();
+}
+
+void X11KeyboardTap::release() {
+    if (session_) session_->release();
+}
+
+}  // namespace plume
