@@ -122,7 +122,6 @@ void OutputDelivery::paste(const PLOutput::Fragment& fragment) {
     offer(fragment);
     current_->pasted = true;
     awaitsTaking_ = tells;
-    hasAskedForPaste_ = false;
     ++keystrokesToCome_;
 
     const ContextInputSetting& setting = *current_->setting;
@@ -167,14 +166,13 @@ void OutputDelivery::sendPasteCommand() {
 void OutputDelivery::wasTaken() {
     if (!awaitsTaking_ || !hasAskedForPaste_) return;
     hasAskedForPaste_ = false;
-    means_.tapLoop.cancel(std::exchange(takingLimit_, 0));
+    means_.tapLoop.cancel(takingLimit_);
     means_.tapLoop.performAfterDelay(0, [this] { goOnBehindPaste(); });
 }
 
 void OutputDelivery::goOnBehindPaste() {
     awaitsTaking_ = false;
     hasAskedForPaste_ = false;
-    takingLimit_ = 0;
     const bool pausesForPaste = pauseAfterPaste(*current_->setting) > 0;
     if (pausesForPaste) batch_.pause = pauseAfterTaking(*current_->setting);
     continueBatch();

@@ -205,7 +205,8 @@ TEST_F(MacInputServiceTest, FollowsSecureInput) {
     desk.hold(1);
     EXPECT_THAT(heard(), IsEmpty());
     desk.keyDown(8, u"c");
-    EXPECT_THAT(heard(), ElementsAre("key 8 c", "not secure"));
+    desk.keyDown(9, u"v");
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "key 9 v", "not secure"));
     desk.service.disableEvents();
     desk.loop.runReady();
     EXPECT_FALSE(desk.loop.nextDue()) << "nothing wakes up any more";

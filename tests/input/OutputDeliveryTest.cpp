@@ -74,6 +74,14 @@ TEST(OutputDelivery, OneOutputAfterTheOther) {
               "v51*5 vfirst ^first release hold vsecond ^second release hold vthird ^third release");
 }
 
+TEST(OutputDelivery, AnyNumberMayWait) {
+    InputDesk desk;
+    desk.service.sendOutput(InputDesk::output(u"first", 25));
+    for (int i = 0; i < 20'000; ++i) desk.service.sendOutput(InputDesk::output(u"x"));
+    desk.loop.advance(1);
+    EXPECT_EQ(desk.poster.timesOf("vx").size(), 20'000U);
+}
+
 TEST(OutputDelivery, KeysLetGoBetweenOutputsMayOrderAnother) {
     InputDesk desk;
     int ordered = 0;
