@@ -51,17 +51,17 @@ class Composition {
         // Writes one line to the log. Never empty.
         std::function<void(const std::string&)> log;
         // Where dates are written: see ContentEnvironment.
-        std::string timeZone;
-        std::string locale;
+        std::string timeZone = {};
+        std::string locale = {};
         // Windows. Without a form the user is told that the snippet needs one; without a list several matches cannot
         // be chosen from.
-        FieldsEditor::Factory makeFieldsEditor;
-        std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController;
-        std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController;
+        FieldsEditor::Factory makeFieldsEditor = {};
+        std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController = {};
+        std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
         const SuggestionSource* suggestionSource = nullptr;
         VMHelperController* vmHelper = nullptr;
         // The switch hot key has enabled or disabled the engine.
-        std::function<void(bool enabled)> enabledChanged;
+        std::function<void(bool enabled)> enabledChanged = {};
     };
 
     Composition(const Ports& ports, Surroundings surroundings);

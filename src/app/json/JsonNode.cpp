@@ -18,25 +18,21 @@ constexpr int DeepestNesting = 64;
 // Watches the parser for what it would let through.
 class Watch {
   public:
+    explicit Watch(const std::string& fileName) : fileName_(fileName) {}
+
     bool operator()(int depth, Json::parse_event_t event, Json& parsed) {
-        if (depth > DeepestNesting) tooDeep_ = true;
+        if (depth > DeepestNesting) throw JsonError(fileName_ + ": the values are nested too deeply");
         if (event == Json::parse_event_t::object_start) keys_.emplace_back();
         if (event == Json::parse_event_t::object_end) keys_.pop_back();
         if (event == Json::parse_event_t::key && !keys_.back().insert(parsed.get<std::string>()).second) {
-            if (twice_.empty()) twice_ = parsed.get<std::string>();
+            throw JsonError(fileName_ + ": an object has the key " + parsed.dump() + " twice");
         }
-        return !tooDeep_;
-    }
-
-    void check(const std::string& fileName) const {
-        if (tooDeep_) throw JsonError(fileName + ": the values are nested too deeply");
-        if (!twice_.empty()) throw JsonError(fileName + ": an object has the key \"" + twice_ + "\" twice");
+        return true;
     }
 
   private:
+    const std::string& fileName_;
     std::vector<std::set<std::string>> keys_;
-    std::string twice_;
-    bool tooDeep_ = false;
 };
 
 // The library's own messages name the line and column behind a prefix of no use to people.
@@ -55,14 +51,13 @@ bool isPlainKey(const std::string& key) {
 }  // namespace
 
 JsonNode JsonNode::parse(std::string_view text, const std::string& fileName) {
-    Watch watch;
+    Watch watch(fileName);
     auto document = std::make_shared<Json>();
     try {
         *document = Json::parse(text, std::ref(watch));
     } catch (const Json::parse_error& error) {
         throw JsonError(fileName + ": this is no JSON: " + explanation(error));
     }
-    watch.check(fileName);
     return {std::move(document), std::make_shared<const std::string>(fileName), "$"};
 }
 

@@ -1,0 +1,67 @@
+// What the composition does that no scenario shows: a program without windows.
+#include "app/Composition.h"
+
+#include <gtest/gtest.h>
+
+#include "app/json/SettingsFile.h"
+#include "platform/desktop/PosixProcessLauncher.h"
+#include "platform/simulated/SimulatedDesktop.h"
+
+namespace plume {
+
+namespace {
+
+class WindowlessProgram : public testing::Test {
+  protected:
+    WindowlessProgram() {
+        desktop_.activate(u"org.example.editor");
+        program_.loadPreferences();
+        program_.start();
+        desktop_.runLoop().runReady();
+    }
+    void add(const std::u16string& content) {
+        group_->addItem(std::make_shared<Snippet>(u"sig", content));
+        program_.setSnippetGroups({group_});
+    }
+    std::u16string typed(std::u16string_view text) {
+        for (const char16_t character : text) desktop_.typeCharacter({&character, 1});
+        desktop_.runLoop().advance(1);
+        return desktop_.front()->field().text();
+    }
+
+    SimulatedDesktop desktop_;
+    PosixProcessLauncher launcher_;
+    std::shared_ptr<const UserDefaults> settings_ = SettingsFile::registeredDefaults();
+    std::vector<std::string> told_;
+    std::shared_ptr<SnippetGroup> group_ = SnippetGroup::make();
+    Composition program_{
+        {desktop_.keyboardTap(), desktop_.mouseTap(), desktop_.poster(), desktop_.pasteboard(),
+         desktop_.processManager(), desktop_.inputSources(), desktop_.accessibility(), desktop_.secureInput(),
+         desktop_.systemHotKeys(), desktop_.sounds(), launcher_, desktop_.runLoop(), desktop_.runLoop()},
+        {*settings_, [this](const std::string& message) { told_.push_back(message); }, [](const std::string&) {}}};
+};
+
+}  // namespace
+
+TEST_F(WindowlessProgram, Expands) {
+    add(u"Best regards");
+    EXPECT_EQ(typed(u"sig"), u"Best regards");
+    program_.stop();
+    EXPECT_EQ(typed(u" sig"), u"Best regards sig");
+}
+
+TEST_F(WindowlessProgram, TellsThatASnippetNeedsAForm) {
+    add(u"Dear \u3010field:Name\u3011");
+    EXPECT_EQ(typed(u"sig"), u"");
+    ASSERT_EQ(told_.size(), 1u);
+    EXPECT_NE(told_[0].find("\"sig\""), std::string::npos);
+}
+
+TEST_F(WindowlessProgram, LeavesDigitsAndReturnAloneWhenSeveralMatch) {
+    add(u"first");
+    add(u"second");
+    EXPECT_EQ(typed(u"sig"), u"sig");
+    EXPECT_EQ(typed(u"1\n"), u"sig1\n");
+}
+
+}  // namespace plume
