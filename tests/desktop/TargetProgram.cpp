@@ -108,6 +108,10 @@ void TargetProgram::setText(const std::string& text) {
     changes_.clear();
 }
 
+void TargetProgram::showPassword(bool shown) {
+    ask(json{{"request", "password"}, {"shown", shown}}.dump());
+}
+
 std::optional<TextChange> TargetProgram::takeChange(Milliseconds bound) {
     std::unique_lock lock(mutex_);
     told_.wait_for(lock, bound, [this] { return !changes_.empty() || ended_; });

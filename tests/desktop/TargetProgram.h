@@ -59,6 +59,10 @@ class TargetProgram {
     void setText(const std::string& text);
     void clear() { setText(""); }
 
+    // Shows a window of its own with the password "secret" in a field, in front of the text, or takes it away. Not for
+    // a terminal.
+    void showPassword(bool shown);
+
     // The next change that was not taken yet, waiting for it at most `bound`.
     std::optional<TextChange> takeChange(Milliseconds bound);
 

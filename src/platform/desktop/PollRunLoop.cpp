@@ -81,9 +81,10 @@ void PollRunLoop::removeSource(int descriptor) {
 
 void PollRunLoop::run() {
     while (!stopped_) {
-        drainSources();
         runHandedOver();
         runDue();
+        // Last: a call that waits for an answer may have made a library read more than that answer.
+        drainSources();
         if (!stopped_) wait();
     }
     stopped_ = false;

@@ -78,6 +78,7 @@ bool TargetChannel::answerRequests() {
 void TargetChannel::answer(const std::string& request) {
     const auto object = json::parse(request);
     if (object.at("request") == "set") editor_.setText(object.at("text"));
+    if (object.at("request") == "password") editor_.showPassword(object.at("shown"));
     write(lineOf({{"event", "answer"}, {"time", monotonicNanoseconds()}, {"text", editor_.text()}}));
 }
 

@@ -10,6 +10,7 @@ namespace plume::target {
 struct Editor {
     std::function<std::string()> text;
     std::function<void(const std::string&)> setText;
+    std::function<void(bool)> showPassword = {};  // a window of its own with a field for a password, in front
 };
 
 // A target program's line to the test that started it: one JSON object a line in both directions. What happens is told

@@ -17,6 +17,7 @@ struct Target {
     GtkWidget* window = nullptr;
     GtkWidget* view = nullptr;
     GtkTextBuffer* buffer = nullptr;
+    GtkWidget* passwordWindow = nullptr;
     std::unique_ptr<TargetChannel> channel;
     int removedFrom = 0;
     int removed = 0;
@@ -49,6 +50,19 @@ void removed(GtkTextBuffer*, const GtkTextIter*, const GtkTextIter*, Target* tar
 
 void pasted(GtkTextBuffer*, GtkClipboard*, Target* target) {
     target->channel->reportPasted(target->length());
+}
+
+void showPassword(Target& target, bool shown) {
+    if (target.passwordWindow != nullptr) gtk_widget_destroy(target.passwordWindow);
+    target.passwordWindow = shown ? gtk_window_new(GTK_WINDOW_TOPLEVEL) : nullptr;
+    if (!shown) return;
+    GtkWidget* entry = gtk_entry_new();
+    gtk_entry_set_visibility(GTK_ENTRY(entry), FALSE);
+    gtk_entry_set_input_purpose(GTK_ENTRY(entry), GTK_INPUT_PURPOSE_PASSWORD);
+    gtk_entry_set_text(GTK_ENTRY(entry), "secret");
+    gtk_container_add(GTK_CONTAINER(target.passwordWindow), entry);
+    gtk_widget_show_all(target.passwordWindow);
+    gtk_window_present(GTK_WINDOW(target.passwordWindow));
 }
 
 gboolean focusChanged(GtkWidget*, const GdkEventFocus* event, Target* target) {
@@ -91,7 +105,8 @@ int main(int argc, char** argv) {
     target.channel = std::make_unique<TargetChannel>(
         argv[1], plume::target::Editor{
                      [&] { return wholeText(target.buffer); },
-                     [&](const std::string& text) { gtk_text_buffer_set_text(target.buffer, text.c_str(), -1); }});
+                     [&](const std::string& text) { gtk_text_buffer_set_text(target.buffer, text.c_str(), -1); },
+                     [&](bool shown) { showPassword(target, shown); }});
     gtk_text_view_set_wrap_mode(GTK_TEXT_VIEW(target.view), GTK_WRAP_WORD_CHAR);
     GtkWidget* scroller = gtk_scrolled_window_new(nullptr, nullptr);
     gtk_container_add(GTK_CONTAINER(scroller), target.view);

@@ -2,12 +2,14 @@
 
 #include <QApplication>
 #include <QFocusEvent>
+#include <QLineEdit>
 #include <QMimeData>
 #include <QSocketNotifier>
 #include <QTextCursor>
 #include <QTextDocument>
 #include <QTextEdit>
 #include <algorithm>
+#include <memory>
 
 #include "tests/desktop/targets/TargetChannel.h"
 
@@ -19,7 +21,8 @@ class TargetEdit : public QTextEdit {
   public:
     explicit TargetEdit(const char* socketPath)
         : channel_(socketPath, {[this] { return toPlainText().toStdString(); },
-                                [this](const std::string& text) { setPlainText(QString::fromStdString(text)); }}) {
+                                [this](const std::string& text) { setPlainText(QString::fromStdString(text)); },
+                                [this](bool shown) { showPassword(shown); }}) {
         connect(document(), &QTextDocument::contentsChange, this, &TargetEdit::reportChange);
     }
 
@@ -49,6 +52,17 @@ class TargetEdit : public QTextEdit {
   private:
     int length() { return plume::target::countCharacters(toPlainText().toStdString()); }
 
+    void showPassword(bool shown) {
+        password_.reset();
+        if (!shown) return;
+        password_ = std::make_unique<QLineEdit>();
+        password_->setEchoMode(QLineEdit::Password);
+        password_->setText("secret");
+        password_->setFocus();
+        password_->show();
+        password_->activateWindow();
+    }
+
     // The document counts the end of its last paragraph, too: some changes are told one longer than they are.
     void reportChange(int position, int removed, int added) {
         const int last = document()->characterCount() - 1;
@@ -60,6 +74,7 @@ class TargetEdit : public QTextEdit {
     }
 
     TargetChannel channel_;
+    std::unique_ptr<QLineEdit> password_;
 };
 
 }  // namespace

@@ -1,0 +1,111 @@
+#include "platform/desktop/AtspiAccessibility.h"
+
+#include <chrono>
+#include <utility>
+
+#include "platform/desktop/AtspiElement.h"
+#include "platform/desktop/AtspiSession.h"
+
+namespace plume {
+
+namespace {
+
+constexpr std::chrono::milliseconds LongestGoodbye{50};
+
+// The program in front. What it is was told by its focus, so nothing needs to be asked to make one.
+class AtspiApplicationElement final : public UIElement {
+  public:
+    using Element = std::shared_ptr<UIElement>;
+
+    AtspiApplicationElement(std::shared_ptr<AtspiQueue> queue, AtspiPart focused)
+        : focused_(std::make_shared<AtspiElement>(std::move(queue), std::move(focused))) {}
+
+    Element elementAttribute(std::string_view name) const override {
+        return name == "AXFocusedUIElement" ? focused_ : nullptr;
+    }
+    std::optional<std::u16string> stringAttribute(std::string_view name) const override {
+        return name == "AXRole" ? std::optional<std::u16string>(u"AXApplication") : std::nullopt;
+    }
+
+    // It has no text and no place.
+    std::vector<Element> elementsAttribute(std::string_view) const override { return {}; }
+    std::optional<TextRange> rangeAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<TextMarkerRange> markerRangeAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<Point> pointAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<Size> sizeAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<std::u16string> stringForRange(std::string_view, TextRange) const override { return std::nullopt; }
+    std::optional<std::u16string> stringForMarkerRange(std::string_view, TextMarkerRange) const override {
+        return std::nullopt;
+    }
+    std::optional<AttributedString> attributedStringForRange(std::string_view, TextRange) const override {
+        return std::nullopt;
+    }
+    std::optional<std::string> dataForRange(std::string_view, TextRange) const override { return std::nullopt; }
+    std::optional<Rectangle> rectangleForRange(std::string_view, TextRange) const override { return std::nullopt; }
+
+  private:
+    Element focused_;
+};
+
+}  // namespace
+
+std::string_view sentenceOf(AccessibilityStatus status) {
+    switch (status) {
+        case AccessibilityStatus::Starting:
+            return "The accessibility bus is being looked for.";
+        case AccessibilityStatus::Working:
+            return "Accessibility works.";
+        case AccessibilityStatus::SwitchedOff:
+            return "Accessibility is not switched on for this session: programs made with GTK 3 tell about their "
+                   "texts, "
+                   "those made with Qt and browsers do not. To switch it on, run \"gsettings set "
+                   "org.gnome.desktop.interface toolkit-accessibility true\" and start those programs again.";
+        case AccessibilityStatus::NotInstalled:
+            return "The accessibility bus cannot be started: install the package at-spi2-core.";
+        case AccessibilityStatus::NoSession:
+            return "There is no D-Bus session, so programs cannot tell about their texts: start Plume inside the "
+                   "desktop "
+                   "session.";
+        case AccessibilityStatus::Failed:
+            return "The accessibility bus does not accept Plume: log out and in again.";
+    }
+    return "";
+}
+
+AtspiAccessibility::AtspiAccessibility() : session_(std::make_shared<AtspiSession>()) {
+    std::promise<void> ended;
+    ended_ = ended.get_future();
+    thread_ = std::thread([session = session_, ended = std::move(ended)]() mutable {
+        session->run();
+        ended.set_value();
+    });
+}
+
+AtspiAccessibility::~AtspiAccessibility() {
+    session_->queue()->end();
+    if (ended_.wait_for(LongestGoodbye) == std::future_status::ready) {
+        thread_.join();
+    } else {
+        thread_.detach();
+    }
+}
+
+std::shared_ptr<UIElement> AtspiAccessibility::frontApplicationElement() const {
+    AtspiPart focused = session_->focus().part();
+    if (!focused) return nullptr;
+    return std::make_shared<AtspiApplicationElement>(session_->queue(), std::move(focused));
+}
+
+bool AtspiAccessibility::focusIsPassword() const {
+    return session_->focus().isPassword();
+}
+
+pid_t AtspiAccessibility::focusedProcess() const {
+    return session_->focus().process();
+}
+
+AccessibilityStatus AtspiAccessibility::status() const {
+    return session_->status();
+}
+
+}  // namespace plume

@@ -1,0 +1,15 @@
+// What AT-SPI calls the parts of a user interface, and what Plume calls them.
+#pragma once
+
+#include <string_view>
+
+#include "platform/desktop/AtspiObjects.h"
+
+namespace plume {
+
+// "AXUnknown" for a role that Plume has no use for. On the accessibility thread.
+std::u16string_view roleOf(AtspiAccessible* part);
+// Empty when it has none. On the accessibility thread.
+std::u16string_view subroleOf(AtspiAccessible* part);
+
+}  // namespace plume

@@ -1,0 +1,300 @@
+// What Plume learns of texts, carets and passwords in real programs, and what it costs when they do not answer.
+
+#include "platform/desktop/AtspiAccessibility.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <sys/socket.h>
+#include <sys/un.h>
+#include <unistd.h>
+
+#include <chrono>
+#include <csignal>
+#include <cstdlib>
+#include <cstring>
+#include <functional>
+
+#include "Foundation/Strings.h"
+#include "input/AXUtils.h"
+#include "tests/desktop/Deadline.h"
+#include "tests/desktop/DesktopRig.h"
+
+// libatspi does not free all it allocates: leaks are not looked for in this program.
+extern "C" const char* __asan_default_options();
+const char* __asan_default_options() {
+    return "detect_leaks=0";
+}
+
+namespace plume::rig {
+
+namespace {
+
+using std::chrono::steady_clock;
+
+bool await(const std::function<bool()>& condition) {
+    const Deadline deadline(Milliseconds(10'000));
+    while (!condition() && !deadline.passed()) deadline.waitReadable(-1, Milliseconds(5));
+    return condition();
+}
+
+// The test itself becomes a program of the rig's desktop.
+void join(const DesktopSession& session) {
+    for (const std::string& line : session.environment()) {
+        const auto end = line.find('=');
+        setenv(line.substr(0, end).c_str(), line.substr(end + 1).c_str(), 1);
+    }
+}
+
+// One desktop for all: libatspi stays with the accessibility bus that it found first.
+class AccessibilityDesktop : public testing::Test {
+  protected:
+    static void SetUpTestSuite() {
+        if (rig_) return;
+        rig_ = std::make_unique<DesktopRig>();
+        join(rig_->session());
+        accessibility_ = std::make_unique<AtspiAccessibility>();
+        ASSERT_TRUE(await([] { return accessibility_->status() != AccessibilityStatus::Starting; }));
+    }
+
+    static std::unique_ptr<TargetProgram> startFocused(TargetKind kind) {
+        auto target = rig_->startTarget(kind);
+        if (kind != TargetKind::Xterm) {
+            EXPECT_TRUE(await([&] { return accessibility_->focusedProcess() == target->pid(); }));
+        }
+        return target;
+    }
+
+    static inline std::unique_ptr<DesktopRig> rig_;
+    static inline std::unique_ptr<AtspiAccessibility> accessibility_;
+};
+
+class AccessibilityTest : public AccessibilityDesktop, public testing::WithParamInterface<TargetKind> {
+  protected:
+    void SetUp() override { target_ = startFocused(GetParam()); }
+
+    // The text, and the caret at its end.
+    void write(const std::string& text) {
+        target_->setText(text);
+        rig_->keyboard().chord({Key::LeftControl}, Key::End);
+        const auto units = static_cast<std::int64_t>(fromUtf8(text).size());
+        EXPECT_TRUE(awaitSelection({units, 0}));
+    }
+
+    static bool awaitSelection(TextRange range) {
+        return await([&] { return AXUtils::getSelectedTextRange(*accessibility_) == range; });
+    }
+
+    std::unique_ptr<TargetProgram> target_;
+};
+
+TEST_P(AccessibilityTest, TextBeforeTheCaretIsCountedInUnits) {
+    write("naïve 日本 a😀b");
+    using Text = std::optional<std::u16string>;
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 1), Text(u"b"));
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3), Text(u"😀b"));
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 4), Text(u"a😀b"));
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 100), Text(u"naïve 日本 a😀b"));
+    EXPECT_EQ(AXUtils::getValue(*accessibility_), Text(u"naïve 日本 a😀b"));
+    rig_->keyboard().tap(Key::Left);
+    rig_->keyboard().tap(Key::Left);
+    ASSERT_TRUE(awaitSelection({10, 0}));
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3), Text(u"本 a"));
+    rig_->keyboard().chord({Key::LeftControl}, Key::Home);
+    ASSERT_TRUE(awaitSelection({0, 0}));
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3), Text(u""));
+}
+
+TEST_P(AccessibilityTest, AnyStretchOfTheTextIsReadAfterASelectionIsKnown) {
+    write("😀😀😀 one 😀 two");
+    rig_->keyboard().tap(Key::Home);
+    for (int i = 0; i < 4; ++i) rig_->keyboard().tap(Key::Right);
+    ASSERT_TRUE(awaitSelection({7, 0}));
+    const auto focused = AXUtils::getFocusedUIElement(*accessibility_);
+    ASSERT_TRUE(focused);
+    ASSERT_EQ(focused->rangeAttribute("AXSelectedTextRange"), (TextRange{7, 0}));
+    using Text = std::optional<std::u16string>;
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {2, 4}), Text(u"😀😀"));
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {4, 6}), Text(u"😀 one"));
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {11, 4}), Text(u"😀 t"));
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {11, 6}), Text(u"😀 two"));
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {11, 7}), std::nullopt);
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {-1, 1}), std::nullopt);
+}
+
+TEST_P(AccessibilityTest, SelectedTextIsMeasured) {
+    write("a😀b");
+    EXPECT_EQ(AXUtils::getSelectedTextLength(*accessibility_), 0);
+    rig_->keyboard().chord({Key::LeftShift}, Key::Home);
+    EXPECT_TRUE(awaitSelection({0, 4}));
+    EXPECT_EQ(AXUtils::getSelectedTextLength(*accessibility_), 4);
+}
+
+TEST_P(AccessibilityTest, ElementsAreNamed) {
+    using Text = std::optional<std::u16string>;
+    const auto application = accessibility_->frontApplicationElement();
+    ASSERT_TRUE(application);
+    EXPECT_EQ(application->stringAttribute("AXRole"), Text(u"AXApplication"));
+    const auto focused = AXUtils::getFocusedUIElement(*accessibility_);
+    ASSERT_TRUE(focused);
+    EXPECT_EQ(focused->stringAttribute("AXRole"), Text(u"AXTextArea"));
+    EXPECT_EQ(focused->stringAttribute("AXSubrole"), std::nullopt);
+    const auto window = AXUtils::getFocusedTopLevelUIElement(*accessibility_);
+    ASSERT_TRUE(window || GetParam() == TargetKind::QtTextEdit);  // the edit is the window itself there
+    if (GetParam() == TargetKind::GtkTextView) {
+        EXPECT_EQ(window->stringAttribute("AXRole"), Text(u"AXWindow"));
+        EXPECT_EQ(window->stringAttribute("AXTitle"), Text(u"GTK text"));
+        EXPECT_THAT(window->elementsAttribute("AXChildren"), testing::SizeIs(1));
+        ASSERT_TRUE(focused->elementAttribute("AXParent"));
+        EXPECT_EQ(focused->elementAttribute("AXParent")->stringAttribute("AXRole"), Text(u"AXScrollArea"));
+    }
+}
+
+TEST_P(AccessibilityTest, CaretIsFoundOnTheScreen) {
+    const auto window = rig_->client().placeOf(target_->window());
+    accessibility_->setMainScreenHeight(0);
+    const auto caret = [] {
+        Rectangle bound = AXUtils::getSelectedTextBound(*accessibility_);
+        bound.origin.y = -bound.origin.y - bound.size.height;  // from the top again
+        return bound;
+    };
+    target_->clear();
+    ASSERT_TRUE(await([&] { return caret().size.height > 0; }));
+    const Rectangle empty = caret();
+    EXPECT_GE(empty.origin.x, window.x - 2);
+    EXPECT_GE(empty.origin.y, window.y - 2);
+    EXPECT_LT(empty.origin.y, window.y + 40);
+
+    write("wide enough 😀");
+    const Rectangle atEnd = caret();
+    EXPECT_EQ(atEnd.size.width, 0);
+    EXPECT_GT(atEnd.size.height, 5);
+    EXPECT_LT(atEnd.size.height, 60);
+    rig_->keyboard().tap(Key::Home);
+    ASSERT_TRUE(awaitSelection({0, 0}));
+    const Rectangle atStart = caret();
+    EXPECT_GT(atEnd.origin.x, atStart.origin.x + 50);
+    EXPECT_GE(atStart.origin.x, window.x);
+    EXPECT_GE(atStart.origin.y, window.y);
+    EXPECT_LT(atStart.origin.x, window.x + 40);
+
+    rig_->keyboard().chord({Key::LeftShift}, Key::End);
+    ASSERT_TRUE(awaitSelection({0, 14}));
+    EXPECT_NEAR(caret().size.width, atEnd.origin.x - atStart.origin.x, 2);
+    EXPECT_GT(AXUtils::getFocusedUIElementBound(*accessibility_).size.width, 100);
+}
+
+TEST_P(AccessibilityTest, PasswordsAreNoticedAndNotRead) {
+    EXPECT_FALSE(accessibility_->focusIsPassword());
+    target_->showPassword(true);
+    ASSERT_TRUE(await([] { return accessibility_->focusIsPassword(); }));
+    const auto focused = AXUtils::getFocusedUIElement(*accessibility_);
+    ASSERT_TRUE(focused);
+    EXPECT_EQ(focused->stringAttribute("AXSubrole"), std::optional<std::u16string>(u"AXSecureTextField"));
+    EXPECT_TRUE(focused->rangeAttribute("AXSelectedTextRange"));
+    EXPECT_EQ(focused->stringAttribute("AXValue"), std::nullopt);
+    EXPECT_EQ(focused->stringForRange("AXStringForRange", {0, 1}), std::nullopt);
+    target_->showPassword(false);
+    EXPECT_TRUE(await([] { return !accessibility_->focusIsPassword(); }));
+}
+
+TEST_P(AccessibilityTest, AProgramThatIsKilledTakesItsPasswordAlong) {
+    target_->showPassword(true);
+    ASSERT_TRUE(await([] { return accessibility_->focusIsPassword(); }));
+    ASSERT_EQ(kill(target_->pid(), SIGKILL), 0);
+    EXPECT_TRUE(await([] { return !accessibility_->focusIsPassword(); }));
+    EXPECT_EQ(accessibility_->frontApplicationElement(), nullptr);
+}
+
+TEST_P(AccessibilityTest, FocusIsFollowedFromProgramToProgram) {
+    const auto other = startFocused(TargetKind::GtkTextView);
+    rig_->keyboard().type("there");
+    EXPECT_TRUE(await([] { return AXUtils::getValue(*accessibility_) == u"there"; }));
+    target_->activate();
+    EXPECT_TRUE(await([&] { return accessibility_->focusedProcess() == target_->pid(); }));
+    rig_->keyboard().type("here");
+    EXPECT_TRUE(await([] { return AXUtils::getValue(*accessibility_) == u"here"; }));
+    // A terminal tells nothing: whoever had the focus before must not stand for it.
+    const auto terminal = rig_->startTarget(TargetKind::Xterm);
+    EXPECT_TRUE(await([] { return accessibility_->frontApplicationElement() == nullptr; }));
+}
+
+TEST_P(AccessibilityTest, AProgramThatHangsCostsTwentyMilliseconds) {
+    write("waiting");
+    ASSERT_EQ(kill(target_->pid(), SIGSTOP), 0);
+    const auto begin = steady_clock::now();
+    // What a quick typist's corrections ask within a second.
+    for (int key = 0; key < 20; ++key) {
+        EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3), std::nullopt);
+        EXPECT_FALSE(accessibility_->focusIsPassword());
+    }
+    const auto cost = steady_clock::now() - begin;
+    ASSERT_EQ(kill(target_->pid(), SIGCONT), 0);
+    EXPECT_LE(cost, std::chrono::milliseconds(20)) << std::chrono::duration<double, std::milli>(cost).count();
+    using Text = std::optional<std::u16string>;
+    EXPECT_TRUE(await([] { return AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3) == Text(u"ing"); }));
+}
+
+INSTANTIATE_TEST_SUITE_P(All, AccessibilityTest, testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit),
+                         [](const auto& tested) { return nameOf(tested.param); });
+
+TEST_F(AccessibilityDesktop, WhatHadTheFocusBeforeIsFound) {
+    const auto target = startFocused(TargetKind::GtkTextView);
+    accessibility_.reset();  // one at a time
+    accessibility_ = std::make_unique<AtspiAccessibility>();
+    EXPECT_TRUE(await([&] { return accessibility_->focusedProcess() == target->pid(); }));
+}
+
+TEST_F(AccessibilityDesktop, TellsThatTheSessionHasNotSwitchedItOn) {
+    EXPECT_EQ(accessibility_->status(), AccessibilityStatus::SwitchedOff);
+    EXPECT_THAT(sentenceOf(accessibility_->status()), testing::HasSubstr("toolkit-accessibility true"));
+}
+
+// ---- Sessions without accessibility: each in a process of its own, because libatspi keeps what it found. ----
+
+[[noreturn]] void reportStatus(const char* sessionBus) {
+    if (sessionBus != nullptr) {
+        setenv("DBUS_SESSION_BUS_ADDRESS", sessionBus, 1);
+    } else {
+        unsetenv("DBUS_SESSION_BUS_ADDRESS");
+    }
+    setenv("XDG_RUNTIME_DIR", "/nonexistent", 1);
+    unsetenv("DISPLAY");
+    const AtspiAccessibility accessibility;
+    const bool told = await([&] { return accessibility.status() != AccessibilityStatus::Starting; });
+    const bool silent = accessibility.frontApplicationElement() == nullptr && !accessibility.focusIsPassword();
+    std::exit(told && silent ? static_cast<int>(accessibility.status()) : 100);
+}
+
+TEST(AccessibilityMissingDeathTest, NoSession) {
+    GTEST_FLAG_SET(death_test_style, "threadsafe");
+    const auto noSession = testing::ExitedWithCode(static_cast<int>(AccessibilityStatus::NoSession));
+    EXPECT_EXIT(reportStatus(nullptr), noSession, "");
+    EXPECT_EXIT(reportStatus("unix:path=/nonexistent/bus"), noSession, "");
+}
+
+// A bus that takes the connection and never says anything.
+[[noreturn]] void startAndEndWithSilentBus() {
+    const FileDescriptor listener(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
+    sockaddr_un address{};
+    address.sun_family = AF_UNIX;
+    const std::string name = "plume-silent-bus-" + std::to_string(getpid());
+    std::memcpy(address.sun_path + 1, name.data(), name.size());
+    const auto size = static_cast<socklen_t>(offsetof(sockaddr_un, sun_path) + 1 + name.size());
+    if (bind(listener.get(), reinterpret_cast<sockaddr*>(&address), size) != 0 || listen(listener.get(), 5) != 0) {
+        std::exit(100);
+    }
+    setenv("DBUS_SESSION_BUS_ADDRESS", ("unix:abstract=" + name).c_str(), 1);
+    const auto begin = steady_clock::now();
+    { const AtspiAccessibility accessibility; }
+    const bool quick = steady_clock::now() - begin < std::chrono::milliseconds(500);
+    std::exit(quick ? 0 : 1);
+}
+
+TEST(AccessibilityMissingDeathTest, SilentBusDelaysNeitherStartNorEnd) {
+    GTEST_FLAG_SET(death_test_style, "threadsafe");
+    EXPECT_EXIT(startAndEndWithSilentBus(), testing::ExitedWithCode(0), "");
+}
+
+}  // namespace
+
+}  // namespace plume::rig
