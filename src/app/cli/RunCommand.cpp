@@ -93,16 +93,18 @@ class Run {
             port_.mainLoop().perform(
                 [this, &service] { service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost); });
             composition.start();
-            if (service.evenTapCreated()) {
-                output_ << "Plume is ready: " << library_.snippetCount() << " snippets from " << library_.file.string()
-                        << ". Ctrl+C ends it." << std::endl;
-            } else {
-                // What is missing was told already.
-                end(ExitStatus::MissingSystem);
-            }
+            // After the start, which waits in the loop, too.
+            port_.tapLoop().perform([this, &service] { tellWhetherStarted(service); });
             port_.tapLoop().run();
         }
         port_.leave();
+    }
+
+    void tellWhetherStarted(const MacInputService& service) {
+        // What is missing was told already.
+        if (!service.evenTapCreated()) return end(ExitStatus::MissingSystem);
+        output_ << "Plume is ready: " << library_.snippetCount() << " snippets from " << library_.file.string()
+                << ". Ctrl+C ends it." << std::endl;
     }
 
     Composition::Surroundings surroundings() {
