@@ -23,6 +23,9 @@ constexpr std::uint32_t LongestProperty = 1024;  // words
 constexpr int DeepestWindow = 32;
 constexpr int FocusAttempts = 4;
 constexpr std::uint32_t AskedByPager = 2;
+// What tells who is in front, of the root window and of the window in front.
+constexpr std::string_view RootNames[] = {"_NET_ACTIVE_WINDOW", "_NET_SUPPORTING_WM_CHECK"};
+constexpr std::string_view WindowNames[] = {"WM_CLASS", "_NET_WM_PID", "_GTK_APPLICATION_ID", "WM_CLIENT_MACHINE"};
 
 std::string ownHostName() {
     std::array<char, HOST_NAME_MAX + 1> name{};
@@ -84,6 +87,9 @@ std::optional<std::u16string> unlessEmpty(const std::string& text) {
 
 X11ProcessManager::X11ProcessManager(X11Session& session, std::shared_ptr<const DesktopFiles> desktopFiles)
     : session_(session), desktopFiles_(std::move(desktopFiles)), hostName_(ownHostName()) {
+    // Asked now, so that no key waits for it.
+    for (const std::string_view name : RootNames) session_.connection().atom(name);
+    for (const std::string_view name : WindowNames) session_.connection().atom(name);
     session_.listen(session_.connection().root(), XCB_EVENT_MASK_PROPERTY_CHANGE);
     for (const int type : {XCB_PROPERTY_NOTIFY, XCB_FOCUS_OUT, XCB_FOCUS_IN, XCB_DESTROY_NOTIFY}) {
         observers_.push_back(session_.addObserver(static_cast<std::uint8_t>(type),
@@ -103,7 +109,8 @@ void X11ProcessManager::hear(const xcb_generic_event_t& event) {
     const int type = event.response_type & 0x7F;
     if (type == XCB_DESTROY_NOTIFY) {
         const auto window = reinterpret_cast<const xcb_destroy_notify_event_t&>(event).window;
-        if (window == manager_.window || window == front_.window) isKnown_ = false;
+        if (window == manager_.window) watch(manager_, {});
+        if (window == front_.window || manager_.window == XCB_WINDOW_NONE) isKnown_ = false;
         return;
     }
     if (type != XCB_PROPERTY_NOTIFY) {
@@ -111,14 +118,11 @@ void X11ProcessManager::hear(const xcb_generic_event_t& event) {
         return;
     }
     const auto& change = reinterpret_cast<const xcb_property_notify_event_t&>(event);
-    XcbConnection& connection = session_.connection();
-    const bool isOfRoot = change.window == connection.root();
-    if (!isOfRoot && change.window != front_.window) return;
-    static constexpr std::string_view RootNames[] = {"_NET_ACTIVE_WINDOW", "_NET_SUPPORTING_WM_CHECK"};
-    static constexpr std::string_view WindowNames[] = {"WM_CLASS", "_NET_WM_PID", "_GTK_APPLICATION_ID"};
-    const auto matters = [&](std::string_view name) { return connection.atom(name) == change.atom; };
+    const auto matters = [&](std::string_view name) { return session_.connection().atom(name) == change.atom; };
+    const bool isOfRoot = change.window == session_.connection().root();
     const bool changes = isOfRoot ? std::any_of(std::begin(RootNames), std::end(RootNames), matters)
-                                  : std::any_of(std::begin(WindowNames), std::end(WindowNames), matters);
+                                  : change.window == front_.window &&
+                                        std::any_of(std::begin(WindowNames), std::end(WindowNames), matters);
     if (changes) isKnown_ = false;
 }
 
@@ -128,7 +132,10 @@ ProcessSerialNumber X11ProcessManager::currentProcess() const {
 
 std::optional<ProcessSerialNumber> X11ProcessManager::frontProcess() const {
     session_.collect();
-    if (!isKnown_) const_cast<X11ProcessManager*>(this)->lookUp();
+    if (!isKnown_) {
+        const_cast<X11ProcessManager*>(this)->lookUp();
+        session_.collect();
+    }
     return frontProcess_;
 }
 
@@ -154,11 +161,13 @@ xcb_window_t X11ProcessManager::activeWindow() {
     const PropertyRequest active(connection, connection.root(), "_NET_ACTIVE_WINDOW");
     const xcb_window_t manager = check.word();
     const xcb_window_t window = active.word();
-    watch(manager_, {manager, XCB_EVENT_MASK_STRUCTURE_NOTIFY});
-    if (manager == XCB_WINDOW_NONE || PropertyRequest(connection, manager, Check).word() != manager) {
-        return XCB_WINDOW_NONE;
+    if (manager == XCB_WINDOW_NONE || manager != manager_.window) {
+        watch(manager_, {manager, XCB_EVENT_MASK_STRUCTURE_NOTIFY});
+        const bool isThere =
+            manager != XCB_WINDOW_NONE && PropertyRequest(connection, manager, Check).word() == manager;
+        if (!isThere) watch(manager_, {});
     }
-    return window;
+    return manager_.window == XCB_WINDOW_NONE ? xcb_window_t{XCB_WINDOW_NONE} : window;
 }
 
 // Asked again once it is watched: it may have changed before.
@@ -278,7 +287,7 @@ void X11ProcessManager::bringToFront(ProcessSerialNumber process) {
                        XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY | XCB_EVENT_MASK_SUBSTRUCTURE_REDIRECT,
                        reinterpret_cast<const char*>(&message));
     }
-    connection.flush();
+    session_.flush();
 }
 
 // Where the process was seen last, or else the topmost of its windows.

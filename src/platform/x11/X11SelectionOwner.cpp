@@ -97,7 +97,7 @@ void X11SelectionOwner::answer(const xcb_selection_request_event_t& request) {
     event.notify.target = request.target;
     event.notify.property = given ? property : xcb_atom_t{XCB_ATOM_NONE};
     xcb_send_event(session_.get(), 0, request.requestor, XCB_EVENT_MASK_NO_EVENT, event.bytes);
-    session_.connection().flush();
+    session_.flush();
 }
 
 bool X11SelectionOwner::give(xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property) {

@@ -92,6 +92,7 @@ std::optional<X11SelectionValue> X11SelectionReader::ask(xcb_atom_t target) {
     xcb_convert_selection(session_.get(), session_.window(), selection_, target, question_.property, question_.time);
     auto value = takeAnswer();
     question_ = {};
+    session_.collect();
     lastAsked_ = runLoop_.now();
     spent_ += lastAsked_ - start;
     return value;

@@ -91,7 +91,7 @@ void X11SelectionTransfers::propertyWasRemoved(const Key& key) {
     } else {
         sendPiece(key, transfer);
     }
-    session_.connection().flush();
+    session_.flush();
     if (taken) taken();
 }
 

@@ -98,17 +98,29 @@ void X11Session::collect() {
         dispatch(*event, true);
         collected_.push_back(std::move(event));
     }
+    // The loop cannot see by itself that there is something to do.
+    if (collected_.empty() || drains_ || std::exchange(drainIsDue_, true)) return;
+    runLoop_.perform([this, alive = std::weak_ptr(alive_)] {
+        if (alive.lock()) drain();
+    });
+}
+
+void X11Session::flush() {
+    connection_->flush();
+    collect();
 }
 
 void X11Session::drain() {
-    collect();
+    drains_ = true;
+    flush();
     while (!collected_.empty()) {
         const auto event = std::move(collected_.front());
         collected_.pop_front();
         dispatch(*event, false);
-        collect();
+        flush();
     }
-    connection_->flush();
+    drains_ = false;
+    drainIsDue_ = false;
     if (!connection_->isBroken() || std::exchange(serverIsGone_, true)) return;
     runLoop_.removeSource(connection_->descriptor());
     if (serverGone) serverGone();
@@ -117,12 +129,11 @@ void X11Session::drain() {
 bool X11Session::waitUntil(const std::function<bool()>& condition, double seconds) {
     const double end = runLoop_.now() + seconds;
     for (bool first = true;; first = false) {
-        collect();
+        if (!first && heartbeat) heartbeat();
+        flush();
         if (condition()) return true;
         const double left = end - runLoop_.now();
         if (left <= 0 || connection_->isBroken()) return false;
-        if (!first && heartbeat) heartbeat();
-        connection_->flush();
         pollfd entry{connection_->descriptor(), POLLIN, 0};
         // Rounded up: the last millisecond is not spent in a busy loop.
         poll(&entry, 1, static_cast<int>(std::ceil(std::min(left, LongestBetweenHeartbeats) * 1000)));

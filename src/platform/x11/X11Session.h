@@ -49,6 +49,8 @@ class X11Session {
 
     // Reads what has arrived, for the observers; the handlers come later, from the run loop. Never waits.
     void collect();
+    // Sends what has been asked for, then collects: while it sends, the library may read.
+    void flush();
     // Reads and handles all that has arrived. Never waits. Not from inside a handler.
     void drain();
     // Waits until the condition holds, collecting, at most so long; false when it still does not. The heartbeat beats
@@ -83,7 +85,10 @@ class X11Session {
     std::map<xcb_window_t, std::map<std::uint32_t, int>> masks_;  // how often each mask was asked for
     std::deque<XcbOwned<xcb_generic_event_t>> collected_;
     xcb_timestamp_t noticedTime_ = 0;
+    bool drains_ = false;
+    bool drainIsDue_ = false;
     bool serverIsGone_ = false;
+    const std::shared_ptr<int> alive_ = std::make_shared<int>();  // for calls that come after the end
 };
 
 }  // namespace plume

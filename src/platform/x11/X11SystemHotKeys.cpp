@@ -4,6 +4,8 @@
 #include <string>
 #include <utility>
 
+#include "platform/x11/XcbXkb.h"
+
 namespace plume {
 
 namespace {
@@ -61,16 +63,28 @@ X11SystemHotKeys::X11SystemHotKeys(X11Session& session, KeyCodeOf keyCodeOf)
     });
     releaseHandler_ = session_.addHandler(XCB_KEY_RELEASE, [this](const xcb_generic_event_t& event) {
         const auto& release = reinterpret_cast<const xcb_key_release_event_t&>(event);
-        releasedKeyCode_ = release.detail;
-        releaseTime_ = release.time;
+        if (release.detail == heldKeyCode_) heldKeyCode_ = 0;
     });
+    tellRepeatsApart();
 }
 
 X11SystemHotKeys::~X11SystemHotKeys() {
     session_.removeHandler(pressHandler_);
     session_.removeHandler(releaseHandler_);
     for (const auto& hotKey : hotKeys_) ungrab(hotKey.second);
-    session_.connection().flush();
+    session_.flush();
+}
+
+// Repeats of a held key come as presses alone then, without a release before each.
+void X11SystemHotKeys::tellRepeatsApart() const {
+    if (!session_.connection().extension(xcb_xkb_id)) return;
+    xcb_connection_t* const server = session_.get();
+    const XcbOwned<xcb_xkb_use_extension_reply_t> use(
+        xcb_xkb_use_extension_reply(server, xcb_xkb_use_extension(server, 1, 0), nullptr));
+    if (!use) return;
+    constexpr std::uint32_t Detectable = XCB_XKB_PER_CLIENT_FLAG_DETECTABLE_AUTO_REPEAT;
+    const auto cookie = xcb_xkb_per_client_flags(server, XCB_XKB_ID_USE_CORE_KBD, Detectable, Detectable, 0, 0, 0);
+    const XcbOwned<xcb_xkb_per_client_flags_reply_t> flags(xcb_xkb_per_client_flags_reply(server, cookie, nullptr));
 }
 
 std::vector<std::uint16_t> X11SystemHotKeys::lockVariants() const {
@@ -97,7 +111,7 @@ void X11SystemHotKeys::unregisterHotKey(Id id) {
     const auto found = hotKeys_.find(id);
     if (found == hotKeys_.end()) return;
     ungrab(found->second);
-    session_.connection().flush();
+    session_.flush();
     hotKeys_.erase(found);
 }
 
@@ -121,6 +135,7 @@ bool X11SystemHotKeys::grab(const HotKey& hotKey) const {
         succeeded = succeeded && !error;
     }
     if (!succeeded) ungrab(hotKey);
+    session_.flush();
     return succeeded && !session_.connection().isBroken();
 }
 
@@ -132,9 +147,7 @@ void X11SystemHotKeys::ungrab(const HotKey& hotKey) const {
 }
 
 void X11SystemHotKeys::pressed(const xcb_key_press_event_t& event) {
-    // A key that is held down repeats as releases and presses of the same moment.
-    const bool repeats = event.detail == releasedKeyCode_ && event.time == releaseTime_;
-    if (repeats) return;
+    if (std::exchange(heldKeyCode_, event.detail) == event.detail) return;
     const auto modifiers = static_cast<std::uint16_t>(event.state & MatteringModifiers);
     for (const auto& [id, hotKey] : hotKeys_) {
         if (hotKey.keyCode != event.detail || hotKey.modifiers != modifiers) continue;

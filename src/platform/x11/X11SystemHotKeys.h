@@ -33,6 +33,7 @@ class X11SystemHotKeys final : public SystemHotKeys {
         std::function<void()> handler;
     };
 
+    void tellRepeatsApart() const;
     bool grab(const HotKey& hotKey) const;
     void ungrab(const HotKey& hotKey) const;
     bool isRegistered(const HotKey& hotKey) const;
@@ -45,8 +46,7 @@ class X11SystemHotKeys final : public SystemHotKeys {
     std::map<Id, HotKey> hotKeys_;
     X11Session::HandlerId pressHandler_ = 0;
     X11Session::HandlerId releaseHandler_ = 0;
-    xcb_keycode_t releasedKeyCode_ = 0;
-    xcb_timestamp_t releaseTime_ = 0;
+    xcb_keycode_t heldKeyCode_ = 0;  // the hot key that is down
 };
 
 }  // namespace plume

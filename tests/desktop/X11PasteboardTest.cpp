@@ -1,0 +1,350 @@
+// The clipboard among other programs: what they are given, what is read from them, and who counts as having taken it.
+
+#include <algorithm>
+#include <chrono>
+#include <future>
+#include <iostream>
+
+#include "Foundation/Strings.h"
+#include "platform/x11/X11SelectionTypes.h"
+#include "tests/desktop/PasteboardTestSupport.h"
+
+namespace plume::rig {
+
+namespace {
+
+using std::chrono::duration_cast;
+using std::chrono::milliseconds;
+using std::chrono::steady_clock;
+using ::testing::Contains;
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+using ::testing::Not;
+
+const std::string String(PasteboardType::String);
+const std::string RTF(PasteboardType::RTF);
+const std::string RTFD(PasteboardType::RTFD);
+const std::string HTML(PasteboardType::HTML);
+
+constexpr std::size_t TwentyMegabytes = 20'000'000;
+
+SelectionData utf8(std::string text) {
+    return {"UTF8_STRING", 8, std::move(text)};
+}
+
+template <typename Call>
+milliseconds timeOf(Call call) {
+    const auto start = steady_clock::now();
+    call();
+    return duration_cast<milliseconds>(steady_clock::now() - start);
+}
+
+// ---- Offering ----
+
+TEST_F(X11PasteboardTest, OffersWrittenTextUnderTheNamesProgramsAskFor) {
+    write(u"na\u00efve \u65e5");
+    SelectionRequestor program(display());
+    EXPECT_THAT(program.targets("CLIPBOARD"), ElementsAre("TARGETS", "TIMESTAMP", "MULTIPLE", "UTF8_STRING",
+                                                          "text/plain;charset=utf-8", "text/plain", "STRING"));
+    for (const char* target : {"UTF8_STRING", "text/plain;charset=utf-8", "text/plain"}) {
+        EXPECT_EQ(program.request("CLIPBOARD", target), (SelectionData{target, 8, "na\u00efve \u65e5"}));
+    }
+    EXPECT_EQ(program.request("CLIPBOARD", "STRING"), (SelectionData{"STRING", 8, "na\xefve ?"}));
+    EXPECT_EQ(program.request("CLIPBOARD", "image/png"), std::nullopt);
+    const auto time = program.request("CLIPBOARD", "TIMESTAMP");
+    ASSERT_TRUE(time);
+    EXPECT_NE(wordsOf(time->bytes).at(0), 0U);
+}
+
+TEST_F(X11PasteboardTest, AnswersSeveralTargetsAtOnceAndNamesTheMissing) {
+    write(u"text");
+    SelectionRequestor program(display());
+    const auto values = program.requestMultiple("CLIPBOARD", {"UTF8_STRING", "image/png", "STRING"});
+    EXPECT_EQ(values, (std::map<std::string, SelectionData>{{"UTF8_STRING", utf8("text")},
+                                                            {"STRING", SelectionData{"STRING", 8, "text"}}}));
+}
+
+TEST_F(X11PasteboardTest, GivesTwentyMegabytesInPiecesToSeveralProgramsAtOnce) {
+    const std::string bytes = unevenBytes(TwentyMegabytes);
+    thread_->run([&] {
+        pasteboard_->declareTypes({"image/png"}, nullptr);
+        pasteboard_->setData(bytes, "image/png");
+    });
+    const auto read = [&] {
+        SelectionRequestor program(display());
+        const auto value = program.request("CLIPBOARD", "image/png");
+        return value && value->bytes == bytes && program.pieces() > 1;
+    };
+    const auto time = timeOf([&] { EXPECT_TRUE(read()); });
+    std::cout << "20 MB given in " << time.count() << " ms\n";
+    std::vector<std::future<bool>> readers;
+    for (int i = 0; i < 3; ++i) readers.push_back(std::async(std::launch::async, read));
+    for (auto& reader : readers) EXPECT_TRUE(reader.get());
+}
+
+TEST_F(X11PasteboardTest, RequestorsThatStopOrDieHarmNobody) {
+    const std::string large = unevenBytes(3'000'000);
+    thread_->run([&] {
+        pasteboard_->declareTypes({"image/png"}, nullptr);
+        pasteboard_->setData(large, "image/png");
+    });
+    SelectionRequestor stopped(display());
+    stopped.requestAndStop("CLIPBOARD", "image/png");
+    for (int i = 0; i < 3; ++i) {
+        SelectionRequestor dying(display());
+        dying.requestAndStop("CLIPBOARD", "image/png");
+    }
+    SelectionRequestor alive(display());
+    EXPECT_EQ(alive.request("CLIPBOARD", "image/png")->bytes, large);
+    EXPECT_EQ(stopped.request("CLIPBOARD", "image/png")->bytes, large);
+}
+
+TEST_F(X11PasteboardTest, RichContentIsOfferedAsHtmlAndPlainTextToo) {
+    NotingOwner owner(
+        NotingOwner::Contents{{RTFD, "rtfd"}, {RTF, "{\\rtf1 rich}"}, {HTML, "<b>rich</b>"}, {String, "rich"}});
+    declare({RTFD, RTF}, &owner);
+    EXPECT_THAT(types(), ElementsAre(RTFD, RTF));
+    SelectionRequestor program(display());
+    EXPECT_EQ(program.request("CLIPBOARD", "text/rtf")->bytes, "{\\rtf1 rich}");
+    EXPECT_EQ(program.request("CLIPBOARD", "application/rtf")->bytes, "{\\rtf1 rich}");
+    EXPECT_EQ(program.request("CLIPBOARD", "text/html")->bytes, "<b>rich</b>");
+    EXPECT_EQ(program.request("CLIPBOARD", "UTF8_STRING")->bytes, "rich");
+    EXPECT_EQ(program.request("CLIPBOARD", RTFD)->bytes, "rtfd");
+}
+
+TEST_F(X11PasteboardTest, ClipboardManagersAreToldToForgetExpansionsAlone) {
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
+    SelectionRequestor manager(display());
+    declare({String}, &owner);
+    EXPECT_EQ(manager.request("CLIPBOARD", "x-kde-passwordManagerHint")->bytes, "secret");
+    declare({String, "UTF8_STRING"}, &owner);
+    EXPECT_EQ(manager.request("CLIPBOARD", "x-kde-passwordManagerHint"), std::nullopt);
+    EXPECT_EQ(manager.request("CLIPBOARD", "UTF8_STRING")->bytes, "given back");
+    write(u"copied");
+    EXPECT_THAT(manager.targets("CLIPBOARD"), Not(Contains("x-kde-passwordManagerHint")));
+}
+
+TEST_F(X11PasteboardTest, OwnContentIsReadWithoutTheServer) {
+    NotingOwner owner(NotingOwner::Contents{{String, "promised"}});
+    declare({String}, &owner);
+    EXPECT_EQ(string(), u"promised");
+    EXPECT_EQ(data(String), "promised");
+    EXPECT_EQ(data(HTML), std::nullopt);
+    declare({}, nullptr);
+    EXPECT_THAT(types(), IsEmpty());
+    EXPECT_EQ(string(), std::nullopt);
+    EXPECT_EQ(rig_->client().selectionOwner("CLIPBOARD"), 0U);
+}
+
+// ---- Who has taken it ----
+
+TEST_F(X11PasteboardTest, OnlyWhatTheProgramInFrontHasReadWasTaken) {
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {HTML, "<i>expansion</i>"}});
+    SelectionRequestor front(display());
+    front.comeToFront(rig_->client());
+    SelectionRequestor manager(display());
+    declare({String, HTML}, &owner);
+    manager.readAll("CLIPBOARD");
+    front.targets("CLIPBOARD");
+    front.request("CLIPBOARD", "TIMESTAMP");
+    EXPECT_THAT(owner.taken(), IsEmpty());
+    front.request("CLIPBOARD", "UTF8_STRING");
+    EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
+    manager.readAll("CLIPBOARD");
+    front.request("CLIPBOARD", "text/html");
+    EXPECT_THAT(owner.awaitTaken(2), ElementsAre(String, HTML));
+}
+
+TEST_F(X11PasteboardTest, LongContentWasTakenWithItsLastPiece) {
+    const std::string text(5'000'000, 'x');
+    NotingOwner owner(NotingOwner::Contents{{String, text}});
+    SelectionRequestor front(display());
+    front.comeToFront(rig_->client());
+    declare({String}, &owner);
+    front.requestAndStop("CLIPBOARD", "UTF8_STRING");
+    EXPECT_THAT(owner.taken(), IsEmpty());
+    EXPECT_EQ(front.request("CLIPBOARD", "UTF8_STRING")->bytes, text);
+    EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
+}
+
+// ---- Changes ----
+
+TEST_F(X11PasteboardTest, CountsItsOwnAndOtherProgramsChangesOnce) {
+    const std::int64_t first = declare({String}, nullptr);
+    EXPECT_EQ(changeCount(), first);
+    const std::int64_t second = declare({String}, nullptr);
+    EXPECT_EQ(second, first + 1);
+    EXPECT_EQ(changeCount(), second);
+    SelectionRequestor(display()).readAll("CLIPBOARD");
+    EXPECT_EQ(changeCount(), second) << "reading changes nothing";
+    auto other = copyElsewhere({{"UTF8_STRING", utf8("theirs")}});
+    EXPECT_EQ(changeCount(), second + 1);
+    EXPECT_EQ(string(), u"theirs");
+    const std::int64_t third = declare({}, nullptr);
+    EXPECT_EQ(changeCount(), third);
+    EXPECT_EQ(third, second + 2);
+}
+
+TEST_F(X11PasteboardTest, LosesItsContentToWhoeverCopies) {
+    write(u"ours");
+    EXPECT_EQ(string(), u"ours");
+    auto other = copyElsewhere({{"UTF8_STRING", utf8("theirs")}});
+    EXPECT_FALSE(thread_->run([&] { return pasteboard_->isOffering(); }));
+    EXPECT_EQ(string(), u"theirs");
+    other.reset();
+    awaitNoOwner();
+    EXPECT_EQ(string(), std::nullopt);
+}
+
+// ---- Reading ----
+
+TEST_F(X11PasteboardTest, ReadsTextUnderItsBestName) {
+    struct Case {
+        SelectionOffer offer;
+        std::optional<std::u16string> expected;
+    };
+    const Case cases[] = {
+        {{{"STRING", {"STRING", 8, "na\xefve"}}, {"UTF8_STRING", utf8("na\u00efve")}}, u"na\u00efve"},
+        {{{"STRING", {"STRING", 8, "na\xefve"}}}, u"na\u00efve"},
+        {{{"text/plain", {"text/plain", 8, "na\xefve"}}}, u"na\u00efve"},
+        {{{"text/plain", {"text/plain", 8, "na\u00efve"}}}, u"na\u00efve"},
+        {{{"text/plain;charset=utf-8", {"text/plain;charset=utf-8", 8, ""}}}, u""},
+        {{{"image/png", {"image/png", 8, "png"}}}, std::nullopt},
+    };
+    for (const Case& one : cases) {
+        const auto owner = copyElsewhere(one.offer);
+        EXPECT_EQ(string(), one.expected) << one.offer.front().first;
+    }
+}
+
+TEST_F(X11PasteboardTest, KeepsEveryNameAndSkipsWhatOnlySteersTheExchange) {
+    const auto owner = copyElsewhere({{"text/html", {"text/html", 8, "<b>x</b>"}},
+                                      {"application/rtf", {"application/rtf", 8, "{\\rtf1 x}"}},
+                                      {"UTF8_STRING", utf8("x")},
+                                      {"DELETE", {"NULL", 8, ""}},
+                                      {"odd", {"odd", 8, std::string("\0\1", 2)}}});
+    EXPECT_THAT(types(), ElementsAre(HTML, "text/html", RTF, "application/rtf", String, "UTF8_STRING", "odd"));
+    EXPECT_EQ(data(HTML), "<b>x</b>");
+    EXPECT_EQ(data(RTF), "{\\rtf1 x}");
+    EXPECT_EQ(data("odd"), std::string("\0\1", 2));
+    EXPECT_EQ(data("DELETE"), std::nullopt);
+    EXPECT_EQ(data("never offered"), std::nullopt);
+}
+
+TEST_F(X11PasteboardTest, ReadsTwentyMegabytesInPieces) {
+    const std::string bytes = unevenBytes(TwentyMegabytes);
+    const auto owner = copyElsewhere({{"image/png", {"image/png", 8, bytes}}});
+    std::optional<std::string> read;
+    const auto time = timeOf([&] { read = data("image/png"); });
+    std::cout << "20 MB read in " << time.count() << " ms\n";
+    EXPECT_TRUE(read == bytes);
+}
+
+TEST_F(X11PasteboardTest, AnOwnerThatNeverAnswersIsAskedOnce) {
+    int beats = 0;
+    thread_->run([&] { thread_->session().heartbeat = [&] { ++beats; }; });
+    ForeignOwner::Options silent;
+    silent.behaviour = ForeignOwner::Behaviour::NeverAnswers;
+    auto owner = copyElsewhere({{"UTF8_STRING", utf8("never seen")}}, silent);
+    const auto first = timeOf([&] { EXPECT_THAT(types(), IsEmpty()); });
+    EXPECT_GE(first, milliseconds(250));
+    EXPECT_LE(first, milliseconds(1000));
+    EXPECT_GE(beats, 2);
+    const auto second = timeOf([&] {
+        EXPECT_THAT(types(), IsEmpty());
+        EXPECT_EQ(string(), std::nullopt);
+        EXPECT_EQ(data("UTF8_STRING"), std::nullopt);
+    });
+    EXPECT_LE(second, milliseconds(100));
+    EXPECT_EQ(owner->requests(), 1);
+    owner = copyElsewhere({{"UTF8_STRING", utf8("answered")}});
+    EXPECT_EQ(string(), u"answered");
+}
+
+TEST_F(X11PasteboardTest, AnOwnerThatDiesInTheMiddleIsNotWaitedFor) {
+    ForeignOwner::Options dying;
+    dying.behaviour = ForeignOwner::Behaviour::DiesInTheMiddle;
+    const auto owner = copyElsewhere({{"image/png", {"image/png", 8, unevenBytes(2'000'000)}}}, dying);
+    std::optional<std::string> read;
+    const auto time = timeOf([&] { read = data("image/png"); });
+    EXPECT_EQ(read, std::nullopt);
+    EXPECT_LE(time, milliseconds(900)) << "noticed when it died, not when the time was over";
+    EXPECT_EQ(owner->requests(), 2) << "TARGETS and the image";
+    write(u"goes on");
+    EXPECT_EQ(SelectionRequestor(display()).request("CLIPBOARD", "UTF8_STRING"), utf8("goes on"));
+}
+
+// ---- The selection for terminals ----
+
+TEST_F(X11PasteboardTest, TerminalsFindTheExpansionInPrimaryAndThenWhatWasSelected) {
+    bool isTerminal = true;
+    thread_->run([&] { pasteboard_->pastesPrimary = [&] { return isTerminal; }; });
+    ForeignOwner::Options primary;
+    primary.selection = "PRIMARY";
+    const ForeignOwner selected(display(), {{"UTF8_STRING", utf8("selected")}}, primary);
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
+    SelectionRequestor program(display());
+    for (int round = 0; round < 2; ++round) {
+        declare({String}, &owner);
+        EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("expansion"));
+    }
+    declare({String, "UTF8_STRING"}, &owner);
+    EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("selected"));
+    EXPECT_EQ(program.request("CLIPBOARD", "UTF8_STRING"), utf8("given back"));
+    isTerminal = false;
+    declare({String}, &owner);
+    EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("selected"));
+}
+
+TEST_F(X11PasteboardTest, PrimaryIsLeftAloneAfterANewSelectionAndEmptyWhenItWas) {
+    thread_->run([&] { pasteboard_->pastesPrimary = [] { return true; }; });
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
+    SelectionRequestor program(display());
+    declare({String}, &owner);
+    EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("expansion"));
+    write(u"copied");
+    EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), std::nullopt);
+    declare({String}, &owner);
+    ForeignOwner::Options primary;
+    primary.selection = "PRIMARY";
+    const ForeignOwner selected(display(), {{"UTF8_STRING", utf8("newly selected")}}, primary);
+    write(u"copied");
+    EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("newly selected"));
+}
+
+// ---- The end ----
+
+TEST_F(X11PasteboardTest, LeavesItsContentToAClipboardManager) {
+    const std::string text(3'000'000, 'x');
+    std::string saved;
+    ForeignOwner::Options options;
+    options.selection = "CLIPBOARD_MANAGER";
+    options.beforeAnswer = [&](const std::string& target) {
+        if (target == "SAVE_TARGETS") saved = SelectionRequestor(display()).request("CLIPBOARD", "UTF8_STRING")->bytes;
+    };
+    const ForeignOwner manager(display(), {{"SAVE_TARGETS", {"NULL", 8, ""}}}, options);
+    const auto handOver = [&] {
+        thread_->end();
+        pasteboard_->handOver();
+    };
+    write(fromUtf8(text));
+    handOver();
+    EXPECT_TRUE(saved == text);
+}
+
+TEST_F(X11PasteboardTest, HandingOverWaitsForNoManagerAndForNoneThatHangs) {
+    write(u"text");
+    thread_->end();
+    EXPECT_LE(timeOf([&] { pasteboard_->handOver(); }), milliseconds(200));
+    ForeignOwner::Options silent;
+    silent.selection = "CLIPBOARD_MANAGER";
+    silent.behaviour = ForeignOwner::Behaviour::NeverAnswers;
+    const ForeignOwner manager(display(), {}, silent);
+    const auto time = timeOf([&] { pasteboard_->handOver(); });
+    EXPECT_GE(time, milliseconds(400));
+    EXPECT_LE(time, milliseconds(1000));
+}
+
+}  // namespace
+
+}  // namespace plume::rig

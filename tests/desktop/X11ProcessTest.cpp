@@ -1,0 +1,426 @@
+// Who has the keyboard, who may have it, and the keys that the server itself keeps for Plume.
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <chrono>
+#include <condition_variable>
+#include <csignal>
+#include <fstream>
+#include <future>
+#include <iostream>
+#include <mutex>
+
+#include "platform/x11/DesktopFiles.h"
+#include "platform/x11/X11ProcessManager.h"
+#include "platform/x11/X11SecureInput.h"
+#include "platform/x11/X11SystemHotKeys.h"
+#include "tests/desktop/DesktopRig.h"
+#include "tests/desktop/SessionThread.h"
+
+namespace plume::rig {
+
+namespace {
+
+namespace fs = std::filesystem;
+using std::chrono::steady_clock;
+
+void writeFile(const fs::path& path, const std::string& text) {
+    fs::create_directories(path.parent_path());
+    std::ofstream(path) << text;
+}
+
+std::string desktopEntry(const std::string& lines) {
+    return "# a comment\n[Desktop Entry]\nType=Application\n" + lines + "\n[Desktop Action new]\nName=New\n";
+}
+
+// ---- Desktop files ----
+
+TEST(DesktopFiles, AreFoundInTheOrderOfWhatTellsMost) {
+    const PrivateDirectory directory;
+    const fs::path applications = directory.path() / "applications";
+    writeFile(applications / "by-class.desktop", desktopEntry("Name=A\nStartupWMClass=Class"));
+    writeFile(applications / "by-instance.desktop", desktopEntry("Name=B\nStartupWMClass=instance"));
+    writeFile(applications / "org.gtk.App.desktop", desktopEntry("Name=C"));
+    writeFile(applications / "Editor.desktop", desktopEntry("Name=D\nExec=/usr/bin/python3 editor"));
+    writeFile(applications / "kde/viewer.desktop", desktopEntry("Name=E\nExec=python3 viewer"));
+    writeFile(applications / "by-program.desktop", desktopEntry("Name=F\nExec=env LANG=C \"/opt/tool\" %U"));
+    writeFile(applications / "broken.desktop", std::string("=\n[\n[Desktop Entry]\n=x\nName\n Exec = \n\0", 36));
+    const DesktopFiles files({directory.path(), directory.path() / "missing"}, "de_DE.UTF-8");
+
+    struct Case {
+        WindowIdentity window;
+        std::string identifier;
+    };
+    const Case cases[] = {
+        {{"Class", "instance", "org.gtk.App", "tool"}, "by-class"},
+        {{"class", "", "", ""}, "by-class"},
+        {{"Other", "instance", "org.gtk.App", "tool"}, "by-instance"},
+        {{"Editor", "other", "org.gtk.App", "tool"}, "org.gtk.App"},
+        {{"editor", "kde-viewer", "", "tool"}, "Editor"},
+        {{"Other", "kde-viewer", "", "tool"}, "kde-viewer"},
+        {{"Other", "other", "", "tool"}, "by-program"},
+        {{"Other", "other", "", "python3"}, ""},
+        {{"", "", "", ""}, ""},
+    };
+    for (const Case& one : cases) {
+        const DesktopFile* const file = files.find(one.window);
+        EXPECT_EQ(file ? file->identifier : "", one.identifier) << one.window.windowClass << one.window.windowInstance;
+    }
+}
+
+TEST(DesktopFiles, TheUsersOwnFilesAndLanguageCome) {
+    const PrivateDirectory user;
+    const PrivateDirectory system;
+    writeFile(user.path() / "applications/app.desktop", desktopEntry("Name=Mine\nName[de]=Meins\nName[de_AT]=Mein's"));
+    writeFile(system.path() / "applications/app.desktop", desktopEntry("Name=Theirs"));
+    const auto nameIn = [&](const char* locale) {
+        return DesktopFiles({user.path(), system.path()}, locale).find({"App", "", "", ""})->name;
+    };
+    EXPECT_EQ(nameIn("de_AT.UTF-8"), "Mein's");
+    EXPECT_EQ(nameIn("de_DE@euro"), "Meins");
+    EXPECT_EQ(nameIn("C"), "Mine");
+}
+
+// ---- Processes ----
+
+class X11ProcessTest : public testing::Test {
+  protected:
+    static void SetUpTestSuite() { rig_ = std::make_unique<DesktopRig>(); }
+    static void TearDownTestSuite() { rig_.reset(); }
+
+    void SetUp() override {
+        const fs::path applications = rig_->directory() / "share/applications";
+        writeFile(applications / "org.example.Writer.desktop",
+                  desktopEntry("Name=Example Writer\nStartupWMClass=qt_target"));
+        writeFile(applications / "example-term.desktop", desktopEntry("Name=Example Terminal\nStartupWMClass=XTerm"));
+        const auto files = std::make_shared<const DesktopFiles>(std::vector{rig_->directory() / "share"}, "C");
+        thread_ = std::make_unique<SessionThread>(rig_->server().display());
+        processes_ = thread_->run([&] { return std::make_unique<X11ProcessManager>(thread_->session(), files); });
+    }
+    void TearDown() override {
+        thread_->end();
+        processes_.reset();
+    }
+
+    std::optional<ProcessSerialNumber> front() {
+        return thread_->run([&] { return processes_->frontProcess(); });
+    }
+    std::optional<RunningApplication> application(ProcessSerialNumber process) {
+        return thread_->run([&] { return processes_->runningApplication(process); });
+    }
+    ProcessSerialNumber awaitFront(const TargetProgram& target) {
+        rig_->client().await("the program in front", Milliseconds(10'000), [&] {
+            const auto process = front();
+            return process && process->lowLongOfPSN == static_cast<std::uint32_t>(target.pid());
+        });
+        return *front();
+    }
+
+    // The process in front, and what the answer took, in microseconds, when it was not known before.
+    std::pair<std::int64_t, std::optional<double>> timedFrontProcess() {
+        return thread_->run([&] {
+            const int before = processes_->lookUps();
+            const auto start = steady_clock::now();
+            const auto process = processes_->frontProcess();
+            const auto application = process ? processes_->runningApplication(*process) : std::nullopt;
+            const std::chrono::duration<double, std::micro> time = steady_clock::now() - start;
+            const bool isNew = processes_->lookUps() != before;
+            return std::pair(application ? application->processIdentifier : 0,
+                             isNew ? std::optional(time.count()) : std::nullopt);
+        });
+    }
+
+    static inline std::unique_ptr<DesktopRig> rig_;
+    std::unique_ptr<SessionThread> thread_;
+    std::unique_ptr<X11ProcessManager> processes_;
+};
+
+TEST_F(X11ProcessTest, NamesTheProgramInFrontAndBringsOthersThere) {
+    struct Case {
+        TargetKind kind;
+        std::u16string identifier;
+        std::u16string name;
+    };
+    const Case cases[] = {{TargetKind::GtkTextView, u"Gtk_target", u"Gtk_target"},
+                          {TargetKind::QtTextEdit, u"org.example.Writer", u"Example Writer"},
+                          {TargetKind::Xterm, u"example-term", u"Example Terminal"}};
+    std::vector<std::unique_ptr<TargetProgram>> targets;
+    std::vector<ProcessSerialNumber> numbers;
+    for (const Case& one : cases) {
+        targets.push_back(rig_->startTarget(one.kind));
+        numbers.push_back(awaitFront(*targets.back()));
+        const auto found = application(numbers.back());
+        ASSERT_TRUE(found);
+        EXPECT_EQ(found->processIdentifier, targets.back()->pid());
+        EXPECT_EQ(found->bundleIdentifier, one.identifier);
+        EXPECT_EQ(found->localizedName, one.name);
+        EXPECT_TRUE(found->executableURL);
+    }
+    for (std::size_t i = 0; i < targets.size(); ++i) {
+        thread_->run([&] { processes_->bringToFront(numbers[i]); });
+        EXPECT_EQ(awaitFront(*targets[i]), numbers[i]);
+        rig_->client().await("the focus", Milliseconds(10'000), [&] {
+            return rig_->client().isInside(rig_->client().focusedWindow(), targets[i]->window());
+        });
+    }
+    const auto ended = numbers.front();
+    targets.erase(targets.begin());
+    rig_->client().await("its end", Milliseconds(10'000), [&] { return !application(ended); });
+}
+
+TEST_F(X11ProcessTest, AnswersAreKnownUntilSomethingChanges) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    const auto process = awaitFront(*target);
+    const auto [lookUps, each] = thread_->run([&] {
+        const int before = processes_->lookUps();
+        constexpr int count = 1000;
+        const auto start = steady_clock::now();
+        for (int i = 0; i < count; ++i) {
+            EXPECT_EQ(processes_->frontProcess(), process);
+            EXPECT_TRUE(processes_->runningApplication(process));
+        }
+        const auto time = std::chrono::duration<double, std::micro>(steady_clock::now() - start);
+        return std::pair(processes_->lookUps() - before, time.count() / count);
+    });
+    std::cout << "identity, known: " << each << " us\n";
+    EXPECT_EQ(lookUps, 0);
+    EXPECT_LT(each, 100);
+    rig_->keyboard().type("typing changes nothing");
+    EXPECT_EQ(target->awaitText("typing changes nothing"), "typing changes nothing");
+    EXPECT_EQ(front(), process);
+    EXPECT_EQ(thread_->run([&] { return processes_->lookUps(); }), thread_->run([&] {
+        processes_->frontProcess();
+        return processes_->lookUps();
+    }));
+}
+
+TEST_F(X11ProcessTest, AHungProgramInFrontIsNotWaitedFor) {
+    const auto hung = rig_->startTarget(TargetKind::QtTextEdit);
+    const auto other = rig_->startTarget(TargetKind::GtkTextView);
+    kill(hung->pid(), SIGSTOP);
+    std::vector<double> times;
+    for (int i = 0; i < 10; ++i) {
+        for (const auto* target : {hung.get(), other.get()}) {
+            rig_->client().activate(target->window());
+            rig_->client().await("the program in front", Milliseconds(10'000), [&] {
+                const auto [pid, time] = timedFrontProcess();
+                if (time) times.push_back(*time);
+                return pid == target->pid();
+            });
+        }
+    }
+    kill(hung->pid(), SIGCONT);
+    ASSERT_FALSE(times.empty());
+    const auto middle = times.begin() + static_cast<std::ptrdiff_t>(times.size() / 2);
+    std::ranges::nth_element(times, middle);
+    std::cout << "identity after a change of the program in front, median: " << *middle << " us\n";
+    EXPECT_LE(*middle, 100'000);
+}
+
+// ---- Without a window manager ----
+
+class BareServerTest : public testing::Test {
+  protected:
+    BareServerTest() : server_(directory_, {}, privateEnvironment(directory_)), client_(server_.display()) {}
+
+    xcb_window_t makeWindow(xcb_window_t parent, const std::string& windowClass) {
+        auto* const connection = client_.connection();
+        const xcb_window_t window = xcb_generate_id(connection);
+        xcb_create_window(connection, XCB_COPY_FROM_PARENT, window, parent, 0, 0, 10, 10, 0,
+                          XCB_WINDOW_CLASS_INPUT_OUTPUT, XCB_COPY_FROM_PARENT, 0, nullptr);
+        setClass(window, windowClass);
+        xcb_map_window(connection, window);
+        return window;
+    }
+    void setClass(xcb_window_t window, const std::string& windowClass) {
+        if (windowClass.empty()) return;
+        const std::string bytes = std::string("instance") + '\0' + windowClass + '\0';
+        xcb_change_property(client_.connection(), XCB_PROP_MODE_REPLACE, window, XCB_ATOM_WM_CLASS, XCB_ATOM_STRING, 8,
+                            static_cast<std::uint32_t>(bytes.size()), bytes.data());
+    }
+    void focus(xcb_window_t window) {
+        xcb_set_input_focus(client_.connection(), XCB_INPUT_FOCUS_NONE, window, XCB_CURRENT_TIME);
+        EXPECT_EQ(client_.focusedWindow(), window);
+    }
+
+    PrivateDirectory directory_;
+    XServer server_;
+    XClient client_;
+};
+
+TEST_F(BareServerTest, TheFocusTellsTheProgramInFront) {
+    SessionThread thread(server_.display());
+    const auto files = std::make_shared<const DesktopFiles>(std::vector<fs::path>(), "C");
+    auto processes = thread.run([&] { return std::make_unique<X11ProcessManager>(thread.session(), files); });
+    const auto frontIdentifier = [&] {
+        return thread.run([&]() -> std::optional<std::u16string> {
+            const auto process = processes->frontProcess();
+            const auto application = process ? processes->runningApplication(*process) : std::nullopt;
+            return application ? application->bundleIdentifier : std::nullopt;
+        });
+    };
+    const auto awaitIdentifier = [&](const std::optional<std::u16string>& expected) {
+        client_.await("the program in front", Milliseconds(10'000), [&] { return frontIdentifier() == expected; });
+    };
+    awaitIdentifier(std::nullopt);
+    const xcb_window_t first = makeWindow(client_.root(), "First");
+    const xcb_window_t inner = makeWindow(makeWindow(first, ""), "");
+    const xcb_window_t second = makeWindow(client_.root(), "Second");
+    focus(inner);
+    awaitIdentifier(u"First");
+    focus(second);
+    awaitIdentifier(u"Second");
+    const int lookUps = processes->lookUps();
+    EXPECT_EQ(frontIdentifier(), u"Second");
+    EXPECT_EQ(processes->lookUps(), lookUps);
+    const auto process = thread.run([&] { return processes->frontProcess(); });
+    focus(first);
+    awaitIdentifier(u"First");
+    thread.run([&] { processes->bringToFront(*process); });
+    awaitIdentifier(u"Second");
+    xcb_destroy_window(client_.connection(), second);
+    xcb_flush(client_.connection());
+    awaitIdentifier(std::nullopt);
+    thread.end();
+    processes.reset();
+}
+
+TEST_F(BareServerTest, AServerThatHasGoneIsTold) {
+    PrivateDirectory directory;
+    auto server = std::make_unique<XServer>(directory, XServer::Options{}, privateEnvironment(directory));
+    SessionThread thread(server->display());
+    std::promise<void> gone;
+    thread.run([&] { thread.session().serverGone = [&] { gone.set_value(); }; });
+    server.reset();
+    EXPECT_EQ(gone.get_future().wait_for(std::chrono::seconds(10)), std::future_status::ready);
+    EXPECT_EQ(thread.run([&] { return thread.session().serverTime(); }), 0U);
+}
+
+// ---- Secure input ----
+
+TEST_F(BareServerTest, AHeldKeyboardAndAPasswordFieldAreSecure) {
+    bool isPassword = false;
+    const auto secure = std::move(X11SecureInput::open(server_.display(), [&] { return isPassword; })).value();
+    EXPECT_FALSE(secure->isSecureEventInputEnabled());
+    isPassword = true;
+    EXPECT_TRUE(secure->isSecureEventInputEnabled());
+    isPassword = false;
+    auto* const connection = client_.connection();
+    const std::unique_ptr<xcb_grab_keyboard_reply_t, XcbFree> held(xcb_grab_keyboard_reply(
+        connection,
+        xcb_grab_keyboard(connection, 0, client_.root(), XCB_CURRENT_TIME, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC),
+        nullptr));
+    ASSERT_EQ(held->status, XCB_GRAB_STATUS_SUCCESS);
+    EXPECT_TRUE(secure->isSecureEventInputEnabled());
+    xcb_ungrab_keyboard(connection, XCB_CURRENT_TIME);
+    client_.focusedWindow();
+    EXPECT_FALSE(secure->isSecureEventInputEnabled());
+}
+
+TEST(X11SecureInput, NamesTheDisplayThatCannotBeOpened) {
+    const auto secure = X11SecureInput::open(":9999", nullptr);
+    ASSERT_FALSE(secure);
+    EXPECT_THAT(secure.error().message, testing::HasSubstr(":9999"));
+}
+
+// ---- Hot keys ----
+
+class X11HotKeyTest : public X11ProcessTest {
+  protected:
+    static constexpr std::int32_t Shift = 1;
+    static constexpr std::int32_t Control = 2;
+    static constexpr std::int32_t Option = 4;
+
+    std::unique_ptr<X11SystemHotKeys> make(SessionThread& thread) {
+        return thread.run([&] {
+            return std::make_unique<X11SystemHotKeys>(
+                thread.session(), [this](std::uint16_t keyCode) -> std::optional<xcb_keycode_t> {
+                    if (keyCode > 0x7F) return std::nullopt;
+                    return static_cast<xcb_keycode_t>(rig_->keyboard().keycodeOf(keyCode));
+                });
+        });
+    }
+    std::function<void()> counting(char name) {
+        return [this, name] {
+            const std::lock_guard lock(mutex_);
+            heard_ += name;
+            changed_.notify_all();
+        };
+    }
+    std::string awaitHeard(const std::string& expected) {
+        std::unique_lock lock(mutex_);
+        changed_.wait_for(lock, std::chrono::seconds(10), [&] { return heard_ == expected; });
+        return heard_;
+    }
+
+    std::string awaitHeardAtLeast(const std::string& expected) {
+        std::unique_lock lock(mutex_);
+        changed_.wait_for(lock, std::chrono::seconds(10), [&] { return heard_.size() >= expected.size(); });
+        return heard_;
+    }
+
+    std::mutex mutex_;
+    std::condition_variable changed_;
+    std::string heard_;
+};
+
+TEST_F(X11HotKeyTest, ExactlyTheRegisteredCombinationIsHeard) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    auto hotKeys = make(*thread_);
+    const auto result = thread_->run([&] {
+        return std::pair(hotKeys->registerHotKey(1, u'h', Control | Option, counting('h')).ok(),
+                         hotKeys->registerHotKey(2, u'j', Control | Shift, counting('j')).ok());
+    });
+    EXPECT_TRUE(result.first && result.second);
+    TestKeyboard& keyboard = rig_->keyboard();
+    keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
+    EXPECT_EQ(awaitHeard("h"), "h");
+    keyboard.tap(Key::CapsLock);
+    keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
+    EXPECT_EQ(awaitHeard("hh"), "hh");
+    keyboard.tap(Key::CapsLock);
+    keyboard.chord({Key::LeftControl, Key::LeftAlt, Key::LeftShift}, U'h');
+    keyboard.chord({Key::LeftAlt, Key::LeftShift}, U'h');
+    keyboard.chord({Key::LeftControl, Key::LeftShift}, U'j');
+    EXPECT_EQ(awaitHeard("hhj"), "hhj");
+    thread_->run([&] { hotKeys->unregisterHotKey(1); });
+    keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
+    keyboard.chord({Key::LeftControl, Key::LeftShift}, U'j');
+    EXPECT_EQ(awaitHeard("hhjj"), "hhjj");
+    thread_->run([&] { thread_->session().addHandler(XCB_KEY_PRESS, [&](const auto&) { counting('.')(); }); });
+    keyboard.press(Key::LeftControl);
+    keyboard.press(Key::LeftShift);
+    keyboard.press(keyboard.keycodeOf(U'j'));
+    const std::string repeated = awaitHeardAtLeast("hhjjj...").substr(0, 8);
+    EXPECT_EQ(repeated, "hhjjj...") << "a held key repeats, a hot key does not";
+    keyboard.releaseAll();
+    thread_->run([&] { hotKeys.reset(); });
+}
+
+TEST_F(X11HotKeyTest, ACombinationThatIsTakenIsRefused) {
+    SessionThread other(rig_->server().display());
+    auto theirs = make(other);
+    auto ours = make(*thread_);
+    const auto take = [&](SessionThread& thread, X11SystemHotKeys& hotKeys, SystemHotKeys::Id id, std::uint16_t key) {
+        return thread.run([&] {
+            const auto result = hotKeys.registerHotKey(id, key, Control | Option, counting('x'));
+            return result.ok() ? std::string() : result.error().message;
+        });
+    };
+    EXPECT_EQ(take(other, *theirs, 1, u'k'), "");
+    EXPECT_THAT(take(*thread_, *ours, 1, u'k'), testing::HasSubstr("Another program"));
+    EXPECT_EQ(take(*thread_, *ours, 1, u'l'), "");
+    EXPECT_THAT(take(*thread_, *ours, 2, u'l'), testing::HasSubstr("Another hot key"));
+    EXPECT_THAT(take(*thread_, *ours, 3, 0xFFFF), testing::HasSubstr("no key"));
+    EXPECT_EQ(take(*thread_, *ours, 1, u'l'), "") << "in place of what was there";
+    other.run([&] { theirs.reset(); });
+    rig_->client().await("the other's letting go", Milliseconds(10'000),
+                         [&] { return take(*thread_, *ours, 4, u'k').empty(); });
+    thread_->run([&] { ours.reset(); });
+}
+
+}  // namespace
+
+}  // namespace plume::rig
