@@ -113,9 +113,15 @@ class Parser {
         return nullptr;
     }
 
+    std::string reasonWithoutCommand() const {
+        const std::vector<std::string> unknown = app_.remaining();
+        if (unknown.empty()) return "there is no command";
+        return "\"" + unknown.front() + "\" is no " + (unknown.front().starts_with("-") ? "option" : "command");
+    }
+
     Farewell refusal(const CLI::ParseError& mistake) const {
         const CommandForm* form = formInUse();
-        std::string reason = mistake.what();
+        std::string reason = form ? mistake.what() : reasonWithoutCommand();
         for (char& c : reason) {
             if (c == '\n') c = ' ';
         }

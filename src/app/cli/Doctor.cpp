@@ -194,8 +194,7 @@ class Examination {
                                        "; when keys get lost or come twice, end one of the two.");
         }
         if (!any) good("other programs", "none that is known to get in the way");
-        const auto lock = InstanceLock::take({});
-        if (!lock) warn("instance", lock.error().message);
+        if (InstanceLock::isTaken({})) good("instance", "Plume is already running on this display");
     }
 
     void examineLibrary() {

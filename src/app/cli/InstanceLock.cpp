@@ -5,6 +5,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstdlib>
@@ -81,6 +82,13 @@ Result<InstanceLock> InstanceLock::take(const std::string& display) {
     // The number is only for the message above.
     if (ftruncate(file.get(), 0) == 0) (void)!pwrite(file.get(), process.data(), process.size(), 0);
     return InstanceLock(std::move(file));
+}
+
+bool InstanceLock::isTaken(const std::string& display) {
+    const Result<std::string> path = pathFor(display);
+    if (!path) return false;
+    const FileDescriptor file(open(path.value().c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW));
+    return file.isOpen() && flock(file.get(), LOCK_SH | LOCK_NB) != 0;
 }
 
 }  // namespace plume

@@ -16,6 +16,9 @@ class InstanceLock {
     // whatever way. The error tells which process has it, or why there is no place for one.
     static Result<InstanceLock> take(const std::string& display);
 
+    // Whether somebody has it; takes and leaves nothing.
+    static bool isTaken(const std::string& display);
+
     // Where the lock file of a display lies; screens of one display share it.
     static Result<std::string> pathFor(const std::string& display);
 

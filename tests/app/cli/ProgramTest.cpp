@@ -1,0 +1,223 @@
+// The command line, seen from a shell.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <algorithm>
+
+#include "tests/app/cli/ProgramRun.h"
+
+namespace plume {
+namespace {
+
+using ::testing::AllOf;
+using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+using ::testing::MatchesRegex;
+using ::testing::Not;
+using ::testing::StartsWith;
+
+// ---- Arguments ----
+
+struct WrongArguments {
+    std::vector<std::string> arguments;
+    const char* says;
+    const char* rightForm;
+};
+
+void PrintTo(const WrongArguments& one, std::ostream* stream) {
+    for (const std::string& argument : one.arguments) *stream << argument << ' ';
+}
+
+class Arguments : public ::testing::TestWithParam<WrongArguments> {};
+
+TEST_P(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
+    const ProgramResult result = ProgramHome().run(GetParam().arguments);
+    EXPECT_EQ(result.status, 2);
+    EXPECT_THAT(result.output, IsEmpty());
+    EXPECT_THAT(result.error,
+                AllOf(StartsWith("plume: "), HasSubstr(GetParam().says), HasSubstr(GetParam().rightForm)));
+    EXPECT_EQ(std::count(result.error.begin(), result.error.end(), '\n'), 1) << result.error;
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Kinds, Arguments,
+    ::testing::Values(WrongArguments{{}, "there is no command", "plume run|list|search|expand|doctor|simulate"},
+                      WrongArguments{{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|doctor|simulate"},
+                      WrongArguments{{"--verbose"}, "--verbose", "plume run|list|search|expand|doctor|simulate"},
+                      WrongArguments{
+                          {"run", "--librari", "x"}, "--librari", "plume run [--library FILE.json|FILE.csv]"},
+                      WrongArguments{{"run", "--library"}, "--library", "[--settings FILE.json]"},
+                      WrongArguments{{"run", "now"}, "now", "plume run [--library"},
+                      WrongArguments{{"list", "--settings", "x"}, "--settings", "plume list [--library"},
+                      WrongArguments{{"search"}, "TEXT", "plume search TEXT"},
+                      WrongArguments{{"expand"}, "ABBREVIATION", "plume expand ABBREVIATION"},
+                      WrongArguments{{"expand", "a", "b"}, "b", "plume expand ABBREVIATION"},
+                      WrongArguments{{"doctor", "--all"}, "--all", "plume doctor"},
+                      WrongArguments{{"simulate"}, "FILE", "plume simulate FILE..."}));
+
+TEST(Help, HasExamplesOfEveryKind) {
+    const ProgramHome home;
+    const ProgramResult result = home.run({"--help"});
+    EXPECT_EQ(result.status, 0);
+    for (const char* example :
+         {"plume run ", "plume list ", "plume search arrow", "plume expand ;date", "plume doctor"}) {
+        EXPECT_THAT(result.output, HasSubstr(example));
+    }
+    for (const char* command : {"run", "list", "search", "expand", "doctor", "simulate"}) {
+        const ProgramResult ofCommand = home.run({command, "--help"});
+        EXPECT_EQ(ofCommand.status, 0);
+        EXPECT_THAT(ofCommand.output, HasSubstr(std::string("plume ") + command));
+    }
+    EXPECT_THAT(home.run({"--version"}).output, MatchesRegex("plume [0-9]+\\.[0-9]+\\.[0-9]+\n"));
+}
+
+// ---- The sample library ----
+
+TEST(SampleLibrary, IsShown) {
+    const ProgramResult result = ProgramHome().run({"list"});
+    EXPECT_EQ(result.status, 0);
+    EXPECT_THAT(result.error, IsEmpty());
+    for (const char* line :
+         {"Dates and times (expands as soon as it is typed)", "  ;date   Today", "  btw ", "  ;sig ",
+          "  ;->     Arrow right: →\n", "uname -sr  [script]", "please answer by Friday.  [rich text]"}) {
+        EXPECT_THAT(result.output, HasSubstr(line));
+    }
+}
+
+struct SampleExpansion {
+    const char* abbreviation;
+    const char* output;  // as a regular expression
+};
+
+TEST(SampleLibrary, Expands) {
+    const ProgramHome home;
+    for (const auto& [abbreviation, output] :
+         {SampleExpansion{";date", "20[0-9][0-9]-[01][0-9]-[0-3][0-9]\n"},
+          SampleExpansion{"date", "20[0-9][0-9]-[01][0-9]-[0-3][0-9]\n"},  // the prefix may be left out
+          SampleExpansion{";time", "[0-2][0-9]:[0-5][0-9]\n"}, SampleExpansion{";week", "20[0-9][0-9]-W[0-5][0-9]\n"},
+          SampleExpansion{";mon", "20[0-9][0-9]-[01][0-9]-[0-3][0-9]\n"}, SampleExpansion{";->", "→\n"},
+          SampleExpansion{"btw", "by the way\n"},
+          SampleExpansion{";hi", "Hello,\n(.|\n)*Kind regards,\nJo Doe\n(.|\n)*"},
+          SampleExpansion{";warn", "Important: please answer by Friday.\n"}, SampleExpansion{";uuid", "[-0-9a-f]+\n"},
+          SampleExpansion{";pass", "[A-Za-z0-9]+\n"}, SampleExpansion{";bug", "System: Linux (.|\n)*"}}) {
+        const ProgramResult result = home.run({"expand", abbreviation});
+        EXPECT_EQ(result.status, 0) << abbreviation << ' ' << result.error;
+        EXPECT_THAT(result.output, MatchesRegex(output)) << abbreviation;
+        EXPECT_THAT(result.error, IsEmpty()) << abbreviation;
+    }
+}
+
+TEST(Expand, SaysWhatItCannotDo) {
+    const ProgramHome home;
+    const ProgramResult form = home.run({"expand", ";letter"});
+    EXPECT_EQ(form.status, 1);
+    EXPECT_THAT(form.output, IsEmpty());
+    EXPECT_THAT(form.error, HasSubstr("form"));
+    const ProgramResult unknown = home.run({"expand", "nothing"});
+    EXPECT_EQ(unknown.status, 1);
+    EXPECT_THAT(unknown.error, HasSubstr("\"nothing\""));
+}
+
+TEST(Search, FindsEveryWordAnywhereInASnippet) {
+    const ProgramHome home;
+    const ProgramResult arrows = home.run({"search", "ARROW left"});
+    EXPECT_EQ(arrows.status, 0);
+    EXPECT_THAT(arrows.output, AllOf(HasSubstr(";<-"), Not(HasSubstr(";->")), HasSubstr("Arrows and symbols")));
+    EXPECT_THAT(home.run({"search", "different in every"}).output, HasSubstr(";letter")) << "it stands in the note";
+    EXPECT_THAT(home.run({"search", "sampletown"}).output, HasSubstr(";sig")) << "it stands in the content";
+    const ProgramResult nothing = home.run({"search", "zebra"});
+    EXPECT_EQ(nothing.status, 1);
+    EXPECT_THAT(nothing.output, IsEmpty());
+}
+
+// ---- Other libraries ----
+
+TEST(Library, OfTheUserComesBeforeTheSample) {
+    const ProgramHome home;
+    home.write("config/plume/library.json",
+               R"([{"name": "Own", "items": [{"abbreviation": "aa", "content": "mine"}]}])");
+    EXPECT_EQ(home.run({"expand", "aa"}).output, "mine\n");
+    EXPECT_THAT(home.run({"list"}).output, Not(HasSubstr("Arrows")));
+}
+
+TEST(Library, ThatIsDamagedIsNeverReplacedByAnother) {
+    const ProgramHome home;
+    const std::string file = home.write("config/plume/library.json", R"([{"items": [{"abbreviation": 5}]}])");
+    for (const char* command : {"list", "run"}) {
+        const ProgramResult result = home.run({command});
+        EXPECT_EQ(result.status, 2);
+        EXPECT_THAT(result.output, IsEmpty());
+        EXPECT_THAT(result.error, AllOf(HasSubstr(file), HasSubstr("abbreviation")));
+    }
+}
+
+TEST(Library, MayBeSeparatedValues) {
+    const ProgramHome home;
+    const std::string file = home.write("words.CSV", "brb,\"be right back, soon\",Away\nomw,on my way\n");
+    const ProgramResult listed = home.run({"list", "--library", file});
+    EXPECT_EQ(listed.status, 0) << listed.error;
+    EXPECT_THAT(listed.output, AllOf(StartsWith("words ("), HasSubstr("  brb  Away: be right back, soon\n")));
+    EXPECT_EQ(home.run({"expand", "omw", "--library", file}).output, "on my way\n");
+}
+
+TEST(Library, ThatCannotBeReadIsToldByName) {
+    const ProgramHome home;
+    for (const std::string& file : {std::string("/no/such/file.json"), home.write("empty.csv", ""),
+                                    home.write("broken.json", "[{]"), std::string("/tmp")}) {
+        const ProgramResult result = home.run({"list", "--library", file});
+        EXPECT_EQ(result.status, 2) << file;
+        EXPECT_THAT(result.error, HasSubstr(file));
+    }
+}
+
+// ---- On a desktop that is none ----
+
+TEST(Run, WithoutADisplaySaysWhatIsMissing) {
+    const ProgramResult result = ProgramHome().run({"run"});
+    EXPECT_EQ(result.status, 3);
+    EXPECT_THAT(result.output, IsEmpty());
+    EXPECT_THAT(result.error, HasSubstr("DISPLAY"));
+}
+
+TEST(Run, ReadsItsSettingsFirst) {
+    const ProgramHome home;
+    const std::string file = home.write("settings.json", R"({"LongTextLength": "long"})");
+    const ProgramResult result = home.run({"run", "--settings", file});
+    EXPECT_EQ(result.status, 2);
+    EXPECT_THAT(result.error, AllOf(HasSubstr(file), HasSubstr("LongTextLength")));
+}
+
+TEST(Doctor, FindsWhatIsMissing) {
+    const ProgramResult result = ProgramHome().run({"doctor"});
+    EXPECT_EQ(result.status, 3);
+    EXPECT_THAT(result.output, AllOf(HasSubstr("MISSING display"), HasSubstr("ok      library: "),
+                                     HasSubstr("warning accessibility"), HasSubstr("cannot work here")));
+}
+
+// ---- Scenarios ----
+
+TEST(Simulate, TellsTheOutcomeAndTheGravestFault) {
+    const ProgramHome home;
+    const std::string library =
+        R"("library": [{"expandTrigger": 0, "items": [{"abbreviation": "sig", "content": "Jo"}]}])";
+    const std::string steps = R"("steps": [{"type": "sig"}])";
+    const std::string right = home.write("right.json", "{" + library + "," + steps + R"(, "expect": {"text": "Jo"}})");
+    const std::string other = home.write("other.json", "{" + library + "," + steps + R"(, "expect": {"text": "No"}})");
+    const std::string wrong = home.write("wrong.json", R"({"stepz": []})");
+
+    const ProgramResult good = home.run({"simulate", right});
+    EXPECT_EQ(good.status, 0) << good.error;
+    EXPECT_THAT(good.output, HasSubstr("\"text\": \"Jo\""));
+    EXPECT_THAT(good.error, IsEmpty());
+
+    const ProgramResult different = home.run({"simulate", right, other});
+    EXPECT_EQ(different.status, 1);
+    EXPECT_THAT(different.error, AllOf(HasSubstr("Jo"), HasSubstr("No")));
+
+    const ProgramResult faulty = home.run({"simulate", wrong, other, right, "/no/such/file.json"});
+    EXPECT_EQ(faulty.status, 2);
+    EXPECT_THAT(faulty.error, AllOf(HasSubstr("stepz"), HasSubstr(wrong), HasSubstr("/no/such/file.json")));
+}
+
+}  // namespace
+}  // namespace plume
