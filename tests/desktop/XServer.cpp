@@ -36,10 +36,26 @@ std::string modeLine(const XServer::Options& options) {
     return line.str();
 }
 
+std::string keyboardSection(const std::string& name, const std::filesystem::path& socket,
+                            const XServer::Options& options) {
+    std::ostringstream section;
+    section << "Section \"InputDevice\"\n  Identifier \"" << name << R"("
+  Driver "inputtest"
+  Option "DeviceType" "Keyboard"
+  Option "XkbRules" "evdev"
+  Option "XkbModel" "pc105"
+)"
+            << "  Option \"SocketPath\" " << socket << "\n  Option \"XkbLayout\" \"" << options.layout
+            << "\"\n  Option \"XkbVariant\" \"" << options.variant << "\"\nEndSection\n";
+    return section.str();
+}
+
 }  // namespace
 
 XServer::XServer(const PrivateDirectory& directory, const Options& options, const Environment& environment)
-    : keyboardSocket_(directory.path() / "keyboard"), pointerSocket_(directory.path() / "pointer") {
+    : keyboardSocket_(directory.path() / "keyboard"),
+      secondKeyboardSocket_(directory.path() / "keyboard2"),
+      pointerSocket_(directory.path() / "pointer") {
     const auto server = requireServer();
     const auto configuration = directory.path() / "xorg.conf";
     writeConfiguration(configuration, options);
@@ -82,17 +98,9 @@ Section "Screen"
         << "    Modes \"wanted\"\n    Virtual " << options.width << ' ' << options.height << R"(
   EndSubSection
 EndSection
-Section "InputDevice"
-  Identifier "test keyboard"
-  Driver "inputtest"
-  Option "DeviceType" "Keyboard"
-  Option "XkbRules" "evdev"
-  Option "XkbModel" "pc105"
-)"
-        << "  Option \"SocketPath\" " << keyboardSocket_ << "\n  Option \"XkbLayout\" \"" << options.layout
-        << "\"\n  Option \"XkbVariant\" \"" << options.variant << R"("
-EndSection
-Section "InputDevice"
+)" << keyboardSection("test keyboard", keyboardSocket_, options)
+        << (options.secondKeyboard ? keyboardSection("second keyboard", secondKeyboardSocket_, options) : "")
+        << R"(Section "InputDevice"
   Identifier "test pointer"
   Driver "inputtest"
   Option "DeviceType" "PointerAbsolute"
@@ -104,8 +112,8 @@ Section "ServerLayout"
   Screen "screen"
   InputDevice "test keyboard" "CoreKeyboard"
   InputDevice "test pointer" "CorePointer"
-EndSection
-)";
+)" << (options.secondKeyboard ? "  InputDevice \"second keyboard\" \"SendCoreEvents\"\n" : "")
+        << "EndSection\n";
     if (!out.flush()) throw RigError("cannot write " + file.string());
 }
 

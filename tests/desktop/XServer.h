@@ -19,6 +19,7 @@ class XServer {
         std::string variant;
         int width = 1280;
         int height = 800;
+        bool secondKeyboard = false;  // one more, to be unplugged and plugged in again
     };
 
     // Ready for clients when the constructor returns; throws RigError. `directory` outlives the server.
@@ -26,6 +27,7 @@ class XServer {
 
     const std::string& display() const { return display_; }  // ":5"
     const std::filesystem::path& keyboardSocket() const { return keyboardSocket_; }
+    const std::filesystem::path& secondKeyboardSocket() const { return secondKeyboardSocket_; }
     const std::filesystem::path& pointerSocket() const { return pointerSocket_; }
     bool isRunning() { return process_->isRunning(); }
 
@@ -33,6 +35,7 @@ class XServer {
     void writeConfiguration(const std::filesystem::path& file, const Options& options) const;
 
     std::filesystem::path keyboardSocket_;
+    std::filesystem::path secondKeyboardSocket_;
     std::filesystem::path pointerSocket_;
     std::string display_;
     std::unique_ptr<ChildProcess> process_;

@@ -33,6 +33,12 @@ std::vector<InputDevice> HardwareKeyboards::list(const TapConnection& connection
     return devices;
 }
 
+Result<void> HardwareKeyboards::check(const TapConnection& connection) {
+    const auto devices = inputDevices(connection.connection());
+    if (!list(connection).empty() || std::ranges::any_of(devices, isTakenByAnother)) return {};
+    return nothingToTake(connection, {});
+}
+
 Result<void> HardwareKeyboards::take() {
     std::string occupied;
     for (const InputDevice& device : list(connection_)) {

@@ -21,6 +21,9 @@ class HardwareKeyboards {
     // What there is to take: every keyboard of the main keyboard but the XTEST one.
     static std::vector<InputDevice> list(const TapConnection& connection);
 
+    // Whether there is any, taken or not; the error says that there is none.
+    static Result<void> check(const TapConnection& connection);
+
     // All of them. One that another program has is left to it; the error is that none could be taken.
     Result<void> take();
     // Those that have come since.

@@ -53,10 +53,12 @@ class ErrorsKept {
 
 bool give(Display* display, XkbDescPtr keymap, std::uint16_t device) {
     keymap->device_spec = device;
-    // The types and symbols first: all at once the server refuses.
+    // The types and symbols first: all at once the server refuses. And all once more, because from the compatibility
+    // map the server derives actions anew, which a Japanese layout has otherwise.
     return XkbSetMap(display, XkbKeyTypesMask | XkbKeySymsMask, keymap) != False &&
            XkbSetMap(display, XkbAllMapComponentsMask, keymap) != False &&
-           XkbSetCompatMap(display, XkbAllCompatMask, keymap, False) != False;
+           XkbSetCompatMap(display, XkbAllCompatMask, keymap, False) != False &&
+           XkbSetMap(display, XkbAllMapComponentsMask, keymap) != False;
 }
 
 }  // namespace

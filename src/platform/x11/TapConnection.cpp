@@ -6,6 +6,7 @@
 #include <string_view>
 #include <utility>
 
+#include "platform/x11/HardwareKeyboards.h"
 #include "platform/x11/InputDevices.h"
 
 namespace plume {
@@ -42,7 +43,7 @@ Result<void> TapConnection::check(const std::string& display) {
     if (!keyboard) return keyboard.error();
     const auto tap = open(display, *keyboard.value());
     if (!tap) return tap.error();
-    return {};
+    return HardwareKeyboards::check(*tap.value());
 }
 
 Result<void> TapConnection::begin() {

@@ -23,7 +23,7 @@ class TapConnection {
   public:
     // An empty name means $DISPLAY. The error says what the server lacks and what to do. The keyboard outlives it.
     static Result<std::unique_ptr<TapConnection>> open(const std::string& display, const XkbKeyboard& keyboard);
-    // Whether open() would succeed. From any thread.
+    // Whether open() would succeed, and whether there is a keyboard to tap. From any thread.
     static Result<void> check(const std::string& display);
     TapConnection(const TapConnection&) = delete;
     TapConnection& operator=(const TapConnection&) = delete;

@@ -30,7 +30,11 @@ TapSession::TapSession(Parts parts)
 
 Result<void> TapSession::begin() {
     TapConnection& connection = parts_.connection;
-    mirrorAtStart();
+    if (!mirrorAtStart()) {
+        return Error{"The X server of display \"" + connection.connection().displayName() +
+                     "\" refuses to give the keyboard's layout to its XTEST keyboard; without that, keys that Plume "
+                     "passes on would come out wrong. Does setxkbmap with your layout help?"};
+    }
     if (auto taken = keyboards_.take(); !taken) return taken;
     connection.userKeys = keyboards_.keysDown();
     decoder_.setKeymap(parts_.keyboard.keymap(), connection.userKeys, parts_.keyboard.locks());
@@ -41,10 +45,10 @@ Result<void> TapSession::begin() {
     return {};
 }
 
-void TapSession::mirrorAtStart() {
+bool TapSession::mirrorAtStart() const {
     const TapConnection& connection = parts_.connection;
     const auto keyboards = HardwareKeyboards::list(connection);
-    if (keyboards.empty()) return;
+    if (keyboards.empty()) return true;
     // The one that was typed on last, where the server still knows it.
     std::uint16_t typedOn = keyboards.front().id;
     for (const InputDevice& device : inputDevices(connection.connection())) {
@@ -54,7 +58,7 @@ void TapSession::mirrorAtStart() {
         }
     }
     const std::array to{connection.testKeyboard()};
-    mirrorKeymap(connection.connection().displayName(), typedOn, to);
+    return mirrorKeymap(connection.connection().displayName(), typedOn, to);
 }
 
 void TapSession::selectHierarchyEvents() {
@@ -79,7 +83,6 @@ void TapSession::end() {
     if (descriptor_ >= 0) parts_.loop.removeSource(descriptor_);
     parts_.loop.cancel(holdLimit_);
     TapConnection& connection = parts_.connection;
-    // First the hardware is back, then the XTEST keys come up: what the user holds stays down for the programs.
     keyboards_.giveBack();
     keyboardHeld_.reset();
     connection.connection().sync();
@@ -169,6 +172,7 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     const std::uint64_t flagsBefore = decoder_.flags();
     const KeyDecoder::Key key = decoder_.press(keycode);
     parts_.connection.userKeys.set(keycode);
+    seen_.set(keycode);
     bool swallow = false;
     told_[keycode] = !key.silent && mayTell();
     if (told_[keycode]) {
@@ -176,7 +180,6 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
         if (!ended_) swallow = tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyDown);
     }
     if (ended_) return;
-    swallowed_[keycode] = swallow;
     if (swallow) {
         decoder_.undoLocks();
         // A repeat of a key that was passed on: let go of it, or it would go on repeating.
@@ -194,9 +197,10 @@ void TapSession::release(xcb_keycode_t keycode) {
         tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyUp);
         if (ended_) return;
     }
-    const bool unseen = swallowed_[keycode] && !parts_.connection.keysDown()[keycode];
-    swallowed_.reset(keycode);
-    if (!unseen) inject({keycode, false});
+    // Swallowed, or let go of meanwhile: no program has it down. What went down before the tap came has to come up.
+    const bool isUp = seen_[keycode] && !parts_.connection.keysDown()[keycode];
+    seen_.reset(keycode);
+    if (!isUp) inject({keycode, false});
 }
 
 void TapSession::tellMissedModifiers(std::uint64_t flags) {

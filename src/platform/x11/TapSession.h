@@ -41,7 +41,8 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
 
     // Takes the keyboards; the error says why there is none to take.
     Result<void> begin();
-    // Gives them back; nothing is down on the XTEST keyboard afterwards. Nobody is called any more.
+    // Gives them back. Nothing is down for the programs afterwards: what the user still holds counts when it is pressed
+    // anew. Nobody is called any more.
     void end();
 
     void keyboardChanged(XkbKeyboard::Change change);
@@ -54,7 +55,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         bool down;
     };
 
-    void mirrorAtStart();
+    bool mirrorAtStart() const;
     void selectHierarchyEvents();
     void addSource();
     void passOnUnheard();
@@ -78,8 +79,8 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     int descriptor_ = -1;
     bool ended_ = false;
 
-    KeycodeSet swallowed_;                      // keys that are down with their press swallowed
-    KeycodeSet told_;                           // keys that are down with their press told
+    KeycodeSet seen_;                           // keys that are down and went down here
+    KeycodeSet told_;                           // those of them that the listener was told of
     std::array<std::uint16_t, 256> devices_{};  // that a key went down on
     std::uint64_t toldFlags_ = 0;
 

@@ -138,6 +138,8 @@ void XkbKeyboard::handleEvent(const xcb_generic_event_t& event) {
         if (layoutName_ != before) tell(Change::Group);
         return;
     }
+    // Which device it is about is in the same place in all of them.
+    if (reinterpret_cast<const xcb_xkb_map_notify_event_t&>(event).deviceID != device_) return;
     switch (event.pad0) {  // which of the extension's events it is
         case XCB_XKB_STATE_NOTIFY:
             stateChanged(event);

@@ -1,0 +1,606 @@
+// The keyboard tap of X11 between a keyboard and real programs.
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <xcb/xinput.h>
+
+#include <algorithm>
+#include <array>
+#include <atomic>
+#include <chrono>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <ostream>
+#include <random>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "Foundation/Strings.h"
+#include "platform/x11/InputDevices.h"
+#include "platform/x11/XcbXkb.h"
+#include "tests/desktop/Deadline.h"
+#include "tests/desktop/DesktopRig.h"
+#include "tests/desktop/FocusCounter.h"
+#include "tests/desktop/TapThread.h"
+#include "tests/desktop/XcbReply.h"
+
+namespace plume::rig {
+
+namespace {
+
+using Parts = TapThread::Parts;
+using Type = TapEvent::Type;
+
+constexpr std::uint64_t ShiftFlag = 0x20000;
+constexpr std::uint64_t ControlFlag = 0x40000;
+constexpr std::uint64_t OptionFlag = 0x80000;
+constexpr std::uint64_t CommandFlag = 0x100000;
+constexpr Milliseconds Bound{10'000};
+
+struct Heard {
+    Type type = Type::KeyDown;
+    std::uint16_t keyCode = 0;
+    std::uint64_t flags = 0;
+    std::u16string string;
+
+    bool operator==(const Heard&) const = default;
+    friend std::ostream& operator<<(std::ostream& out, const Heard& heard) {
+        constexpr std::array<const char*, 3> names{"down", "up", "flags"};
+        out << names[static_cast<std::size_t>(heard.type)] << ' ' << heard.keyCode << ' ' << std::hex << heard.flags;
+        for (const char16_t unit : heard.string) out << " U+" << static_cast<unsigned>(unit);
+        return out << std::dec;
+    }
+};
+
+// Writes down what it hears and does as it is told. Tap thread.
+class Listener final : public KeyboardTapListener {
+  public:
+    bool keyboardEvent(const TapEvent& event) override {
+        heard.push_back({event.type, event.keyCode, event.flags, std::u16string(event.string)});
+        return decide && decide(event);
+    }
+    void tapDisabledByTimeout() override {
+        ++timeouts;
+        if (tapToEnable) tapToEnable->enable();
+    }
+    void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody did that"; }
+
+    std::vector<Heard> heard;
+    std::function<bool(const TapEvent&)> decide;
+    int timeouts = 0;
+    KeyboardTap* tapToEnable = nullptr;
+};
+
+class X11TapTest : public testing::Test {
+  protected:
+    static void SetUpTestSuite() {
+        rig_ = std::make_unique<DesktopRig>();
+        rig_->keyboard().tap(Key::LeftShift);  // only a device that was used answers when asked to sync
+    }
+    static void TearDownTestSuite() { rig_.reset(); }
+
+    void SetUp() override { tap_ = std::make_unique<TapThread>(rig_->server().display()); }
+    void TearDown() override {
+        rig_->keyboard().releaseAll();
+        tap_.reset();
+        EXPECT_EQ(keysDown(), std::vector<int>{}) << "what was pressed has to come up";
+        if (layoutChanged_) setLayout({"us", "-option", ""});
+    }
+
+    void createTap() {
+        const auto created = tap_->call([this](Parts& parts) { return parts.tap->create(listener_, false); });
+        ASSERT_TRUE(created.ok()) << created.error().message;
+    }
+    void removeTap() {
+        tap_->call([](Parts& parts) { parts.tap->remove(); });
+    }
+    void setDecision(std::function<bool(const TapEvent&)> decide) {
+        tap_->call([&](Parts& /*parts*/) { listener_.decide = std::move(decide); });
+    }
+    std::vector<Heard> heard() {
+        return tap_->call([this](Parts& /*parts*/) { return listener_.heard; });
+    }
+    std::vector<Heard> takeHeard(std::size_t count) {
+        await("keys are heard", [&] { return heard().size() >= count; });
+        return tap_->call([this](Parts& /*parts*/) { return std::exchange(listener_.heard, {}); });
+    }
+    static void await(const std::string& what, const std::function<bool()>& condition) {
+        rig_->client().await(what, Bound, condition);
+    }
+
+    void setLayout(const std::vector<std::string>& arguments) {
+        layoutChanged_ = true;
+        std::vector<std::string> command{"setxkbmap"};
+        command.insert(command.end(), arguments.begin(), arguments.end());
+        const auto program = rig_->session().start(command, "x11-xkb-utils");
+        ASSERT_EQ(program->waitForExit(Bound), 0) << program->logTail();
+    }
+    std::string identifier() {
+        const auto name = tap_->call([](Parts& parts) { return parts.inputSources->currentInputSourceIdentifier(); });
+        return name ? toUtf8(*name) : "";
+    }
+    std::optional<std::u16string> translate(std::uint16_t keyCode, std::uint64_t flags) {
+        return tap_->call([=](Parts& parts) { return parts.inputSources->translateKey(keyCode, flags); });
+    }
+
+    static void tapKey(int keycode) {
+        rig_->keyboard().press(keycode);
+        rig_->keyboard().release(keycode);
+        rig_->keyboard().sync();
+    }
+
+    // On the main keyboard, as programs see it.
+    static std::vector<int> keysDown() {
+        auto* const connection = rig_->client().connection();
+        const auto reply = own(xcb_query_keymap_reply(connection, xcb_query_keymap(connection), nullptr));
+        std::vector<int> down;
+        for (int key = 0; reply && key < 256; ++key) {
+            if (((reply->keys[key / 8] >> (key % 8)) & 1) != 0) down.push_back(key);
+        }
+        return down;
+    }
+
+    static inline std::unique_ptr<DesktopRig> rig_;
+    Listener listener_;  // outlives the tap
+    std::unique_ptr<TapThread> tap_;
+    bool layoutChanged_ = false;
+};
+
+class X11TapTargetTest : public X11TapTest, public testing::WithParamInterface<TargetKind> {};
+
+TEST_P(X11TapTargetTest, SwallowsAnyHalfOfFastTyping) {
+    constexpr std::size_t keys = 2'000;
+    std::mt19937 random(static_cast<unsigned>(GetParam()) + 1);  // NOLINT(cert-msc51-cpp): the same every time
+    std::string typed;
+    std::string expected;
+    std::vector<bool> swallow;
+    for (std::size_t i = 0; i < keys; ++i) {
+        typed += "abcdefghijklmnopqrstuvwxyz0123456789 "[random() % 37];
+        swallow.push_back(random() % 2 == 0);
+        if (!swallow.back()) expected += typed.back();
+    }
+    const auto target = rig_->startTarget(GetParam());
+    FocusCounter focus(rig_->server().display(), target->window());
+    createTap();
+    setDecision([&swallow, next = std::size_t{0}](const TapEvent& event) mutable {
+        return event.type == Type::KeyDown && swallow.at(next++);
+    });
+    rig_->keyboard().typeRollingOver(typed);
+    EXPECT_EQ(target->awaitText(expected, Milliseconds(30'000)), expected);
+    EXPECT_EQ(takeHeard(2 * keys).size(), 2 * keys);
+    await("all keys are up", [] { return keysDown().empty(); });
+    removeTap();
+    EXPECT_EQ(focus.takeCore(), FocusCounter::Counts{});
+    EXPECT_EQ(focus.takeInputExtension(), FocusCounter::Counts{});
+    rig_->keyboard().type("End");
+    EXPECT_EQ(target->awaitText(expected + "End"), expected + "End");
+}
+
+INSTANTIATE_TEST_SUITE_P(All, X11TapTargetTest,
+                         testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm),
+                         [](const auto& tested) { return nameOf(tested.param); });
+
+TEST_F(X11TapTest, TellsWhatKeysProduceAndWhichModifiersAreHeld) {
+    struct Case {
+        int keycode;
+        Heard down;
+        std::vector<Key> held = {};
+    };
+    const std::vector<Case> cases{
+        {38, {Type::KeyDown, 0, 0, u"a"}},
+        {38, {Type::KeyDown, 0, ShiftFlag, u"A"}, {Key::LeftShift}},
+        {54, {Type::KeyDown, 8, ControlFlag, u"\x03"}, {Key::LeftControl}},
+        {53, {Type::KeyDown, 7, OptionFlag, u""}, {Key::LeftAlt}},
+        {22, {Type::KeyDown, 51, OptionFlag, u"\b"}, {Key::LeftAlt}},
+        {29, {Type::KeyDown, 16, CommandFlag, u"y"}, {Key::LeftSuper}},
+        {29, {Type::KeyDown, 16, ControlFlag | ShiftFlag, u"\x19"}, {Key::LeftControl, Key::LeftShift}},
+        {36, {Type::KeyDown, 36, 0, u"\r"}},
+        {104, {Type::KeyDown, 76, 0, u"\r"}},
+        {23, {Type::KeyDown, 48, 0, u"\t"}},
+        {9, {Type::KeyDown, 53, 0, u"\x1B"}},
+        {119, {Type::KeyDown, 117, 0, u"\x7F"}},
+        {113, {Type::KeyDown, 123, 0, u""}},
+        {83, {Type::KeyDown, 123, 0, u""}},   // keypad 4 while Num Lock is off
+        {71, {Type::KeyDown, 96, 0, u""}},    // F5
+        {123, {Type::KeyDown, 72, 0, u""}},   // louder
+        {180, {Type::KeyDown, 436, 0, u""}},  // a browser key, which Apple keyboards do not have
+    };
+    createTap();
+    for (const Case& each : cases) {
+        for (const Key key : each.held) rig_->keyboard().press(key);
+        takeHeard(each.held.size());
+        tapKey(each.keycode);
+        Heard up = each.down;
+        up.type = Type::KeyUp;
+        EXPECT_THAT(takeHeard(2), testing::ElementsAre(each.down, up)) << "X key code " << each.keycode;
+        for (const Key key : each.held) rig_->keyboard().release(key);
+        takeHeard(each.held.size());
+    }
+}
+
+TEST_F(X11TapTest, TellsEachModifierByItsKey) {
+    struct Case {
+        int keycode;
+        std::uint16_t keyCode;
+        std::uint64_t flags;
+    };
+    const std::vector<Case> cases{{50, 56, ShiftFlag},    {62, 60, ShiftFlag},   {37, 59, ControlFlag},
+                                  {105, 62, ControlFlag}, {64, 58, OptionFlag},  {108, 61, OptionFlag},
+                                  {133, 55, CommandFlag}, {134, 54, CommandFlag}};
+    createTap();
+    for (const Case& each : cases) {
+        tapKey(each.keycode);
+        EXPECT_THAT(takeHeard(2), testing::ElementsAre(Heard{Type::FlagsChanged, each.keyCode, each.flags, u""},
+                                                       Heard{Type::FlagsChanged, each.keyCode, 0, u""}));
+    }
+}
+
+TEST_F(X11TapTest, CapsLockLocks) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    rig_->keyboard().tap(Key::CapsLock);
+    rig_->keyboard().type("a");
+    rig_->keyboard().tap(Key::CapsLock);
+    rig_->keyboard().type("b");
+    EXPECT_EQ(target->awaitText("Ab"), "Ab");
+    constexpr std::uint64_t locked = 0x10000;
+    const auto all = takeHeard(8);
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 0, locked, u"A"}));
+    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, 11, 0, u"b"}));
+}
+
+TEST_F(X11TapTest, FollowsTheLayout) {
+    const auto target = rig_->startTarget(TargetKind::QtTextEdit);
+    createTap();
+    EXPECT_EQ(identifier(), "us");
+    EXPECT_EQ(translate(16, 0), u"y");
+    EXPECT_EQ(translate(16, ShiftFlag), u"Y");
+    EXPECT_EQ(translate(16, OptionFlag), std::nullopt);
+    EXPECT_EQ(translate(83, 0), u"1") << "on the keypad";
+    EXPECT_EQ(translate(51, OptionFlag), u"\b");
+
+    setLayout({"de"});
+    await("the layout is de", [&] { return identifier() == "de"; });
+    EXPECT_EQ(translate(16, 0), u"z");
+    EXPECT_EQ(translate(24, 0), std::nullopt) << "a dead key";
+    tapKey(29);
+    EXPECT_EQ(target->awaitText("z"), "z");
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, 16, 0, u"z"}));
+    rig_->keyboard().press(Key::AltGr);
+    tapKey(24);
+    rig_->keyboard().releaseAll();
+    EXPECT_EQ(target->awaitText("z@"), "z@");
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, 12, 0, u"@"})) << "AltGr is not told of";
+
+    removeTap();
+    tapKey(29);
+    EXPECT_EQ(target->awaitText("z@z"), "z@z") << "the keyboard itself has to have the new layout, too";
+    createTap();
+    setLayout({"de", "-variant", "nodeadkeys"});
+    await("the variant is told", [&] { return identifier() == "de(nodeadkeys)"; });
+    EXPECT_EQ(translate(24, 0), u"\u00B4");
+}
+
+TEST_F(X11TapTest, FollowsTheGroup) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    setLayout({"-layout", "us,de", "-option", "grp:menu_toggle"});
+    await("both layouts are there", [&] {
+        return tap_->call([](Parts& parts) { return xkb_keymap_num_layouts(parts.keyboard->keymap()->get()) == 2; });
+    });
+    EXPECT_EQ(identifier(), "us");
+    tapKey(135);  // switches
+    tapKey(29);
+    EXPECT_EQ(target->awaitText("z"), "z");
+    await("the other layout is named", [&] { return identifier() == "de"; });
+    const auto all = heard();
+    EXPECT_THAT(all, testing::Contains(Heard{Type::KeyDown, 16, 0, u"z"}));
+
+    // A program that switches layouts does it so.
+    XClient switcher(rig_->server().display());
+    const auto use = xcb_xkb_use_extension(switcher.connection(), 1, 0);
+    own(xcb_xkb_use_extension_reply(switcher.connection(), use, nullptr));
+    xcb_xkb_latch_lock_state(switcher.connection(), XCB_XKB_ID_USE_CORE_KBD, 0, 0, 1, 0, 0, 0, 0);
+    switcher.focusedWindow();
+    await("the first layout is back", [&] { return identifier() == "us"; });
+    takeHeard(2);
+    tapKey(29);
+    EXPECT_EQ(target->awaitText("zy"), "zy");
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, 16, 0, u"y"}));
+}
+
+TEST_F(X11TapTest, ComposesDeadKeys) {
+    const auto target = rig_->startTarget(TargetKind::Xterm);
+    createTap();
+    setLayout({"de"});
+    await("the layout is de", [&] { return identifier() == "de"; });
+    tapKey(21);  // dead acute
+    tapKey(26);  // e
+    tapKey(26);
+    const auto all = takeHeard(6);
+    EXPECT_EQ(all.at(0), (Heard{Type::KeyDown, 24, 0, u""}));
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 14, 0, u"\u00E9"}));
+    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, 14, 0, u"e"}));
+    EXPECT_EQ(target->awaitText("ée"), "ée");
+}
+
+TEST_F(X11TapTest, HeldKeysRepeat) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    rig_->keyboard().press(38);
+    await("it repeats", [&] { return target->text().size() >= 4; });
+    rig_->keyboard().releaseAll();
+    await("it is up", [] { return keysDown().empty(); });
+    const std::string text = target->text();
+    rig_->keyboard().type("b");
+    EXPECT_EQ(target->awaitText(text + "b"), text + "b");
+    const auto all = heard();
+    EXPECT_GE(std::ranges::count(all, Heard{Type::KeyDown, 0, 0, u"a"}), 3);
+    EXPECT_EQ(std::ranges::count(all, Heard{Type::KeyUp, 0, 0, u"a"}), 1);
+}
+
+TEST_F(X11TapTest, AKeyWhoseRepeatIsSwallowedStopsRepeating) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    setDecision([presses = 0](const TapEvent& event) mutable { return event.type == Type::KeyDown && ++presses > 1; });
+    rig_->keyboard().press(38);
+    takeHeard(8);
+    EXPECT_EQ(keysDown(), std::vector<int>{}) << "for the programs, that is";
+    const std::string text = target->text();
+    EXPECT_LE(text.size(), 2U);
+    rig_->keyboard().releaseAll();
+    setDecision(nullptr);
+    rig_->keyboard().type("b");
+    EXPECT_EQ(target->awaitText(text + "b"), text + "b");
+}
+
+TEST_F(X11TapTest, HeldBackKeysFollowInOrder) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    setDecision([this](const TapEvent& event) {
+        if (event.type == Type::KeyDown && event.string == u"x") tap_->parts().tap->hold();
+        return false;
+    });
+    rig_->keyboard().type("axyz");
+    takeHeard(3);
+    tap_->call([](Parts& parts) {
+        for (const bool down : {true, false}) parts.connection->sendKey(24, down);  // q
+        parts.connection->connection().sync();                                      // reads ahead
+    });
+    EXPECT_EQ(target->awaitText("aq"), "aq");
+    EXPECT_EQ(heard(), std::vector<Heard>{}) << "the keys behind it wait";
+    tap_->call([](Parts& parts) { parts.tap->release(); });
+    EXPECT_EQ(target->awaitText("aqxyz"), "aqxyz");
+}
+
+TEST_F(X11TapTest, HeldBackKeysWaitTwoSecondsAtMost) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    setDecision([this](const TapEvent& event) {
+        if (event.type == Type::KeyDown && event.string == u"x") tap_->parts().tap->hold();
+        return false;
+    });
+    const auto start = std::chrono::steady_clock::now();
+    rig_->keyboard().type("xy");
+    EXPECT_EQ(target->awaitText("xy"), "xy");
+    EXPECT_GT(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(1'900));
+}
+
+TEST_F(X11TapTest, KeysHeldWhileItComesAndGoesComeUp) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    rig_->keyboard().press(Key::LeftShift);
+    rig_->keyboard().sync();
+    createTap();
+    tapKey(38);
+    EXPECT_EQ(target->awaitText("A"), "A");
+    rig_->keyboard().releaseAll();
+    tapKey(38);
+    EXPECT_EQ(target->awaitText("Aa"), "Aa");
+    rig_->keyboard().press(Key::LeftShift);
+    rig_->keyboard().sync();
+    await("shift is down", [] { return keysDown() == std::vector<int>{50}; });
+    removeTap();
+    EXPECT_EQ(keysDown(), std::vector<int>{}) << "nothing pressed by the tap stays down";
+    rig_->keyboard().releaseAll();
+    rig_->keyboard().type("bC");
+    EXPECT_EQ(target->awaitText("AabC"), "AabC");
+}
+
+TEST_F(X11TapTest, PassesKeysUnheardWhileSomebodyHoldsTheKeyboard) {
+    createTap();
+    {
+        XClient locker(rig_->server().display());
+        const auto cookie = xcb_grab_keyboard(locker.connection(), 0, locker.root(), XCB_CURRENT_TIME,
+                                              XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC);
+        ASSERT_EQ(own(xcb_grab_keyboard_reply(locker.connection(), cookie, nullptr))->status, 0);
+        tapKey(39);  // the answer may be as old as the key before
+        takeHeard(0);
+        tap_->call([this](Parts& /*parts*/) { listener_.heard.clear(); });
+        tapKey(38);
+        int received = 0;
+        await("the locker gets the keys", [&] {
+            while (const auto event = own(xcb_poll_for_event(locker.connection()))) {
+                if (event->response_type == XCB_KEY_PRESS) ++received;
+            }
+            return received == 2;
+        });
+        EXPECT_EQ(heard(), std::vector<Heard>{});
+    }
+    await("the locker has let go", [&] {
+        tapKey(38);
+        return !heard().empty();
+    });
+}
+
+TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    std::atomic<bool> password = true;
+    tap_->call([&](Parts& parts) { parts.tap->setFocusIsPassword([&] { return password.load(); }); });
+    createTap();
+    rig_->keyboard().type("Se");
+    rig_->keyboard().press(Key::LeftShift);
+    EXPECT_EQ(target->awaitText("Se"), "Se");
+    EXPECT_EQ(heard(), std::vector<Heard>{});
+    await("shift is down", [] { return keysDown() == std::vector<int>{50}; });
+    password = false;
+    tapKey(38);
+    rig_->keyboard().releaseAll();
+    EXPECT_EQ(target->awaitText("SeA"), "SeA");
+    const auto all = takeHeard(3);
+    EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, 56, ShiftFlag, u""})) << "what was missed is made up for";
+    EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, 0, ShiftFlag, u"A"}));
+}
+
+TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEnded) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    std::vector<xcb_window_t> windows;
+    tap_->call([&](Parts& parts) {
+        listener_.tapToEnable = parts.tap.get();
+        windows.push_back(parts.connection->window());
+        parts.connection->setReopenedListener([&](xcb_window_t window) { windows.push_back(window); });
+    });
+    rig_->keyboard().press(38);
+    await("a is down", [] { return keysDown() == std::vector<int>{38}; });
+    xcb_kill_client(rig_->client().connection(), windows.front());
+    rig_->client().focusedWindow();
+    await("the tap is told", [&] { return tap_->call([this](Parts& /*parts*/) { return listener_.timeouts == 1; }); });
+    rig_->keyboard().releaseAll();
+    await("all keys are up", [] { return keysDown().empty(); });
+    const std::string text = target->text();
+    takeHeard(1);
+    rig_->keyboard().type("b");
+    EXPECT_EQ(target->awaitText(text + "b"), text + "b");
+    EXPECT_THAT(takeHeard(2), testing::Contains(Heard{Type::KeyDown, 11, 0, u"b"}));
+    tap_->call([&](Parts& parts) {
+        EXPECT_EQ(windows.size(), 2U);
+        EXPECT_EQ(windows.back(), parts.connection->window());
+        EXPECT_EQ(listener_.timeouts, 1);
+    });
+}
+
+TEST_F(X11TapTest, SaysThatAnotherProgramHasTheKeyboard) {
+    TapThread other(rig_->server().display());
+    Listener listener;
+    EXPECT_TRUE(other.call([&](Parts& parts) { return parts.tap->create(listener, false); }).ok());
+    const auto refused = tap_->call([this](Parts& parts) { return parts.tap->create(listener_, false); });
+    ASSERT_FALSE(refused.ok());
+    EXPECT_THAT(refused.error().message, testing::HasSubstr("\"test keyboard\""));
+    EXPECT_THAT(refused.error().message, testing::HasSubstr("held by another program"));
+    EXPECT_FALSE(tap_->call([](Parts& parts) { return parts.tap->exists(); }));
+    other.call([](Parts& parts) { parts.tap->remove(); });
+    createTap();
+    EXPECT_TRUE(tap_->call([](Parts& parts) { return parts.tap->check().ok(); }));
+}
+
+TEST_F(X11TapTest, ChecksWithoutCreating) {
+    EXPECT_TRUE(tap_->call([](Parts& parts) { return parts.tap->check().ok() && !parts.tap->exists(); }));
+    const auto nowhere = TapConnection::check(":99999");
+    ASSERT_FALSE(nowhere.ok());
+    EXPECT_THAT(nowhere.error().message, testing::HasSubstr(":99999"));
+}
+
+// A keyboard of the server. Switching it on and off is what plugging it in and out does to it.
+class Device {
+  public:
+    Device(const std::string& display, std::string name) : client_(display), name_(std::move(name)) {
+        auto connection = XcbConnection::open(display);
+        if (!connection) throw RigError(connection.error().message);
+        connection_ = std::move(connection).value();
+        const auto version = xcb_input_xi_query_version(connection_->get(), 2, 2);
+        own(xcb_input_xi_query_version_reply(connection_->get(), version, nullptr));
+    }
+    void set(bool on) {
+        const std::uint8_t value = on ? 1 : 0;
+        xcb_input_xi_change_property(client_.connection(), now().id, XCB_PROP_MODE_REPLACE, 8,
+                                     client_.atom("Device Enabled"), XCB_ATOM_INTEGER, 1, &value);
+        client_.focusedWindow();
+    }
+    // It hangs on no master as long as somebody has taken it.
+    bool isTaken() const { return now().type == XCB_INPUT_DEVICE_TYPE_FLOATING_SLAVE; }
+
+  private:
+    InputDevice now() const {
+        for (InputDevice& device : inputDevices(*connection_)) {
+            if (device.name == name_) return device;
+        }
+        throw RigError("there is no " + name_);
+    }
+
+    XClient client_;
+    std::string name_;
+    std::unique_ptr<XcbConnection> connection_;
+};
+
+TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThatGo) {
+    XServer::Options options;
+    options.secondKeyboard = true;
+    DesktopRig rig(options);
+    Device second(rig.server().display(), "second keyboard");
+    second.set(false);
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    Listener listener;
+    TapThread tap(rig.server().display());
+    ASSERT_TRUE(tap.call([&](Parts& parts) { return parts.tap->create(listener, false); }).ok());
+    second.set(true);
+    rig.client().await("the keyboard is taken", Bound, [&] { return second.isTaken(); });
+    InputTestSocket keys(rig.server().secondKeyboardSocket());
+    for (const bool down : {true, false}) keys.sendKey(56, down);
+    EXPECT_EQ(target->awaitText("b"), "b");
+    const auto heard = tap.call([&](Parts& /*parts*/) { return listener.heard; });
+    EXPECT_THAT(heard, testing::ElementsAre(Heard{Type::KeyDown, 11, 0, u"b"}, Heard{Type::KeyUp, 11, 0, u"b"}));
+
+    keys.sendKey(50, true);  // Shift
+    keys.sync();
+    second.set(false);
+    rig.keyboard().type("c");
+    EXPECT_EQ(target->awaitText("bc"), "bc");
+}
+
+TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
+    constexpr xkb_keysym_t own = 0x1006E00;
+    int changes = 0;
+    const auto spare = tap_->call([&](Parts& parts) {
+        parts.keyboard->addListener([&](XkbKeyboard::Change change) {
+            if (change == XkbKeyboard::Change::Keymap) ++changes;
+        });
+        return parts.keyboard->keymap()->spareKeycodes().back();
+    });
+    const auto write = [&](xcb_keycode_t keycode, std::vector<xcb_keysym_t> symbols) {
+        xcb_change_keyboard_mapping(rig_->client().connection(), 1, keycode, static_cast<std::uint8_t>(symbols.size()),
+                                    symbols.data());
+        rig_->client().focusedWindow();
+    };
+    layoutChanged_ = true;  // to be undone
+    tap_->call([&](Parts& parts) { parts.keyboard->willWrite(spare, std::array{own}); });
+    write(spare, {own, own});
+    write(38, {XKB_KEY_q, XKB_KEY_Q});  // the user's change
+    await("the layout has changed", [&] { return translate(0, 0) == u"q"; });
+    tap_->call([&](Parts& parts) {
+        EXPECT_EQ(changes, 1);
+        EXPECT_FALSE(parts.keyboard->keymap()->strokeFor(U'\u6E00', 0).has_value());
+        EXPECT_THAT(parts.keyboard->keymap()->spareKeycodes(), testing::Contains(spare));
+        EXPECT_EQ(parts.keyboard->keymap()->strokeFor(U'Q', 0)->keycode, 24) << "Q first of all where it was";
+    });
+}
+
+TEST_F(X11TapTest, HearsClicks) {
+    std::vector<Point> clicks;
+    const auto created = tap_->call(
+        [&](Parts& parts) { return parts.mouse->create([&](Point location) { clicks.push_back(location); }); });
+    ASSERT_TRUE(created.ok());
+    for (const int button : {1, 2, 3}) {
+        rig_->click(200 + button, 300, button);
+        const std::size_t expected = button == 3 ? 2 : 1;
+        await("it is heard", [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() == expected; }); });
+    }
+    tap_->call([](Parts& parts) { parts.mouse->remove(); });
+    rig_->click(1, 1);
+    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }), (std::vector<Point>{{201, 300}, {203, 300}}));
+}
+
+}  // namespace
+
+}  // namespace plume::rig

@@ -1,0 +1,116 @@
+// What the layout of a keyboard says, without a keyboard.
+
+#include "platform/x11/XkbKeymap.h"
+
+#include <gtest/gtest.h>
+
+#include <ostream>
+#include <string>
+
+#include "platform/x11/X11KeyCodes.h"
+
+namespace plume {
+
+namespace {
+
+XkbKeymap keymapOf(const char* layout, const char* variant = "", const char* options = "",
+                   const KeycodeSet& foreign = {}) {
+    const XkbOwned<xkb_context> context(xkb_context_new(XKB_CONTEXT_NO_FLAGS));
+    const xkb_rule_names names{"evdev", "pc105", layout, variant, options};
+    return {XkbOwned<xkb_keymap>(xkb_keymap_new_from_names(context.get(), &names, XKB_KEYMAP_COMPILE_NO_FLAGS)),
+            foreign};
+}
+
+constexpr std::uint8_t Shift = XCB_MOD_MASK_SHIFT;
+constexpr std::uint8_t LevelThree = XCB_MOD_MASK_5;
+
+struct Typed {
+    const char* layout;
+    char32_t character;
+    int keycode;
+    int modifiers;
+    unsigned group = 0;
+};
+
+void PrintTo(const Typed& typed, std::ostream* out) {
+    *out << typed.layout << " U+" << std::hex << static_cast<unsigned>(typed.character);
+}
+
+class XkbStrokeTest : public testing::TestWithParam<Typed> {};
+
+TEST_P(XkbStrokeTest, CharactersAreTypedWithTheFewestModifiers) {
+    const auto stroke = keymapOf(GetParam().layout).strokeFor(GetParam().character, GetParam().group);
+    ASSERT_TRUE(stroke.has_value());
+    EXPECT_EQ(stroke->keycode, GetParam().keycode);
+    EXPECT_EQ(stroke->modifiers, GetParam().modifiers);
+}
+
+INSTANTIATE_TEST_SUITE_P(All, XkbStrokeTest,
+                         testing::Values(Typed{"us", U'a', 38, 0}, Typed{"us", U'A', 38, Shift},
+                                         Typed{"us", U'1', 10, 0},  // not the keypad's
+                                         Typed{"us", U'<', 94, 0}, Typed{"us", U'\n', 36, 0}, Typed{"us", U'\t', 23, 0},
+                                         Typed{"de", U'z', 29, 0}, Typed{"de", U'<', 94, 0},
+                                         Typed{"de", U'@', 24, LevelThree}, Typed{"de", U'\u00E4', 48, 0},
+                                         Typed{"fr", U'1', 10, Shift}, Typed{"us,de", U'z', 52, 0},
+                                         Typed{"us,de", U'z', 29, 0, 1}, Typed{"us,ru", U'\u0434', 46, 0, 1}));
+
+TEST(XkbKeymapTest, CharactersOnNoKeyHaveNoStroke) {
+    EXPECT_FALSE(keymapOf("us").strokeFor(U'\u65E5', 0).has_value());
+    EXPECT_FALSE(keymapOf("us,ru").strokeFor(U'\u0434', 0).has_value());
+    EXPECT_FALSE(keymapOf("us").strokeFor(U'\b', 0).has_value());
+}
+
+TEST(XkbKeymapTest, KeysAreWhatTheUserMadeOfThem) {
+    const auto swapped = keymapOf("us", "", "caps:swapescape");
+    EXPECT_EQ(swapped.keycodeOf(53), 66);
+    EXPECT_EQ(swapped.keycodeOf(57), 9);
+    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_Escape), 53);
+    const auto control = keymapOf("us", "", "ctrl:nocaps");
+    EXPECT_EQ(control.keycodeOf(57), 0) << "there is no Caps Lock left";
+    EXPECT_EQ(control.keycodeOf(59), 37);
+    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_Control_L), 59);
+    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_a), FirstForeignKeyCode + 66) << "no longer Caps Lock";
+}
+
+TEST(XkbKeymapTest, ModifiersHaveKeys) {
+    const auto german = keymapOf("de");
+    EXPECT_EQ(german.keyOfModifier(Shift), 50);
+    EXPECT_EQ(german.keyOfModifier(XCB_MOD_MASK_CONTROL), 37);
+    EXPECT_EQ(german.keyOfModifier(XCB_MOD_MASK_1), 64);
+    EXPECT_EQ(german.keyOfModifier(XCB_MOD_MASK_4), 133);
+    EXPECT_EQ(german.modifiersOf(german.keyOfModifier(LevelThree)), LevelThree);
+    EXPECT_EQ(german.keyOfModifier(XCB_MOD_MASK_LOCK), 0) << "it locks, it is not held";
+    EXPECT_EQ(german.modifiersOf(38), 0);
+    EXPECT_EQ(german.modifiersOf(62), Shift);
+}
+
+TEST(XkbKeymapTest, ForeignKeysAreNoPartOfTheLayout) {
+    const auto german = keymapOf("de");
+    KeycodeSet foreign;
+    foreign.set(48);  // the only one for U+00E4
+    const auto without = keymapOf("de", "", "", foreign);
+    EXPECT_FALSE(without.strokeFor(U'\u00E4', 0).has_value());
+    EXPECT_EQ(without.spareKeycodes().size(), german.spareKeycodes().size() + 1);
+    EXPECT_NE(without.fingerprint(), german.fingerprint());
+    EXPECT_EQ(german.fingerprint(), keymapOf("de").fingerprint());
+    EXPECT_NE(german.fingerprint(), keymapOf("de", "nodeadkeys").fingerprint());
+}
+
+TEST(XkbKeymapTest, OnlyDeadAndComposeKeysCompose) {
+    EXPECT_FALSE(keymapOf("us").hasComposingKeys());
+    EXPECT_TRUE(keymapOf("de").hasComposingKeys());
+    EXPECT_TRUE(keymapOf("us", "", "compose:ralt").hasComposingKeys());
+}
+
+TEST(X11KeyCodesTest, EveryKeyHasOneCodeAndBack) {
+    for (unsigned keycode = 8; keycode < 256; ++keycode) {
+        const auto key = static_cast<xcb_keycode_t>(keycode);
+        EXPECT_EQ(placeOfVirtualKey(virtualKeyAt(key)), key);
+    }
+    EXPECT_EQ(placeOfVirtualKey(65535), 0);
+    EXPECT_EQ(placeOfVirtualKey(127), 0);
+}
+
+}  // namespace
+
+}  // namespace plume
