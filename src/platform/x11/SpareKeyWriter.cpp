@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
-#include <span>
+#include <utility>
 #include <vector>
 
 #include "platform/x11/XcbXkb.h"
@@ -20,29 +20,76 @@ xkb_keysym_t symbolOf(char32_t character) {
     return latin1 ? character : 0x01000000 + character;
 }
 
-// The first symbol of each of the key codes on one device, by key code from the first.
-std::vector<xkb_keysym_t> firstSymbols(xcb_connection_t* connection, std::uint16_t device, xcb_keycode_t first,
-                                       std::uint8_t count) {
+// The symbols of some key codes on one device: for each a head and as many symbols as it says, one after the other.
+struct KeySymbols {
+    struct Key {
+        xcb_xkb_key_sym_map_t head{};
+        std::vector<xkb_keysym_t> symbols;
+
+        void set(xkb_keysym_t symbol);
+    };
+
+    xcb_keycode_t minimum = 0;
+    xcb_keycode_t maximum = 0;
+    xcb_keycode_t first = 0;
+    std::vector<Key> keys;
+
+    static KeySymbols read(xcb_connection_t* connection, std::uint16_t device, xcb_keycode_t first, std::uint8_t count);
+    void write(xcb_connection_t* connection, std::uint16_t device) const;
+};
+
+// One group of one level, of the first type, which is that of keys without levels everywhere; or none.
+void KeySymbols::Key::set(xkb_keysym_t symbol) {
+    const bool any = symbol != XKB_KEY_NoSymbol;
+    head = {};
+    head.groupInfo = any ? 1 : 0;
+    head.width = any ? 1 : 0;
+    head.nSyms = any ? 1 : 0;
+    symbols.assign(head.nSyms, symbol);
+}
+
+KeySymbols KeySymbols::read(xcb_connection_t* connection, std::uint16_t device, xcb_keycode_t first,
+                            std::uint8_t count) {
     xcb_discard_reply(connection, xcb_xkb_use_extension(connection, 1, 0).sequence);
     const auto cookie = xcb_xkb_get_map(connection, device, 0, XCB_XKB_MAP_PART_KEY_SYMS, 0, 0, first, count, 0, 0, 0,
                                         0, 0, 0, 0, 0, 0, 0, 0);
     const XcbOwned<xcb_xkb_get_map_reply_t> reply(xcb_xkb_get_map_reply(connection, cookie, nullptr));
-    if (!reply) return {};
-    std::vector<xkb_keysym_t> symbols;
+    KeySymbols map;
+    if (!reply) return map;
+    map.minimum = reply->minKeyCode;
+    map.maximum = reply->maxKeyCode;
+    map.first = reply->firstKeySym;
     const auto* next = static_cast<const std::uint8_t*>(xcb_xkb_get_map_map(reply.get()));
     const auto* const end = reinterpret_cast<const std::uint8_t*>(reply.get()) + 32 + std::size_t{reply->length} * 4;
-    xcb_xkb_key_sym_map_t head;
-    while (symbols.size() < reply->nKeySyms && static_cast<std::size_t>(end - next) >= sizeof head) {
-        std::memcpy(&head, next, sizeof head);
-        next += sizeof head;
-        const std::size_t length = head.nSyms * sizeof(xkb_keysym_t);
-        if (static_cast<std::size_t>(end - next) < length) break;
-        xkb_keysym_t symbol = XKB_KEY_NoSymbol;
-        if (length > 0) std::memcpy(&symbol, next, sizeof symbol);
-        symbols.push_back(symbol);
-        next += length;
+    const auto left = [&] { return static_cast<std::size_t>(end - next); };
+    while (map.keys.size() < reply->nKeySyms && left() >= sizeof(xcb_xkb_key_sym_map_t)) {
+        Key key;
+        std::memcpy(&key.head, next, sizeof key.head);
+        next += sizeof key.head;
+        if (left() < key.head.nSyms * sizeof(xkb_keysym_t)) break;
+        key.symbols.resize(key.head.nSyms);
+        std::copy_n(next, key.head.nSyms * sizeof(xkb_keysym_t), reinterpret_cast<std::uint8_t*>(key.symbols.data()));
+        next += key.head.nSyms * sizeof(xkb_keysym_t);
+        map.keys.push_back(std::move(key));
     }
-    return symbols;
+    return map;
+}
+
+void KeySymbols::write(xcb_connection_t* connection, std::uint16_t device) const {
+    std::vector<std::uint8_t> bytes;
+    std::size_t total = 0;
+    const auto append = [&bytes](const void* data, std::size_t size) {
+        const auto* const start = static_cast<const std::uint8_t*>(data);
+        bytes.insert(bytes.end(), start, start + size);
+    };
+    for (const Key& key : keys) {
+        append(&key.head, sizeof key.head);
+        append(key.symbols.data(), key.symbols.size() * sizeof(xkb_keysym_t));
+        total += key.symbols.size();
+    }
+    xcb_xkb_set_map(connection, device, XCB_XKB_MAP_PART_KEY_SYMS, 0, minimum, maximum, 0, 0, first,
+                    static_cast<std::uint8_t>(keys.size()), static_cast<std::uint16_t>(total), 0, 0, 0, 0, 0, 0, 0, 0,
+                    0, 0, 0, 0, 0, 0, 0, 0, bytes.data());
 }
 
 }  // namespace
@@ -74,12 +121,12 @@ void SpareKeyWriter::verify(SpareKeycodes& spares, double since) const {
     if (first == loans.end()) return;
     const auto last = std::ranges::find_if(loans.rbegin(), loans.rend(), isUsed);
     const auto count = static_cast<std::uint8_t>(last->keycode - first->keycode + 1);
-    const auto symbols =
-        firstSymbols(connection_.connection().get(), connection_.testKeyboard(), first->keycode, count);
+    const auto map =
+        KeySymbols::read(connection_.connection().get(), connection_.testKeyboard(), first->keycode, count);
     for (auto& loan : loans) {
         if (!isUsed(loan)) continue;
         const std::size_t index = loan.keycode - first->keycode;
-        loan.written = index < symbols.size() && symbols[index] == symbolOf(loan.character);
+        loan.written = index < map.keys.size() && map.keys[index].symbols == std::vector{symbolOf(loan.character)};
     }
 }
 
@@ -98,25 +145,18 @@ bool SpareKeyWriter::change(const Symbols& symbols, const Symbols* only) {
     auto* const connection = connection_.connection().get();
     const xcb_keycode_t first = symbols.begin()->first;
     const auto count = static_cast<std::uint8_t>(symbols.rbegin()->first - first + 1);
-    const XcbOwned<xcb_get_keyboard_mapping_reply_t> reply(
-        xcb_get_keyboard_mapping_reply(connection, xcb_get_keyboard_mapping(connection, first, count), nullptr));
-    if (!reply) return false;
-    const std::size_t width = reply->keysyms_per_keycode;
-    const std::span all(xcb_get_keyboard_mapping_keysyms(reply.get()), width * count);
+    auto map = KeySymbols::read(connection, XCB_XKB_ID_USE_CORE_KBD, first, count);
+    if (map.keys.size() != count) return false;
     std::vector<xkb_keysym_t> written(count, XKB_KEY_NoSymbol);
     for (const auto& [keycode, symbol] : symbols) {
         const std::size_t index = keycode - first;
-        const auto row = all.subspan(index * width, width);
-        const auto isOther = [&, keycode = keycode](xcb_keysym_t there) {
-            return there != XKB_KEY_NoSymbol && there != only->at(keycode);
-        };
-        if (only && std::ranges::any_of(row, isOther)) continue;
-        std::ranges::fill(row, symbol);
+        if (only && map.keys[index].symbols != std::vector{only->at(keycode)}) continue;
+        map.keys[index].set(symbol);
         written[index] = symbol;
     }
     // The end of a leftover, which was taken for a part of the layout, is to be noticed as a change of it.
     if (!only) keyboard_.willWrite(first, written);
-    xcb_change_keyboard_mapping(connection, count, first, reply->keysyms_per_keycode, all.data());
+    map.write(connection, XCB_XKB_ID_USE_CORE_KBD);
     return true;
 }
 

@@ -1,0 +1,336 @@
+// The poster on a real X server: what it types arrives, exactly, in programs of three kinds, whatever the user's
+// keyboard is just doing.
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <chrono>
+#include <iostream>
+#include <string>
+
+#include "platform/x11/TerminalApplications.h"
+#include "platform/x11/X11KeyCodes.h"
+#include "tests/desktop/Deadline.h"
+#include "tests/desktop/DesktopRig.h"
+#include "tests/desktop/KeyboardPort.h"
+
+namespace plume::rig {
+
+namespace {
+
+using std::chrono::steady_clock;
+
+std::u16string utf16(const std::string& text) {
+    std::u16string units;
+    for (std::size_t i = 0; i < text.size();) {
+        const auto lead = static_cast<unsigned char>(text[i]);
+        const std::size_t length = lead < 0x80 ? 1 : lead < 0xE0 ? 2 : lead < 0xF0 ? 3 : 4;
+        char32_t character = length == 1 ? lead : lead & (0x7FU >> length);
+        for (std::size_t k = 1; k < length; ++k) {
+            character = (character << 6) | (static_cast<unsigned char>(text[i + k]) & 0x3FU);
+        }
+        if (character >= 0x10000) {
+            units += static_cast<char16_t>(0xD800 + ((character - 0x10000) >> 10));
+            units += static_cast<char16_t>(0xDC00 + ((character - 0x10000) & 0x3FF));
+        } else {
+            units += static_cast<char16_t>(character);
+        }
+        i += length;
+    }
+    return units;
+}
+
+// `characters` CJK characters from the given one on, none twice.
+std::string distinctCharacters(int from, int characters) {
+    std::string text;
+    for (int code = 0x4E00 + from; characters > 0; --characters, ++code) {
+        text += static_cast<char>(0xE0 | (code >> 12));
+        text += static_cast<char>(0x80 | ((code >> 6) & 0x3F));
+        text += static_cast<char>(0x80 | (code & 0x3F));
+    }
+    return text;
+}
+
+// Lines of about forty characters, a thousand characters together, such that a lost, doubled or swapped one shows.
+std::string lines(const std::string& start, std::size_t startLength) {
+    std::string text;
+    std::size_t length = 0;
+    for (int line = 0; length < 1000; ++line) {
+        const std::string number = " Line " + std::to_string(line * 7919 % 1000) + ", (~_~) {x}|\\^";
+        text += start + number + '\n';
+        length += startLength + number.size() + 1;
+    }
+    return text;
+}
+
+const std::string AsciiLine = "Quick \"brown\" fox";
+const std::string MixedLine = "naïve Ünïcödé — 日本語 【】 😀";
+
+// A held or locked key at the end of a test must not reach the next one, so each brings its own desktop's keyboard to
+// rest.
+class X11PosterTest : public testing::TestWithParam<TargetKind> {
+  protected:
+    static void SetUpTestSuite() { rig_ = std::make_unique<DesktopRig>(); }
+    static void TearDownTestSuite() { rig_.reset(); }
+
+    void SetUp() override { target_ = rig_->startTarget(GetParam()); }
+    void TearDown() override { rig_->keyboard().releaseAll(); }
+
+    void startPort(KeyboardPort::Decide decide = {}) {
+        port_ = std::make_unique<KeyboardPort>(rig_->server().display(),
+                                               KeyboardPort::Options{.decide = std::move(decide), .disabled = {}});
+    }
+    bool canType(const std::string& text) {
+        bool can = false;
+        port_->run([&] { can = port_->poster().canType(utf16(text)); });
+        return can;
+    }
+    void expectTyped(const std::string& what, const std::string& text, std::size_t characters) {
+        target_->clear();
+        const auto start = steady_clock::now();
+        port_->type(utf16(text));
+        ASSERT_EQ(target_->awaitText(text, Milliseconds(20'000)), text);
+        const double seconds = std::chrono::duration<double>(steady_clock::now() - start).count();
+        std::cout << nameOf(GetParam()) << ": " << what << ", " << characters << " characters, "
+                  << static_cast<int>(static_cast<double>(characters) / seconds) << " a second\n";
+    }
+
+    static inline std::unique_ptr<DesktopRig> rig_;
+    std::unique_ptr<TargetProgram> target_;
+    std::unique_ptr<KeyboardPort> port_;
+};
+
+TEST_P(X11PosterTest, TypesAThousandCharactersExactly) {
+    startPort();
+    expectTyped("ASCII", lines(AsciiLine, 17), 1000);
+    ASSERT_TRUE(canType(MixedLine));
+    expectTyped("mixed", lines(MixedLine, 25), 1000);
+}
+
+TEST_P(X11PosterTest, CapsLockAndHeldShiftDoNotTouchTheTextAndComeBack) {
+    startPort();
+    rig_->keyboard().tap(Key::CapsLock);
+    rig_->keyboard().type("x");
+    ASSERT_EQ(target_->awaitText("X"), "X");
+    port_->type(u" Caps é日 Ün ");
+    EXPECT_EQ(target_->awaitText("X Caps é日 Ün "), "X Caps é日 Ün ");
+    rig_->keyboard().type("x");
+    ASSERT_EQ(target_->awaitText("X Caps é日 Ün X"), "X Caps é日 Ün X");
+    rig_->keyboard().tap(Key::CapsLock);
+
+    target_->clear();
+    const int x = rig_->keyboard().keycodeOf(U'x');
+    const auto tapX = [&] {
+        rig_->keyboard().press(x);
+        rig_->keyboard().release(x);
+        rig_->keyboard().sync();
+    };
+    rig_->keyboard().press(Key::LeftShift);
+    tapX();
+    ASSERT_EQ(target_->awaitText("X"), "X");
+    port_->type(u" Shift é日 {} ");
+    tapX();
+    EXPECT_EQ(target_->awaitText("X Shift é日 {} X"), "X Shift é日 {} X");
+    rig_->keyboard().release(Key::LeftShift);
+    tapX();
+    EXPECT_EQ(target_->awaitText("X Shift é日 {} Xx"), "X Shift é日 {} Xx");
+}
+
+TEST_P(X11PosterTest, ExpansionsInsideUnbrokenTypingAreExact) {
+    const std::string output = "é—Expansion—日本 ";
+    bool swallowed = false;
+    startPort([&](const TapEvent& event) {
+        if (event.type != TapEvent::Type::KeyDown || event.string != u"q") return false;
+        swallowed = true;
+        port_->poster().holdUserKeys();
+        // Later, as deliveries are: what is typed until then must wait.
+        port_->loop().performAfterDelay(0.003, [&] {
+            auto& poster = port_->poster();
+            poster.begin();
+            poster.post({.text = utf16(output)}, false);
+            poster.end();
+            poster.releaseUserKeys();
+        });
+        return true;
+    });
+    std::string expected;
+    for (int i = 0; i < 20; ++i) {
+        rig_->keyboard().typeRollingOver("abcqdefgh ");
+        expected += "abc" + output + "defgh ";
+    }
+    EXPECT_EQ(target_->awaitText(expected, Milliseconds(20'000)), expected);
+    EXPECT_TRUE(swallowed);
+    bool anyDown = true;
+    port_->run([&] { anyDown = port_->connection().keysDown().any(); });
+    EXPECT_FALSE(anyDown);
+}
+
+TEST_P(X11PosterTest, SpareKeyCodesAreUsedAgainOnceTheyHaveRested) {
+    startPort();
+    EXPECT_FALSE(canType(distinctCharacters(0, 40)));
+    EXPECT_FALSE(canType("control \x02"));
+    EXPECT_TRUE(canType("line\nand\ttab"));
+    std::string expected;
+    int rested = 0;
+    for (int round = 0; round < 4; ++round) {
+        const std::string text = distinctCharacters(10 * round, 10) + ' ';
+        const Deadline deadline(Milliseconds(10'000));
+        if (!canType(text)) ++rested;
+        while (!canType(text) && !deadline.passed()) deadline.waitReadable(-1, Milliseconds(10));
+        port_->type(utf16(text));
+        expected += text;
+    }
+    EXPECT_EQ(target_->awaitText(expected), expected);
+    EXPECT_GT(rested, 0);
+    // More than there are: the batch waits for the first ones to have rested.
+    target_->clear();
+    port_->type(utf16(distinctCharacters(100, 24)));
+    EXPECT_EQ(target_->awaitText(distinctCharacters(100, 24)), distinctCharacters(100, 24));
+}
+
+INSTANTIATE_TEST_SUITE_P(All, X11PosterTest,
+                         testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm),
+                         [](const auto& tested) { return nameOf(tested.param); });
+
+// What does not depend on the program.
+using X11PosterKeysTest = X11PosterTest;
+
+TEST_P(X11PosterKeysTest, PostsKeysWithExactlyTheirModifiers) {
+    constexpr std::uint16_t A = 0;
+    constexpr std::uint16_t Left = 123;
+    constexpr std::uint16_t Home = 115;
+    constexpr std::uint16_t Backspace = 51;
+    startPort();
+    rig_->keyboard().type("abcd");
+    ASSERT_EQ(target_->awaitText("abcd"), "abcd");
+    const auto press = [&](std::uint16_t key, std::uint64_t flags) {
+        port_->poster().post({.keyCode = key, .flags = flags, .down = true, .text = {}}, false);
+        port_->poster().post({.keyCode = key, .flags = 0, .down = false, .text = {}}, false);
+    };
+    // The user holds Shift: an arrow would select, were it not for the poster.
+    rig_->keyboard().press(Key::LeftShift);
+    rig_->keyboard().sync();
+    const Deadline deadline(Milliseconds(10'000));
+    bool shiftIsDown = false;
+    while (!shiftIsDown && !deadline.passed()) port_->run([&] { shiftIsDown = port_->poster().isKeyDown(56); });
+    port_->run([&] {
+        auto& poster = port_->poster();
+        poster.begin();
+        press(Left, 0);
+        poster.post({.text = u"-"}, false);
+        press(Left, X11Flag::Shift);
+        press(Backspace, 0);
+        press(Home, X11Flag::Shift);
+        poster.post({.text = u"X"}, false);
+        press(A, X11Flag::Control);
+        poster.post({.text = u"all\r\n\tü"}, false);
+        poster.end();
+    });
+    EXPECT_EQ(target_->awaitText("all\n\tü"), "all\n\tü");
+}
+
+TEST_P(X11PosterKeysTest, AKeyThatTheUserHoldsNeitherRepeatsIntoTheTextNorHidesInIt) {
+    startPort();
+    const int x = rig_->keyboard().keycodeOf(U'x');
+    rig_->keyboard().press(x);
+    rig_->keyboard().sync();
+    ASSERT_EQ(target_->awaitText("x"), "x");
+    port_->type(u"xx, box");
+    ASSERT_EQ(target_->awaitText("xxx, box"), "xxx, box");
+    rig_->keyboard().release(x);
+    rig_->keyboard().type("x");
+    EXPECT_EQ(target_->awaitText("xxx, boxx"), "xxx, boxx");
+}
+
+TEST_P(X11PosterKeysTest, CopiesAndPastesAsTheProgramInFrontWantsIt) {
+    constexpr std::uint16_t End = 119;
+    startPort();
+    std::optional<std::u16string> front;
+    port_->run([&] { port_->poster().frontIdentifier = [&] { return front; }; });
+    target_->setText("copied");
+    const auto send = [&](bool pastes) {
+        port_->run([&] {
+            auto& poster = port_->poster();
+            const auto stroke = pastes ? poster.pasteKeystroke() : poster.copyKeystroke();
+            poster.begin();
+            poster.post({.keyCode = stroke->keyCode, .flags = stroke->flags, .down = true, .text = {}}, false);
+            poster.post({.keyCode = stroke->keyCode, .flags = stroke->flags, .down = false, .text = {}}, false);
+            poster.end();
+        });
+    };
+    const auto selectAll = [&] {
+        rig_->keyboard().chord({Key::LeftControl}, U'a');
+        rig_->client().await("the selection", Milliseconds(5'000), [&] {
+            return rig_->client().areOfSameClient(rig_->client().selectionOwner("PRIMARY"), target_->window());
+        });
+    };
+    selectAll();
+    send(false);
+    rig_->client().await("the copy", Milliseconds(5'000), [&] {
+        return rig_->client().areOfSameClient(rig_->client().selectionOwner("CLIPBOARD"), target_->window());
+    });
+    port_->run([&] { port_->poster().post({.keyCode = End, .flags = 0, .down = true, .text = {}}, false); });
+    send(true);
+    EXPECT_EQ(target_->awaitText("copiedcopied"), "copiedcopied");
+    selectAll();  // which is what the terminal pastes
+
+    front = u"debian-xterm";
+    const auto terminal = rig_->startTarget(TargetKind::Xterm);
+    rig_->keyboard().type("typed ");
+    ASSERT_EQ(terminal->awaitText("typed "), "typed ");
+    send(false);  // Control+C would end what runs there
+    rig_->keyboard().type("on");
+    EXPECT_EQ(terminal->awaitText("typed on"), "typed on");
+    send(true);
+    EXPECT_TRUE(terminal->awaitPaste(Milliseconds(5'000)));
+}
+
+INSTANTIATE_TEST_SUITE_P(All, X11PosterKeysTest, testing::Values(TargetKind::GtkTextView),
+                         [](const auto& tested) { return nameOf(tested.param); });
+
+TEST(X11PosterLayoutTest, TypesTextOnTheLayoutAndTheGroupInForce) {
+    XServer::Options options;
+    options.layout = "de,us";
+    DesktopRig rig(options);
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    KeyboardPort port(rig.server().display(), {});
+    const std::string text = "zyZY äöüÖß?_-:; @€{[]}\\~ µ „Grüße“ — 日本語 ^`´";
+    port.type(utf16(text));
+    EXPECT_EQ(target->awaitText(text), text);
+
+    target->clear();
+    const auto switcher = rig.session().start({"setxkbmap", "us,de"}, "x11-xkb-utils");
+    ASSERT_EQ(switcher->waitForExit(Milliseconds(10'000)), 0);
+    const std::string mixed = "zyZY [] /?' äöü 日";
+    std::string typed;
+    // The port hears of the change in its own time.
+    for (int tries = 0; tries < 100 && typed != mixed; ++tries) {
+        target->clear();
+        port.type(utf16(mixed));
+        typed = target->awaitText(mixed, Milliseconds(200));
+    }
+    EXPECT_EQ(typed, mixed);
+}
+
+struct PasteCase {
+    std::u16string_view identifier;
+    PasteStyle style;
+};
+
+TEST(TerminalApplicationsTest, TerminalsPasteInTheirOwnWays) {
+    const PasteCase cases[] = {
+        {u"org.gnome.gedit", PasteStyle::Control}, {u"", PasteStyle::Control},
+        {u"XTerm", PasteStyle::ShiftInsert},       {u"debian-xterm.desktop", PasteStyle::ShiftInsert},
+        {u"URxvt", PasteStyle::ShiftInsert},       {u"org.gnome.Terminal.desktop", PasteStyle::ControlShift},
+        {u"Alacritty", PasteStyle::ControlShift},  {u"st", PasteStyle::ControlShift},
+        {u"xtermcontrol", PasteStyle::Control},
+    };
+    for (const auto& [identifier, style] : cases) {
+        EXPECT_EQ(pasteStyleOf(identifier), style) << std::string(identifier.begin(), identifier.end());
+        EXPECT_EQ(pastesPrimary(identifier), style == PasteStyle::ShiftInsert);
+    }
+}
+
+}  // namespace
+
+}  // namespace plume::rig

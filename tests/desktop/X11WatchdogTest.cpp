@@ -1,0 +1,232 @@
+// A program that holds the keyboard goes wrong in every way: the keyboard works within a second, every time.
+
+#include <gtest/gtest.h>
+#include <signal.h>
+
+#include <chrono>
+#include <cstdlib>
+#include <fstream>
+#include <iostream>
+#include <sstream>
+#include <string>
+
+#include "tests/desktop/Deadline.h"
+#include "tests/desktop/DesktopRig.h"
+#include "tests/desktop/XcbReply.h"
+
+namespace plume::rig {
+
+namespace {
+
+using std::chrono::steady_clock;
+
+std::string contentOf(const std::filesystem::path& file) {
+    std::ifstream stream(file);
+    std::ostringstream content;
+    content << stream.rdbuf();
+    return content.str();
+}
+
+int timesIn(const std::string& text, const std::string& word) {
+    int times = 0;
+    for (auto at = text.find(word); at != std::string::npos; at = text.find(word, at + 1)) ++times;
+    return times;
+}
+
+// Its state as the system has it; nothing for a process that is gone, or only waits to be noticed.
+std::optional<char> stateOf(pid_t process) {
+    const std::string content = contentOf("/proc/" + std::to_string(process) + "/stat");
+    const auto end = content.rfind(") ");
+    if (end == std::string::npos) return std::nullopt;
+    const char state = content.at(end + 2);
+    return state == 'Z' || state == 'X' ? std::nullopt : std::optional(state);
+}
+
+bool await(const std::function<bool()>& condition, Milliseconds bound = Milliseconds(10'000)) {
+    const Deadline deadline(bound);
+    while (!condition()) {
+        if (deadline.passed()) return false;
+        deadline.waitReadable(-1, Milliseconds(2));
+    }
+    return true;
+}
+
+// PLUME_WATCHDOG_TRIES asks for more than one try of each, with longer hangs.
+int tries() {
+    const char* const value = std::getenv("PLUME_WATCHDOG_TRIES");
+    return value ? std::atoi(value) : 1;
+}
+
+class X11WatchdogTest : public testing::Test {
+  protected:
+    static void SetUpTestSuite() { rig_ = std::make_unique<DesktopRig>(); }
+    static void TearDownTestSuite() { rig_.reset(); }
+
+    void SetUp() override {
+        target_ = rig_->startTarget(TargetKind::GtkTextView);
+        startProgram();
+    }
+    void TearDown() override { rig_->keyboard().releaseAll(); }
+
+    void startProgram() {
+        report_ = rig_->directory() / ("report" + std::to_string(++programs_));
+        const auto folder = std::filesystem::read_symlink("/proc/self/exe").parent_path();
+        program_ = rig_->session().start({folder / "keyboard_program", report_, tries() > 1 ? "10" : "2"}, "plume");
+        ASSERT_TRUE(await([&] { return timesIn(contentOf(report_), "\n") > 0 || !program_->isRunning(); }));
+        std::istringstream line(contentOf(report_));
+        std::string ready;
+        line >> ready >> watchdog_;
+        ASSERT_EQ(ready, "ready") << program_->logTail();
+        awaitSwallowing();
+    }
+
+    // Until the program has the keyboard.
+    void awaitSwallowing() {
+        ASSERT_TRUE(await([&] {
+            target_->clear();
+            rig_->keyboard().type("sx");
+            return target_->awaitText("x", Milliseconds(1'000)) == "x";
+        }));
+        target_->clear();
+    }
+
+    // Types until a key arrives; seconds from the first one.
+    double typeUntilFreed() {
+        const auto start = steady_clock::now();
+        const bool freed = await([&] {
+            rig_->keyboard().type("y");
+            return target_->text().find('y') != std::string::npos;
+        });
+        const double seconds = std::chrono::duration<double>(steady_clock::now() - start).count();
+        std::cout << "the keyboard worked after " << static_cast<int>(seconds * 1000) << " ms\n";
+        return freed ? seconds : 1e9;
+    }
+
+    // Nothing is down for any program, so nothing repeats.
+    void expectNoKeyDown() {
+        auto* const connection = rig_->client().connection();
+        std::string down;
+        EXPECT_TRUE(await([&] {
+            const auto reply = own(xcb_query_keymap_reply(connection, xcb_query_keymap(connection), nullptr));
+            down.clear();
+            for (int key = 0; reply && key < 256; ++key) {
+                if ((reply->keys[key / 8] >> (key % 8)) & 1) down += ' ' + std::to_string(key);
+            }
+            return reply && down.empty();
+        })) << "keys down:"
+            << down;
+    }
+
+    // When this returns, no thread of the program runs any more.
+    void stopProgram() {
+        const auto tasks = "/proc/" + std::to_string(program_->pid()) + "/task";
+        kill(program_->pid(), SIGSTOP);
+        ASSERT_TRUE(await([&] {
+            for (const auto& task : std::filesystem::directory_iterator(tasks)) {
+                const std::string state = contentOf(task.path() / "stat");
+                if (state.find(") T ") == std::string::npos) return false;
+            }
+            return true;
+        }));
+    }
+
+    void holdX() {
+        rig_->keyboard().press(rig_->keyboard().keycodeOf(U'x'));
+        rig_->keyboard().sync();
+        ASSERT_EQ(target_->takeChange(Milliseconds(10'000)).value_or(TextChange{}).inserted, "x");
+    }
+
+    void expectRecovered(int disabled) {
+        EXPECT_TRUE(await([&] { return timesIn(contentOf(report_), "disabled") == disabled; })) << contentOf(report_);
+        awaitSwallowing();
+    }
+
+    void expectEnded() {
+        program_->end();
+        EXPECT_TRUE(await([&] { return !stateOf(watchdog_); }));
+        expectNoKeyDown();
+    }
+
+    static inline std::unique_ptr<DesktopRig> rig_;
+    std::unique_ptr<TargetProgram> target_;
+    std::unique_ptr<ChildProcess> program_;
+    std::filesystem::path report_;
+    pid_t watchdog_ = 0;
+    static inline int programs_ = 0;
+};
+
+TEST_F(X11WatchdogTest, AStoppedProgramLosesTheKeyboardAndTakesItAgainWhenContinued) {
+    for (int i = 1; i <= tries(); ++i) {
+        holdX();
+        stopProgram();
+        rig_->keyboard().releaseAll();
+        EXPECT_LT(typeUntilFreed(), 1.0);
+        expectNoKeyDown();
+        kill(program_->pid(), SIGCONT);
+        expectRecovered(i);
+    }
+    expectEnded();
+}
+
+TEST_F(X11WatchdogTest, AHangingListenerLosesTheKeyboardAndTakesItAgain) {
+    for (int i = 1; i <= tries(); ++i) {
+        rig_->keyboard().press(Key::LeftShift);
+        rig_->keyboard().release(Key::LeftShift);
+        rig_->keyboard().type("h");
+        EXPECT_LT(typeUntilFreed(), 1.0);
+        expectNoKeyDown();
+        ASSERT_TRUE(await([&] { return timesIn(contentOf(report_), "disabled") == i; }, Milliseconds(15'000)));
+        expectRecovered(i);
+    }
+    expectEnded();
+}
+
+TEST_F(X11WatchdogTest, ALoopingListenerLosesTheKeyboard) {
+    for (int i = 1; i <= tries(); ++i) {
+        if (i > 1) startProgram();
+        holdX();
+        rig_->keyboard().type("l");
+        rig_->keyboard().releaseAll();
+        EXPECT_LT(typeUntilFreed(), 1.0);
+        expectNoKeyDown();
+        kill(program_->pid(), SIGKILL);
+        expectEnded();
+    }
+}
+
+TEST_F(X11WatchdogTest, AKilledProgramLeavesNoKeyDownAndNoWatchdog) {
+    for (int i = 1; i <= tries(); ++i) {
+        if (i > 1) startProgram();
+        holdX();
+        kill(program_->pid(), SIGKILL);
+        rig_->keyboard().releaseAll();
+        EXPECT_LT(typeUntilFreed(), 1.0);
+        expectNoKeyDown();
+        expectEnded();
+    }
+}
+
+TEST_F(X11WatchdogTest, AWatchdogThatIsKilledIsReplacedAndAsksForNothingWhileNobodyTypes) {
+    kill(watchdog_, SIGKILL);
+    // Its successor is the program's only child.
+    const auto task = std::to_string(program_->pid());
+    pid_t successor = 0;
+    ASSERT_TRUE(await([&] {
+        for (const auto& thread : std::filesystem::directory_iterator("/proc/" + task + "/task")) {
+            std::istringstream(contentOf(thread.path() / "children")) >> successor;
+            if (successor != 0 && successor != watchdog_) return true;
+        }
+        return false;
+    }));
+    watchdog_ = successor;
+    rig_->keyboard().type("x");
+    stopProgram();
+    EXPECT_LT(typeUntilFreed(), 1.5);  // it may just be starting
+    kill(program_->pid(), SIGCONT);
+    expectRecovered(1);
+    expectEnded();
+}
+
+}  // namespace
+
+}  // namespace plume::rig
