@@ -200,6 +200,7 @@ const Controls& documentControls() {
         {"expandedcolortbl", startDestination<Destination::ExpandedColorTable>},
         {"listtable", startDestination<Destination::ListTable>},
         {"listoverridetable", startDestination<Destination::ListOverrideTable>},
+        {"listtext", [](RTFReader& reader, RTFParameter) { reader.expectListMarker(); }},
         {"levelmarker", startDestination<Destination::ListMarker>},
         {"stylesheet", startDestination<Destination::Skip>},
         {"info", startDestination<Destination::Skip>},

@@ -90,6 +90,7 @@ void RTFReader::closeGroup() {
     } else {
         const Group closed = std::move(groups_.back());
         groups_.pop_back();
+        if (groups_.size() < markerGroup_) markerGroup_ = 0;
         if (closed.destination != group().destination) finishDestination(closed);
     }
 }
@@ -352,6 +353,11 @@ void RTFReader::emit(std::u16string_view text) {
 }
 
 void RTFReader::addToBody(std::u16string_view text) {
+    if (markerGroup_ != 0 && !text.empty()) {
+        markerGroup_ = 0;
+        text.remove_prefix(std::min(text.find_first_not_of(u' '), text.size()));
+        if (!text.starts_with(u'\t')) addRun(u"\t", group().character);
+    }
     while (!text.empty()) {
         const std::size_t newline = text.find(u'\n');
         const std::size_t length = newline == std::u16string_view::npos ? text.size() : newline + 1;

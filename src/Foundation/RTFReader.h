@@ -63,6 +63,8 @@ class RTFReader {
     void setDestination(RTFDestination destination);
     void setCodePage(int codePage);
     void setDefaultFont(int font);
+    // What follows in this group is a list item's marker; it will stand between two tabs whatever its writer does.
+    void expectListMarker() { markerGroup_ = groups_.size(); }
     // Character formatting as at the start of the document; a link goes on.
     void resetCharacterFormat();
 
@@ -101,8 +103,9 @@ class RTFReader {
 
     std::vector<Group> groups_;
     std::size_t groupsTooDeep_ = 0;
-    bool isIgnorable_ = false;   // "\*" stood just before
-    int fallbackRemaining_ = 0;  // characters still to be left out after \u
+    std::size_t markerGroup_ = 0;  // how many groups are open where a list item's marker is to come; 0: nowhere
+    bool isIgnorable_ = false;     // "\*" stood just before
+    int fallbackRemaining_ = 0;    // characters still to be left out after \u
 
     RTFCodePages codePages_;
     RTFFontTable fonts_;

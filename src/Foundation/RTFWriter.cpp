@@ -138,6 +138,8 @@ void RTFWriter::writeBody() {
             }
         }
     }
+    // LibreOffice puts raised text that the document ends in into a paragraph of its own.
+    if (character_.superscript != 0) body_.control("nosupersub");
 }
 
 void RTFWriter::beginParagraph(const TextAttributes* attributes) {
