@@ -15,6 +15,8 @@ namespace {
 constexpr int DeepestPart = 40;
 constexpr int MostPartsSearched = 400;
 constexpr int MostChildren = 100;
+constexpr int MostLooks = 5;
+constexpr std::chrono::milliseconds TimeBetweenLooks{200};
 
 constexpr std::array<const char*, 6> EventTypes = {"object:state-changed:focused",
                                                    "object:text-caret-moved",
@@ -121,7 +123,7 @@ void AtspiFocusTracker::windowActivated(const AtspiPart& window) {
     if (areOfSameProgram(focused.get(), window.get())) return;
     previous_ = focused;
     clearFocus();
-    findFocusIn(window);
+    lookForFocusIn(window, MostLooks);
 }
 
 void AtspiFocusTracker::windowLeft(const AtspiPart& window) {
@@ -173,6 +175,14 @@ void AtspiFocusTracker::findFocus() {
             return;
         }
     }
+}
+
+// Programs that are just starting, or busy, may not answer at first, nor tell again.
+void AtspiFocusTracker::lookForFocusIn(const AtspiPart& window, int looks) {
+    if (activeWindow_ != window || focus_.part()) return;
+    findFocusIn(window);
+    if (focus_.part() || looks <= 1) return;
+    queue_.postAfter(TimeBetweenLooks, [this, window, looks] { lookForFocusIn(window, looks - 1); });
 }
 
 void AtspiFocusTracker::findFocusIn(const AtspiPart& window) {

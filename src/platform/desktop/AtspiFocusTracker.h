@@ -46,6 +46,7 @@ class AtspiFocusTracker {
 
     // For programs that told of their focus before anybody listened, or do not tell again.
     void findFocus();
+    void lookForFocusIn(const AtspiPart& window, int looks);
     void findFocusIn(const AtspiPart& window);
     AtspiPart focusedBelow(const AtspiPart& part, int depth, int& left) const;
     AtspiPart child(const AtspiPart& part, int index) const;

@@ -25,9 +25,16 @@ AtspiPart AtspiQueue::share(AtspiAccessible* part) {
             }};
 }
 
-// Not g_main_context_invoke(): between two turns of the thread it would run the call on this one.
 void AtspiQueue::post(Call call) {
-    GSource* source = g_idle_source_new();
+    attach(g_idle_source_new(), std::move(call));
+}
+
+void AtspiQueue::postAfter(std::chrono::milliseconds delay, Call call) {
+    attach(g_timeout_source_new(static_cast<guint>(delay.count())), std::move(call));
+}
+
+// Not g_main_context_invoke(): between two turns of the thread it would run the call on this one.
+void AtspiQueue::attach(GSource* source, Call call) {
     g_source_set_priority(source, G_PRIORITY_DEFAULT);
     g_source_set_callback(
         source,

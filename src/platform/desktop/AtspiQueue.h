@@ -26,7 +26,7 @@ class AtspiQueue : public std::enable_shared_from_this<AtspiQueue> {
 
     // ---- On the accessibility thread ----
     GMainContext* context() const { return context_; }
-    // Runs what is posted, and `afterEach` time something was run, until end().
+    // Runs what is posted until end(), and `afterEach` whenever something was run.
     void run(const Call& afterEach);
     // From now on questions are passed on; until then they stay unanswered.
     void open() { open_ = true; }
@@ -35,6 +35,7 @@ class AtspiQueue : public std::enable_shared_from_this<AtspiQueue> {
 
     // ---- From any thread ----
     void post(Call call);
+    void postAfter(std::chrono::milliseconds delay, Call call);
     void end();
     bool hasEnded() const { return ended_; }
 
@@ -62,6 +63,7 @@ class AtspiQueue : public std::enable_shared_from_this<AtspiQueue> {
     static constexpr std::chrono::milliseconds LongestWait{15};
     static constexpr std::chrono::seconds Pause{1};
 
+    void attach(GSource* source, Call call);
     bool answersAreExpected() const;
     void expectNoAnswers();
 
