@@ -43,7 +43,7 @@ std::string programOf(const std::string& command) {
     std::string word;
     while (words >> word) {
         std::erase(word, '"');
-        const std::string name = word.substr(word.find_last_of('/') + 1);
+        std::string name = word.substr(word.find_last_of('/') + 1);
         const bool isSetting = word.find('=') != std::string::npos;
         if (!isSetting && name != "env") return name;
     }

@@ -13,6 +13,12 @@ namespace {
 constexpr int Attempts = 2;                      // somebody may have been quicker with a later time
 constexpr std::uint32_t LongestMultiple = 4096;  // words
 
+X11SelectionValue words(xcb_atom_t type, const std::vector<std::uint32_t>& words) {
+    auto bytes = std::make_shared<std::string>(words.size() * 4, '\0');
+    std::memcpy(bytes->data(), words.data(), bytes->size());
+    return {type, 32, std::move(bytes)};
+}
+
 }  // namespace
 
 X11SelectionOwner::X11SelectionOwner(X11Session& session, X11SelectionTransfers& transfers, std::string_view selection,
@@ -143,12 +149,6 @@ bool X11SelectionOwner::giveMultiple(xcb_window_t requestor, xcb_atom_t property
     xcb_change_property(session_.get(), XCB_PROP_MODE_REPLACE, requestor, property, reply->type, 32,
                         static_cast<std::uint32_t>(pairs.size()), pairs.data());
     return true;
-}
-
-X11SelectionValue X11SelectionOwner::words(xcb_atom_t type, const std::vector<std::uint32_t>& words) const {
-    auto bytes = std::make_shared<std::string>(words.size() * 4, '\0');
-    std::memcpy(bytes->data(), words.data(), bytes->size());
-    return {type, 32, std::move(bytes)};
 }
 
 X11SelectionValue X11SelectionOwner::offeredTargets() const {

@@ -59,7 +59,6 @@ class X11SelectionOwner {
     void answer(const xcb_selection_request_event_t& request);
     bool give(xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property);
     bool giveMultiple(xcb_window_t requestor, xcb_atom_t property);
-    X11SelectionValue words(xcb_atom_t type, const std::vector<std::uint32_t>& words) const;
     X11SelectionValue offeredTargets() const;
 
     X11Session& session_;
