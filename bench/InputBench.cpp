@@ -1,0 +1,197 @@
+// Hearing and sending keys on a real desktop: what Plume adds to a key that passes, what a synthesised one costs, how
+// fast text arrives, and whether what is swallowed and passed is exactly what it should be.
+#include <poll.h>
+
+#include <algorithm>
+#include <atomic>
+#include <future>
+#include <iostream>
+#include <memory>
+#include <random>
+#include <string>
+#include <vector>
+
+#include "Foundation/Strings.h"
+#include "bench/Figures.h"
+#include "platform/x11/DesktopFiles.h"
+#include "platform/x11/X11ProcessManager.h"
+#include "tests/desktop/KeyboardPort.h"
+#include "tests/desktop/PlumeProgram.h"
+
+namespace plume::bench {
+
+namespace {
+
+using rig::DesktopRig;
+using rig::KeyboardPort;
+using rig::Milliseconds;
+using rig::PlumeProgram;
+using rig::TargetKind;
+using rig::TargetProgram;
+
+constexpr TargetKind Targets[] = {TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm};
+
+std::string shortName(TargetKind kind) {
+    return kind == TargetKind::GtkTextView ? "gtk" : kind == TargetKind::QtTextEdit ? "qt" : "xterm";
+}
+
+// Microseconds from a key's press to its letter in the text, for each of some keys.
+std::vector<double> latencies(DesktopRig& rig, TargetProgram& target, int keys) {
+    std::vector<double> result;
+    const int keycode = rig.keyboard().keycodeOf(U'a');
+    for (int i = 0; i < keys; ++i) {
+        if (i % 100 == 0) target.clear();
+        const auto pressed = std::chrono::steady_clock::now();
+        rig.keyboard().press(keycode);
+        const auto change = target.takeChange(Milliseconds(2'000));
+        rig.keyboard().release(keycode);
+        rig.keyboard().sync();
+        if (change) result.push_back(std::chrono::duration<double, std::micro>(change->time - pressed).count());
+    }
+    return result;
+}
+
+double percentile99(std::vector<double> values) {
+    std::ranges::sort(values);
+    return values[values.size() * 99 / 100];
+}
+
+// With and without Plume by turns, so that what else the machine does falls on both.
+void measureAdded(DesktopRig& rig) {
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    std::vector<double> without, with;
+    for (int turn = 0; turn < 8; ++turn) {
+        const auto bare = latencies(rig, *target, 250);
+        without.insert(without.end(), bare.begin(), bare.end());
+        const PlumeProgram plume(rig, "");
+        const auto heard = latencies(rig, *target, 250);
+        with.insert(with.end(), heard.begin(), heard.end());
+    }
+    print("input.untapped.median", median(without), "us");
+    print("input.added.median", median(with) - median(without), "us");
+    print("input.added.p99", percentile99(with) - percentile99(without), "us");
+}
+
+// Shift by itself, which no target has anything to do for.
+void measureSynthesised(DesktopRig& rig, KeyboardPort& port) {
+    const auto target = rig.startTarget(TargetKind::Xterm);
+    constexpr int Keys = 1000;
+    double nanoseconds = 0;
+    port.run([&] {
+        nanoseconds = medianNanoseconds(5, [&] {
+            port.poster().begin();
+            for (int i = 0; i < Keys; ++i) {
+                port.poster().post({.keyCode = 56, .flags = 0, .down = true, .text = {}}, false);
+                port.poster().post({.keyCode = 56, .flags = 0, .down = false, .text = {}}, false);
+            }
+            port.poster().end();
+            port.connection().connection().sync();
+        });
+    });
+    print("input.synthesised", nanoseconds / 1000 / Keys, "us");
+}
+
+// A thousand characters in short lines.
+std::string linesOf(const std::string& line) {
+    std::string text;
+    std::size_t characters = 0;
+    while (characters < 1000) {
+        text += line + "\n";
+        characters += fromUtf8(line).size() + 1;
+    }
+    return text;
+}
+
+int measureRate(DesktopRig& rig, KeyboardPort& port, const std::string& kindOfText, const std::string& text) {
+    int wrong = 0;
+    for (const TargetKind kind : Targets) {
+        const auto target = rig.startTarget(kind);
+        std::vector<double> rates;
+        const double characters = static_cast<double>(fromUtf8(text).size());
+        for (int run = 0; run < 5; ++run) {
+            const auto expansion = rig::awaitExpansion(*target, text, [&] { port.type(fromUtf8(text)); });
+            if (expansion.isRight) rates.push_back(characters / expansion.milliseconds * 1000);
+            wrong += expansion.isRight ? 0 : 1;
+        }
+        if (!rates.empty()) print("input.rate." + kindOfText + "." + shortName(kind), median(rates), "chars/s");
+    }
+    return wrong;
+}
+
+// Keys with roll-over, a random half of which is swallowed: 0 when the target got the other half, in order.
+int swallowHalf(DesktopRig& rig) {
+    std::mt19937 random(20);
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    std::string typed, expected;
+    std::vector<bool> swallowed;
+    for (int i = 0; i < 2000; ++i) {
+        typed += static_cast<char>('a' + random() % 26);
+        swallowed.push_back(random() % 2 == 0);
+        if (!swallowed.back()) expected += typed.back();
+    }
+    std::size_t next = 0;
+    KeyboardPort port(
+        rig.server().display(),
+        {.decide = [&](const TapEvent& event) { return event.type == TapEvent::Type::KeyDown && swallowed[next++]; },
+         .disabled = {}});
+    std::vector<int> down;
+    for (const char letter : typed) {
+        const int keycode = rig.keyboard().keycodeOf(static_cast<char32_t>(letter));
+        if (const auto held = std::ranges::find(down, keycode); held != down.end()) {
+            rig.keyboard().release(keycode);
+            down.erase(held);
+        }
+        rig.keyboard().press(keycode);
+        down.push_back(keycode);
+        if (down.size() > 2 + random() % 3) {
+            rig.keyboard().release(down.front());
+            down.erase(down.begin());
+        }
+        poll(nullptr, 0, 8);
+    }
+    rig.keyboard().releaseAll();
+    return target->awaitText(expected) == expected ? 0 : 1;
+}
+
+void measureIdentity(DesktopRig& rig) {
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    PollRunLoop loop;
+    auto session = X11Session::open(rig.server().display(), loop);
+    if (!session) throw rig::RigError(session.error().message);
+    X11ProcessManager processes(*session.value(), DesktopFiles::ofEnvironment());
+    const auto ask = [&] {
+        const auto front = processes.frontProcess();
+        if (!front || !processes.runningApplication(*front)) throw rig::RigError("nobody is in front");
+    };
+    ask();
+    print("input.identity", medianNanoseconds(2000, ask) / 1000, "us");
+}
+
+int measureAll() {
+    DesktopRig rig;
+    measureAdded(rig);
+    int wrong = 0;
+    {
+        KeyboardPort port(rig.server().display(), KeyboardPort::Options{});
+        measureSynthesised(rig, port);
+        wrong += measureRate(rig, port, "ascii", linesOf("The quick brown fox jumps over the lazy dog 0123456789."));
+        wrong += measureRate(rig, port, "unicode", linesOf("naïve Ünïcödé — 日本語 【】 😀 and plain letters"));
+    }
+    wrong += swallowHalf(rig);
+    print("input.wrong", wrong, "count");
+    measureIdentity(rig);
+    return 0;
+}
+
+}  // namespace
+
+}  // namespace plume::bench
+
+int main() {
+    try {
+        return plume::bench::measureAll();
+    } catch (const std::exception& problem) {
+        std::cerr << "bench_input: " << problem.what() << '\n';
+        return 1;
+    }
+}
