@@ -220,8 +220,8 @@ bool X11EventPoster::awaitSpare(double deadline) const {
     const double free = spares_.nextFree();
     if (free > deadline) return false;
     connection_.flush();
-    for (double left = free - loop_.now(); left > 0; left = free - loop_.now()) {
-        poll(nullptr, 0, static_cast<int>(std::ceil(std::min(left, BeatPeriod) * 1000)));
+    while (loop_.now() < free) {
+        poll(nullptr, 0, static_cast<int>(std::ceil(std::clamp(free - loop_.now(), 0.0, BeatPeriod) * 1000)));
         if (heartbeat) heartbeat();
     }
     return true;
