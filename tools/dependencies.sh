@@ -23,9 +23,9 @@ BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config libatspi2.0-dev libcanbe
 TEST_PACKAGES=(libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
 CHECK_PACKAGES=(clang clang-format clang-tidy libclang-rt-14-dev git)
 
-# build <preset>: configures and builds, quietly unless something is wrong.
+# build <preset> [CMake options]: configures and builds, quietly unless something is wrong.
 build() {
-    cmake --preset "$1" >"build-$1.log" 2>&1 || { cat "build-$1.log"; rm -f "build-$1.log"; return 1; }
+    cmake --preset "$@" >"build-$1.log" 2>&1 || { cat "build-$1.log"; rm -f "build-$1.log"; return 1; }
     rm -f "build-$1.log"
     cmake --build --preset "$1" -- --quiet
 }
