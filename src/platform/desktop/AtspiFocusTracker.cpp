@@ -99,8 +99,12 @@ void AtspiFocusTracker::handle(const Event& event) {
             if (focus_.part() == event.source) clearFocus();
             break;
         case Kind::CaretMoved:
-            if (focus_.part() != event.source && hasState(event.source.get(), ATSPI_STATE_FOCUSED))
+            if (focus_.part() == event.source) break;
+            if (hasState(event.source.get(), ATSPI_STATE_FOCUSED)) {
                 gained(event.source);
+            } else {
+                considerAgain(event.source);
+            }
             break;
         case Kind::WindowActivated:
             windowActivated(event.source);
@@ -113,8 +117,28 @@ void AtspiFocusTracker::handle(const Event& event) {
 
 void AtspiFocusTracker::gained(const AtspiPart& part) {
     // A program in the background may move its own focus about.
-    if (activeWindow_ && !areOfSameProgram(activeWindow_.get(), part.get()) && !isInActiveWindow(part)) return;
-    setFocus(part);
+    if (activeWindow_ && !areOfSameProgram(activeWindow_.get(), part.get()) && !isInActiveWindow(part)) {
+        considerAgain(part);
+    } else {
+        setFocus(part);
+    }
+}
+
+// Programs that are just starting, or busy, may not answer at first, nor tell again.
+void AtspiFocusTracker::considerAgain(const AtspiPart& part) {
+    const bool isWaiting = candidate_ != nullptr;
+    candidate_ = part;
+    if (!isWaiting) considerCandidate(MostLooks);
+}
+
+void AtspiFocusTracker::considerCandidate(int looks) {
+    if (looks == 0 || focus_.part() == candidate_) {
+        candidate_ = nullptr;
+    } else if (hasState(candidate_.get(), ATSPI_STATE_FOCUSED) && isInActiveWindow(candidate_)) {
+        setFocus(std::exchange(candidate_, nullptr));
+    } else {
+        queue_.postAfter(TimeBetweenLooks, [this, looks] { considerCandidate(looks - 1); });
+    }
 }
 
 void AtspiFocusTracker::windowActivated(const AtspiPart& window) {
@@ -151,7 +175,7 @@ void AtspiFocusTracker::clearFocus() {
     stopWatching();
 }
 
-bool AtspiFocusTracker::isInActiveWindow(const AtspiPart& part) const {
+bool AtspiFocusTracker::isInActiveWindow(const AtspiPart& part) {
     GObjectOwned<AtspiAccessible> at(ATSPI_ACCESSIBLE(g_object_ref(part.get())));
     for (int depth = 0; at && depth < DeepestPart; ++depth) {
         if (hasState(at.get(), ATSPI_STATE_ACTIVE)) return true;
@@ -177,7 +201,6 @@ void AtspiFocusTracker::findFocus() {
     }
 }
 
-// Programs that are just starting, or busy, may not answer at first, nor tell again.
 void AtspiFocusTracker::lookForFocusIn(const AtspiPart& window, int looks) {
     if (activeWindow_ != window || focus_.part()) return;
     findFocusIn(window);

@@ -38,11 +38,13 @@ class AtspiFocusTracker {
     void handle(const Event& event);
 
     void gained(const AtspiPart& part);
+    void considerAgain(const AtspiPart& part);
+    void considerCandidate(int looks);
     void windowActivated(const AtspiPart& window);
     void windowLeft(const AtspiPart& window);
     void setFocus(const AtspiPart& part);
     void clearFocus();
-    bool isInActiveWindow(const AtspiPart& part) const;
+    static bool isInActiveWindow(const AtspiPart& part);
 
     // For programs that told of their focus before anybody listened, or do not tell again.
     void findFocus();
@@ -60,7 +62,8 @@ class AtspiFocusTracker {
     std::array<AtspiEventListener*, 6> listeners_{};
     std::deque<Event> noted_;
     AtspiPart activeWindow_;
-    AtspiPart previous_;  // what had the focus before that window
+    AtspiPart candidate_;  // said to have the focus, and to be looked at again
+    AtspiPart previous_;   // what had the focus before that window
     pid_t watched_ = 0;
     int watchedDescriptor_ = -1;
     GSource* watch_ = nullptr;

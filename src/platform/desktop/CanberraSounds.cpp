@@ -40,9 +40,8 @@ std::string eventOf(std::string_view sound) {
     return std::string(sound);
 }
 
-bool start(ca_context* context, const char* event) {
-    return ca_context_play(context, 0, CA_PROP_EVENT_ID, event, CA_PROP_CANBERRA_CACHE_CONTROL, "volatile", nullptr) ==
-           CA_SUCCESS;
+int start(ca_context* context, const char* event) {
+    return ca_context_play(context, 0, CA_PROP_EVENT_ID, event, CA_PROP_CANBERRA_CACHE_CONTROL, "volatile", nullptr);
 }
 
 }  // namespace
@@ -87,8 +86,8 @@ class CanberraSounds::Player {
             context_.reset(context);
             ca_context_change_props(context, CA_PROP_APPLICATION_NAME, "Plume", nullptr);
         }
-        // Fails as well without any device; then so does the beep.
-        if (!start(context_.get(), eventOf(name).c_str())) start(context_.get(), Beep);
+        // Every other failure means that there is no device, or that the user wants no sounds.
+        if (start(context_.get(), eventOf(name).c_str()) == CA_ERROR_NOTFOUND) start(context_.get(), Beep);
     }
 
     std::unique_ptr<ca_context, ContextDestroy> context_;  // the thread's own
