@@ -28,7 +28,7 @@ class Promise final : public PasteboardOwner {
 
 TEST_P(PasteboardContract, GivesBackWhatWasWritten) {
     Pasteboard& pasteboard = desk_->pasteboard();
-    const std::string odd("\0\xFF\x80 odd", 8);
+    const std::string odd("\0\xFF\x80 odd", 7);
     pasteboard.declareTypes({std::string(PasteboardType::HTML), StringType, "org.example.odd"}, nullptr);
     pasteboard.setData("<b>x</b>", PasteboardType::HTML);
     pasteboard.setString(u"na\u00EFve \U0001F600", StringType);

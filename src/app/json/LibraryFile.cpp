@@ -36,7 +36,7 @@ void readContent(const JsonObject& object, Snippet& snippet) {
     const auto rtf = object.find("rtf");
     if (rtf && !rtf->isNull()) {
         if (snippet.contentType() != ContentType::RichText) rtf->fail("only contentType 1, rich text, has this key");
-        if (object.has("content")) rtf->fail("expected either \"content\" or \"rtf\"");
+        if (object.has("content")) rtf->fail("expected either content or rtf, not both");
         Result<AttributedString> text = attributedStringFromRTF(toUtf8(rtf->string()));
         if (!text) rtf->fail("expected RTF: " + text.error().message);
         snippet.setRichTextContent(std::move(text).value());
@@ -69,7 +69,7 @@ std::shared_ptr<SnippetGroup> readGroup(const JsonNode& node) {
     const JsonObject object = node.object({"name", "abbreviationPrefix", "expandAfter", "expandAfterDelimiters",
                                            "expandTrigger", "delimiters", "caseSensitivity", "resetFormatting",
                                            "suggestAbbreviations", "showInMenuBar", "availability", "items"});
-    const std::shared_ptr<SnippetGroup> group = SnippetGroup::make();
+    std::shared_ptr<SnippetGroup> group = SnippetGroup::make();
     object.whenSet("name", [&](const JsonNode& n) { group->setName(n.string()); });
     object.whenSet("abbreviationPrefix", [&](const JsonNode& n) { group->setAbbreviationPrefix(n.string()); });
     object.whenSet("expandAfter", [&](const JsonNode& n) { group->setExpandAfter(code<ExpandAfter>(n, 3)); });

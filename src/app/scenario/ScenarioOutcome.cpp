@@ -94,13 +94,17 @@ struct Counts {
 void compare(const Json& expected, const Json& actual, const std::string& place, std::vector<std::string>& found) {
     if (expected.is_object() && actual.is_object()) {
         for (const auto& [key, value] : expected.items()) {
-            compare(value, actual.contains(key) ? actual.at(key) : Json(), place + "." + key, found);
+            std::string member = place;
+            member.append(".").append(key);
+            compare(value, actual.contains(key) ? actual.at(key) : Json(), member, found);
         }
         return;
     }
     if (expected.is_array() && actual.is_array() && expected.size() == actual.size()) {
         for (std::size_t i = 0; i < expected.size(); ++i) {
-            compare(expected[i], actual[i], place + "[" + std::to_string(i) + "]", found);
+            std::string element = place;
+            element.append("[").append(std::to_string(i)).append("]");
+            compare(expected[i], actual[i], element, found);
         }
         return;
     }

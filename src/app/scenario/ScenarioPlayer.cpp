@@ -43,7 +43,7 @@ class Player {
         const std::u16string& text = step.text;
         for (std::size_t i = 0; i < text.size();) {
             std::size_t end = i;
-            U16_FWD_1(text.data(), end, text.size());
+            U16_FWD_1(text, end, text.size());
             beforeKey();
             desktop_.typeCharacter(std::u16string_view(text).substr(i, end - i));
             i = end;
@@ -109,11 +109,11 @@ class Player {
         if (stage_.forms().open.empty()) return Error{"no form is open"};
         FormModel& model = *stage_.forms().open.back().model;
         for (const auto& [name, value] : step.values) {
-            const Result<void> filled = fill(model, name, value);
+            Result<void> filled = fill(model, name, value);
             if (!filled) return filled;
         }
         for (const auto& [name, tick] : step.ticks) {
-            const Result<void> ticked = setTick(model, name, tick);
+            Result<void> ticked = setTick(model, name, tick);
             if (!ticked) return ticked;
         }
         const auto close = stage_.forms().open.back().close;
@@ -180,7 +180,7 @@ ScenarioReport simulate(std::string_view text, const std::string& fileName) {
     ScenarioReport report;
     report.output = outcome.value().outcome.dump(2) + "\n";
     for (const std::string& difference : differences(scenario.value().expect, outcome.value())) {
-        report.problems += fileName + ": " + difference + "\n";
+        report.problems.append(fileName).append(": ").append(difference).append("\n");
         report.exitStatus = different;
     }
     return report;

@@ -97,7 +97,7 @@ std::vector<std::string> ScenarioStage::errors() const {
 
 std::uint64_t ScenarioStage::stamp() const {
     auto& desktop = const_cast<SimulatedDesktop&>(desktop_);
-    std::uint64_t happened = static_cast<std::uint64_t>(desktop.pasteboard().changeCount());
+    auto happened = static_cast<std::uint64_t>(desktop.pasteboard().changeCount());
     happened += desktop.sounds().played().size() + desktop.poster().clicks().size();
     for (const SimulatedApplication* application : applications_) happened += application->events().size();
     return happened;
