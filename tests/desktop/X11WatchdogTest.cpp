@@ -10,6 +10,7 @@
 #include <sstream>
 #include <string>
 
+#include "platform/x11/watchdog/Vigil.h"
 #include "tests/desktop/Deadline.h"
 #include "tests/desktop/DesktopRig.h"
 #include "tests/desktop/XcbReply.h"
@@ -211,7 +212,7 @@ TEST_F(X11WatchdogTest, AKilledProgramLeavesNoKeyDownAndNoWatchdog) {
     }
 }
 
-TEST_F(X11WatchdogTest, AWatchdogThatIsKilledIsReplacedAndAsksForNothingWhileNobodyTypes) {
+TEST_F(X11WatchdogTest, AWatchdogThatIsKilledIsReplaced) {
     kill(watchdog_, SIGKILL);
     // Its successor is the program's only child.
     const auto task = std::to_string(program_->pid());
@@ -230,6 +231,47 @@ TEST_F(X11WatchdogTest, AWatchdogThatIsKilledIsReplacedAndAsksForNothingWhileNob
     kill(program_->pid(), SIGCONT);
     expectRecovered(1);
     expectEnded();
+}
+
+TEST(VigilTest, AsksWhileKeysAreTypedAndIsAtRestOtherwise) {
+    Vigil vigil;
+    EXPECT_EQ(vigil.next(100), Vigil::Step::Wait);
+    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
+    vigil.watch(true);
+    EXPECT_EQ(vigil.next(100), Vigil::Step::ListenAndAsk);
+    EXPECT_EQ(vigil.next(100), Vigil::Step::Wait);
+    vigil.answered(vigil.question());
+    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
+
+    ASSERT_TRUE(vigil.keyHeard(200));
+    EXPECT_FALSE(vigil.keyHeard(200.1));
+    int questions = 0;
+    double now = 200;
+    auto step = vigil.next(now);
+    for (; step == Vigil::Step::Ask && questions < 100; step = vigil.next(now)) {
+        ++questions;
+        vigil.answered(vigil.question());
+        now = vigil.nextMoment();
+    }
+    // The last question covers what was typed before keys were listened to again.
+    EXPECT_EQ(step, Vigil::Step::ListenAndAsk);
+    EXPECT_EQ(now, 210);
+    EXPECT_EQ(questions, 40);
+    vigil.answered(vigil.question());
+    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
+}
+
+TEST(VigilTest, GivesUpWhenTheAnswerToTheLatestQuestionIsMissing) {
+    Vigil vigil;
+    vigil.watch(true);
+    ASSERT_EQ(vigil.next(0), Vigil::Step::ListenAndAsk);
+    vigil.answered(vigil.question() - 1);
+    EXPECT_EQ(vigil.next(0.5), Vigil::Step::Wait);
+    EXPECT_EQ(vigil.nextMoment(), Vigil::Patience);
+    EXPECT_EQ(vigil.next(0.6), Vigil::Step::GiveUp);
+    EXPECT_EQ(vigil.next(0.7), Vigil::Step::Wait);
+    EXPECT_FALSE(vigil.keyHeard(0.8));
+    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
 }
 
 }  // namespace

@@ -79,6 +79,8 @@ Result<void> Watchdog::start() {
     FileDescriptor mine(ends[0]);
     const FileDescriptor theirs(ends[1]);
     starts_.push_back(loop_.now());
+    // It finds the window waiting, should Plume be stopped before it gets any further.
+    sendWatchdogMessage(mine.get(), {WatchdogMessage::Type::TapWindow, tapWindow_});
     const int code = spawn(program_, display_, theirs.get(), process_);
     if (code != 0) {
         process_ = 0;
@@ -86,7 +88,6 @@ Result<void> Watchdog::start() {
     }
     socket_ = std::move(mine);
     loop_.addSource(socket_.get(), [this] { beat(); });
-    setTapWindow(tapWindow_);
     return {};
 }
 
