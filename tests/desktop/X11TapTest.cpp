@@ -513,9 +513,9 @@ class Device {
         own(xcb_input_xi_query_version_reply(connection_->get(), version, nullptr));
     }
     void set(bool on) {
-        const std::uint8_t value = on ? 1 : 0;
+        const std::array<std::uint8_t, 4> value{static_cast<std::uint8_t>(on ? 1 : 0)};  // xcb reads whole words
         xcb_input_xi_change_property(client_.connection(), now().id, XCB_PROP_MODE_REPLACE, 8,
-                                     client_.atom("Device Enabled"), XCB_ATOM_INTEGER, 1, &value);
+                                     client_.atom("Device Enabled"), XCB_ATOM_INTEGER, 1, value.data());
         client_.focusedWindow();
     }
     // It hangs on no master as long as somebody has taken it.

@@ -19,7 +19,7 @@ Error nothingToTake(const TapConnection& connection, const std::string& occupied
                      "\" is held by another program, perhaps another Plume or key tool: end that program."};
     }
     return Error{"The X server of display \"" + display +
-                 "\" has no keyboard but its own: \"xinput list\" has to show one below \"Virtual core keyboard\"."};
+                 R"(" has no keyboard but its own: "xinput list" has to show one below "Virtual core keyboard".)"};
 }
 
 }  // namespace

@@ -61,7 +61,7 @@ bool TapSession::mirrorAtStart() const {
     return mirrorKeymap(connection.connection().displayName(), typedOn, to);
 }
 
-void TapSession::selectHierarchyEvents() {
+void TapSession::selectHierarchyEvents() const {
     struct {
         xcb_input_event_mask_t header;
         std::uint32_t events;

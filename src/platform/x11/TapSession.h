@@ -56,7 +56,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     };
 
     bool mirrorAtStart() const;
-    void selectHierarchyEvents();
+    void selectHierarchyEvents() const;
     void addSource();
     void passOnUnheard();
     void drain();
