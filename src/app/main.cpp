@@ -1,5 +1,4 @@
 // The program: reads the command line and does what it says.
-#include <cstdio>
 #include <exception>
 #include <iostream>
 #include <variant>
@@ -55,7 +54,7 @@ int main(int argc, const char* const* argv) {
     try {
         return run(argc, argv);
     } catch (const std::exception& problem) {
-        std::fprintf(stderr, "plume: %s\n", problem.what());
+        std::cerr << "plume: " << problem.what() << '\n';
         return Failure;
     }
 }

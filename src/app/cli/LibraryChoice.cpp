@@ -14,7 +14,7 @@ namespace plume {
 namespace {
 
 std::filesystem::path standardFile() {
-    const std::filesystem::path own = configurationFolder() / "library.json";
+    std::filesystem::path own = configurationFolder() / "library.json";
     std::error_code problem;
     if (own.is_absolute() && std::filesystem::exists(own, problem)) return own;
     return dataFolder() / "sample-library.json";

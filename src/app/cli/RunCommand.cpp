@@ -51,7 +51,7 @@ FileDescriptor endSignals() {
     for (const int number : {SIGINT, SIGTERM, SIGHUP}) sigaddset(&signals, number);
     pthread_sigmask(SIG_BLOCK, &signals, nullptr);
     // A program that went away while it was written to is no reason to end.
-    std::signal(SIGPIPE, SIG_IGN);
+    (void)std::signal(SIGPIPE, SIG_IGN);
     return FileDescriptor(signalfd(-1, &signals, SFD_CLOEXEC | SFD_NONBLOCK));
 }
 
