@@ -28,6 +28,8 @@ Result<void> X11MouseTap::create(Listener listener) {
     listener_ = std::move(listener);
     handler_ = session_.addHandler(XCB_GE_GENERIC, [this](const xcb_generic_event_t& event) { handleEvent(event); });
     select(XCB_INPUT_XI_EVENT_MASK_RAW_BUTTON_PRESS);
+    // From the return of this on, every click is heard.
+    session_.connection().sync();
     return {};
 }
 
