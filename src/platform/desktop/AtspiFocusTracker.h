@@ -26,7 +26,7 @@ class AtspiFocusTracker {
     void adoptConnections() const;
 
   private:
-    enum class Kind { FocusGained, FocusLost, CaretMoved, WindowActivated, WindowLeft };
+    enum class Kind { FocusGained, FocusLost, WindowActivated, WindowLeft };
     struct Event {
         Kind kind;
         AtspiPart source;
@@ -59,7 +59,7 @@ class AtspiFocusTracker {
 
     AtspiQueue& queue_;
     AtspiFocus& focus_;
-    std::array<AtspiEventListener*, 6> listeners_{};
+    std::array<AtspiEventListener*, 5> listeners_{};
     std::deque<Event> noted_;
     AtspiPart activeWindow_;
     AtspiPart candidate_;  // said to have the focus, and to be looked at again
