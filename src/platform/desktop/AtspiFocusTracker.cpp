@@ -15,7 +15,7 @@ namespace {
 constexpr int DeepestPart = 40;
 constexpr int MostPartsSearched = 400;
 constexpr int MostChildren = 100;
-constexpr int MostLooks = 5;
+constexpr int MostLooks = 20;
 constexpr std::chrono::milliseconds TimeBetweenLooks{200};
 
 // Not the movements of the caret: telling of one with every key costs a program, and so the typist, 0.4 ms a key.
