@@ -22,6 +22,9 @@ function(plume_library name)
   target_link_libraries(${name} PUBLIC ${LIB_SEES} PRIVATE plume_options)
 endfunction()
 
+# All tests with the label "threads".
+add_custom_target(threads_tests)
+
 # plume_test(<name> SOURCES <files…> SEES <libraries…> [LABELS <labels…>] [ENVIRONMENT <variables…>])
 # The label "threads" is for what ThreadSanitizer should watch.
 function(plume_test name)
@@ -30,6 +33,9 @@ function(plume_test name)
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR})
   target_link_libraries(${name} PRIVATE ${TEST_SEES} plume_options GTest::gmock GTest::gtest_main)
   set(properties TIMEOUT 300)
+  if("threads" IN_LIST TEST_LABELS)
+    add_dependencies(threads_tests ${name})
+  endif()
   if(TEST_LABELS)
     list(APPEND properties LABELS "${TEST_LABELS}")
   endif()
