@@ -56,20 +56,27 @@ double percentile99(std::vector<double> values) {
     return values[values.size() * 99 / 100];
 }
 
-// With and without Plume by turns, so that what else the machine does falls on both.
-void measureAdded(DesktopRig& rig) {
-    const auto target = rig.startTarget(TargetKind::GtkTextView);
+// What Plume adds to a key: with and without it by turns, so that what else the machine does falls on both.
+void measureAdded(DesktopRig& rig, TargetProgram& target, const std::string& name,
+                  PlumeProgram::Accessibility accessibility) {
     std::vector<double> without, with;
     for (int turn = 0; turn < 8; ++turn) {
-        const auto bare = latencies(rig, *target, 250);
+        const auto bare = latencies(rig, target, 250);
         without.insert(without.end(), bare.begin(), bare.end());
-        const PlumeProgram plume(rig, "");
-        const auto heard = latencies(rig, *target, 250);
+        const PlumeProgram plume(rig, "", "{}", accessibility);
+        const auto heard = latencies(rig, target, 250);
         with.insert(with.end(), heard.begin(), heard.end());
     }
-    print("input.untapped.median", median(without), "us");
-    print("input.added.median", median(with) - median(without), "us");
-    print("input.added.p99", percentile99(with) - percentile99(without), "us");
+    print("input.untapped" + name + ".median", median(without), "us");
+    print("input.added" + name + ".median", median(with) - median(without), "us");
+    print("input.added" + name + ".p99", percentile99(with) - percentile99(without), "us");
+}
+
+void measureAdded(DesktopRig& rig) {
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    measureAdded(rig, *target, "", PlumeProgram::Accessibility::Missing);
+    // A program that an assistive program listens to tells the accessibility bus of every key before it takes it.
+    measureAdded(rig, *target, ".accessible", PlumeProgram::Accessibility::Found);
 }
 
 // Shift by itself, which no target has anything to do for.

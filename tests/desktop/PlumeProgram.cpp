@@ -40,9 +40,14 @@ void apply(const TextChange& change, std::u32string& text) {
 
 }  // namespace
 
-PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings) {
+PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings,
+                           Accessibility accessibility) {
     const auto program = std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume";
-    std::vector<std::string> arguments{program, "run"};
+    std::vector<std::string> arguments{"/usr/bin/env"};
+    if (accessibility == Accessibility::Missing) {
+        arguments.insert(arguments.end(), {"-u", "DBUS_SESSION_BUS_ADDRESS", "AT_SPI_BUS_ADDRESS=unix:path=/nowhere"});
+    }
+    arguments.insert(arguments.end(), {program, "run"});
     arguments.insert(arguments.end(), {"--settings", writeFile(rig.directory() / "settings.json", settings)});
     if (!library.empty()) {
         arguments.insert(arguments.end(), {"--library", writeFile(rig.directory() / "library.json", library)});

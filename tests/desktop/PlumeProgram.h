@@ -12,8 +12,11 @@ namespace plume::rig {
 // when it is destroyed.
 class PlumeProgram {
   public:
+    enum class Accessibility { Found, Missing };
+
     // The contents of a library and a settings file; an empty library means the sample library. Throws RigError.
-    PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings = "{}");
+    PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings = "{}",
+                 Accessibility accessibility = Accessibility::Found);
 
     ChildProcess& process() { return *process_; }
     // Seconds from the start to the moment it said that it was ready.

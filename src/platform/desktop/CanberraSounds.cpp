@@ -4,11 +4,14 @@
 
 #include <array>
 #include <condition_variable>
+#include <cstdlib>
 #include <deque>
+#include <filesystem>
 #include <memory>
 #include <mutex>
 #include <optional>
 #include <string>
+#include <system_error>
 #include <thread>
 
 namespace plume {
@@ -38,6 +41,14 @@ std::string eventOf(std::string_view sound) {
         if (name.sound == sound) return name.event;
     }
     return std::string(sound);
+}
+
+// Without any, libcanberra's ALSA driver would write lines of complaints about it to standard error.
+bool hasSoundDevice() {
+    std::error_code ignored;
+    const char* const runtime = std::getenv("XDG_RUNTIME_DIR");
+    return std::getenv("PULSE_SERVER") || std::filesystem::exists("/dev/snd", ignored) ||
+           (runtime && std::filesystem::exists(std::filesystem::path(runtime) / "pulse", ignored));
 }
 
 int start(ca_context* context, const char* event) {
@@ -81,6 +92,7 @@ class CanberraSounds::Player {
 
     void playNow(const std::string& name) {
         if (!context_) {
+            if (!hasSoundDevice()) return;
             ca_context* context = nullptr;
             if (ca_context_create(&context) != CA_SUCCESS) return;
             context_.reset(context);
