@@ -27,7 +27,7 @@ class ContractLoop {
   public:
     virtual ~ContractLoop() = default;
     virtual RunLoop& runLoop() = 0;
-    // Lets this time pass on the loop, running what is due.
+    // Lets this time pass on the loop, running what is due by then, or a little later.
     virtual void run(double seconds) = 0;
 };
 
@@ -45,11 +45,12 @@ class ContractDesk {
     virtual InputSources& inputSources() = 0;
     virtual Accessibility& accessibility() = 0;
 
-    // Lets the port and the programs work until the condition holds; false when it does not in good time.
+    // Lets the port and the programs work, at least once, until the condition holds; false when it does not in good
+    // time. On a real desktop nothing happens outside of it, and nobody can tell when all has happened: what must not
+    // happen is shown by something later that did.
     virtual bool runUntil(const std::function<bool()>& condition) = 0;
-    // Lets them work for as long as a key takes to arrive anywhere.
-    virtual void settle() = 0;
 
+    // The user's keyboard: a, b, c and Shift.
     virtual void press(std::uint16_t keyCode) = 0;
     virtual void release(std::uint16_t keyCode) = 0;
     virtual void activate(Program program) = 0;

@@ -27,10 +27,9 @@ class SimulatedDesk final : public ContractDesk {
     Accessibility& accessibility() override { return desktop_.accessibility(); }
 
     bool runUntil(const std::function<bool()>& condition) override {
-        settle();
+        desktop_.runLoop().advance(1);
         return condition();
     }
-    void settle() override { desktop_.runLoop().advance(1); }
 
     void press(std::uint16_t keyCode) override { desktop_.keyboard().press(keyCode); }
     void release(std::uint16_t keyCode) override { desktop_.keyboard().release(keyCode); }

@@ -10,7 +10,6 @@
 
 #include <chrono>
 #include <csignal>
-#include <cstdlib>
 #include <cstring>
 #include <functional>
 
@@ -40,21 +39,13 @@ bool await(const std::function<bool()>& condition) {
     return true;
 }
 
-// The test itself becomes a program of the rig's desktop.
-void join(const DesktopSession& session) {
-    for (const std::string& line : session.environment()) {
-        const auto end = line.find('=');
-        setenv(line.substr(0, end).c_str(), line.substr(end + 1).c_str(), 1);
-    }
-}
-
 // One desktop for all: libatspi stays with the accessibility bus that it found first.
 class AccessibilityDesktop : public testing::Test {
   protected:
     static void SetUpTestSuite() {
         if (rig_) return;
         rig_ = std::make_unique<DesktopRig>();
-        join(rig_->session());
+        rig_->session().join();
         accessibility_ = std::make_unique<AtspiAccessibility>();
         ASSERT_TRUE(await([] { return accessibility_->status() != AccessibilityStatus::Starting; }));
     }

@@ -50,6 +50,13 @@ DesktopSession::DesktopSession(const PrivateDirectory& directory, const XServer&
     startWindowManager(client);
 }
 
+void DesktopSession::join() const {
+    for (const std::string& line : environment_) {
+        const auto end = line.find('=');
+        setenv(line.substr(0, end).c_str(), line.substr(end + 1).c_str(), 1);
+    }
+}
+
 void DesktopSession::startBus() {
     const auto program = requireProgram("dbus-daemon", "dbus-daemon");
     requireFile({"/usr/share/dbus-1/session.conf"}, "dbus-session-bus-common");

@@ -24,6 +24,9 @@ class DesktopSession {
     // For the programs of this desktop.
     const Environment& environment() const { return environment_; }
 
+    // Makes the calling program one of this desktop: it takes over the environment.
+    void join() const;
+
     // Starts a program of this desktop, found along PATH; its output goes to a file of its own.
     std::unique_ptr<ChildProcess> start(const std::vector<std::string>& arguments, const std::string& package);
 
