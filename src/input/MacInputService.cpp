@@ -96,6 +96,7 @@ void MacInputService::setListenMouseDownEvents(bool listen) {
 
 void MacInputService::tapDisabledByTimeout() {
     around_.log("Event tap was disabled by timeout");
+    delivery_.abandon();
     const double now = around_.tapLoop.now();
     std::erase_if(timeouts_, [&](double moment) { return now - moment >= TimeoutPeriod; });
     timeouts_.push_back(now);

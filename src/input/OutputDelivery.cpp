@@ -37,6 +37,18 @@ void OutputDelivery::send(std::shared_ptr<PLOutput> output, const TriggerKey& tr
     startNext();
 }
 
+// What is left is nothing, and comes to its end as always.
+void OutputDelivery::abandon() {
+    queue_.clear();
+    if (!current_) return;
+    PLOutput& rest = *current_->output;
+    rest.fragments.clear();
+    rest.backspaceCount = 0;
+    rest.leftArrowCount = 0;
+    current_->heldBackspaces = 0;
+    nextStep_ = batch_.steps.size();
+}
+
 // Keys that are let go at the end of an output may order the next one: that takes its place in the queue.
 void OutputDelivery::startNext() {
     if (startsNext_) return;

@@ -49,6 +49,9 @@ class OutputDelivery {
     // Decides how the output is delivered (its `cancelTrigger` and its content's suffix are final when this returns)
     // and starts, behind the outputs that are still on their way. `target` is the process that received the last key.
     void send(std::shared_ptr<PLOutput> output, const TriggerKey& triggerKey, ProcessSerialNumber target);
+    // Drops what has not been sent yet, for good: the rest of a text is of no use to whoever has the focus by now. The
+    // user's clipboard still comes back.
+    void abandon();
     // The tap lets every event pass, unseen.
     bool letsEverythingPass() const { return sender_.isSending() || pasting_; }
     // Every output has been delivered.

@@ -239,6 +239,20 @@ TEST_P(ClipboardDeliveryTest, GivesTheClipboardBack) {
     EXPECT_THAT(pasted, ElementsAre(u"expansion"));
 }
 
+TEST_P(ClipboardDeliveryTest, WhatIsAbandonedStillOwesTheRestore) {
+    desk.activate(u"net.ichi2.anki");
+    desk.service.sendOutput(InputDesk::output(u"expansion", 45));
+    desk.service.sendOutput(InputDesk::output(u"another"));
+    desk.tap.listener->tapDisabledByTimeout();
+    desk.loop.advance(2);
+    EXPECT_THAT(desk.poster.timesOf("v51"), ::testing::SizeIs(20)) << "the first batch";
+    EXPECT_THAT(pasted, IsEmpty());
+    EXPECT_TRUE(desk.service.isIdle());
+    EXPECT_EQ(desk.pasteboard.string(), u"user's");
+    sendTo(u"net.ichi2.anki", u"later");
+    EXPECT_THAT(pasted, ElementsAre(u"later"));
+}
+
 TEST_P(ClipboardDeliveryTest, AnOutputThatDoesNotPasteStillOwesTheRestore) {
     sendTo(u"net.ichi2.anki", u"expansion");
     desk.loop.advance(0.2);
