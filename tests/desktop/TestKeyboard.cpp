@@ -1,5 +1,6 @@
 #include "tests/desktop/TestKeyboard.h"
 
+#include <poll.h>
 #include <xkbcommon/xkbcommon.h>
 
 #include <algorithm>
@@ -104,7 +105,7 @@ void TestKeyboard::type(std::string_view text) {
     sync();
 }
 
-void TestKeyboard::typeRollingOver(std::string_view text) {
+void TestKeyboard::typeRollingOver(std::string_view text, Milliseconds gap) {
     std::size_t unsynced = 0;
     int previous = 0;
     for (const Stroke& stroke : strokesOf(text)) {
@@ -113,6 +114,7 @@ void TestKeyboard::typeRollingOver(std::string_view text) {
         press(stroke.keycode);
         if (previous != 0) release(previous);
         previous = stroke.keycode;
+        if (gap.count() > 0) poll(nullptr, 0, static_cast<int>(gap.count()));
         if (++unsynced % keysBetweenSyncs == 0) sync();
     }
     if (previous != 0) release(previous);

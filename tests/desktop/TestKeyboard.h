@@ -53,8 +53,8 @@ class TestKeyboard {
     // keys. Throws RigError, before the first key, for a character that is not on the layout.
     void type(std::string_view text);
 
-    // The same, as a fast typist does it: each key goes down before the one before it comes up.
-    void typeRollingOver(std::string_view text);
+    // The same, as a fast typist does it: each key goes down before the one before it comes up, and waits for the gap.
+    void typeRollingOver(std::string_view text, Milliseconds gap = Milliseconds(0));
 
     // Releases all keys that are still down.
     void releaseAll();

@@ -30,6 +30,8 @@ class XServer {
     const std::filesystem::path& secondKeyboardSocket() const { return secondKeyboardSocket_; }
     const std::filesystem::path& pointerSocket() const { return pointerSocket_; }
     bool isRunning() { return process_->isRunning(); }
+    // Ends it as a crash would; every client loses its connection.
+    void crash() { kill(process_->pid(), SIGKILL); }
 
   private:
     void writeConfiguration(const std::filesystem::path& file, const Options& options) const;

@@ -1,0 +1,179 @@
+// The whole program when something goes wrong: it is killed or stopped, the program in front hangs, the X server is
+// gone. The keyboard belongs to the user again within a second.
+#include "tests/desktop/Robustness.h"
+
+#include <chrono>
+
+namespace plume::rig {
+
+namespace {
+
+using std::chrono::steady_clock;
+
+// Waits until the expansion is on the clipboard, which had no owner before.
+void awaitOffer(DesktopRig& rig) {
+    rig.client().await("the expansion on the clipboard", Milliseconds(5'000),
+                       [&] { return rig.client().selectionOwner("CLIPBOARD") != 0; });
+}
+
+class Crash : public Robustness {
+  protected:
+    static pid_t plumePid() { return plume_->process().pid(); }
+
+    // Types a letter until one arrives; the first ones may have gone down with who held the keyboard.
+    static bool typedTextArrives(TargetProgram& target, Milliseconds bound) {
+        target.forgetReports();
+        const Deadline deadline(bound);
+        while (!deadline.passed()) {
+            rig_->keyboard().type("y");
+            while (const auto change = target.takeChange(Milliseconds(20))) {
+                if (change->inserted.ends_with('y')) return true;
+            }
+        }
+        return false;
+    }
+
+    static void expectKeyboardAtRest(TargetProgram& target) {
+        EXPECT_TRUE(waitUntil([] { return isKeyboardAtRest(); }, Milliseconds(1'000)));
+        // Behind what else is still on its way.
+        rig_->keyboard().type("usable, Again");
+        EXPECT_TRUE(waitUntil([&] { return target.text().ends_with("usable, Again"); }, Milliseconds(2'000)))
+            << target.text();
+        target.clear();
+    }
+
+    static void expectExpands(TargetProgram& target, const Sample& sample) {
+        const Expansion expansion = typeAndAwait(*rig_, target, sample.abbreviation, sample.content);
+        EXPECT_TRUE(expansion.isRight) << expansion.got << '\n' << log();
+    }
+
+    // Sets a long expansion off with Shift held, which is put aside while it is typed. Both keys stay down.
+    static void startExpansionWithShift(TargetProgram& target) {
+        target.clear();
+        rig_->keyboard().type(HugeShifted.abbreviation.substr(0, 2));
+        rig_->keyboard().press(Key::LeftShift);
+        rig_->keyboard().press(rig_->keyboard().keycodeOf(static_cast<char32_t>(HugeShifted.abbreviation.back())));
+        rig_->keyboard().sync();
+    }
+};
+
+TEST_F(Crash, KilledInTheMiddleOfAnExpansion) {
+    const auto target = rig_->startTarget(TargetKind::Xterm);
+    for (const Way way : {Way::Typed, Way::Pasted}) {
+        for (const int delay : {0, 1, 3, 10, 30}) {
+            SCOPED_TRACE(std::to_string(delay) + " ms" + (way == Way::Pasted ? ", pasted" : ""));
+            startPlume(way);
+            startExpansionWithShift(*target);
+            poll(nullptr, 0, delay);
+            ASSERT_EQ(kill(plumePid(), SIGKILL), 0);
+            EXPECT_EQ(plume_->process().waitForExit(Milliseconds(1'000)), 128 + SIGKILL);
+            rig_->keyboard().releaseAll();
+            EXPECT_TRUE(typedTextArrives(*target, Milliseconds(1'000)));
+            expectKeyboardAtRest(*target);
+        }
+        startPlume(way);
+        expectExpands(*target, ShortMixed);
+    }
+}
+
+TEST_F(Crash, KilledWhileAProgramHasNotTakenThePaste) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    startPlume(Way::Pasted);
+    ASSERT_EQ(kill(target->pid(), SIGSTOP), 0);
+    rig_->keyboard().type(LongAscii.abbreviation);
+    awaitOffer(*rig_);
+    ASSERT_EQ(kill(plumePid(), SIGKILL), 0);
+    EXPECT_EQ(plume_->process().waitForExit(Milliseconds(1'000)), 128 + SIGKILL);
+    ASSERT_EQ(kill(target->pid(), SIGCONT), 0);
+    EXPECT_TRUE(typedTextArrives(*target, Milliseconds(1'000)));
+    expectKeyboardAtRest(*target);
+    startPlume(Way::Pasted);
+    expectExpands(*target, LongAscii);
+}
+
+TEST_F(Crash, StoppedForFiveSeconds) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    startPlume(Way::Typed);
+    startExpansionWithShift(*target);
+    EXPECT_TRUE(waitUntil([&] { return target->text().starts_with("naïve"); }, Milliseconds(5'000)));
+    const Deadline stopped(Milliseconds(5'000));
+    ASSERT_EQ(kill(plumePid(), SIGSTOP), 0);  // with more of the text to come, which must not come later
+    EXPECT_TRUE(typedTextArrives(*target, Milliseconds(1'000)));
+    rig_->keyboard().releaseAll();
+    expectKeyboardAtRest(*target);
+    while (!stopped.passed()) stopped.waitReadable(-1);
+    ASSERT_EQ(kill(plumePid(), SIGCONT), 0);
+    EXPECT_TRUE(waitUntil([] { return log().find("Event tap was disabled by timeout") != std::string::npos; },
+                          Milliseconds(5'000)))
+        << log();
+    expectKeyboardAtRest(*target);
+    expectExpands(*target, LongMixed);
+    expectExpands(*target, ShortMixed);
+}
+
+// Stops the program in front when the expansion is on the clipboard and its keystroke on the way.
+class HungTarget : public Crash {
+  protected:
+    void SetUp() override {
+        startPlume(Way::Pasted);
+        other_ = rig_->startTarget(TargetKind::QtTextEdit);
+        hung_ = rig_->startTarget(TargetKind::GtkTextView);
+        ASSERT_EQ(kill(hung_->pid(), SIGSTOP), 0);
+        rig_->keyboard().type(LongMixed.abbreviation);
+        awaitOffer(*rig_);
+    }
+
+    // Goes to the other program, and types into it what becomes the expected text.
+    void expectOtherUsable(const std::string& typed, const std::string& expected) {
+        const auto start = steady_clock::now();
+        other_->activate();
+        rig_->keyboard().type(typed);
+        EXPECT_EQ(other_->awaitText(expected, Milliseconds(5'000)), expected) << log();
+        EXPECT_LE(steady_clock::now() - start, Milliseconds(2'000));
+    }
+
+    void wake() { ASSERT_EQ(kill(hung_->pid(), SIGCONT), 0); }
+
+    std::unique_ptr<TargetProgram> other_;
+    std::unique_ptr<TargetProgram> hung_;
+};
+
+TEST_F(HungTarget, LeavesTheKeyboardUsableAndGetsItsPasteLater) {
+    expectOtherUsable("usable", "usable");
+    wake();
+    EXPECT_EQ(hung_->awaitText(LongMixed.content), LongMixed.content) << log();
+}
+
+TEST_F(HungTarget, LeavesExpandingToTheOthers) {
+    expectOtherUsable("usable " + LongAscii.abbreviation + "behind", "usable " + LongAscii.content + "behind");
+    wake();
+    expectExpands(*other_, ShortMixed);
+}
+
+// Each on a desktop of its own, which does not outlive its X server.
+void expectEndsWithTheServer(DesktopRig& rig, PlumeProgram& plume) {
+    rig.server().crash();
+    EXPECT_EQ(plume.process().waitForExit(Milliseconds(5'000)), 1) << plume.process().logTail();
+    EXPECT_NE(plume.process().logTail().find("The X server is gone"), std::string::npos) << plume.process().logTail();
+}
+
+TEST(ServerGone, EndsPlumeAtRest) {
+    DesktopRig rig;
+    PlumeProgram plume(rig, sampleLibrary(), settingsFor(Way::Typed));
+    expectEndsWithTheServer(rig, plume);
+}
+
+TEST(ServerGone, EndsPlumeInTheMiddleOfAnExpansion) {
+    DesktopRig rig;
+    PlumeProgram plume(rig, sampleLibrary(), settingsFor(Way::Pasted));
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    ASSERT_EQ(kill(target->pid(), SIGSTOP), 0);
+    rig.keyboard().type(HugeShifted.abbreviation);
+    awaitOffer(rig);
+    expectEndsWithTheServer(rig, plume);
+    kill(target->pid(), SIGCONT);  // to end, too
+}
+
+}  // namespace
+
+}  // namespace plume::rig
