@@ -103,6 +103,13 @@ class Robustness : public testing::Test {
                (state->mask & 0xFF) == 0;
     }
 
+    static bool isKeyDown(int keycode) {
+        auto* const connection = rig_->client().connection();
+        const auto keys = own(xcb_query_keymap_reply(connection, xcb_query_keymap(connection), nullptr));
+        const auto code = static_cast<unsigned>(keycode);
+        return keys && (keys->keys[code / 8] >> (code % 8) & 1) != 0;
+    }
+
     static std::string log() { return plume_->process().logTail(); }
 
     static inline std::unique_ptr<DesktopRig> rig_;
