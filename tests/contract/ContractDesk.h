@@ -16,9 +16,12 @@
 #include "platform/EventPoster.h"
 #include "platform/InputSources.h"
 #include "platform/KeyboardTap.h"
+#include "platform/MouseTap.h"
 #include "platform/Pasteboard.h"
 #include "platform/ProcessManager.h"
 #include "platform/RunLoop.h"
+#include "platform/SecureInput.h"
+#include "platform/SystemHotKeys.h"
 
 namespace plume {
 
@@ -36,6 +39,7 @@ class ContractLoop {
 class ContractDesk {
   public:
     enum class Program { First, Second };
+    enum class Button { Left, Right };
 
     virtual ~ContractDesk() = default;
     virtual Pasteboard& pasteboard() = 0;
@@ -44,21 +48,31 @@ class ContractDesk {
     virtual ProcessManager& processManager() = 0;
     virtual InputSources& inputSources() = 0;
     virtual Accessibility& accessibility() = 0;
+    virtual SecureInput& secureInput() = 0;
+    virtual SystemHotKeys& systemHotKeys() = 0;
+    virtual MouseTap& mouseTap() = 0;
+
+    // Whether the poster can make the user's keys wait.
+    virtual bool canHoldUserKeys() = 0;
 
     // Lets the port and the programs work, at least once, until the condition holds; false when it does not in good
     // time. On a real desktop nothing happens outside of it, and nobody can tell when all has happened: what must not
     // happen is shown by something later that did.
     virtual bool runUntil(const std::function<bool()>& condition) = 0;
 
-    // The user's keyboard: a, b, c and Shift.
+    // The user's keyboard: a, b, c, Shift and Control.
     virtual void press(std::uint16_t keyCode) = 0;
     virtual void release(std::uint16_t keyCode) = 0;
+    // The user moves the mouse there and clicks; no program minds it.
+    virtual void click(Button button, Point place) = 0;
     virtual void activate(Program program) = 0;
     // What stands in the program's field.
     virtual std::u16string text(Program program) = 0;
     // Another program than Plume puts this on the clipboard, or reads the clipboard's text.
     virtual void copyElsewhere(const std::u16string& text) = 0;
     virtual std::optional<std::u16string> readElsewhere() = 0;
+    // Another program takes the keyboard to itself, or gives it back.
+    virtual void setKeyboardHeldElsewhere(bool held) = 0;
 };
 
 template <typename Bench>
@@ -89,5 +103,18 @@ class KeyboardContract : public DeskContract {};
 class ProcessManagerContract : public DeskContract {};
 class InputSourcesContract : public DeskContract {};
 class AccessibilityContract : public DeskContract {};
+class SecureInputContract : public DeskContract {};
+class MouseTapContract : public DeskContract {};
+
+class SystemHotKeysContract : public DeskContract {
+  protected:
+    static constexpr SystemHotKeys::Id FirstId = 1;
+    static constexpr SystemHotKeys::Id SecondId = 2;
+
+    // A desk may be there for longer than the test whose handlers these are.
+    void TearDown() override {
+        for (const auto id : {FirstId, SecondId}) desk_->systemHotKeys().unregisterHotKey(id);
+    }
+};
 
 }  // namespace plume

@@ -1,4 +1,5 @@
 // The tap and the poster, which have to know of each other.
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -11,6 +12,7 @@ namespace {
 
 constexpr std::uint16_t KeyA = 0;
 constexpr std::uint16_t KeyB = 11;
+constexpr std::uint16_t KeyC = 8;
 constexpr std::uint16_t ShiftKey = 56;
 
 // Writes down what it hears, and swallows one key.
@@ -26,16 +28,31 @@ class Listener final : public KeyboardTapListener {
 
     bool keyboardEvent(const TapEvent& event) override {
         heard.push_back({event.type, event.keyCode, event.flags, std::u16string(event.string)});
+        if (event.type == TapEvent::Type::KeyDown) downs += event.string;
+        if (whenHeard) whenHeard(event);
         return event.keyCode == swallowed;
     }
     void tapDisabledByTimeout() override { ADD_FAILURE() << "nothing took long"; }
     void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody switched the tap off"; }
 
     std::vector<Heard> heard;
+    std::u16string downs;                            // the texts of all presses
+    std::function<void(const TapEvent&)> whenHeard;  // during the decision; may be empty
     std::uint16_t swallowed = KeyCode::None;
 };
 
 using Type = TapEvent::Type;
+
+void strike(ContractDesk& desk, std::uint16_t keyCode) {
+    desk.press(keyCode);
+    desk.release(keyCode);
+}
+
+void postText(EventPoster& poster, std::u16string_view text) {
+    poster.begin();
+    for (const bool down : {true, false}) poster.post({0, 0, down, text}, false);
+    poster.end();
+}
 
 }  // namespace
 
@@ -134,6 +151,57 @@ TEST_P(KeyboardContract, KnowsWhichKeysTheUserHolds) {
     EXPECT_FALSE(desk_->poster().isKeyDown(KeyA));
     desk_->release(KeyB);
     EXPECT_TRUE(desk_->runUntil([&] { return !desk_->poster().isKeyDown(KeyB); }));
+    desk_->keyboardTap().remove();
+}
+
+// What is typed while keys are held comes after the output where the port can make keys wait, else at once.
+
+TEST_P(KeyboardContract, LetsTheDecidedKeyAndThoseAfterItFollowTheOutput) {
+    Listener listener;
+    listener.whenHeard = [&](const TapEvent& event) {
+        if (event.type == Type::KeyDown && event.keyCode == KeyC) desk_->poster().holdUserKeys();
+    };
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    for (const std::uint16_t key : {KeyC, KeyA, KeyB}) strike(*desk_, key);
+    const bool canHold = desk_->canHoldUserKeys();
+    const std::u16string heardAtOnce = canHold ? u"c" : u"cab";
+    ASSERT_TRUE(desk_->runUntil([&] { return listener.downs == heardAtOnce; }));
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == (canHold ? u"" : u"cab"); }));
+    postText(desk_->poster(), u"12");
+    postText(desk_->poster(), u"34");
+    desk_->poster().releaseUserKeys();
+    const std::u16string expected = canHold ? u"1234cab" : u"cab1234";
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == expected; }));
+    EXPECT_EQ(listener.downs, u"cab") << "each key is decided about once";
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(KeyboardContract, KeepsTheModifiersOfHeldKeysOutOfTheOutput) {
+    Listener listener;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    desk_->poster().holdUserKeys();
+    desk_->press(ShiftKey);
+    strike(*desk_, KeyA);
+    desk_->release(ShiftKey);
+    strike(*desk_, KeyB);
+    const bool canHold = desk_->canHoldUserKeys();
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == (canHold ? u"" : u"Ab"); }));
+    postText(desk_->poster(), u"x");
+    desk_->poster().releaseUserKeys();
+    const std::u16string expected = canHold ? u"xAb" : u"Abx";
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == expected; }));
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(KeyboardContract, LosesNoKeyWhenNobodyReleasesThem) {
+    Listener listener;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    desk_->poster().holdUserKeys();
+    for (const std::uint16_t key : {KeyA, KeyB}) strike(*desk_, key);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"ab"; }));
+    desk_->poster().releaseUserKeys();
+    strike(*desk_, KeyC);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"abc"; }));
     desk_->keyboardTap().remove();
 }
 

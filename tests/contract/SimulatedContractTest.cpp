@@ -17,7 +17,10 @@ class SimulatedLoop final : public ContractLoop {
 
 class SimulatedDesk final : public ContractDesk {
   public:
-    SimulatedDesk() { activate(Program::First); }
+    explicit SimulatedDesk(bool canHoldUserKeys) : canHoldUserKeys_(canHoldUserKeys) {
+        desktop_.keyboard().setCanHold(canHoldUserKeys);
+        activate(Program::First);
+    }
 
     Pasteboard& pasteboard() override { return desktop_.pasteboard(); }
     KeyboardTap& keyboardTap() override { return desktop_.keyboardTap(); }
@@ -25,37 +28,55 @@ class SimulatedDesk final : public ContractDesk {
     ProcessManager& processManager() override { return desktop_.processManager(); }
     InputSources& inputSources() override { return desktop_.inputSources(); }
     Accessibility& accessibility() override { return desktop_.accessibility(); }
+    SecureInput& secureInput() override { return desktop_.secureInput(); }
+    SystemHotKeys& systemHotKeys() override { return desktop_.systemHotKeys(); }
+    MouseTap& mouseTap() override { return desktop_.mouseTap(); }
+    bool canHoldUserKeys() override { return canHoldUserKeys_; }
 
     bool runUntil(const std::function<bool()>& condition) override {
-        desktop_.runLoop().advance(1);
-        return condition();
+        // In small steps: a look must not let the time of held keys run out.
+        for (int step = 0; step < 500; ++step) {
+            desktop_.runLoop().advance(0.01);
+            if (condition()) return true;
+        }
+        return false;
     }
 
     void press(std::uint16_t keyCode) override { desktop_.keyboard().press(keyCode); }
     void release(std::uint16_t keyCode) override { desktop_.keyboard().release(keyCode); }
+    void click(Button, Point place) override {
+        desktop_.poster().setPointerLocation(place);
+        desktop_.click();
+    }
     void activate(Program program) override { desktop_.activate(nameOf(program)); }
     std::u16string text(Program program) override { return desktop_.application(nameOf(program)).field().text(); }
     void copyElsewhere(const std::u16string& text) override { desktop_.pasteboard().copyFromProgram(text); }
     std::optional<std::u16string> readElsewhere() override { return desktop_.pasteboard().string(); }
+    void setKeyboardHeldElsewhere(bool held) override { desktop_.secureInput().setEnabled(held); }
 
   private:
     static std::u16string nameOf(Program program) {
         return program == Program::First ? u"org.example.first" : u"org.example.second";
     }
 
+    const bool canHoldUserKeys_;
     SimulatedDesktop desktop_;
 };
 
 const ContractPort<ContractLoop> Loop{"Simulated", [] { return std::make_unique<SimulatedLoop>(); }};
-const ContractPort<ContractDesk> Desk{"Simulated", [] { return std::make_unique<SimulatedDesk>(); }};
+const ContractPort<ContractDesk> Desk{"Simulated", [] { return std::make_unique<SimulatedDesk>(false); }};
+const ContractPort<ContractDesk> HoldingDesk{"SimulatedHolding", [] { return std::make_unique<SimulatedDesk>(true); }};
 
 }  // namespace
 
 INSTANTIATE_TEST_SUITE_P(Simulated, RunLoopContract, testing::Values(Loop));
 INSTANTIATE_TEST_SUITE_P(Simulated, PasteboardContract, testing::Values(Desk));
-INSTANTIATE_TEST_SUITE_P(Simulated, KeyboardContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, KeyboardContract, testing::Values(Desk, HoldingDesk));
 INSTANTIATE_TEST_SUITE_P(Simulated, ProcessManagerContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(Simulated, InputSourcesContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(Simulated, AccessibilityContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, SecureInputContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, SystemHotKeysContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, MouseTapContract, testing::Values(Desk));
 
 }  // namespace plume

@@ -12,6 +12,7 @@
 #include "tests/desktop/Deadline.h"
 #include "tests/desktop/DesktopRig.h"
 #include "tests/desktop/SelectionClients.h"
+#include "tests/desktop/XcbReply.h"
 
 // libatspi does not free all it allocates: leaks are not looked for in this program.
 // NOLINTBEGIN(bugprone-reserved-identifier,cert-dcl37-c,cert-dcl51-cpp): the name is the sanitizer's
@@ -29,7 +30,8 @@ constexpr Milliseconds Bound{10'000};
 constexpr double Step = 0.005;  // seconds between two looks at a condition
 
 // The keys that the suites press, as a US keyboard has them.
-const std::map<std::uint16_t, int> Keycodes{{0, 38}, {11, 56}, {8, 54}, {56, static_cast<int>(Key::LeftShift)}};
+const std::map<std::uint16_t, int> Keycodes{
+    {0, 38}, {11, 56}, {8, 54}, {56, static_cast<int>(Key::LeftShift)}, {59, static_cast<int>(Key::LeftControl)}};
 
 // What is expensive to bring up, and what a process can have only once.
 struct Desktop {
@@ -56,6 +58,31 @@ class DesktopEnvironment final : public testing::Environment {
 
 const testing::Environment* const TheEnvironment = testing::AddGlobalTestEnvironment(new DesktopEnvironment);
 
+// Covers the whole screen, unseen, and takes the clicks: they would open menus and move the insertion point.
+class ClickPad {
+  public:
+    explicit ClickPad(XClient& client)
+        : connection_(client.connection()), client_(client), window_(xcb_generate_id(connection_)) {
+        const std::uint32_t values[] = {1, XCB_EVENT_MASK_BUTTON_PRESS};
+        xcb_create_window(connection_, 0, window_, client.root(), 0, 0, client.screen().width_in_pixels,
+                          client.screen().height_in_pixels, 0, XCB_WINDOW_CLASS_INPUT_ONLY, XCB_COPY_FROM_PARENT,
+                          XCB_CW_OVERRIDE_REDIRECT | XCB_CW_EVENT_MASK, values);
+        xcb_map_window(connection_, window_);
+        client_.focusedWindow();  // the answer comes when it is there
+    }
+    ~ClickPad() {
+        xcb_destroy_window(connection_, window_);
+        client_.focusedWindow();
+    }
+    ClickPad(const ClickPad&) = delete;
+    ClickPad& operator=(const ClickPad&) = delete;
+
+  private:
+    xcb_connection_t* const connection_;
+    XClient& client_;
+    const xcb_window_t window_;
+};
+
 class X11Desk final : public ContractDesk {
   public:
     X11Desk() {
@@ -69,6 +96,8 @@ class X11Desk final : public ContractDesk {
     }
     ~X11Desk() override {
         desktop_.rig.keyboard().releaseAll();
+        setKeyboardHeldElsewhere(false);
+        mouseTap().remove();
         keyboardTap().remove();
         pasteboard().declareTypes({}, nullptr);
     }
@@ -79,6 +108,10 @@ class X11Desk final : public ContractDesk {
     ProcessManager& processManager() override { return ports_.processManager; }
     InputSources& inputSources() override { return ports_.inputSources; }
     Accessibility& accessibility() override { return ports_.accessibility; }
+    SecureInput& secureInput() override { return ports_.secureInput; }
+    SystemHotKeys& systemHotKeys() override { return ports_.systemHotKeys; }
+    MouseTap& mouseTap() override { return ports_.mouseTap; }
+    bool canHoldUserKeys() override { return true; }
 
     bool runUntil(const std::function<bool()>& condition) override {
         PollRunLoop& loop = desktop_.port->tapLoop();
@@ -91,8 +124,19 @@ class X11Desk final : public ContractDesk {
         return false;
     }
 
-    void press(std::uint16_t keyCode) override { desktop_.rig.keyboard().press(Keycodes.at(keyCode)); }
-    void release(std::uint16_t keyCode) override { desktop_.rig.keyboard().release(Keycodes.at(keyCode)); }
+    // The server has taken the key when these return: whoever may read it then, will.
+    void press(std::uint16_t keyCode) override {
+        desktop_.rig.keyboard().press(Keycodes.at(keyCode));
+        desktop_.rig.keyboard().sync();
+    }
+    void release(std::uint16_t keyCode) override {
+        desktop_.rig.keyboard().release(Keycodes.at(keyCode));
+        desktop_.rig.keyboard().sync();
+    }
+    void click(Button button, Point place) override {
+        const ClickPad pad(desktop_.rig.client());
+        desktop_.rig.click(static_cast<int>(place.x), static_cast<int>(place.y), button == Button::Left ? 1 : 3);
+    }
     void activate(Program program) override { target(program).activate(); }
     std::u16string text(Program program) override { return fromUtf8(target(program).text()); }
     void copyElsewhere(const std::u16string& text) override {
@@ -106,6 +150,21 @@ class X11Desk final : public ContractDesk {
         runUntil([&] { return answer.wait_for(std::chrono::seconds(0)) == std::future_status::ready; });
         const auto data = answer.get();
         return data ? std::optional(fromUtf8(data->bytes)) : std::nullopt;
+    }
+    void setKeyboardHeldElsewhere(bool held) override {
+        XClient& other = desktop_.rig.client();
+        if (!held) {
+            xcb_ungrab_keyboard(other.connection(), XCB_CURRENT_TIME);
+            other.focusedWindow();  // the answer comes when it is done
+            return;
+        }
+        other.await("another program's taking the keyboard", Bound, [&] {
+            constexpr std::uint8_t Async = XCB_GRAB_MODE_ASYNC;
+            const auto cookie = xcb_grab_keyboard(other.connection(), 0, other.root(), XCB_CURRENT_TIME, Async, Async);
+            const XcbOwned<xcb_grab_keyboard_reply_t> reply(
+                xcb_grab_keyboard_reply(other.connection(), cookie, nullptr));
+            return reply && reply->status == XCB_GRAB_STATUS_SUCCESS;
+        });
     }
 
   private:
@@ -138,5 +197,8 @@ INSTANTIATE_TEST_SUITE_P(X11, KeyboardContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(X11, ProcessManagerContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(X11, InputSourcesContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(X11, AccessibilityContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(X11, SecureInputContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(X11, SystemHotKeysContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(X11, MouseTapContract, testing::Values(Desk));
 
 }  // namespace plume

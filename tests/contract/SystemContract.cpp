@@ -1,0 +1,154 @@
+// What a port tells of the rest of the desktop: who keeps the keyboard, the system's hot keys, clicks.
+#include <initializer_list>
+#include <string>
+#include <vector>
+
+#include "input/KeyCodes.h"
+#include "tests/contract/ContractDesk.h"
+
+namespace plume {
+
+namespace {
+
+constexpr std::uint16_t KeyA = 0;
+constexpr std::uint16_t KeyB = 11;
+constexpr std::uint16_t ShiftKey = 56;
+constexpr std::uint16_t ControlKey = 59;
+
+void chord(ContractDesk& desk, std::initializer_list<std::uint16_t> modifiers, std::uint16_t keyCode) {
+    for (const std::uint16_t modifier : modifiers) desk.press(modifier);
+    desk.press(keyCode);
+    desk.release(keyCode);
+    for (const std::uint16_t modifier : modifiers) desk.release(modifier);
+}
+
+class PassingListener final : public KeyboardTapListener {
+  public:
+    bool keyboardEvent(const TapEvent&) override { return false; }
+    void tapDisabledByTimeout() override {}
+    void tapDisabledByUserInput() override {}
+};
+
+// Writes the places of clicks down.
+MouseTap::Listener writingTo(std::vector<Point>& places) {
+    return [&places](Point place) { places.push_back(place); };
+}
+
+}  // namespace
+
+TEST_P(SecureInputContract, IsOnWhileAnotherProgramHoldsTheKeyboard) {
+    const SecureInput& secureInput = desk_->secureInput();
+    EXPECT_FALSE(secureInput.isSecureEventInputEnabled());
+    for (int round = 0; round < 2; ++round) {
+        desk_->setKeyboardHeldElsewhere(true);
+        EXPECT_TRUE(desk_->runUntil([&] { return secureInput.isSecureEventInputEnabled(); }));
+        desk_->setKeyboardHeldElsewhere(false);
+        EXPECT_TRUE(desk_->runUntil([&] { return !secureInput.isSecureEventInputEnabled(); }));
+    }
+}
+
+TEST_P(SecureInputContract, DoesNotMistakeTheKeyboardTapForAnotherProgram) {
+    PassingListener listener;
+    ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
+    chord(*desk_, {}, KeyA);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"a"; }));
+    EXPECT_FALSE(desk_->secureInput().isSecureEventInputEnabled());
+    desk_->keyboardTap().remove();
+}
+
+TEST_P(SystemHotKeysContract, CallsTheHandlerForExactlyItsCombination) {
+    int called = 0;
+    ASSERT_TRUE(desk_->systemHotKeys().registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { ++called; }).ok());
+    chord(*desk_, {}, KeyB);
+    chord(*desk_, {ShiftKey}, KeyB);
+    chord(*desk_, {ControlKey, ShiftKey}, KeyB);
+    chord(*desk_, {ShiftKey}, KeyA);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"bBA"; }));
+    EXPECT_EQ(called, 0);
+    chord(*desk_, {ControlKey}, KeyB);
+    EXPECT_TRUE(desk_->runUntil([&] { return called > 0; }));
+    chord(*desk_, {ControlKey}, KeyB);
+    EXPECT_TRUE(desk_->runUntil([&] { return called > 1; }));
+    EXPECT_EQ(called, 2);
+}
+
+TEST_P(SystemHotKeysContract, ReplacesWhatHadTheSameId) {
+    SystemHotKeys& hotKeys = desk_->systemHotKeys();
+    std::string called;
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { called += 'x'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyA, KeyModifier::Control, [&] { called += 'x'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyA, KeyModifier::Control, [&] { called += 'a'; }).ok());
+    chord(*desk_, {ControlKey}, KeyB);
+    chord(*desk_, {ControlKey}, KeyA);
+    EXPECT_TRUE(desk_->runUntil([&] { return !called.empty(); }));
+    EXPECT_EQ(called, "a");
+    EXPECT_TRUE(hotKeys.registerHotKey(SecondId, KeyB, KeyModifier::Control, [&] { called += 'b'; }).ok())
+        << "what was replaced is free";
+    chord(*desk_, {ControlKey}, KeyB);
+    EXPECT_TRUE(desk_->runUntil([&] { return called == "ab"; }));
+}
+
+TEST_P(SystemHotKeysContract, RefusesACombinationThatAnotherIdHas) {
+    SystemHotKeys& hotKeys = desk_->systemHotKeys();
+    std::string called;
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { called += '1'; }).ok());
+    const auto refused = hotKeys.registerHotKey(SecondId, KeyB, KeyModifier::Control, [&] { called += '2'; });
+    ASSERT_FALSE(refused.ok());
+    EXPECT_FALSE(refused.error().message.empty());
+    chord(*desk_, {ControlKey}, KeyB);
+    EXPECT_TRUE(desk_->runUntil([&] { return called == "1"; }));
+}
+
+TEST_P(SystemHotKeysContract, ForgetsWhatWasUnregistered) {
+    SystemHotKeys& hotKeys = desk_->systemHotKeys();
+    std::string called;
+    hotKeys.unregisterHotKey(FirstId);
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { called += 'x'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(SecondId, KeyA, KeyModifier::Control, [&] { called += 'a'; }).ok());
+    hotKeys.unregisterHotKey(FirstId);
+    hotKeys.unregisterHotKey(FirstId);
+    chord(*desk_, {ControlKey}, KeyB);
+    chord(*desk_, {ControlKey}, KeyA);
+    EXPECT_TRUE(desk_->runUntil([&] { return !called.empty(); }));
+    EXPECT_EQ(called, "a");
+}
+
+TEST_P(MouseTapContract, HearsLeftAndRightPressesWithTheirPlace) {
+    using Button = ContractDesk::Button;
+    struct Case {
+        Button button;
+        Point place;
+    };
+    std::vector<Point> heard;
+    ASSERT_TRUE(desk_->mouseTap().create(writingTo(heard)).ok());
+    std::vector<Point> expected;
+    for (const Case& c : {Case{Button::Left, {40, 60}}, {Button::Right, {300, 20}}, {Button::Left, {0, 0}}}) {
+        desk_->click(c.button, c.place);
+        expected.push_back(c.place);
+        EXPECT_TRUE(desk_->runUntil([&] { return heard.size() >= expected.size(); }));
+        EXPECT_EQ(heard, expected) << "the button's coming up is not told";
+        EXPECT_EQ(desk_->poster().pointerLocation(), c.place);
+    }
+    desk_->mouseTap().remove();
+}
+
+TEST_P(MouseTapContract, HearsNothingOnceRemoved) {
+    MouseTap& mouseTap = desk_->mouseTap();
+    std::vector<Point> before;
+    std::vector<Point> after;
+    EXPECT_FALSE(mouseTap.exists());
+    ASSERT_TRUE(mouseTap.create(writingTo(before)).ok());
+    EXPECT_TRUE(mouseTap.exists());
+    mouseTap.remove();
+    EXPECT_FALSE(mouseTap.exists());
+    mouseTap.remove();
+    desk_->click(ContractDesk::Button::Left, {40, 60});
+    ASSERT_TRUE(mouseTap.create(writingTo(after)).ok());
+    desk_->click(ContractDesk::Button::Right, {50, 70});
+    EXPECT_TRUE(desk_->runUntil([&] { return !after.empty(); }));
+    EXPECT_EQ(after, (std::vector<Point>{{50, 70}}));
+    EXPECT_TRUE(before.empty());
+    mouseTap.remove();
+}
+
+}  // namespace plume
