@@ -96,6 +96,16 @@ TargetProgram::TargetProgram(TargetKind kind, DesktopSession& session, XClient& 
 TargetProgram::~TargetProgram() {
     shutdown(line_.get(), SHUT_RDWR);
     reader_.join();
+    process_.reset();
+    // The window manager gives the focus to somebody else when it notices: later it would take it from the next program.
+    try {
+        client_.await("the end of the target's window", Milliseconds(2'000), [this] {
+            const auto managed = client_.managedWindows();
+            return std::ranges::find(managed, window_) == managed.end();
+        });
+    } catch (const RigError&) {
+        // The window manager or the server may have ended before it.
+    }
 }
 
 std::string TargetProgram::text() {
