@@ -97,7 +97,8 @@ TargetProgram::~TargetProgram() {
     shutdown(line_.get(), SHUT_RDWR);
     reader_.join();
     process_.reset();
-    // The window manager gives the focus to somebody else when it notices: later it would take it from the next program.
+    // The window manager gives the focus to somebody else when it notices: later it would take it from the next
+    // program.
     try {
         client_.await("the end of the target's window", Milliseconds(2'000), [this] {
             const auto managed = client_.managedWindows();
