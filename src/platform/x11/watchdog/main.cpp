@@ -95,7 +95,7 @@ class WatchdogProcess {
 int main(int count, char** arguments) {
     auto guard = plume::KeyboardGuard::open(count > 1 ? arguments[1] : "");
     if (!guard) {
-        std::fprintf(stderr, "plume-watchdog: %s\n", guard.error().message.c_str());
+        static_cast<void>(std::fprintf(stderr, "plume-watchdog: %s\n", guard.error().message.c_str()));
         return 1;
     }
     plume::WatchdogProcess(*guard.value()).run();
