@@ -1,7 +1,7 @@
 // Whether another program keeps the keyboard to itself: a screen locker, a password prompt, an open menu.
 //
 // The server is asked to hand over the keyboard for a window that is not shown, which it refuses with one reason or the
-// other and without an effect. The question goes along with one key and its answer is read at the next, so that
+// other and without an effect. The question goes behind one key and its answer is read at the next, so that
 // typing never waits for it. Belongs to the tap thread.
 #pragma once
 
