@@ -138,21 +138,10 @@ void TapSession::handle(const xcb_generic_event_t& event) {
         release(keycode);
     }
     if (ended_) return;
+    // The key first: asking must not hold it up.
     parts_.connection.flush();
-    askWhoHoldsTheKeyboard();
-}
-
-// Behind the key, in a request of its own: the server would answer it before it sends the key on.
-void TapSession::askWhoHoldsTheKeyboard() {
-    if (std::exchange(asksSoon_, true)) return;
-    parts_.loop.perform([weak = weak_from_this()] {
-        const auto self = weak.lock();
-        if (!self) return;
-        self->asksSoon_ = false;
-        if (self->ended_) return;
-        self->keyboardHeld_->ask(self->parts_.loop.now());
-        self->parts_.connection.flush();
-    });
+    keyboardHeld_->ask(parts_.loop.now());
+    parts_.connection.flush();
 }
 
 void TapSession::handleHierarchy(const xcb_input_hierarchy_event_t& event) {

@@ -67,7 +67,6 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void press(xcb_keycode_t keycode, bool repeated);
     void release(xcb_keycode_t keycode);
     void releaseKeysOf(std::uint16_t device);
-    void askWhoHoldsTheKeyboard();
     bool mayTell();
     void tellMissedModifiers(std::uint64_t flags);
     bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
@@ -79,7 +78,6 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     std::unique_ptr<KeyboardHeld> keyboardHeld_;
     int descriptor_ = -1;
     bool ended_ = false;
-    bool asksSoon_ = false;
 
     KeycodeSet seen_;                           // keys that are down and went down here
     KeycodeSet told_;                           // those of them that the listener was told of
