@@ -26,7 +26,7 @@ FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|s
 MAY_USE = {
     "": ("unicode/",),
     "platform/x11": ("xcb/", "X11/", "xkbcommon/"),
-    "platform/desktop": ("atspi", "canberra", "dbus", "glib"),
+    "platform/desktop": ("canberra", "dbus"),
     "app": ("CLI/", "nlohmann/", "xcb/"),
 }
 

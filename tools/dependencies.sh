@@ -17,8 +17,8 @@ need_packages() {
     "${as_root[@]}" apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
 }
 
-BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config libatspi2.0-dev libcanberra-dev libglib2.0-dev
-    libcli11-dev libicu-dev libx11-dev libxcb-xfixes0-dev libxcb-xinput-dev libxcb-xkb-dev libxcb-xtest0-dev libxcb1-dev
+BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config libcanberra-dev libcli11-dev libdbus-1-dev
+    libicu-dev libx11-dev libxcb-xfixes0-dev libxcb-xinput-dev libxcb-xkb-dev libxcb-xtest0-dev libxcb1-dev
     libxkbcommon-dev libxkbcommon-x11-dev nlohmann-json3-dev)
 TEST_PACKAGES=(libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
 CHECK_PACKAGES=(clang clang-format clang-tidy libclang-rt-14-dev git)

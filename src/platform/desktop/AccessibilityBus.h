@@ -1,13 +1,18 @@
-// Whether this session has an accessibility bus, asked of the session's D-Bus before libatspi looks for it: libatspi
-// waits longer and ends the program with some faults.
+// Where this session has its accessibility bus, if it has one: asked of the session's D-Bus.
 #pragma once
+
+#include <string>
 
 #include "platform/desktop/AtspiAccessibility.h"
 
 namespace plume {
 
-// Starts the bus when it can be started. May wait for seconds: on the accessibility thread. Working, SwitchedOff,
-// NotInstalled or NoSession.
-AccessibilityStatus findAccessibilityBus();
+struct AccessibilityBus {
+    AccessibilityStatus status;  // Working, SwitchedOff, NotInstalled or NoSession
+    std::string address;         // empty for the last two
+};
+
+// Starts the bus when it can be started. May wait for seconds: on the accessibility thread.
+AccessibilityBus findAccessibilityBus();
 
 }  // namespace plume

@@ -12,16 +12,18 @@ namespace {
 
 constexpr std::chrono::milliseconds LongestGoodbye{50};
 
-// The program in front. What it is was told by its focus, so nothing needs to be asked to make one.
+// The program in front, of which something is known to have the focus. Nothing needs to be asked to make one.
 class AtspiApplicationElement final : public UIElement {
   public:
     using Element = std::shared_ptr<UIElement>;
 
-    AtspiApplicationElement(std::shared_ptr<AtspiQueue> queue, AtspiPart focused)
-        : focused_(std::make_shared<AtspiElement>(std::move(queue), std::move(focused))) {}
+    explicit AtspiApplicationElement(std::shared_ptr<AtspiSession> session) : session_(std::move(session)) {}
 
     Element elementAttribute(std::string_view name) const override {
-        return name == "AXFocusedUIElement" ? focused_ : nullptr;
+        if (name != "AXFocusedUIElement") return nullptr;
+        auto focused = session_->askForFocus();
+        if (!focused || !*focused) return nullptr;
+        return std::make_shared<AtspiElement>(session_, std::move(*focused));
     }
     std::optional<std::u16string> stringAttribute(std::string_view name) const override {
         return name == "AXRole" ? std::optional<std::u16string>(u"AXApplication") : std::nullopt;
@@ -44,7 +46,7 @@ class AtspiApplicationElement final : public UIElement {
     std::optional<Rectangle> rectangleForRange(std::string_view, TextRange) const override { return std::nullopt; }
 
   private:
-    Element focused_;
+    std::shared_ptr<AtspiSession> session_;
 };
 
 }  // namespace
@@ -82,7 +84,7 @@ AtspiAccessibility::AtspiAccessibility() : session_(std::make_shared<AtspiSessio
 }
 
 AtspiAccessibility::~AtspiAccessibility() {
-    session_->queue()->end();
+    session_->end();
     if (ended_.wait_for(LongestGoodbye) == std::future_status::ready) {
         thread_.join();
     } else {
@@ -91,9 +93,19 @@ AtspiAccessibility::~AtspiAccessibility() {
 }
 
 std::shared_ptr<UIElement> AtspiAccessibility::frontApplicationElement() const {
-    AtspiPart focused = session_->focus().part();
-    if (!focused) return nullptr;
-    return std::make_shared<AtspiApplicationElement>(session_->queue(), std::move(focused));
+    return session_->focus().isKnown() ? std::make_shared<AtspiApplicationElement>(session_) : nullptr;
+}
+
+void AtspiAccessibility::setFrontProcess(pid_t process) {
+    session_->tracker().setFrontProcess(process);
+}
+
+void AtspiAccessibility::focusMayHaveMoved() {
+    session_->tracker().focusMayHaveMoved();
+}
+
+void AtspiAccessibility::userTypes() {
+    session_->tracker().userTypes();
 }
 
 bool AtspiAccessibility::focusIsPassword() const {

@@ -1,11 +1,11 @@
 // What the focused program tells of its user interface, by AT-SPI.
 //
-// Programs may be slow or hang, so none is ever asked on a caller's thread: a thread of its own, on which libatspi
-// runs, follows the focus and asks. A caller waits for an answer for 15 ms at most, and after an answer that did not
-// come nobody waits for another one for a second. One object a process: libatspi has one connection.
+// Programs may be slow or hang, so none is ever asked on a caller's thread: a thread of its own asks them. A caller
+// waits for an answer for 15 ms at most, and after an answer that did not come nobody waits for another one for a
+// second.
 //
-// libatspi puts some of its connections into GLib's default main context. No other thread may run that context: a
-// program with a Qt main loop sets QT_NO_GLIB before it makes its application object.
+// No program is asked to tell of its focus by itself, which would slow down every key that it gets. Whoever owns this
+// object says when the focus may be elsewhere: which program is in front, that somebody clicks, that somebody types.
 #pragma once
 
 #include <sys/types.h>
@@ -44,16 +44,26 @@ class AtspiAccessibility final : public Accessibility {
     AtspiAccessibility(const AtspiAccessibility&) = delete;
     AtspiAccessibility& operator=(const AtspiAccessibility&) = delete;
 
-    // The program that has the focus, when it tells so. Never waits; its elements' attributes do. An element belongs to
-    // the thread that it was made for.
+    // The program in front, when something of it is known to have the focus. Never waits; its elements' attributes do,
+    // and its AXFocusedUIElement is what has the focus when it is asked for. An element belongs to the thread that it
+    // was made for.
     std::shared_ptr<UIElement> frontApplicationElement() const override;
     double mainScreenHeight() const override { return screenHeight_; }
     // In the pixels in which programs tell of their places. From any thread.
     void setMainScreenHeight(double height) { screenHeight_ = height; }
 
+    // ---- What happens on the desktop. From any thread, never waiting. ----
+    // The process of the program in front; 0 when it is not known. When it is another one than before, the focus is
+    // forgotten at once, and then looked for.
+    void setFrontProcess(pid_t process);
+    // After a click, a Tab, or a change of windows: looks for the focus a few times within a second.
+    void focusMayHaveMoved();
+    // At every key: looks for the focus when it was not looked for lately. Costs a look at the clock otherwise.
+    void userTypes();
+
     // Whether a password is typed into what has the focus. From any thread, never waits.
     bool focusIsPassword() const;
-    // The process that has the focus; 0 when it is not known. From any thread, never waits.
+    // The process that has the focus, by the bus's account; 0 when it is not known. From any thread, never waits.
     pid_t focusedProcess() const;
     // From any thread, never waits.
     AccessibilityStatus status() const;

@@ -3,7 +3,7 @@
 #pragma once
 
 #include "platform/Accessibility.h"
-#include "platform/desktop/AtspiQueue.h"
+#include "platform/desktop/AtspiSession.h"
 #include "platform/desktop/AtspiText.h"
 
 namespace plume {
@@ -13,7 +13,7 @@ class AtspiElement final : public UIElement {
   public:
     using Element = std::shared_ptr<UIElement>;
 
-    AtspiElement(std::shared_ptr<AtspiQueue> queue, AtspiPart part);
+    AtspiElement(std::shared_ptr<AtspiSession> session, AtspiPart part);
 
     Element elementAttribute(std::string_view name) const override;
     std::vector<Element> elementsAttribute(std::string_view name) const override;
@@ -32,7 +32,7 @@ class AtspiElement final : public UIElement {
     Element elementFor(AtspiPart part) const;
     std::optional<Rectangle> place() const;
 
-    std::shared_ptr<AtspiQueue> queue_;
+    std::shared_ptr<AtspiSession> session_;
     AtspiPart part_;
     mutable AtspiTextReader::Anchor anchor_;  // the selection when it was asked for last
 };

@@ -1,72 +1,65 @@
-// Follows the focus from program to program by what they tell of themselves. Belongs to the accessibility thread.
+// Knows what has the focus by asking for it: when somebody says that it may have moved, and while somebody types. With
+// nothing going on it does nothing, and sets no timer.
 #pragma once
 
 #include <sys/types.h>
 
-#include <array>
+#include <atomic>
 #include <chrono>
-#include <deque>
-#include <memory>
+#include <cstddef>
+#include <functional>
+#include <string>
 
 #include "platform/desktop/AtspiFocus.h"
-#include "platform/desktop/AtspiQueue.h"
+#include "platform/desktop/AtspiFocusFinder.h"
+#include "platform/desktop/AtspiFocusListener.h"
+#include "platform/desktop/PollRunLoop.h"
 
 namespace plume {
 
 class AtspiFocusTracker {
   public:
-    AtspiFocusTracker(AtspiQueue& queue, AtspiFocus& focus) : queue_(queue), focus_(focus) {}
-    ~AtspiFocusTracker();
+    // `address` makes sure that the bus is connected, and tells where it is: nothing when it cannot be.
+    using BusAddressSource = std::function<const std::string*()>;
+    AtspiFocusTracker(PollRunLoop& loop, AtspiBus& bus, BusAddressSource address);
     AtspiFocusTracker(const AtspiFocusTracker&) = delete;
     AtspiFocusTracker& operator=(const AtspiFocusTracker&) = delete;
 
-    // Whether libatspi tells of the focus from now on.
-    bool start();
-    // libatspi gives each program a connection of its own, in GLib's default main context; they are brought here.
-    void adoptConnections() const;
+    // ---- From any thread, never waiting ----
+    const AtspiFocus& focus() const { return focus_; }
+    void setFrontProcess(pid_t process);
+    void focusMayHaveMoved();
+    void userTypes();
+
+    // ---- On the accessibility thread ----
+    // What has the focus now, or a moment ago.
+    AtspiPart focusedNow();
 
   private:
-    enum class Kind { FocusGained, FocusLost, WindowActivated, WindowLeft };
-    struct Event {
-        Kind kind;
-        AtspiPart source;
-    };
-    // libatspi's own calls, run inside of ours while those wait for a program: they only take notes.
-    static void heard(AtspiEvent* event, void* tracker);
-    void note(Kind kind, AtspiAccessible* source);
-    void handleNoted();
-    void handle(const Event& event);
+    using Clock = std::chrono::steady_clock;
 
-    void gained(const AtspiPart& part);
-    void considerAgain(const AtspiPart& part);
-    void considerCandidate(int looks);
-    void windowActivated(const AtspiPart& window);
-    void windowLeft(const AtspiPart& window);
-    void setFocus(const AtspiPart& part);
-    void clearFocus();
-    static bool isInActiveWindow(const AtspiPart& part);
+    void lookSeveralTimes();
+    void lookAfter(std::size_t step);
+    void look();
+    void search(const AtspiFocus::Front& front);
+    void becomeFocused(const AtspiFocus::Front& front, const AtspiPart& part, pid_t process);
+    void listenWhereItHelps(const AtspiFocus::Front& front, const AtspiFocusFinder::Found& found);
+    void setPause(std::chrono::milliseconds pause);
 
-    // For programs that told of their focus before anybody listened, or do not tell again.
-    void findFocus();
-    void lookForFocusIn(const AtspiPart& window, int looks);
-    void findFocusIn(const AtspiPart& window);
-    AtspiPart focusedBelow(const AtspiPart& part, int depth, int& left) const;
-    AtspiPart child(const AtspiPart& part, int index) const;
-
-    // A program that ends need not tell that its focus has gone.
-    void watch(pid_t process);
-    void stopWatching();
-
-    AtspiQueue& queue_;
-    AtspiFocus& focus_;
-    std::array<AtspiEventListener*, 5> listeners_{};
-    std::deque<Event> noted_;
-    AtspiPart activeWindow_;
-    AtspiPart candidate_;  // said to have the focus, and to be looked at again
-    AtspiPart previous_;   // what had the focus before that window
-    pid_t watched_ = 0;
-    int watchedDescriptor_ = -1;
-    GSource* watch_ = nullptr;
+    PollRunLoop& loop_;
+    AtspiBus& bus_;
+    const BusAddressSource address_;
+    AtspiFocusFinder finder_;
+    AtspiFocusListener listener_;
+    AtspiFocus::Front listenedFront_;  // whose focus the listener tells
+    pid_t listenedProcess_ = 0;
+    AtspiFocus focus_;
+    int connection_ = 0;  // the one on which it was found
+    Clock::time_point lookedAt_{};
+    std::size_t misses_ = 0;            // looks in a row that found nothing, without those of a series
+    RunLoop::CallId nextOfSeries_ = 0;  // of looks after a move; 0 after the last one
+    // From when on a key makes for a look.
+    std::atomic<Clock::rep> nextLook_ = 0;
 };
 
 }  // namespace plume

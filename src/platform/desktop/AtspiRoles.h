@@ -3,13 +3,13 @@
 
 #include <string_view>
 
-#include "platform/desktop/AtspiObjects.h"
+#include "platform/desktop/AtspiParts.h"
 
 namespace plume {
 
 // "AXUnknown" for a role that Plume has no use for. On the accessibility thread.
-std::u16string_view roleOf(AtspiAccessible* part);
+std::u16string_view roleOf(AtspiBus& bus, const AtspiPart& part);
 // Empty when it has none. On the accessibility thread.
-std::u16string_view subroleOf(AtspiAccessible* part);
+std::u16string_view subroleOf(AtspiBus& bus, const AtspiPart& part);
 
 }  // namespace plume

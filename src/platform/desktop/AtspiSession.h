@@ -2,29 +2,57 @@
 #pragma once
 
 #include <atomic>
+#include <chrono>
+#include <functional>
 #include <memory>
+#include <optional>
+#include <string>
+#include <utility>
 
 #include "platform/desktop/AtspiAccessibility.h"
-#include "platform/desktop/AtspiFocus.h"
+#include "platform/desktop/AtspiBus.h"
+#include "platform/desktop/AtspiFocusTracker.h"
 #include "platform/desktop/AtspiQueue.h"
 
 namespace plume {
 
 class AtspiSession {
   public:
-    const std::shared_ptr<AtspiQueue>& queue() const { return queue_; }
-    const AtspiFocus& focus() const { return focus_; }
-    AccessibilityStatus status() const { return status_; }
+    AtspiSession();
 
-    // The thread itself, until the queue ends.
+    AccessibilityStatus status() const { return status_; }
+    AtspiFocusTracker& tracker() { return tracker_; }
+    const AtspiFocus& focus() const { return tracker_.focus(); }
+
+    // Asks on the accessibility thread: the answer, or nothing when it does not come in time.
+    template <typename Answer>
+    std::optional<Answer> ask(std::function<std::optional<Answer>(AtspiBus& bus)> question) {
+        // Not shared: what waits in the queue would keep the queue. Whoever runs it keeps this session meanwhile.
+        return queue_.ask<Answer>([this, question = std::move(question)] {
+            bus_.begin(QuestionBound);
+            return question(bus_);
+        });
+    }
+    // What has the focus at this moment.
+    std::optional<AtspiPart> askForFocus();
+
+    // The thread itself, until end().
     void run();
+    void end() { queue_.end(); }
 
   private:
-    bool connect();
+    using Clock = std::chrono::steady_clock;
+    static constexpr std::chrono::milliseconds QuestionBound{150};
 
-    const std::shared_ptr<AtspiQueue> queue_ = std::make_shared<AtspiQueue>();
-    AtspiFocus focus_;
+    const std::string* connectedAddress();
+    void connect();
+
+    AtspiQueue queue_;
+    AtspiBus bus_;
+    std::string address_;
+    Clock::time_point connectedAt_{};  // or tried to
     std::atomic<AccessibilityStatus> status_ = AccessibilityStatus::Starting;
+    AtspiFocusTracker tracker_;
 };
 
 }  // namespace plume

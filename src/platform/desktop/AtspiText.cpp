@@ -3,8 +3,11 @@
 #include <unicode/ustring.h>
 
 #include <algorithm>
+#include <array>
 #include <cstdlib>
+#include <limits>
 #include <string_view>
+#include <utility>
 
 #include "Foundation/Strings.h"
 
@@ -12,6 +15,10 @@ namespace plume {
 
 namespace {
 
+constexpr const char* TextInterface = "org.a11y.atspi.Text";
+constexpr std::uint32_t ScreenCoordinates = 0;
+
+constexpr std::int64_t MostOffset = std::numeric_limits<std::int32_t>::max();
 constexpr std::int64_t MostUnits = 1'000'000;
 constexpr std::int64_t MostCounted = 65'536;
 
@@ -20,10 +27,17 @@ std::int64_t sizeOf(const std::u16string& text) {
 }
 
 // Programs answer with an empty rectangle, or one of negative size, for a place that they do not know.
-std::optional<Rectangle> rectangleFrom(GlibOwned<AtspiRect> rect) {
-    if (!rect || rect->height <= 0 || rect->width < 0) return std::nullopt;
-    return Rectangle{{static_cast<double>(rect->x), static_cast<double>(rect->y)},
-                     {static_cast<double>(rect->width), static_cast<double>(rect->height)}};
+std::optional<Rectangle> rectangleIn(BusReader reader) {
+    std::array<std::int32_t, 4> numbers{};
+    for (std::int32_t& number : numbers) {
+        const auto read = reader.int32();
+        if (!read) return std::nullopt;
+        number = *read;
+    }
+    const auto [x, y, width, height] = numbers;
+    if (height <= 0 || width < 0) return std::nullopt;
+    return Rectangle{{static_cast<double>(x), static_cast<double>(y)},
+                     {static_cast<double>(width), static_cast<double>(height)}};
 }
 
 std::int64_t charactersIn(std::u16string_view text) {
@@ -32,35 +46,44 @@ std::int64_t charactersIn(std::u16string_view text) {
 
 }  // namespace
 
-AtspiTextReader::AtspiTextReader(AtspiAccessible* part, Anchor anchor)
-    : part_(part), text_(atspi_accessible_get_text_iface(part)), anchor_(anchor) {}
+AtspiTextReader::AtspiTextReader(AtspiBus& bus, AtspiPart part, Anchor anchor)
+    : bus_(bus), part_(std::move(part)), anchor_(anchor) {}
 
 bool AtspiTextReader::isPassword() const {
-    return atspi_accessible_get_role(part_, nullptr) == ATSPI_ROLE_PASSWORD_TEXT;
+    const auto role = roleNumberOf(bus_, part_);
+    return !role || role == AtspiRole::PasswordText;
+}
+
+BusAnswer AtspiTextReader::ask(const char* method, std::initializer_list<BusValue> arguments) const {
+    return bus_.call(part_, TextInterface, method, arguments);
+}
+
+std::optional<std::int64_t> AtspiTextReader::number(const char* property) const {
+    return bus_.property(part_, TextInterface, property).values().inside().int32();
 }
 
 std::optional<std::u16string> AtspiTextReader::fetch(std::int64_t from, std::int64_t to) const {
     if (from >= to) return std::u16string();
-    if (!text_ || to > G_MAXINT) return std::nullopt;
-    AtspiError error;
-    const GlibOwned<char> bytes(
-        atspi_text_get_text(text_.get(), static_cast<int>(from), static_cast<int>(to), error.out()));
-    if (!bytes || error.isSet()) return std::nullopt;
-    return fromUtf8(bytes.get());
+    if (from < 0 || to > MostOffset) return std::nullopt;
+    const auto text =
+        ask("GetText", {static_cast<std::int32_t>(from), static_cast<std::int32_t>(to)}).values().string();
+    return text ? std::optional(fromUtf8(*text)) : std::nullopt;
 }
 
 std::optional<TextRange> AtspiTextReader::selectedRange() {
-    if (!text_) return std::nullopt;
-    AtspiError error;
-    std::int64_t start = atspi_text_get_caret_offset(text_.get(), error.out());
+    const auto caret = number("CaretOffset");
+    if (!caret || *caret < 0) return std::nullopt;
+    std::int64_t start = *caret;
     std::int64_t end = start;
-    if (start < 0 || error.isSet()) return std::nullopt;
-    if (atspi_text_get_n_selections(text_.get(), nullptr) > 0) {
+    if (ask("GetNSelections").values().int32().value_or(0) > 0) {
+        const BusAnswer answer = ask("GetSelection", {0});
+        BusReader bounds = answer.values();
+        const auto one = bounds.int32();
+        const auto other = bounds.int32();
         // There may be one without anything in it.
-        const GlibOwned<AtspiRange> selected(atspi_text_get_selection(text_.get(), 0, nullptr));
-        if (selected && selected->start_offset >= 0 && selected->start_offset != selected->end_offset) {
-            start = std::min(selected->start_offset, selected->end_offset);
-            end = std::max(selected->start_offset, selected->end_offset);
+        if (one && other && *one >= 0 && *other >= 0 && one != other) {
+            start = std::min(*one, *other);
+            end = std::max(*one, *other);
         }
     }
     if (isPassword()) return TextRange{start, end - start};
@@ -90,11 +113,10 @@ std::optional<std::u16string> AtspiTextReader::string(TextRange range) const {
 }
 
 std::optional<std::u16string> AtspiTextReader::wholeText() const {
-    if (!text_ || isPassword()) return std::nullopt;
-    AtspiError error;
-    const int characters = atspi_text_get_character_count(text_.get(), error.out());
-    if (error.isSet() || characters < 0 || characters > MostUnits) return std::nullopt;
-    return fetch(0, characters);
+    if (isPassword()) return std::nullopt;
+    const auto characters = number("CharacterCount");
+    if (!characters || *characters < 0 || *characters > MostUnits) return std::nullopt;
+    return fetch(0, *characters);
 }
 
 std::optional<std::int64_t> AtspiTextReader::offsetOf(std::int64_t units) const {
@@ -112,28 +134,28 @@ std::optional<std::int64_t> AtspiTextReader::offsetOf(std::int64_t units) const 
 }
 
 std::optional<Rectangle> AtspiTextReader::bounds(TextRange range) const {
-    if (!text_ || range.location < 0 || range.length < 0) return std::nullopt;
+    if (range.location < 0 || range.length < 0) return std::nullopt;
     const auto start = offsetOf(range.location);
     if (!start) return std::nullopt;
     if (range.length == 0) return caretAt(*start);
     const auto end = offsetOf(range.location + range.length);
-    if (!end || *end > G_MAXINT) return std::nullopt;
-    return rectangleFrom(GlibOwned<AtspiRect>(atspi_text_get_range_extents(
-        text_.get(), static_cast<int>(*start), static_cast<int>(*end), ATSPI_COORD_TYPE_SCREEN, nullptr)));
+    if (!end || *start < 0 || *end > MostOffset) return std::nullopt;
+    return rectangleIn(
+        ask("GetRangeExtents", {static_cast<std::int32_t>(*start), static_cast<std::int32_t>(*end), ScreenCoordinates})
+            .values());
 }
 
 std::optional<Rectangle> AtspiTextReader::characterAt(std::int64_t offset) const {
-    if (offset < 0 || offset > G_MAXINT) return std::nullopt;
-    return rectangleFrom(GlibOwned<AtspiRect>(
-        atspi_text_get_character_extents(text_.get(), static_cast<int>(offset), ATSPI_COORD_TYPE_SCREEN, nullptr)));
+    if (offset < 0 || offset > MostOffset) return std::nullopt;
+    return rectangleIn(ask("GetCharacterExtents", {static_cast<std::int32_t>(offset), ScreenCoordinates}).values());
 }
 
 std::optional<Rectangle> AtspiTextReader::caretAt(std::int64_t offset) const {
-    const int characters = atspi_text_get_character_count(text_.get(), nullptr);
+    const std::int64_t characters = number("CharacterCount").value_or(0);
     if (offset < characters) {
         if (const auto next = characterAt(offset)) return Rectangle{next->origin, {0, next->size.height}};
     }
-    const auto field = screenBounds(part_);
+    const auto field = screenBounds(bus_, part_);
     const auto last = characterAt(offset - 1);
     if (!last) return field;  // an empty text
     const bool startsLine = !isPassword() && fetch(offset - 1, offset) == u"\n";
@@ -144,11 +166,9 @@ std::optional<Rectangle> AtspiTextReader::caretAt(std::int64_t offset) const {
     return Rectangle{{last->origin.x + last->size.width, last->origin.y}, {0, last->size.height}};
 }
 
-std::optional<Rectangle> screenBounds(AtspiAccessible* part) {
-    const GObjectOwned<AtspiComponent> component(atspi_accessible_get_component_iface(part));
-    if (!component) return std::nullopt;
-    return rectangleFrom(
-        GlibOwned<AtspiRect>(atspi_component_get_extents(component.get(), ATSPI_COORD_TYPE_SCREEN, nullptr)));
+std::optional<Rectangle> screenBounds(AtspiBus& bus, const AtspiPart& part) {
+    const BusAnswer answer = bus.call(part, "org.a11y.atspi.Component", "GetExtents", {ScreenCoordinates});
+    return rectangleIn(answer.values().inside());
 }
 
 }  // namespace plume

@@ -10,7 +10,7 @@
 #include <string>
 
 #include "platform/Accessibility.h"
-#include "platform/desktop/AtspiObjects.h"
+#include "platform/desktop/AtspiParts.h"
 
 namespace plume {
 
@@ -22,7 +22,7 @@ class AtspiTextReader {
         std::int64_t units = 0;
     };
 
-    AtspiTextReader(AtspiAccessible* part, Anchor anchor);
+    AtspiTextReader(AtspiBus& bus, AtspiPart part, Anchor anchor);
 
     // What was selected, or the caret as an empty stretch; the anchor then is its start. What lies more than 65,536
     // characters before the selection is counted as one unit a character.
@@ -36,18 +36,21 @@ class AtspiTextReader {
     std::optional<Rectangle> bounds(TextRange range) const;
 
   private:
+    // Also when the part does not say what it is.
     bool isPassword() const;
+    BusAnswer ask(const char* method, std::initializer_list<BusValue> arguments = {}) const;
+    std::optional<std::int64_t> number(const char* property) const;
     std::optional<std::u16string> fetch(std::int64_t from, std::int64_t to) const;
     std::optional<std::int64_t> offsetOf(std::int64_t units) const;
     std::optional<Rectangle> caretAt(std::int64_t offset) const;
     std::optional<Rectangle> characterAt(std::int64_t offset) const;
 
-    AtspiAccessible* part_;
-    GObjectOwned<AtspiText> text_;
+    AtspiBus& bus_;
+    AtspiPart part_;
     Anchor anchor_;
 };
 
 // Where a part is on the screen; nothing when it does not tell.
-std::optional<Rectangle> screenBounds(AtspiAccessible* part);
+std::optional<Rectangle> screenBounds(AtspiBus& bus, const AtspiPart& part);
 
 }  // namespace plume

@@ -1,0 +1,58 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <memory>
+
+#include "platform/desktop/AtspiAccessibility.h"
+#include "tests/desktop/Deadline.h"
+#include "tests/desktop/DesktopRig.h"
+
+namespace plume::rig {
+
+inline bool await(const std::function<bool()>& condition) {
+    const Deadline deadline(Milliseconds(10'000));
+    while (!condition()) {
+        if (deadline.passed()) return false;
+        deadline.waitReadable(-1, Milliseconds(5));
+    }
+    return true;
+}
+
+// One desktop for all. The tests say who is in front and that somebody types, as the keyboard's port does.
+class AccessibilityDesktop : public testing::Test {
+  protected:
+    static void SetUpTestSuite() {
+        if (rig_) return;
+        rig_ = std::make_unique<DesktopRig>();
+        rig_->session().join();
+        accessibility_ = std::make_unique<AtspiAccessibility>();
+        ASSERT_TRUE(await([] { return accessibility_->status() != AccessibilityStatus::Starting; }));
+    }
+
+    static std::unique_ptr<TargetProgram> startFocused(TargetKind kind) {
+        auto target = rig_->startTarget(kind);
+        comesToFront(*target);
+        return target;
+    }
+
+    static void comesToFront(const TargetProgram& target) {
+        accessibility_->setFrontProcess(target.pid());
+        if (target.kind() == TargetKind::Xterm) return;
+        EXPECT_TRUE(awaitTyping([&] { return accessibility_->focusedProcess() == target.pid(); }));
+    }
+
+    // With somebody who types all the while.
+    static bool awaitTyping(const std::function<bool()>& condition) {
+        return await([&] {
+            accessibility_->userTypes();
+            return condition();
+        });
+    }
+
+    static inline std::unique_ptr<DesktopRig> rig_;
+    static inline std::unique_ptr<AtspiAccessibility> accessibility_;
+};
+
+}  // namespace plume::rig
