@@ -117,7 +117,9 @@ void AtspiFocusTracker::becomeFocused(const AtspiFocus::Front& front, const Atsp
 
 void AtspiFocusTracker::listenWhereItHelps(const AtspiFocus::Front& front, const AtspiFocusFinder::Found& found) {
     if (found.program.empty()) return;
-    if (isWalkedThrough(finder_.toolkitOf(found.program))) return listener_.stop();
+    const std::string& toolkit = finder_.toolkitOf(found.program);
+    if (toolkit.empty()) return;  // one of those that are slow to answer must not become slower
+    if (isWalkedThrough(toolkit)) return listener_.stop();
     const std::string* address = address_();
     if (address == nullptr) return;
     listenedFront_ = front;
