@@ -138,8 +138,12 @@ void TapSession::handle(const xcb_generic_event_t& event) {
         release(keycode);
     }
     if (ended_) return;
-    // The key first: asking must not hold it up.
     parts_.connection.flush();
+    // Not behind a press: the answer would come while the program is busy with the key.
+    if (key.event_type == XCB_INPUT_KEY_RELEASE) askWhoHoldsTheKeyboard();
+}
+
+void TapSession::askWhoHoldsTheKeyboard() {
     keyboardHeld_->ask(parts_.loop.now());
     parts_.connection.flush();
 }

@@ -63,6 +63,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;
     bool isKey(const xcb_generic_event_t& event) const;
     void handle(const xcb_generic_event_t& event);
+    void askWhoHoldsTheKeyboard();
     void handleHierarchy(const xcb_input_hierarchy_event_t& event);
     void press(xcb_keycode_t keycode, bool repeated);
     void release(xcb_keycode_t keycode);
