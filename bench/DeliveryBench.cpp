@@ -1,5 +1,6 @@
 // From the press of the key that completes an abbreviation to the complete text in a program, on a real desktop, beside
-// the least that any expander could take: the same text typed or pasted by a bare synthesiser.
+// the least that any expander could take: the same text typed or pasted by a bare synthesiser. With --with-peer also
+// beside another expander, AutoKey.
 #include <poll.h>
 #include <unistd.h>
 #include <xcb/xtest.h>
@@ -16,6 +17,7 @@
 #include <vector>
 
 #include "bench/Figures.h"
+#include "bench/PeerProgram.h"
 #include "tests/desktop/PlumeProgram.h"
 #include "tests/desktop/SelectionClients.h"
 
@@ -126,6 +128,30 @@ int measurePlume(DesktopRig& rig, const std::vector<Case>& cases, bool paste) {
         });
     }
     return wrong;
+}
+
+// A tenth of the runs: it takes its time.
+void measurePeer(DesktopRig& rig) {
+    int wrong = 0;
+    int runs = 0;
+    for (const TargetKind kind : Targets) {
+        const auto target = rig.startTarget(kind);
+        for (const bool paste : {false, true}) {
+            std::vector<Case> cases = paste ? Pasted : Typed;
+            std::vector<PeerPhrase> phrases;
+            for (Case& tested : cases) {
+                phrases.push_back({tested.abbreviation, textOf(tested.length, true), paste});
+                runs += tested.runs /= 10;
+            }
+            const PeerProgram peer(rig, phrases, kind == TargetKind::Xterm);
+            wrong +=
+                measure("peer.delivery.", cases, shortName(kind), [&](const Case& tested, const std::string& text) {
+                    return rig::typeAndAwait(rig, *target, tested.abbreviation, text);
+                });
+        }
+    }
+    print("peer.delivery.wrong", wrong, "count");
+    print("peer.delivery.runs", runs, "count");
 }
 
 // As a fast typist does it, each key before the one before it comes up.
@@ -281,9 +307,11 @@ void measureFootprint(DesktopRig& rig) {
     print("delivery.idle_wakeups", static_cast<double>(wakeUps(process) - atRest) / Seconds, "per_s");
 }
 
-int measureAll() {
+int measureAll(bool withPeer) {
+    if (withPeer && !PeerProgram::isInstalled()) throw rig::RigError("install the package autokey-gtk");
     DesktopRig rig;
     measureFloor(rig);
+    if (withPeer) measurePeer(rig);
     int wrong = measurePlume(rig, Typed, false);
     wrong += measurePlume(rig, Pasted, true);
     wrong += countWrong(rig, false) + countWrong(rig, true);
@@ -296,9 +324,9 @@ int measureAll() {
 
 }  // namespace plume::bench
 
-int main() {
+int main(int count, char** arguments) {
     try {
-        return plume::bench::measureAll();
+        return plume::bench::measureAll(count > 1 && arguments[1] == std::string("--with-peer"));
     } catch (const std::exception& problem) {
         std::cerr << "bench_delivery: " << problem.what() << '\n';
         return 1;
