@@ -2,10 +2,15 @@
 
 #include <xcb/xproto.h>
 
+#include <algorithm>
+#include <array>
 #include <optional>
 #include <utility>
 
+#include "input/BundleIdentifierResolver.h"
+#include "input/KeyCodes.h"
 #include "platform/x11/TerminalApplications.h"
+#include "platform/x11/X11KeyCodes.h"
 
 namespace plume {
 
@@ -17,6 +22,13 @@ Result<void> keep(Result<std::unique_ptr<Part>> result, std::unique_ptr<Part>& p
     if (!result) return result.error();
     place = std::move(result).value();
     return {};
+}
+
+// Keys by which people leave a field or set something off, by themselves or with a modifier.
+bool movesFocus(std::uint16_t keyCode, std::uint64_t flags) {
+    constexpr std::array Keys = {KeyCode::Tab, KeyCode::Return, KeyCode::KeypadEnter, KeyCode::Escape};
+    constexpr std::uint64_t Shortcuts = X11Flag::Control | X11Flag::Option | X11Flag::Command;
+    return (flags & Shortcuts) != 0 || std::ranges::find(Keys, keyCode) != Keys.end();
 }
 
 }  // namespace
@@ -62,6 +74,7 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
 
 void LinuxPort::connectParts() {
     keyboard_->listenTo(*session_);
+    followFocus();
     poster_->frontIdentifier = [this] { return frontIdentifier(); };
     pasteboard_->pastesPrimary = [this] { return pastesPrimary(frontIdentifier().value_or(u"")); };
     accessibility_.setMainScreenHeight(session_->connection().screen().height_in_pixels);
@@ -70,6 +83,26 @@ void LinuxPort::connectParts() {
     session_->heartbeat = [this] { watchdog_->beat(); };
     poster_->heartbeat = [this] { watchdog_->beat(); };
     tapConnection_->setReopenedListener([this](xcb_window_t window) { watchdog_->setTapWindow(window); });
+}
+
+// Programs are asked for their focus when it may have moved.
+void LinuxPort::followFocus() {
+    keyboardTap_->setUserTyped([this](std::uint16_t keyCode, std::uint64_t flags) {
+        if (movesFocus(keyCode, flags)) {
+            accessibility_.focusMayHaveMoved();
+        } else {
+            accessibility_.userTypes();
+        }
+    });
+    mouseTap_->clicked = [this] { accessibility_.focusMayHaveMoved(); };
+    processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
+    tapLoop_.perform([this] { tellFrontProcess(); });
+}
+
+void LinuxPort::tellFrontProcess() {
+    const auto application = foregroundApplication(*processManager_);
+    accessibility_.setFrontProcess(application ? static_cast<pid_t>(application->processIdentifier) : 0);
+    accessibility_.focusMayHaveMoved();
 }
 
 Result<void> LinuxPort::startWatchdog() {

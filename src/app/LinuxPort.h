@@ -55,6 +55,8 @@ class LinuxPort {
     Result<void> openKeyboard(const std::string& display);
     Result<void> openDesktop(const std::string& display);
     void connectParts();
+    void followFocus();
+    void tellFrontProcess();
     std::optional<std::u16string> frontIdentifier() const;
 
     PollRunLoop mainLoop_;

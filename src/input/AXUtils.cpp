@@ -69,7 +69,7 @@ std::optional<AttributedString> AXUtils::copySelectedAttributedString(const Acce
 
 std::int64_t AXUtils::getSelectedTextLength(const Accessibility& accessibility) {
     const Element focused = getFocusedUIElement(accessibility);
-    if (!focused) return 0;
+    if (!focused || focused->selectsNothing()) return 0;
     if (const std::optional<TextRange> range = focused->rangeAttribute("AXSelectedTextRange")) {
         return range->location >= 0 ? std::max<std::int64_t>(range->length, 0) : 0;
     }

@@ -62,6 +62,8 @@ class UIElement {
     virtual std::optional<AttributedString> attributedStringForRange(std::string_view name, TextRange range) const = 0;
     virtual std::optional<std::string> dataForRange(std::string_view name, TextRange range) const = 0;
     virtual std::optional<Rectangle> rectangleForRange(std::string_view name, TextRange range) const = 0;
+    // True when the element can tell, sooner than by its selected range, that nothing is selected.
+    virtual bool selectsNothing() const { return false; }
 };
 
 class Accessibility {

@@ -131,4 +131,10 @@ std::optional<Rectangle> AtspiElement::rectangleForRange(std::string_view name, 
     });
 }
 
+bool AtspiElement::selectsNothing() const {
+    return session_
+        ->ask<bool>([part = part_](AtspiBus& bus) { return AtspiTextReader(bus, part, {}).selectsNothing(); })
+        .value_or(false);
+}
+
 }  // namespace plume

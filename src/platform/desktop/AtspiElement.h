@@ -27,6 +27,7 @@ class AtspiElement final : public UIElement {
     std::optional<AttributedString> attributedStringForRange(std::string_view name, TextRange range) const override;
     std::optional<std::string> dataForRange(std::string_view name, TextRange range) const override;
     std::optional<Rectangle> rectangleForRange(std::string_view name, TextRange range) const override;
+    bool selectsNothing() const override;
 
   private:
     Element elementFor(AtspiPart part) const;

@@ -70,6 +70,11 @@ std::optional<std::u16string> AtspiTextReader::fetch(std::int64_t from, std::int
     return text ? std::optional(fromUtf8(*text)) : std::nullopt;
 }
 
+std::optional<bool> AtspiTextReader::selectsNothing() const {
+    const auto selections = ask("GetNSelections").values().int32();
+    return selections ? std::optional(*selections == 0) : std::nullopt;
+}
+
 std::optional<TextRange> AtspiTextReader::selectedRange() {
     const auto caret = number("CaretOffset");
     if (!caret || *caret < 0) return std::nullopt;

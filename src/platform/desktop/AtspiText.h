@@ -24,6 +24,8 @@ class AtspiTextReader {
 
     AtspiTextReader(AtspiBus& bus, AtspiPart part, Anchor anchor);
 
+    // Whether it says so itself.
+    std::optional<bool> selectsNothing() const;
     // What was selected, or the caret as an empty stretch; the anchor then is its start. What lies more than 65,536
     // characters before the selection is counted as one unit a character.
     std::optional<TextRange> selectedRange();

@@ -193,6 +193,7 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     } else if (!repeated || !down[keycode]) {
         inject({keycode, true});
     }
+    if (parts_.userTyped) parts_.userTyped(key.keyCode, key.flags);
 }
 
 void TapSession::release(xcb_keycode_t keycode) {

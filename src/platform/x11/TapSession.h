@@ -24,6 +24,9 @@
 
 namespace plume {
 
+// A key that the user pressed, by its virtual key code and with the flags of the modifiers held.
+using UserTyped = std::function<void(std::uint16_t keyCode, std::uint64_t flags)>;
+
 class TapSession : public std::enable_shared_from_this<TapSession> {
   public:
     struct Parts {
@@ -32,6 +35,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         const XkbKeyboard& keyboard;
         KeyboardTapListener& listener;
         const std::function<bool()>& focusIsPassword;  // may be empty
+        const UserTyped& userTyped;                    // may be empty
         std::function<void()> lost;                    // the connection is gone
     };
 

@@ -19,6 +19,10 @@ void X11KeyboardTap::setFocusIsPassword(std::function<bool()> focusIsPassword) {
     focusIsPassword_ = std::move(focusIsPassword);
 }
 
+void X11KeyboardTap::setUserTyped(UserTyped userTyped) {
+    userTyped_ = std::move(userTyped);
+}
+
 Result<void> X11KeyboardTap::create(KeyboardTapListener& listener, bool /*annotatedSession*/) {
     remove();
     if (connection_.isBroken()) {
@@ -29,6 +33,7 @@ Result<void> X11KeyboardTap::create(KeyboardTapListener& listener, bool /*annota
                                                                   .keyboard = keyboard_,
                                                                   .listener = listener,
                                                                   .focusIsPassword = focusIsPassword_,
+                                                                  .userTyped = userTyped_,
                                                                   .lost = [this] { lost(); }});
     if (auto begun = session->begin(); !begun) return begun;
     listener_ = &listener;

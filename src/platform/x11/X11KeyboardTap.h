@@ -28,6 +28,8 @@ class X11KeyboardTap final : public KeyboardTap {
     // Whether what has the focus now takes a password; asked for every key, so it must be quick. Then, and while
     // another program holds the keyboard, keys pass unheard.
     void setFocusIsPassword(std::function<bool()> focusIsPassword);
+    // Told of every press, also of those that pass unheard; it must be quick, too.
+    void setUserTyped(UserTyped userTyped);
 
     Result<void> create(KeyboardTapListener& listener, bool annotatedSession) override;
     bool exists() const override;
@@ -48,6 +50,7 @@ class X11KeyboardTap final : public KeyboardTap {
     XkbKeyboard& keyboard_;
     const std::string display_;
     std::function<bool()> focusIsPassword_;
+    UserTyped userTyped_;
     KeyboardTapListener* listener_ = nullptr;
     std::shared_ptr<TapSession> session_;  // while the keyboards are taken
     std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);

@@ -53,6 +53,7 @@ void X11MouseTap::handleEvent(const xcb_generic_event_t& event) {
     const auto& press = reinterpret_cast<const xcb_input_raw_button_press_event_t&>(event);
     if (press.extension != inputOpcode_ || press.event_type != XCB_INPUT_RAW_BUTTON_PRESS) return;
     if (press.detail != LeftButton && press.detail != RightButton) return;
+    if (clicked) clicked();
     const auto cookie = xcb_query_pointer(session_.get(), session_.connection().root());
     const XcbOwned<xcb_query_pointer_reply_t> pointer(xcb_query_pointer_reply(session_.get(), cookie, nullptr));
     if (!pointer) return;

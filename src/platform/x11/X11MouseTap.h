@@ -1,6 +1,8 @@
 // Hears clicks anywhere on the screen, whoever gets them.
 #pragma once
 
+#include <functional>
+
 #include "platform/MouseTap.h"
 #include "platform/x11/X11Session.h"
 
@@ -13,6 +15,9 @@ class X11MouseTap final : public MouseTap {
     ~X11MouseTap() override { remove(); }
     X11MouseTap(const X11MouseTap&) = delete;
     X11MouseTap& operator=(const X11MouseTap&) = delete;
+
+    // Told of every click while the tap exists.
+    std::function<void()> clicked;
 
     Result<void> create(Listener listener) override;
     bool exists() const override { return listener_ != nullptr; }

@@ -110,11 +110,11 @@ void X11ProcessManager::hear(const xcb_generic_event_t& event) {
     if (type == XCB_DESTROY_NOTIFY) {
         const auto window = reinterpret_cast<const xcb_destroy_notify_event_t&>(event).window;
         if (window == manager_.window) watch(manager_, {});
-        if (window == front_.window || manager_.window == XCB_WINDOW_NONE) isKnown_ = false;
+        if (window == front_.window || manager_.window == XCB_WINDOW_NONE) forgetFront();
         return;
     }
     if (type != XCB_PROPERTY_NOTIFY) {
-        isKnown_ = isKnown_ && reinterpret_cast<const xcb_focus_in_event_t&>(event).event != focus_.window;
+        if (reinterpret_cast<const xcb_focus_in_event_t&>(event).event == focus_.window) forgetFront();
         return;
     }
     const auto& change = reinterpret_cast<const xcb_property_notify_event_t&>(event);
@@ -123,7 +123,11 @@ void X11ProcessManager::hear(const xcb_generic_event_t& event) {
     const bool changes = isOfRoot ? std::any_of(std::begin(RootNames), std::end(RootNames), matters)
                                   : change.window == front_.window &&
                                         std::any_of(std::begin(WindowNames), std::end(WindowNames), matters);
-    if (changes) isKnown_ = false;
+    if (changes) forgetFront();
+}
+
+void X11ProcessManager::forgetFront() {
+    if (std::exchange(isKnown_, false) && frontMayHaveChanged) frontMayHaveChanged();
 }
 
 ProcessSerialNumber X11ProcessManager::currentProcess() const {

@@ -4,6 +4,7 @@
 // of a change: in between, an answer costs no round trip. Without a window manager the input focus decides.
 #pragma once
 
+#include <functional>
 #include <map>
 #include <memory>
 #include <string>
@@ -22,6 +23,10 @@ class X11ProcessManager final : public ProcessManager {
     ~X11ProcessManager() override;
     X11ProcessManager(const X11ProcessManager&) = delete;
     X11ProcessManager& operator=(const X11ProcessManager&) = delete;
+
+    // Another window or program may be in front than the last answer said. Called while events are read, so it may only
+    // take note; not called again until somebody has asked.
+    std::function<void()> frontMayHaveChanged;
 
     ProcessSerialNumber currentProcess() const override;
     std::optional<ProcessSerialNumber> frontProcess() const override;
@@ -45,6 +50,7 @@ class X11ProcessManager final : public ProcessManager {
     };
 
     void hear(const xcb_generic_event_t& event);
+    void forgetFront();
     void lookUp();
     xcb_window_t activeWindow();
     xcb_window_t focusedWindow();
