@@ -23,6 +23,7 @@ constexpr const char* Library = R"json([
       { "abbreviation": "uni", "content": "naïve Ünïcödé — 日本語 【】 😀" },
       { "abbreviation": "tag", "content": "<b>【|】</b>" },
       { "abbreviation": "run", "contentType": 3, "content": "echo out$((6*7))" },
+      { "abbreviation": "mark", "contentType": 3, "content": "echo mark >> \"$HOME/marks\"" },
       { "abbreviation": "in", "content": "[【snippet:;run】]" },
       { "abbreviation": "ask", "content": "Dear 【field:Name】" } ] },
   { "name": "Words", "expandTrigger": 1, "items": [
@@ -94,6 +95,30 @@ TEST_P(ProgramInTarget, RunsScripts) {
     rig_->keyboard().type("x ;in");
     EXPECT_EQ(target->awaitText("x [out42]"), "x [out42]") << plume_->logTail();
 }
+
+// A snippet that leaves a mark elsewhere tells whether Plume listened: what a password field holds is nobody's
+// business.
+// A terminal does not tell that a password is typed into it.
+class ProgramInPasswordField : public ProgramInTarget {};
+
+TEST_P(ProgramInPasswordField, DoesNotListen) {
+    const auto target = rig_->startTarget(GetParam());
+    const auto marks = rig_->directory() / "home" / "marks";
+    const auto listens = [&] {
+        std::filesystem::remove(marks);
+        rig_->keyboard().type(";mark");
+        return waitUntil([&] { return std::filesystem::exists(marks); }, Milliseconds(400));
+    };
+    EXPECT_TRUE(waitUntil(listens, Milliseconds(5'000))) << plume_->logTail();
+    target->showPassword(true);
+    EXPECT_TRUE(waitUntil([&] { return !listens(); }, Milliseconds(10'000)));
+    EXPECT_FALSE(listens());
+    target->showPassword(false);
+    EXPECT_TRUE(waitUntil(listens, Milliseconds(10'000))) << plume_->logTail();
+}
+
+INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,
+                         testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit));
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInTarget,
                          testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm));
