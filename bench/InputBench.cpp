@@ -1,6 +1,7 @@
 // Hearing and sending keys on a real desktop: what Plume adds to a key that passes, what a synthesised one costs, how
 // fast text arrives, and whether what is swallowed and passed is exactly what it should be.
 #include <poll.h>
+#include <xcb/xtest.h>
 
 #include <algorithm>
 #include <atomic>
@@ -61,33 +62,49 @@ double percentile99(std::vector<double> values) {
     return values[values.size() * 99 / 100];
 }
 
-// What Plume adds to a key: with and without it by turns, so that what else the machine does falls on both.
-void measureAdded(DesktopRig& rig, TargetProgram& target, const std::string& name,
-                  PlumeProgram::Accessibility accessibility) {
-    std::vector<double> without, with;
-    for (int turn = 0; turn < 8; ++turn) {
-        const auto bare = latencies(rig, target, 250);
-        without.insert(without.end(), bare.begin(), bare.end());
-        const PlumeProgram plume(rig, "", "{}", accessibility);
-        const auto heard = latencies(rig, target, 250);
-        with.insert(with.end(), heard.begin(), heard.end());
-    }
-    print("input.untapped" + name + ".median", median(without), "us");
-    print("input.added" + name + ".median", median(with) - median(without), "us");
-    print("input.added" + name + ".p99", percentile99(with) - percentile99(without), "us");
+void append(std::vector<double>& all, const std::vector<double>& more) {
+    all.insert(all.end(), more.begin(), more.end());
 }
 
-void measureAdded(DesktopRig& rig) {
-    const auto target = rig.startTarget(TargetKind::GtkTextView);
-    measureAdded(rig, *target, "", PlumeProgram::Accessibility::Missing);
-    // A program that an assistive program listens to tells the accessibility bus of every key before it takes it.
-    measureAdded(rig, *target, ".accessible", PlumeProgram::Accessibility::Found);
+// What Plume adds to a key, and what a tap that does nothing but pass keys on adds: by turns with keys that nobody
+// hears, so that what else the machine does falls on all.
+void measureAdded(DesktopRig& rig, TargetProgram& target) {
+    std::vector<double> without, with, passed;
+    for (int turn = 0; turn < 8; ++turn) {
+        append(without, latencies(rig, target, 250));
+        {
+            const PlumeProgram plume(rig, "", "{}");
+            append(with, latencies(rig, target, 250));
+        }
+        const KeyboardPort tap(rig.server().display(), KeyboardPort::Options{});
+        append(passed, latencies(rig, target, 250));
+    }
+    print("input.untapped.median", median(without), "us");
+    print("floor.input.added.median", median(passed) - median(without), "us");
+    print("floor.input.added.p99", percentile99(passed) - percentile99(without), "us");
+    print("input.added.median", median(with) - median(without), "us");
+    print("input.added.p99", percentile99(with) - percentile99(without), "us");
+}
+
+constexpr int Keys = 1000;
+
+// The same by bare requests: what the server needs.
+double bareKeyNanoseconds(DesktopRig& rig) {
+    rig::XClient client(rig.server().display());
+    const auto keycode = static_cast<std::uint8_t>(rig.keyboard().keycodeOf(U'a'));
+    return medianNanoseconds(5, [&] {
+        for (int i = 0; i < 2 * Keys; ++i) {
+            xcb_test_fake_input(client.connection(), i % 2 == 0 ? XCB_KEY_PRESS : XCB_KEY_RELEASE, keycode,
+                                XCB_CURRENT_TIME, XCB_WINDOW_NONE, 0, 0, 0);
+        }
+        client.focusedWindow();  // a round trip: the server has done them all
+    });
 }
 
 // The letter a, typed into a terminal.
 void measureSynthesised(DesktopRig& rig, KeyboardPort& port) {
     const auto target = rig.startTarget(TargetKind::Xterm);
-    constexpr int Keys = 1000;
+    print("floor.input.synthesised", bareKeyNanoseconds(rig) / 1000 / Keys, "us");
     double nanoseconds = 0;
     port.run([&] {
         nanoseconds = medianNanoseconds(5, [&] {
@@ -181,7 +198,7 @@ void measureIdentity(DesktopRig& rig) {
 
 int measureAll() {
     DesktopRig rig;
-    measureAdded(rig);
+    measureAdded(rig, *rig.startTarget(TargetKind::GtkTextView));
     int wrong = 0;
     {
         KeyboardPort port(rig.server().display(), KeyboardPort::Options{});
