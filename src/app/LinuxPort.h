@@ -16,6 +16,7 @@
 #include "platform/desktop/CanberraSounds.h"
 #include "platform/desktop/PollRunLoop.h"
 #include "platform/desktop/PosixProcessLauncher.h"
+#include "platform/x11/ClipboardLegacy.h"
 #include "platform/x11/TapConnection.h"
 #include "platform/x11/Watchdog.h"
 #include "platform/x11/X11EventPoster.h"
@@ -64,6 +65,7 @@ class LinuxPort {
     PosixProcessLauncher processLauncher_;
     CanberraSounds sounds_;
     AtspiAccessibility accessibility_;
+    ClipboardLegacy legacy_;
     std::unique_ptr<X11Session> session_;
     std::unique_ptr<XkbKeyboard> keyboard_;
     std::unique_ptr<Watchdog> watchdog_;

@@ -83,6 +83,7 @@ TEST_F(Crash, KilledInTheMiddleOfAnExpansion) {
 TEST_F(Crash, KilledWhileAProgramHasNotTakenThePaste) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     startPlume(Way::Pasted);
+    rig_->client().emptySelection("CLIPBOARD");
     ASSERT_EQ(kill(target->pid(), SIGSTOP), 0);
     rig_->keyboard().type(LongAscii.abbreviation);
     awaitOffer(*rig_);

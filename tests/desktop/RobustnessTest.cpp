@@ -1,6 +1,7 @@
 // The whole program while the user does what users do: keeps things on the clipboard, holds keys, types on.
 #include "tests/desktop/Robustness.h"
 
+#include <csignal>
 #include <ostream>
 #include <vector>
 
@@ -93,12 +94,45 @@ TEST_P(ClipboardInTarget, IsTheUsersAgainAfterPastes) {
 TEST_P(ClipboardInTarget, StaysEmpty) {
     startPlume(Way::Pasted);
     const auto target = rig_->startTarget(GetParam());
-    ASSERT_EQ(rig_->client().selectionOwner("CLIPBOARD"), 0U);
+    rig_->client().emptySelection("CLIPBOARD");
     pasteOneByOne(*target, 3);
     pasteBackToBack(*target, 2);
     SelectionRequestor reader(rig_->server().display());
     EXPECT_TRUE(waitUntil([&] { return reader.readAll("CLIPBOARD").empty(); }, Milliseconds(10'000))) << log();
 }
+
+// Ended by a signal, when the clipboard is the user's again or while the expansion still stands there.
+struct End {
+    int signal;
+    bool inTheMiddle;
+};
+
+class ClipboardAfterTheEnd : public ClipboardInTarget {};
+
+TEST_P(ClipboardAfterTheEnd, IsTheUsersUntilSomethingNewIsCopied) {
+    for (const auto& [signal, inTheMiddle] : {End{SIGKILL, false}, End{SIGKILL, true}, End{SIGTERM, false}}) {
+        SCOPED_TRACE(std::to_string(signal) + (inTheMiddle ? ", in the middle" : ""));
+        startPlume(Way::Pasted);
+        const auto target = rig_->startTarget(GetParam());
+        const ForeignOwner user(rig_->server().display(), copiedByUser());
+        if (inTheMiddle) kill(target->pid(), SIGSTOP);
+        rig_->keyboard().type(LongAscii.abbreviation);
+        const auto isPlumes = [&] { return rig_->client().selectionOwner("CLIPBOARD") != user.window(); };
+        ASSERT_TRUE(waitUntil(isPlumes, Milliseconds(5'000)));
+        if (!inTheMiddle) expectOnClipboard(copiedByUser());
+        kill(plume_->process().pid(), signal);
+        ASSERT_TRUE(plume_->process().waitForExit(Milliseconds(5'000)));
+        kill(target->pid(), SIGCONT);
+        expectOnClipboard(copiedByUser());
+
+        const xcb_window_t heir = rig_->client().selectionOwner("CLIPBOARD");
+        EXPECT_NE(heir, 0U);
+        rig_->client().emptySelection("CLIPBOARD");
+        EXPECT_TRUE(waitUntil([&] { return !rig_->client().exists(heir); }, Milliseconds(5'000)));
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Targets, ClipboardAfterTheEnd, testing::Values(TargetKind::GtkTextView), targetName);
 
 INSTANTIATE_TEST_SUITE_P(Targets, ClipboardInTarget, testing::ValuesIn(Targets), targetName);
 

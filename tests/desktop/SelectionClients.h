@@ -48,6 +48,7 @@ class ForeignOwner {
     ForeignOwner(const ForeignOwner&) = delete;
     ForeignOwner& operator=(const ForeignOwner&) = delete;
 
+    xcb_window_t window() const { return window_; }
     // How many requests have come.
     int requests() const { return requests_; }
 

@@ -72,6 +72,15 @@ xcb_window_t XClient::selectionOwner(const std::string& selection) {
     return reply ? reply->owner : noWindow;
 }
 
+void XClient::emptySelection(const std::string& selection) {
+    xcb_set_selection_owner(connection_, noWindow, atom(selection), XCB_CURRENT_TIME);
+    selectionOwner(selection);  // a round trip
+}
+
+bool XClient::exists(xcb_window_t window) {
+    return own(xcb_get_geometry_reply(connection_, xcb_get_geometry(connection_, window), nullptr)) != nullptr;
+}
+
 bool XClient::areOfSameClient(xcb_window_t one, xcb_window_t other) const {
     return ((one ^ other) & ~xcb_get_setup(connection_)->resource_id_mask) == 0;
 }

@@ -38,6 +38,9 @@ class XClient {
 
     // The window that owns a selection such as CLIPBOARD; 0 when nobody does.
     xcb_window_t selectionOwner(const std::string& selection);
+    // Takes it away from whoever has it.
+    void emptySelection(const std::string& selection);
+    bool exists(xcb_window_t window);
 
     // Whether two windows were made by the same connection, which almost always means by the same program.
     bool areOfSameClient(xcb_window_t one, xcb_window_t other) const;

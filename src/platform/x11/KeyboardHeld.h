@@ -1,8 +1,8 @@
 // Whether another program keeps the keyboard to itself: a screen locker, a password prompt, an open menu.
 //
 // The server is asked to hand over the keyboard for a window that is not shown, which it refuses with one reason or the
-// other and without an effect. The question goes behind a key that comes up and its answer is read at the next press, so
-// that typing never waits for it. Belongs to the tap thread.
+// other and without an effect. The question goes behind a key that comes up and its answer is read at the next press,
+// so that typing never waits for it. Belongs to the tap thread.
 #pragma once
 
 #include <xcb/xcb.h>

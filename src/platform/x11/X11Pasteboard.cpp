@@ -59,7 +59,24 @@ X11Pasteboard::~X11Pasteboard() = default;
 void X11Pasteboard::noteChange(bool ours) {
     ++changeCount_;
     if (ours) declaredCount_ = changeCount_;
+    if (!ours && legacy_) legacy_->clear();
+    if (!ours && ownershipLost) ownershipLost();
     reader_->ownerChanged();
+}
+
+void X11Pasteboard::takeUp(const std::vector<ClipboardLegacy::Entry>& entries) {
+    std::vector<std::string> types;
+    for (const auto& entry : entries) {
+        types.push_back(entry.type);
+        forms_.insert_or_assign(entry.type, std::pair(entry.form, entry.format));
+    }
+    declareTypes(types, nullptr);
+    for (const auto& entry : entries) setData(entry.bytes, entry.type);
+}
+
+bool X11Pasteboard::isHeld() const {
+    session_.collect();
+    return clipboard_->hasOwner();
 }
 
 bool X11Pasteboard::isOffering() const {
@@ -92,9 +109,11 @@ std::optional<std::string> X11Pasteboard::data(std::string_view type) const {
     if (target.empty() || isMetaTarget(target)) return std::nullopt;
     const auto value = reader_->read(target);
     if (!value) return std::nullopt;
-    if (type == PasteboardType::String) return utf8FromText(*value->bytes, target);
-    forms_.insert_or_assign(target, std::pair(value->type, value->format));
-    return *value->bytes;
+    const bool isText = type == PasteboardType::String;
+    if (!isText) forms_.insert_or_assign(target, std::pair(value->type, value->format));
+    std::string bytes = isText ? utf8FromText(*value->bytes, target) : *value->bytes;
+    if (legacy_) legacy_->add(type, isText ? xcb_atom_t{XCB_ATOM_NONE} : value->type, value->format, bytes);
+    return bytes;
 }
 
 std::int64_t X11Pasteboard::declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) {

@@ -15,6 +15,7 @@
 #include <vector>
 
 #include "platform/Pasteboard.h"
+#include "platform/x11/ClipboardLegacy.h"
 #include "platform/x11/X11PasteboardContent.h"
 #include "platform/x11/X11SelectionOwner.h"
 #include "platform/x11/X11SelectionReader.h"
@@ -34,6 +35,15 @@ class X11Pasteboard final : public Pasteboard {
     // Whether the program in front pastes the PRIMARY selection. While it does, an expansion is offered there, too, and
     // the text that was selected before returns with the clipboard's content.
     std::function<bool()> pastesPrimary;
+
+    // Keeps what is read of other programs' content, as long as it is the newest. Outlives the pasteboard.
+    void setLegacy(ClipboardLegacy* legacy) { legacy_ = legacy; }
+    // Offers what another Plume left. Nobody must hold the clipboard.
+    void takeUp(const std::vector<ClipboardLegacy::Entry>& entries);
+    // Somebody else has put something on the clipboard.
+    std::function<void()> ownershipLost;
+    // Whether anybody holds the clipboard.
+    bool isHeld() const;
 
     std::vector<std::string> types() const override;
     std::optional<std::u16string> string() const override;
@@ -58,6 +68,7 @@ class X11Pasteboard final : public Pasteboard {
     bool isInFront(xcb_window_t requestor) const;
 
     X11Session& session_;
+    ClipboardLegacy* legacy_ = nullptr;
     std::int64_t changeCount_ = 0;
     std::int64_t declaredCount_ = 0;  // of the last declaration
     // What programs gave along with their data: a backup of it is given back alike.

@@ -1,6 +1,7 @@
 // The watchdog: frees the keyboard when Plume, which started it, hangs or has ended. See platform/x11/Watchdog.h.
 //
-// plume-watchdog <display>, with one end of Plume's pair of sockets as standard input.
+// plume-watchdog <display>, with one end of Plume's pair of sockets as standard input, and the memory of the
+// clipboard's legacy as descriptor 3.
 
 #include <poll.h>
 
@@ -8,9 +9,11 @@
 #include <chrono>
 #include <cmath>
 #include <cstdio>
+#include <string>
 #include <utility>
 
 #include "platform/x11/WatchdogProtocol.h"
+#include "platform/x11/watchdog/ClipboardHeir.h"
 #include "platform/x11/watchdog/KeyboardGuard.h"
 #include "platform/x11/watchdog/Vigil.h"
 
@@ -93,11 +96,14 @@ class WatchdogProcess {
 }  // namespace plume
 
 int main(int count, char** arguments) {
-    auto guard = plume::KeyboardGuard::open(count > 1 ? arguments[1] : "");
+    const std::string display = count > 1 ? arguments[1] : "";
+    auto guard = plume::KeyboardGuard::open(display);
     if (!guard) {
         static_cast<void>(std::fprintf(stderr, "plume-watchdog: %s\n", guard.error().message.c_str()));
         return 1;
     }
     plume::WatchdogProcess(*guard.value()).run();
+    guard.value().reset();
+    plume::offerClipboardLegacy(display, plume::WatchdogLegacy);
     return 0;
 }
