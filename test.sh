@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Builds Plume and runs its tests: optimised, with those on a real desktop, and with AddressSanitizer and
-# UndefinedBehaviorSanitizer.
+# Builds Plume and runs its tests: optimised, with all those on a real desktop, and with AddressSanitizer and
+# UndefinedBehaviorSanitizer, with those in which Plume reads what the programs of a real desktop send.
 set -euo pipefail
 cd "$(dirname "$0")"
 . tools/dependencies.sh

@@ -14,14 +14,6 @@
 #include "tests/desktop/SelectionClients.h"
 #include "tests/desktop/XcbReply.h"
 
-// libatspi does not free all it allocates: leaks are not looked for in this program.
-// NOLINTBEGIN(bugprone-reserved-identifier,cert-dcl37-c,cert-dcl51-cpp): the name is the sanitizer's
-extern "C" const char* __asan_default_options();
-const char* __asan_default_options() {
-    return "detect_leaks=0";
-}
-// NOLINTEND(bugprone-reserved-identifier,cert-dcl37-c,cert-dcl51-cpp)
-
 namespace plume::rig {
 
 namespace {
