@@ -153,8 +153,9 @@ void SendingPipeline::sendText(EngineState& engine, const Expansion& content, Ou
     output->snippetExpandedContent = content;
     surroundings_.inputService.sendOutput(std::move(output));
     playFeedback(feedbackSound_);
-    // Typing goes on behind the expanded text, unless the caret may stand elsewhere.
-    if (content->variables.empty()) engine.setLetters(content->string());
+    // Typing goes on behind the expanded text, unless the caret may stand elsewhere. What was typed while a form or a
+    // script was busy stands in front of the text.
+    engine.setLetters(content->variables.empty() ? content->string() : u"");
 }
 
 bool SendingPipeline::undo(EngineState& engine, bool withTrigger) {

@@ -65,6 +65,12 @@ bool matchesPrefixed(const SnippetMatcher& matcher, const Candidate& candidate, 
     return snippet.caseSensitivity() != CaseSensitivity::CaseSensitive || typed == snippet.abbreviationWithPrefix();
 }
 
+// A snippet tells one group of a new abbreviation; another that lists it has it filed under the former one.
+bool isUpToDate(const Candidate& candidate) {
+    const auto& abbreviation = (*candidate.snippet)->abbreviation();
+    return abbreviation && candidate.group->prefix.size() + abbreviation->size() == candidate.length;
+}
+
 bool matchesPlain(const SnippetMatcher& matcher, const Candidate& candidate, std::u16string_view text) {
     const Snippet& snippet = **candidate.snippet;
     const bool caseSensitive = snippet.caseSensitivity() == CaseSensitivity::CaseSensitive;
@@ -98,7 +104,7 @@ class Search final : public AbbreviationIndex::Visitor {
     void visit(const Candidate& candidate) override {
         const SnippetGroup& group = *candidate.group->group;
         if (way_ == Trigger::Delimiter && !matcher_.delimitersOf(group).contains(trigger_)) return;
-        if (!(*candidate.snippet)->hasContent() || !isActive(group.availability(), context_)) return;
+        if (!isUpToDate(candidate) || !(*candidate.snippet)->hasContent() || !isActive(group.availability(), context_)) return;
         const bool matches = candidate.group->prefix.empty() ? matchesPlain(matcher_, candidate, text_)
                                                              : matchesPrefixed(matcher_, candidate, text_);
         if (matches) found_.push_back({candidate, text_.substr(text_.size() - candidate.length)});

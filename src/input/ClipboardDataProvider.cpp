@@ -16,6 +16,8 @@ ClipboardDataProvider::~ClipboardDataProvider() {
 }
 
 void ClipboardDataProvider::prepareSetData() {
+    // What is remembered would pass for the user's latest content while it is older than that.
+    if (types_ && pasteboard_.changeCount() != backupChangeCount_) backup();
     provideBackupData_ = false;
     providedData_ = false;
     stringData_.reset();
@@ -76,6 +78,7 @@ void ClipboardDataProvider::provideExpansion(Pasteboard& pasteboard, std::string
 void ClipboardDataProvider::backup() {
     if (pasteboard_.changeCount() == changeCount_) return;
     backupData_.clear();
+    backupChangeCount_ = pasteboard_.changeCount();
     types_ = pasteboard_.types();
     for (const auto& type : *types_) {
         if (auto data = pasteboard_.data(type)) backupData_[type] = std::move(*data);

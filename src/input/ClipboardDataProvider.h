@@ -65,6 +65,7 @@ class ClipboardDataProvider final : public PasteboardOwner {
     std::int64_t changeCount_ = std::numeric_limits<std::int64_t>::max();
     std::map<std::string, std::string, std::less<>> backupData_;
     std::optional<std::vector<std::string>> types_;
+    std::int64_t backupChangeCount_ = 0;  // the clipboard's when the content was remembered
     bool providedData_ = false;       // the expansion was read
     bool restoresWhenTaken_ = false;  // a restore is due as soon as it was
     bool provideBackupData_ = false;

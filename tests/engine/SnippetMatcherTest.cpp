@@ -262,6 +262,23 @@ TEST(SnippetMatcher, FollowsEveryEditOfTheLibrary) {
     two->setAbbreviation(u"still safe to edit");
 }
 
+TEST(SnippetMatcher, ASnippetListedByTwoGroupsMatchesWhereItsAbbreviationIsKnown) {
+    const auto first = SnippetGroup::make();
+    const auto second = SnippetGroup::make();
+    first->setExpandAfter(ExpandAfter::Anything);
+    second->setExpandAfter(ExpandAfter::Anything);
+    const auto snippet = std::make_shared<Snippet>(u"sig", u"content");
+    first->addItem(snippet);
+    SnippetMatcher matcher(testDelimiters());
+    matcher.setSnippetGroups({first, second});
+    second->addItem(snippet);
+    snippet->setAbbreviation(u"signature");
+    EXPECT_THAT(typeKey(matcher, u"si", u"g"), IsEmpty());
+    EXPECT_THAT(contentsOf(typeKey(matcher, u"signatur", u"e")), ElementsAre(u"content"));
+    snippet->setAbbreviation(std::nullopt);
+    EXPECT_THAT(typeKey(matcher, u"si", u"g"), IsEmpty());
+}
+
 TEST(SnippetMatcher, FindsVeryLongAbbreviations) {
     const std::u16string common(100, u'x');
     const auto group = SnippetGroup::make();
