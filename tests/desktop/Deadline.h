@@ -29,4 +29,15 @@ class Deadline {
     std::chrono::steady_clock::time_point end_;
 };
 
+// Waits for a condition that nothing tells about; false when it still does not hold after the bound.
+template <typename Condition>
+bool waitUntil(Condition holds, Milliseconds bound) {
+    const Deadline deadline(bound);
+    while (!holds()) {
+        if (deadline.passed()) return false;
+        poll(nullptr, 0, 5);
+    }
+    return true;
+}
+
 }  // namespace plume::rig

@@ -30,16 +30,7 @@ constexpr const char* Library = R"json([
       { "abbreviation": "btw", "caseSensitivity": 2, "content": "by the way" } ] }
 ])json";
 
-// For conditions that nothing tells about.
-template <typename Condition>
-bool waitUntil(Condition holds, Milliseconds bound) {
-    const Deadline deadline(bound);
-    while (!holds()) {
-        if (deadline.passed()) return false;
-        poll(nullptr, 0, 5);
-    }
-    return true;
-}
+constexpr Milliseconds Bound(10'000);
 
 class Program : public testing::Test {
   protected:
@@ -61,7 +52,7 @@ class Program : public testing::Test {
     }
 
     static bool awaitLog(const ChildProcess& program, const std::string& text) {
-        return waitUntil([&] { return program.logTail().find(text) != std::string::npos; }, Milliseconds(5'000));
+        return waitUntil([&] { return program.logTail().find(text) != std::string::npos; }, Bound);
     }
 
     static inline std::unique_ptr<DesktopRig> rig_;
@@ -78,7 +69,7 @@ TEST_P(ProgramInTarget, ExpandsWhatIsTyped) {
         target->clear();
         rig_->keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
         rig_->keyboard().type(typed);
-        EXPECT_EQ(target->awaitText(expected, Milliseconds(3'000)), expected) << plume_->logTail();
+        EXPECT_EQ(target->awaitText(expected), expected) << plume_->logTail();
     };
     typeAndExpect("x ;sig", "x Kind regards, Jo");
     typeAndExpect("btw, Btw BTW ", "by the way, By the way BY THE WAY ");
@@ -109,12 +100,12 @@ TEST_P(ProgramInPasswordField, DoesNotListen) {
         rig_->keyboard().type(";mark");
         return waitUntil([&] { return std::filesystem::exists(marks); }, Milliseconds(400));
     };
-    EXPECT_TRUE(waitUntil(listens, Milliseconds(5'000))) << plume_->logTail();
+    EXPECT_TRUE(waitUntil(listens, Bound)) << plume_->logTail();
     target->showPassword(true);
-    EXPECT_TRUE(waitUntil([&] { return !listens(); }, Milliseconds(10'000)));
+    EXPECT_TRUE(waitUntil([&] { return !listens(); }, Bound));
     EXPECT_FALSE(listens());
     target->showPassword(false);
-    EXPECT_TRUE(waitUntil(listens, Milliseconds(10'000))) << plume_->logTail();
+    EXPECT_TRUE(waitUntil(listens, Bound)) << plume_->logTail();
 }
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,
@@ -137,7 +128,7 @@ TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {
         rig_->keyboard().type(";sig");
         EXPECT_EQ(target->awaitText("Kind regards, Jo"), "Kind regards, Jo");
         ASSERT_EQ(kill(plume_->pid(), signal), 0);
-        EXPECT_EQ(plume_->waitForExit(Milliseconds(3'000)), 0) << plume_->logTail();
+        EXPECT_EQ(plume_->waitForExit(Bound), 0) << plume_->logTail();
         target->clear();
         rig_->keyboard().type(";sig");
         EXPECT_EQ(target->awaitText(";sig"), ";sig");
@@ -155,14 +146,14 @@ TEST_F(Program, EndsInTheMiddleOfAScript) {
     plume_ = start();
     ASSERT_TRUE(awaitLog(*plume_, "Plume is ready")) << plume_->logTail();
     rig_->keyboard().type("slow");
-    ASSERT_TRUE(waitUntil([&] { return std::filesystem::exists(rig_->directory() / "pid"); }, Milliseconds(3'000)));
+    ASSERT_TRUE(waitUntil([&] { return std::filesystem::exists(rig_->directory() / "pid"); }, Bound));
     ASSERT_EQ(kill(plume_->pid(), SIGTERM), 0);
-    EXPECT_EQ(plume_->waitForExit(Milliseconds(2'000)), 0) << plume_->logTail();
+    EXPECT_EQ(plume_->waitForExit(Bound), 0) << plume_->logTail();
 }
 
 TEST_F(Program, RunsOncePerDisplay) {
     const auto second = start();
-    EXPECT_EQ(second->waitForExit(Milliseconds(3'000)), 1);
+    EXPECT_EQ(second->waitForExit(Bound), 1);
     EXPECT_NE(second->logTail().find("already running"), std::string::npos) << second->logTail();
     EXPECT_NE(second->logTail().find(std::to_string(plume_->pid())), std::string::npos) << second->logTail();
     EXPECT_TRUE(plume_->isRunning());

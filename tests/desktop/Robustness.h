@@ -64,17 +64,6 @@ inline std::string settingsFor(Way way) {
            R"("UseClipboard": )" + (way == Way::Pasted ? "true}" : "false}");
 }
 
-// For conditions that nothing tells about.
-template <typename Condition>
-bool waitUntil(Condition holds, Milliseconds bound) {
-    const Deadline deadline(bound);
-    while (!holds()) {
-        if (deadline.passed()) return false;
-        poll(nullptr, 0, 5);
-    }
-    return true;
-}
-
 // Plume on the suite's desktop; a fresh one when the way changes or the last one ended.
 class Robustness : public testing::Test {
   protected:

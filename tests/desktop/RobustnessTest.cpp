@@ -143,7 +143,7 @@ class HeldKeysInTarget : public RobustnessInTarget {
     // The text is exact; behind it, and nowhere else, the key may have repeated while it was held.
     void expectTextAndRepeats(TargetProgram& target, const std::string& expected, char key) {
         rig_->keyboard().sync();
-        EXPECT_TRUE(waitUntil([] { return isKeyboardAtRest(); }, Milliseconds(2'000)));
+        EXPECT_TRUE(waitUntil([] { return isKeyboardAtRest(); }, Milliseconds(5'000)));
         waitUntil([&] { return target.text().size() >= expected.size(); }, Milliseconds(5'000));
         rig_->keyboard().type(" ok");
         waitUntil([&] { return target.text().ends_with(" ok"); }, Milliseconds(5'000));
