@@ -9,6 +9,7 @@
 
 #include "Foundation/CharacterSet.h"
 #include "Foundation/Strings.h"
+#include "Foundation/UserLocale.h"
 
 namespace plume {
 
@@ -18,8 +19,8 @@ using NumberFormat = std::unique_ptr<UNumberFormat, void (*)(UNumberFormat*)>;
 
 NumberFormat decimalFormat(const std::string& locale) {
     UErrorCode status = U_ZERO_ERROR;
-    const char* name = locale.empty() ? nullptr : locale.c_str();
-    UNumberFormat* format = unum_open(UNUM_DECIMAL, nullptr, 0, name, nullptr, &status);
+    const std::string name = locale.empty() ? userLocale(LocaleCategory::Numbers) : locale;
+    UNumberFormat* format = unum_open(UNUM_DECIMAL, nullptr, 0, name.c_str(), nullptr, &status);
     unum_setAttribute(format, UNUM_GROUPING_USED, 0);
     return {format, [](UNumberFormat* opened) { unum_close(opened); }};
 }

@@ -31,7 +31,7 @@ class FormModel {
         bool hasControl() const;
     };
 
-    // Numbers are read and written as in the locale; empty: the user's.
+    // Numbers are read and written as in the locale; empty: the user's for numbers.
     FormModel(const SnippetExpandedContent& content, std::string locale);
 
     const std::vector<Field>& fields() const { return fields_; }

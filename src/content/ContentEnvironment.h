@@ -14,7 +14,7 @@ struct ContentEnvironment {
     std::function<Date()> now = currentDate;
     // IANA name ("Europe/Berlin"); empty: the system's.
     std::string timeZone;
-    // Locale identifier ("de_DE"); empty: the user's.
+    // Locale identifier ("de_DE"); empty: the user's for dates.
     std::string locale;
     // Not owned; null: an empty clipboard.
     const PasteboardReader* pasteboard = nullptr;

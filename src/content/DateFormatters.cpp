@@ -11,6 +11,7 @@
 #include <optional>
 
 #include "Foundation/Strings.h"
+#include "Foundation/UserLocale.h"
 
 namespace plume {
 namespace {
@@ -57,12 +58,12 @@ std::unique_ptr<icu::TimeZone> zoneNamed(const std::string& name) {
 
 std::string nameOfLocale(const std::optional<std::u16string>& locale, const ContentEnvironment& environment) {
     if (locale && !locale->empty() && locale->size() <= LongestLocale) return toUtf8(*locale);
-    return environment.locale.empty() ? icu::Locale::getDefault().getName() : environment.locale;
+    return environment.locale.empty() ? userLocale(LocaleCategory::Dates) : environment.locale;
 }
 
 icu::Locale localeNamed(const std::string& name) {
     const icu::Locale locale = icu::Locale::createCanonical(name.c_str());
-    return locale.isBogus() ? icu::Locale::getDefault() : locale;
+    return locale.isBogus() ? icu::Locale(userLocale(LocaleCategory::Dates).c_str()) : locale;
 }
 
 std::optional<icu::DateFormat::EStyle> styleNamed(std::u16string_view word) {

@@ -19,7 +19,10 @@ ProgramHome::ProgramHome() {
     set("XDG_RUNTIME_DIR", name);
     set("TMPDIR", name);
     set("LANG", "C.UTF-8");
-    for (const char* variable : {"DISPLAY", "WAYLAND_DISPLAY", "DBUS_SESSION_BUS_ADDRESS"}) set(variable, std::nullopt);
+    for (const char* variable :
+         {"DISPLAY", "WAYLAND_DISPLAY", "DBUS_SESSION_BUS_ADDRESS", "LC_ALL", "LC_TIME", "LC_NUMERIC"}) {
+        set(variable, std::nullopt);
+    }
 }
 
 ProgramHome::~ProgramHome() {

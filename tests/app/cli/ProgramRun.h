@@ -25,12 +25,13 @@ class ProgramHome {
 
     // Waits at most 20 seconds.
     ProgramResult run(const std::vector<std::string>& arguments) const;
+    // Gives the program a variable of its environment, or takes it away.
+    void set(const std::string& name, const std::optional<std::string>& value);
     // Writes a file, below the home folder, and gives its path.
     std::string write(const std::string& name, const std::string& content) const;
 
   private:
     static void put(const std::string& name, const std::optional<std::string>& value);
-    void set(const std::string& name, const std::optional<std::string>& value);
 
     std::filesystem::path folder_;
     std::map<std::string, std::optional<std::string>> before_;

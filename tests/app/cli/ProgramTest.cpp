@@ -118,6 +118,16 @@ TEST(Expand, SaysWhatItCannotDo) {
     EXPECT_THAT(unknown.error, HasSubstr("\"nothing\""));
 }
 
+TEST(Expand, WritesDatesAsTheUserReadsThem) {
+    ProgramHome home;
+    home.set("LANG", "en_US.UTF-8");
+    home.set("LC_TIME", "de_DE.UTF-8");
+    const std::string library =
+        home.write("dates.json", R"([{"items": [{"abbreviation": "era", "content": "【date:G】 【time:G】"}]}])");
+    const ProgramResult result = home.run({"expand", "era", "--library", library});
+    EXPECT_EQ(result.output, "n. Chr. n. Chr.\n") << result.error;
+}
+
 TEST(Search, FindsEveryWordAnywhereInASnippet) {
     const ProgramHome home;
     const ProgramResult arrows = home.run({"search", "ARROW left"});
@@ -217,6 +227,21 @@ TEST(Simulate, TellsTheOutcomeAndTheGravestFault) {
     const ProgramResult faulty = home.run({"simulate", wrong, other, right, "/no/such/file.json"});
     EXPECT_EQ(faulty.status, 2);
     EXPECT_THAT(faulty.error, AllOf(HasSubstr("stepz"), HasSubstr(wrong), HasSubstr("/no/such/file.json")));
+}
+
+TEST(Simulate, WritesDatesAndNumbersAsTheUserReadsThem) {
+    ProgramHome home;
+    home.set("LANG", "en_US.UTF-8");
+    home.set("LC_TIME", "de_DE.UTF-8");
+    home.set("LC_NUMERIC", "fr_FR.UTF-8");
+    const std::string scenario = home.write("user.json", R"({
+        "library": [{"expandTrigger": 0, "items": [{"abbreviation": "q",
+            "content": "【date:full】 【field:a type:3 value:2,5】 【field:b type:3 value:a+1】"}]}],
+        "now": "2026-03-09T14:05:06", "timeZone": "UTC",
+        "steps": [{"type": "q"}, {"form": {}}],
+        "expect": {"text": "Montag, 9. März 2026 2,5 3,5"}})");
+    const ProgramResult result = home.run({"simulate", scenario});
+    EXPECT_EQ(result.status, 0) << result.error;
 }
 
 }  // namespace
