@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "Foundation/RTFD.h"
+#include "content/SystemTimeZone.h"
 
 namespace plume {
 
@@ -64,6 +65,12 @@ bool ExpansionContext::enterScript() {
     if (exhausted_ || scriptDepth_ == MaximumScriptDepth) return giveUp();
     ++scriptDepth_;
     return true;
+}
+
+void ExpansionContext::settleTimeZone() {
+    static SystemTimeZone system;
+    if (!timeZoneSettled_ && environment_.timeZone.empty()) system.follow();
+    timeZoneSettled_ = true;
 }
 
 std::shared_ptr<Snippet> ExpansionContext::nestedSnippet(const SnippetAbbreviationVariable& variable) {

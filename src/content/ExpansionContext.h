@@ -31,6 +31,10 @@ class ExpansionContext {
     void leaveScript() { --scriptDepth_; }
     bool isExhausted() const { return exhausted_; }
 
+    // To be called before a date or time is written. Where the system's zone is asked for, it is that of now, but the
+    // same throughout the expansion.
+    void settleTimeZone();
+
     // The snippet that the placeholder names, looked up once for equal names. Null when there is none, or when it is
     // the expanded snippet itself.
     std::shared_ptr<Snippet> nestedSnippet(const SnippetAbbreviationVariable& variable);
@@ -52,6 +56,7 @@ class ExpansionContext {
     std::size_t unitsLeft_ = SnippetParser::MaximumLength;
     std::size_t scriptDepth_ = 0;
     bool exhausted_ = false;
+    bool timeZoneSettled_ = false;
     std::unordered_map<std::u16string, std::shared_ptr<Snippet>> found_;
     // The outer level: whether it was read.
     std::optional<std::optional<std::u16string>> clipboardText_;

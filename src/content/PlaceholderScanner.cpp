@@ -103,6 +103,7 @@ class PlaceholderScanner {
     }
 
     void replaceByMoment(const SnippetDateTimeVariable& moment) {
+        context_.settleTimeZone();
         const std::u16string value = moment.value(context_.environment());
         if (!context_.takeUnits(value.size())) return;
         if (Text::OptionalDatesBecomeFields && moment.isOptional) {
