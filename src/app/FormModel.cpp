@@ -169,7 +169,11 @@ void FormModel::showNumbers() {
 
 void FormModel::accept() const {
     for (const Field& field : fields_) {
-        if (field.hasControl()) field.variable->value = field.value;
+        if (field.hasControl()) {
+            // What was typed has no look of its own, and comes before what stood there.
+            if (field.value != field.variable->value.value_or(u"")) field.variable->richTextValue.reset();
+            field.variable->value = field.value;
+        }
         field.variable->isSelected = field.selected;
     }
 }

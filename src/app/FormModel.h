@@ -39,7 +39,7 @@ class FormModel {
     // of the same name follow, and formulas are evaluated anew. The error says why the field does not take it.
     Result<void> fill(std::size_t index, const std::u16string& value);
     void setSelected(std::size_t index, bool selected) { fields_[index].selected = selected; }
-    // Hands the values over to the content's fields.
+    // Hands the values over to the content's fields. One that shows what it began with keeps its rich text.
     void accept() const;
 
   private:

@@ -118,6 +118,19 @@ TEST(ScenarioPlayer, DoesNotWaitForTimersThatRepeatForGood) {
               "");
 }
 
+TEST(ScenarioPlayer, FillsFormsInWhereRichTextStood) {
+    const std::string library = R"({"library": [{"items": [
+        {"abbreviation": "nn", "contentType": 1, "rtf": "{\\rtf1\\ansi \\b old\\b0 }"},
+        {"abbreviation": "q", "contentType": 1,
+         "rtf": "{\\rtf1\\ansi A \\u12304 ?snippet:nn optional:1\\u12305 ? B}"}]}], )";
+    for (const auto& [form, text] : {std::pair("\"#0\": \"EDITED\"", "A EDITED B"),
+                                     std::pair("\"#0\": \"old\"", "A old B"), std::pair("", "A old B")}) {
+        const std::string rest = std::string(R"("steps": [{"type": "q"}, {"form": {)") + form +
+                                 R"(}}], "expect": {"text": ")" + text + "\"}}";
+        EXPECT_EQ(simulated(library + rest).problems, "") << form;
+    }
+}
+
 TEST(ScenarioPlayer, PlaysTheSameTwice) {
     const std::string text = R"({"library": [{"items": [{"abbreviation": "q", "contentType": 3,
                                  "content": "echo done"}]}], "steps": [{"type": "x q y"}]})";
