@@ -20,6 +20,7 @@ std::string plumeProgram() {
 constexpr const char* Library = R"json([
   { "name": "At once", "abbreviationPrefix": ";", "expandAfter": 2, "expandTrigger": 0, "items": [
       { "abbreviation": "sig", "content": "Kind regards, Jo" },
+      { "abbreviation": "cut", "content": "1234567890123456789😀x" },
       { "abbreviation": "uni", "content": "naïve Ünïcödé — 日本語 【】 😀" },
       { "abbreviation": "tag", "content": "<b>【|】</b>" },
       { "abbreviation": "run", "contentType": 3, "content": "echo out$((6*7))" },
@@ -75,6 +76,7 @@ TEST_P(ProgramInTarget, ExpandsWhatIsTyped) {
     typeAndExpect("btw, Btw BTW ", "by the way, By the way BY THE WAY ");
     typeAndExpect("x ;uni.", "x naïve Ünïcödé — 日本語 【】 😀.");
     typeAndExpect("x ;tagbold", "x <b>bold</b>");
+    typeAndExpect("x ;cut", "x 1234567890123456789😀x");
     typeAndExpect("no abbreviation at all", "no abbreviation at all");
 }
 

@@ -107,6 +107,20 @@ TEST_P(X11PosterTest, TypesAThousandCharactersExactly) {
     expectTyped("mixed", lines(MixedLine, 25), 1000);
 }
 
+TEST_P(X11PosterTest, TextInPiecesLosesNothingAtTheCuts) {
+    startPort();
+    port_->run([&] {
+        port_->poster().begin();
+        for (const std::u16string_view piece : {u"a\xD83D", u"\xDE00\r", u"\nb\r", u"\r\n", u"\nc\xD83D", u"d"}) {
+            port_->poster().post({.down = true, .text = piece}, false);
+            port_->poster().post({.down = false, .text = piece}, false);
+        }
+        port_->poster().end();
+    });
+    const std::string expected = "a😀\nb\n\n\ncd";
+    EXPECT_EQ(target_->awaitText(expected), expected);
+}
+
 TEST_P(X11PosterTest, CapsLockAndHeldShiftDoNotTouchTheTextAndComeBack) {
     startPort();
     rig_->keyboard().tap(Key::CapsLock);

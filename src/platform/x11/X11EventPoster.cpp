@@ -35,6 +35,10 @@ std::uint8_t realModifiers(std::uint64_t flags) {
     return static_cast<std::uint8_t>(modifiers);
 }
 
+bool isHighSurrogate(char16_t unit) {
+    return unit >= 0xD800 && unit <= 0xDBFF;
+}
+
 // Half of a surrogate pair, a control character: nothing that a key could type.
 bool isTypeable(char32_t character) {
     const bool control = character < 0x20 || (character >= 0x7F && character < 0xA0);
@@ -47,8 +51,7 @@ template <typename Function>
 void forEachCharacter(std::u16string_view text, Function&& function) {
     for (std::size_t i = 0; i < text.size(); ++i) {
         char32_t character = text[i];
-        const bool high = character >= 0xD800 && character <= 0xDBFF;
-        if (high && i + 1 < text.size() && text[i + 1] >= 0xDC00 && text[i + 1] <= 0xDFFF) {
+        if (isHighSurrogate(text[i]) && i + 1 < text.size() && text[i + 1] >= 0xDC00 && text[i + 1] <= 0xDFFF) {
             character = 0x10000 + ((character - 0xD800) << 10) + (text[++i] - 0xDC00U);
         }
         if (character == U'\r') {
@@ -97,6 +100,7 @@ void X11EventPoster::post(const SynthesisedKey& key, bool) {
         // A text is typed when its key goes down; its going up has nothing left to do.
         if (key.down) addText(key.text);
     } else {
+        textEnd_ = 0;
         Item item{.modifiers = realModifiers(key.flags), .down = key.down, .isKey = true};
         if ((key.keyCode & LetterKeyCode) != 0 && key.keyCode < NoKeyCode) {
             item.character = key.keyCode & 0x7FU;
@@ -108,8 +112,14 @@ void X11EventPoster::post(const SynthesisedKey& key, bool) {
     end();
 }
 
+// A long text comes in pieces of a fixed length, so a character or an end of line may have been cut in two.
 void X11EventPoster::addText(std::u16string_view text) {
-    forEachCharacter(text, [this](char32_t character) {
+    const char16_t before = std::exchange(textEnd_, text.back());
+    std::u16string whole;
+    if (isHighSurrogate(before)) whole = before;
+    if (before == u'\r' && text.front() == u'\n') text.remove_prefix(1);
+    whole += text;
+    forEachCharacter(whole, [this](char32_t character) {
         if (isTypeable(character) || isKeyOfItsOwn(character)) items_.push_back({.character = character});
     });
 }

@@ -87,6 +87,7 @@ class X11EventPoster final : public EventPoster {
     SpareKeyWriter writer_;
     int depth_ = 0;
     std::vector<Item> items_;
+    char16_t textEnd_ = 0;                // last unit of the text that was posted last, 0 when a key came since
     std::uint8_t modifiers_ = 0;          // pressed for the items that are being sent
     std::uint8_t explicitModifiers_ = 0;  // pressed as keys of their own
 };
