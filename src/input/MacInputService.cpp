@@ -97,6 +97,8 @@ void MacInputService::setListenMouseDownEvents(bool listen) {
 void MacInputService::tapDisabledByTimeout() {
     around_.log("Event tap was disabled by timeout");
     delivery_.abandon();
+    // What becomes of the modifiers meanwhile is no hot key.
+    if (hotKeys_.keyModifier() != 0) hotKeys_.ignoreNextHotKey();
     const double now = around_.tapLoop.now();
     std::erase_if(timeouts_, [&](double moment) { return now - moment >= TimeoutPeriod; });
     timeouts_.push_back(now);

@@ -137,6 +137,7 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     bool keyboardEvent(const TapEvent& event) override;
     void tapDisabledByTimeout() override;
     void tapDisabledByUserInput() override;
+    void keysWithheld() override;
 
     void onTapThread(std::function<void()> call);
     void enableEventsInternal();
@@ -145,7 +146,7 @@ class MacInputService final : public InputService, private KeyboardTapListener {
 
     void mouseDown(Point location);
     void forgetLastKey();
-    bool keyDown(ZDKeyEventArgs& key);
+    bool keyDown(ZDKeyEventArgs& key, bool isCommand);
     bool keyUp(const ZDKeyEventArgs& key);
     bool unregisteredHotKey(const ZDKeyEventArgs& key);
     void followFrontProcess();

@@ -16,7 +16,7 @@ bool MacInputService::keyboardEvent(const TapEvent& event) {
     readKey(event, key);
     lastKeyString_ = key.s;
     lastKeyCode_ = key.key;
-    return event.type == TapEvent::Type::KeyUp ? keyUp(key) : keyDown(key);
+    return event.type == TapEvent::Type::KeyUp ? keyUp(key) : keyDown(key, event.command);
 }
 
 void MacInputService::mouseDown(Point location) {
@@ -26,6 +26,11 @@ void MacInputService::mouseDown(Point location) {
     click.x = location.x;
     click.y = location.y;
     mouseDownEvent.raise(click);
+}
+
+// What is typed afterwards does not follow what was typed before.
+void MacInputService::keysWithheld() {
+    if (active_) raiseInputContextChanged();
 }
 
 void MacInputService::forgetLastKey() {
@@ -52,10 +57,12 @@ void MacInputService::readKey(const TapEvent& event, ZDKeyEventArgs& key) const 
     key.key = event.keyCode;
     if (!event.string.empty()) {
         key.s.emplace(event.string);
-    } else {
+    } else if (!event.composing) {
         key.s = stringForKeyCode(event.keyCode, event.flags);
     }
-    if (key.s && !key.s->empty()) key.c = key.s->front();
+    // A command is told by the character on its key.
+    const auto named = event.command && !key.s ? stringForKeyCode(event.keyCode, 0) : key.s;
+    if (named && !named->empty()) key.c = named->front();
 }
 
 bool MacInputService::keyUp(const ZDKeyEventArgs& key) {
@@ -67,11 +74,11 @@ bool MacInputService::keyUp(const ZDKeyEventArgs& key) {
     return false;
 }
 
-bool MacInputService::keyDown(ZDKeyEventArgs& key) {
+bool MacInputService::keyDown(ZDKeyEventArgs& key, bool isCommand) {
     bool swallow = hotKeys_.keyDown(key.key);
     if (!swallow) {
         const std::int32_t held = keyModifier();
-        const bool isShortcut = (held & (KeyModifier::Control | KeyModifier::Command)) != 0;
+        const bool isShortcut = isCommand || (held & (KeyModifier::Control | KeyModifier::Command)) != 0;
         const bool deletesWord = (held & KeyModifier::Option) != 0 && key.c == u'\b';
         if (isShortcut || deletesWord) {
             swallow = unregisteredHotKey(key);

@@ -20,6 +20,10 @@ struct TapEvent {
     std::uint16_t keyCode = 0;
     std::uint64_t flags = 0;     // event flag bits of the modifiers held; for FlagsChanged: from now on
     std::u16string_view string;  // what the key produces, at most 10 units; valid during the call
+    // Part of a sequence of keys that has produced nothing yet: what the key would produce by itself does not count.
+    bool composing = false;
+    // With the modifiers held, programs take the key for a command, whatever it produces.
+    bool command = false;
 };
 
 class KeyboardTapListener {
@@ -29,6 +33,8 @@ class KeyboardTapListener {
     virtual bool keyboardEvent(const TapEvent& event) = 0;
     virtual void tapDisabledByTimeout() = 0;
     virtual void tapDisabledByUserInput() = 0;
+    // From here on keys go by that nobody is told of, into a password or to a program that holds the keyboard.
+    virtual void keysWithheld() {}
 };
 
 class KeyboardTap {

@@ -12,7 +12,7 @@ namespace plume {
 
 class MouseTap {
   public:
-    // A left or right button went down here, from the top left of the main screen.
+    // A button went down here, from the top left of the main screen.
     using Listener = std::function<void(Point location)>;
 
     virtual ~MouseTap() = default;

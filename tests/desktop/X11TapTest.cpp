@@ -44,13 +44,15 @@ struct Heard {
     std::uint16_t keyCode = 0;
     std::uint64_t flags = 0;
     std::u16string string;
+    bool composing = false;
+    bool command = false;
 
     bool operator==(const Heard&) const = default;
     friend std::ostream& operator<<(std::ostream& out, const Heard& heard) {
         constexpr std::array<const char*, 3> names{"down", "up", "flags"};
         out << names[static_cast<std::size_t>(heard.type)] << ' ' << heard.keyCode << ' ' << std::hex << heard.flags;
         for (const char16_t unit : heard.string) out << " U+" << static_cast<unsigned>(unit);
-        return out << std::dec;
+        return out << std::dec << (heard.composing ? " composing" : "") << (heard.command ? " command" : "");
     }
 };
 
@@ -58,7 +60,8 @@ struct Heard {
 class Listener final : public KeyboardTapListener {
   public:
     bool keyboardEvent(const TapEvent& event) override {
-        heard.push_back({event.type, event.keyCode, event.flags, std::u16string(event.string)});
+        heard.push_back(
+            {event.type, event.keyCode, event.flags, std::u16string(event.string), event.composing, event.command});
         return decide && decide(event);
     }
     void tapDisabledByTimeout() override {
@@ -66,10 +69,12 @@ class Listener final : public KeyboardTapListener {
         if (tapToEnable) tapToEnable->enable();
     }
     void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody did that"; }
+    void keysWithheld() override { ++withheld; }
 
     std::vector<Heard> heard;
     std::function<bool(const TapEvent&)> decide;
     int timeouts = 0;
+    int withheld = 0;
     KeyboardTap* tapToEnable = nullptr;
 };
 
@@ -192,8 +197,10 @@ TEST_F(X11TapTest, TellsWhatKeysProduceAndWhichModifiersAreHeld) {
         {38, {Type::KeyDown, 0, 0, u"a"}},
         {38, {Type::KeyDown, 0, ShiftFlag, u"A"}, {Key::LeftShift}},
         {54, {Type::KeyDown, 8, ControlFlag, u"\x03"}, {Key::LeftControl}},
-        {53, {Type::KeyDown, 7, OptionFlag, u""}, {Key::LeftAlt}},
-        {22, {Type::KeyDown, 51, OptionFlag, u"\b"}, {Key::LeftAlt}},
+        {11, {Type::KeyDown, 19, ControlFlag, u"2"}, {Key::LeftControl}},
+        {17, {Type::KeyDown, 28, ControlFlag, u"8"}, {Key::LeftControl}},
+        {53, {Type::KeyDown, 7, OptionFlag, u"", false, true}, {Key::LeftAlt}},
+        {22, {Type::KeyDown, 51, OptionFlag, u"\b", false, true}, {Key::LeftAlt}},
         {29, {Type::KeyDown, 16, CommandFlag, u"y"}, {Key::LeftSuper}},
         {29, {Type::KeyDown, 16, ControlFlag | ShiftFlag, u"\x19"}, {Key::LeftControl, Key::LeftShift}},
         {36, {Type::KeyDown, 36, 0, u"\r"}},
@@ -320,10 +327,28 @@ TEST_F(X11TapTest, ComposesDeadKeys) {
     tapKey(26);  // e
     tapKey(26);
     const auto all = takeHeard(6);
-    EXPECT_EQ(all.at(0), (Heard{Type::KeyDown, 24, 0, u""}));
+    EXPECT_EQ(all.at(0), (Heard{Type::KeyDown, 24, 0, u"", true}));
     EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 14, 0, u"\u00E9"}));
     EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, 14, 0, u"e"}));
     EXPECT_EQ(target->awaitText("ée"), "ée");
+}
+
+TEST_F(X11TapTest, ComposesSequences) {
+    const auto target = rig_->startTarget(TargetKind::Xterm);
+    createTap();
+    setLayout({"us", "-option", "compose:ralt"});
+    await("the key composes",
+          [&] { return tap_->call([](Parts& parts) { return parts.keyboard->keymap()->hasComposingKeys(); }); });
+    tapKey(108);  // Compose
+    tapKey(59);   // comma
+    tapKey(54);   // c
+    tapKey(54);
+    const auto all = takeHeard(8);
+    EXPECT_TRUE(all.at(0).composing);
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 43, 0, u"", true}));
+    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, 8, 0, u"\u00E7"}));
+    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, 8, 0, u"c"}));
+    EXPECT_EQ(target->awaitText("çc"), "çc");
 }
 
 TEST_F(X11TapTest, HeldKeysRepeat) {
@@ -446,6 +471,7 @@ TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     rig_->keyboard().press(Key::LeftShift);
     EXPECT_EQ(target->awaitText("Se"), "Se");
     EXPECT_EQ(heard(), std::vector<Heard>{});
+    EXPECT_EQ(tap_->call([this](Parts& /*parts*/) { return listener_.withheld; }), 1) << "of all of them";
     await("shift is down", [] { return keysDown() == std::vector<int>{50}; });
     password = false;
     tapKey(38);
@@ -454,6 +480,23 @@ TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     const auto all = takeHeard(3);
     EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, 56, ShiftFlag, u""})) << "what was missed is made up for";
     EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, 0, ShiftFlag, u"A"}));
+}
+
+TEST_F(X11TapTest, MakesUpForModifiersThatCameUpWhileItWasLost) {
+    createTap();
+    rig_->keyboard().press(Key::LeftControl);
+    EXPECT_EQ(takeHeard(1).front(), (Heard{Type::FlagsChanged, 59, ControlFlag, u""}));
+    const auto window = tap_->call([](Parts& parts) { return parts.connection->window(); });
+    xcb_kill_client(rig_->client().connection(), window);
+    rig_->client().focusedWindow();
+    await("the tap is told", [&] { return tap_->call([this](Parts& /*parts*/) { return listener_.timeouts == 1; }); });
+    rig_->keyboard().releaseAll();
+    await("the key is up", [] { return keysDown().empty(); });
+    tap_->call([](Parts& parts) { parts.tap->enable(); });
+    tapKey(38);
+    const auto all = takeHeard(3);
+    EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, 59, 0, u""}));
+    EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, 0, 0, u"a"}));
 }
 
 TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEnded) {
@@ -594,14 +637,12 @@ TEST_F(X11TapTest, HearsClicks) {
     const auto created = tap_->call(
         [&](Parts& parts) { return parts.mouse->create([&](Point location) { clicks.push_back(location); }); });
     ASSERT_TRUE(created.ok());
-    for (const int button : {1, 2, 3}) {
-        rig_->click(200 + button, 300, button);
-        const std::size_t expected = button == 3 ? 2 : 1;
-        await("it is heard", [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() == expected; }); });
-    }
+    constexpr int wheel = 4;
+    for (const int button : {1, wheel, 2, 3}) rig_->click(200 + button, 300, button);
+    await("they are heard", [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() >= 3; }); });
     tap_->call([](Parts& parts) { parts.mouse->remove(); });
     rig_->click(1, 1);
-    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }), (std::vector<Point>{{201, 300}, {203, 300}}));
+    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }), (std::vector<Point>{{201, 300}, {202, 300}, {203, 300}}));
 }
 
 }  // namespace

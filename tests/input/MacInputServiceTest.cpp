@@ -41,6 +41,7 @@ struct Listener {
     void shortcut(ZDUnregisteredHotKeyPressedEventArgs& event) {
         heard.push_back("shortcut " + name(event.hotKey));
         EXPECT_EQ(event.key, event.hotKey.keyCode);
+        shortcutCharacter = event.c;
         event.cancel = swallows;
     }
     void hotKeys(ZDHotKeysPressedEventArgs& event) {
@@ -57,6 +58,7 @@ struct Listener {
 
     MacInputService& service;
     std::vector<std::string> heard;
+    char16_t shortcutCharacter = 0;
     bool swallows = false;
 };
 
@@ -118,6 +120,30 @@ TEST_F(MacInputServiceTest, ShortcutsAreNoText) {
     desk.keyDown(8, u"ç");
     desk.keyDown(51, u"\b");
     EXPECT_THAT(heard(), ElementsAre("key 8 ç", "shortcut 51/4", "context"));
+}
+
+TEST_F(MacInputServiceTest, ACommandOfThePortIsAShortcutWhateverItTypes) {
+    desk.hold(KeyModifier::Option);
+    const auto press = [&](std::uint16_t keyCode, std::u16string_view text) {
+        desk.tap.listener->keyboardEvent(
+            {.keyCode = keyCode, .flags = desk.heldFlags, .string = text, .command = true});
+    };
+    press(8, u"");
+    EXPECT_EQ(listener.shortcutCharacter, u'c') << "what the key is called";
+    press(36, u"\r");
+    EXPECT_THAT(heard(), ElementsAre("shortcut 8/4", "context", "shortcut 36/4", "context"));
+}
+
+TEST_F(MacInputServiceTest, AKeyInTheMiddleOfASequenceTypesNothing) {
+    desk.tap.listener->keyboardEvent({.keyCode = 8, .string = {}, .composing = true});
+    EXPECT_THAT(heard(), ElementsAre("key 8 -"));
+}
+
+TEST_F(MacInputServiceTest, WhatIsTypedAfterWithheldKeysStandsAlone) {
+    desk.keyDown(8, u"c");
+    desk.tap.listener->keysWithheld();
+    desk.keyDown(9, u"v");
+    EXPECT_THAT(heard(), ElementsAre("key 8 c", "context", "key 9 v"));
 }
 
 TEST_F(MacInputServiceTest, HotKeysComeBeforeTheEngine) {
@@ -210,6 +236,17 @@ TEST_F(MacInputServiceTest, FollowsSecureInput) {
     desk.service.disableEvents();
     desk.loop.runReady();
     EXPECT_FALSE(desk.loop.nextDue()) << "nothing wakes up any more";
+}
+
+TEST_F(MacInputServiceTest, ModifiersHeldWhenTheTapIsLostAreNoHotKey) {
+    desk.service.registerHotKey({KeyModifier::Command, KeyCode::None});
+    desk.hold(KeyModifier::Command);
+    desk.tap.listener->tapDisabledByTimeout();
+    desk.hold(0);
+    EXPECT_THAT(heard(), IsEmpty());
+    desk.hold(KeyModifier::Command);
+    desk.hold(0);
+    EXPECT_THAT(heard(), ElementsAre("hot 65535/8"));
 }
 
 TEST_F(MacInputServiceTest, TakesTheTapAgainTwiceAMinute) {

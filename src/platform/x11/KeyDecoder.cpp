@@ -98,9 +98,9 @@ KeyDecoder::Key KeyDecoder::press(xcb_keycode_t keycode) {
     key.flags = flags();
     keyCodes_[keycode] = key.keyCode;
     key.modifier = isModifierSymbol(symbol);
-    if (!key.modifier && !isComposed(symbol)) {
-        text_.assignKey(*state_, keycode, (key.flags & X11Flag::Option) != 0);
-    }
+    const bool composed = !key.modifier && isComposed(symbol);
+    if (!key.modifier && !composed) text_.assignKey(*state_, keycode, (key.flags & X11Flag::Option) != 0);
+    key.composing = composed && text_.view().empty();
     locksBefore_ = locks();
     xkb_state_update_key(state_.get(), keycode, XKB_KEY_DOWN);
     if (key.modifier) {

@@ -28,6 +28,7 @@ class KeyDecoder {
         bool silent = false;
         std::uint64_t flags = 0;     // for a modifier, with this change
         std::u16string_view string;  // valid until the next call
+        bool composing = false;      // one of a sequence that has produced nothing yet
     };
 
     KeyDecoder();

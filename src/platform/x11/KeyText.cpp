@@ -1,12 +1,17 @@
 #include "platform/x11/KeyText.h"
 
+#include <xkbcommon/xkbcommon-keysyms.h>
+
 #include "Foundation/Strings.h"
 
 namespace plume {
 
 void KeyText::assignKey(xkb_state& state, xcb_keycode_t keycode, bool alt) {
     clear();
-    const char32_t character = xkb_state_key_get_utf32(&state, keycode);
+    char32_t character = xkb_state_key_get_utf32(&state, keycode);
+    // With Control some digits are control characters, an inheritance of terminals.
+    const xkb_keysym_t symbol = xkb_state_key_get_one_sym(&state, keycode);
+    if (symbol >= XKB_KEY_0 && symbol <= XKB_KEY_9) character = symbol;
     const bool control = character < U' ' || character == 0x7F;
     if (character != 0 && (control || !alt)) append(character);
 }

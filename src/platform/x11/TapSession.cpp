@@ -173,6 +173,14 @@ bool TapSession::mayTell() {
     return !parts_.focusIsPassword || !parts_.focusIsPassword();
 }
 
+bool TapSession::tellsKey(const KeyDecoder::Key& key) {
+    if (key.silent) return false;
+    const bool withholdsNow = !mayTell();
+    if (withholdsNow && !std::exchange(withholding_, true)) parts_.listener.keysWithheld();
+    if (!withholdsNow) withholding_ = false;
+    return !withholdsNow && !ended_;
+}
+
 void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     const KeycodeSet& down = parts_.connection.keysDown();
     const std::uint64_t flagsBefore = decoder_.flags();
@@ -180,7 +188,7 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     parts_.connection.userKeys.set(keycode);
     seen_.set(keycode);
     bool swallow = false;
-    told_[keycode] = !key.silent && mayTell();
+    told_[keycode] = tellsKey(key);
     if (told_[keycode]) {
         tellMissedModifiers(flagsBefore);
         if (!ended_) swallow = tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyDown);
@@ -211,15 +219,17 @@ void TapSession::release(xcb_keycode_t keycode) {
 }
 
 void TapSession::tellMissedModifiers(std::uint64_t flags) {
-    const std::uint64_t changed = (flags ^ toldFlags_) & ModifierFlags;
+    const std::uint64_t changed = (flags ^ parts_.toldFlags) & ModifierFlags;
     if (changed == 0) return;
-    toldFlags_ = flags;
+    parts_.toldFlags = flags;
     parts_.listener.keyboardEvent({TapEvent::Type::FlagsChanged, modifierKeyOf(changed), flags, {}});
 }
 
 bool TapSession::tell(const KeyDecoder::Key& key, TapEvent::Type type) {
-    toldFlags_ = key.flags;
-    return parts_.listener.keyboardEvent({type, key.keyCode, key.flags, key.string});
+    parts_.toldFlags = key.flags;
+    // Programs type nothing with Alt.
+    const bool command = !key.modifier && (key.flags & X11Flag::Option) != 0;
+    return parts_.listener.keyboardEvent({type, key.keyCode, key.flags, key.string, key.composing, command});
 }
 
 void TapSession::inject(Injection injection) {

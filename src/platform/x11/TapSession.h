@@ -37,6 +37,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         const std::function<bool()>& focusIsPassword;  // may be empty
         const UserTyped& userTyped;                    // may be empty
         std::function<void()> lost;                    // the connection is gone
+        std::uint64_t& toldFlags;                      // the modifiers that the listener takes to be held
     };
 
     explicit TapSession(Parts parts);
@@ -73,6 +74,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void release(xcb_keycode_t keycode);
     void releaseKeysOf(std::uint16_t device);
     bool mayTell();
+    bool tellsKey(const KeyDecoder::Key& key);
     void tellMissedModifiers(std::uint64_t flags);
     bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
     void inject(Injection injection);
@@ -87,7 +89,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     KeycodeSet seen_;                           // keys that are down and went down here
     KeycodeSet told_;                           // those of them that the listener was told of
     std::array<std::uint16_t, 256> devices_{};  // that a key went down on
-    std::uint64_t toldFlags_ = 0;
+    bool withholding_ = false;                  // the latest key went by untold
 
     bool held_ = false;
     std::optional<Injection> waiting_;

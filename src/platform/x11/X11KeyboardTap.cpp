@@ -4,6 +4,12 @@
 
 namespace plume {
 
+namespace {
+
+constexpr double TryPeriod = 1;  // seconds
+
+}  // namespace
+
 X11KeyboardTap::X11KeyboardTap(PollRunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard)
     : loop_(loop), connection_(connection), keyboard_(keyboard), display_(connection.connection().displayName()) {
     keyboard.addListener([this, alive = std::weak_ptr<bool>(alive_)](XkbKeyboard::Change change) {
@@ -25,18 +31,25 @@ void X11KeyboardTap::setUserTyped(UserTyped userTyped) {
 
 Result<void> X11KeyboardTap::create(KeyboardTapListener& listener, bool /*annotatedSession*/) {
     remove();
+    listener_ = &listener;
+    auto begun = begin();
+    if (!begun) listener_ = nullptr;
+    return begun;
+}
+
+Result<void> X11KeyboardTap::begin() {
     if (connection_.isBroken()) {
         if (auto reopened = connection_.reopen(); !reopened) return reopened;
     }
     auto session = std::make_shared<TapSession>(TapSession::Parts{.loop = loop_,
                                                                   .connection = connection_,
                                                                   .keyboard = keyboard_,
-                                                                  .listener = listener,
+                                                                  .listener = *listener_,
                                                                   .focusIsPassword = focusIsPassword_,
                                                                   .userTyped = userTyped_,
-                                                                  .lost = [this] { lost(); }});
+                                                                  .lost = [this] { lost(); },
+                                                                  .toldFlags = toldFlags_});
     if (auto begun = session->begin(); !begun) return begun;
-    listener_ = &listener;
     session_ = std::move(session);
     return {};
 }
@@ -51,12 +64,19 @@ void X11KeyboardTap::lost() {
 }
 
 void X11KeyboardTap::enable() {
-    // When the server is gone, there is nothing to take, and no tap exists.
-    if (!session_ && listener_) static_cast<void>(create(*listener_, false).ok());
+    if (session_ || !listener_) return;
+    loop_.cancel(nextTry_);
+    if (!begin()) tryAgainLater();
+}
+
+// The server may be gone, and Plume with it before long; or another program has the keyboard just now.
+void X11KeyboardTap::tryAgainLater() {
+    nextTry_ = loop_.performAfterDelay(TryPeriod, [this] { enable(); });
 }
 
 void X11KeyboardTap::remove() {
     listener_ = nullptr;
+    loop_.cancel(nextTry_);
     if (session_) std::exchange(session_, nullptr)->end();
 }
 

@@ -43,7 +43,9 @@ class X11KeyboardTap final : public KeyboardTap {
     void release();
 
   private:
+    Result<void> begin();
     void lost();
+    void tryAgainLater();
 
     PollRunLoop& loop_;
     TapConnection& connection_;
@@ -52,7 +54,9 @@ class X11KeyboardTap final : public KeyboardTap {
     std::function<bool()> focusIsPassword_;
     UserTyped userTyped_;
     KeyboardTapListener* listener_ = nullptr;
+    std::uint64_t toldFlags_ = 0;          // the modifiers that the listener takes to be held, across sessions
     std::shared_ptr<TapSession> session_;  // while the keyboards are taken
+    RunLoop::CallId nextTry_ = 0;
     std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
 };
 

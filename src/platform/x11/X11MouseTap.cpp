@@ -8,8 +8,9 @@ namespace plume {
 
 namespace {
 
-constexpr std::uint32_t LeftButton = 1;
-constexpr std::uint32_t RightButton = 3;
+// Turning the wheel arrives as presses of these.
+constexpr std::uint32_t FirstWheelButton = 4;
+constexpr std::uint32_t LastWheelButton = 7;
 
 }  // namespace
 
@@ -52,7 +53,8 @@ void X11MouseTap::select(std::uint32_t events) const {
 void X11MouseTap::handleEvent(const xcb_generic_event_t& event) {
     const auto& press = reinterpret_cast<const xcb_input_raw_button_press_event_t&>(event);
     if (press.extension != inputOpcode_ || press.event_type != XCB_INPUT_RAW_BUTTON_PRESS) return;
-    if (press.detail != LeftButton && press.detail != RightButton) return;
+    // The middle one pastes, those at the side turn pages.
+    if (press.detail >= FirstWheelButton && press.detail <= LastWheelButton) return;
     if (clicked) clicked();
     const auto cookie = xcb_query_pointer(session_.get(), session_.connection().root());
     const XcbOwned<xcb_query_pointer_reply_t> pointer(xcb_query_pointer_reply(session_.get(), cookie, nullptr));
