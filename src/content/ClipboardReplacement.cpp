@@ -148,8 +148,9 @@ UBool findInTime(const void* deadline, std::int64_t) {
 // The matches of a pattern in a text, one after the other.
 class PatternReplacement {
   public:
-    PatternReplacement(const SnippetClipboardVariable& variable, std::u16string_view content)
-        : variable_(variable), content_(content) {}
+    PatternReplacement(const SnippetClipboardVariable& variable, std::u16string_view content,
+                       Clock::time_point deadline)
+        : variable_(variable), content_(content), deadline_(deadline) {}
 
     // What is wrong, in words that follow the find text; empty when all matches were visited.
     std::string visit(const Visitor& visitor) {
@@ -172,15 +173,14 @@ class PatternReplacement {
 
   private:
     std::string visitMatches(icu::RegexMatcher& matcher, const ReplacementTemplate& pieces, const Visitor& visitor) {
-        const Clock::time_point deadline = Clock::now() + TimeLimit;
         UErrorCode status = U_ZERO_ERROR;
         matcher.setStackLimit(MatcherStackBytes, status);
-        matcher.setMatchCallback(matchInTime, &deadline, status);
-        matcher.setFindProgressCallback(findInTime, &deadline, status);
+        matcher.setMatchCallback(matchInTime, &deadline_, status);
+        matcher.setFindProgressCallback(findInTime, &deadline_, status);
         while (matcher.find(status)) {
             const auto start = static_cast<std::size_t>(matcher.start(status));
             const auto end = static_cast<std::size_t>(matcher.end(status));
-            if (!inTime(&deadline)) return "takes too much time or memory to search for";
+            if (!inTime(&deadline_)) return "takes too much time or memory to search for";
             if (!visitor({start, end - start}, pieces.expand(matcher, content_))) return "makes the text too long";
         }
         return U_FAILURE(status) ? "takes too much time or memory to search for" : "";
@@ -188,6 +188,7 @@ class PatternReplacement {
 
     const SnippetClipboardVariable& variable_;
     std::u16string_view content_;
+    const Clock::time_point deadline_;
 };
 
 // The occurrences of a literal text, one after the other, in time linear in both texts: the content is anybody's.
@@ -234,12 +235,24 @@ class LiteralReplacement {
     std::u16string replacement_;
 };
 
+// As PatternReplacement::visit.
+std::string visitPattern(const SnippetClipboardVariable& variable, std::u16string_view content,
+                         std::chrono::nanoseconds& timeLeft, const Visitor& visitor) {
+    if (timeLeft <= timeLeft.zero()) return "is not searched for, because others have taken too much time";
+    const Clock::time_point start = Clock::now();
+    const Clock::time_point deadline = start + std::min<Clock::duration>(TimeLimit, timeLeft);
+    std::string problem = PatternReplacement(variable, content, deadline).visit(visitor);
+    timeLeft -= Clock::now() - start;
+    return problem;
+}
+
 // Calls the visitor for every replacement to make. False, with the reason reported, when the content is to stay.
 bool visitReplacements(const SnippetClipboardVariable& variable, std::u16string_view content,
-                       const ContentEnvironment& environment, const Visitor& visitor) {
+                       const ContentEnvironment& environment, std::chrono::nanoseconds& timeLeft,
+                       const Visitor& visitor) {
     if (!variable.find || variable.find->empty()) return false;
     if (content.size() > std::numeric_limits<std::int32_t>::max()) return false;
-    const std::string problem = usesPattern(variable) ? PatternReplacement(variable, content).visit(visitor)
+    const std::string problem = usesPattern(variable) ? visitPattern(variable, content, timeLeft, visitor)
                                                       : LiteralReplacement(variable, content).visit(visitor);
     if (problem.empty()) return true;
     reportOnce(environment, "The clipboard is inserted unchanged: the find text " + quotedForReport(*variable.find) +
@@ -258,22 +271,22 @@ SharedAttributes forText(const SharedAttributes& attributes) {
 }  // namespace
 
 std::u16string processClipboardVariable(const SnippetClipboardVariable& variable, const std::u16string& content,
-                                        const ContentEnvironment& environment) {
+                                        const ContentEnvironment& environment, std::chrono::nanoseconds& timeLeft) {
     std::u16string result;
     std::size_t copied = 0;
-    const bool done = visitReplacements(variable, content, environment, [&](Range range, const auto& replacement) {
+    const auto replace = [&](Range range, const std::u16string& replacement) {
         result.append(content, copied, range.location - copied);
         result += replacement;
         copied = range.end();
         return result.size() <= std::max(LongestResult, content.size());
-    });
-    if (!done) return content;
+    };
+    if (!visitReplacements(variable, content, environment, timeLeft, replace)) return content;
     result.append(content, copied);
     return result;
 }
 
 AttributedString processClipboardVariable(const SnippetClipboardVariable& variable, const AttributedString& content,
-                                          const ContentEnvironment& environment) {
+                                          const ContentEnvironment& environment, std::chrono::nanoseconds& timeLeft) {
     AttributedStringRewriter rewriter(content);
     const auto replace = [&](Range range, const std::u16string& replacement) {
         rewriter.copyTo(range.location);
@@ -281,7 +294,7 @@ AttributedString processClipboardVariable(const SnippetClipboardVariable& variab
         rewriter.skipTo(range.end());
         return rewriter.resultLength() <= std::max(LongestResult, content.length());
     };
-    return visitReplacements(variable, content.string(), environment, replace) ? rewriter.finish() : content;
+    return visitReplacements(variable, content.string(), environment, timeLeft, replace) ? rewriter.finish() : content;
 }
 
 }  // namespace plume

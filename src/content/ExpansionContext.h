@@ -1,6 +1,7 @@
 // What all the texts of one expansion share: the snippet, how much may still be done, and what was found already.
 #pragma once
 
+#include <chrono>
 #include <cstddef>
 #include <memory>
 #include <optional>
@@ -31,6 +32,9 @@ class ExpansionContext {
     void leaveScript() { --scriptDepth_; }
     bool isExhausted() const { return exhausted_; }
 
+    // What find-and-replace with patterns may still take; the caller takes off what it took.
+    std::chrono::nanoseconds& patternTimeLeft() { return patternTimeLeft_; }
+
     // To be called before a date or time is written. Where the system's zone is asked for, it is that of now, but the
     // same throughout the expansion.
     void settleTimeZone();
@@ -54,6 +58,7 @@ class ExpansionContext {
     const SnippetParser::Groups& groups_;
     std::size_t replacementsLeft_ = SnippetParser::MaximumReplacements;
     std::size_t unitsLeft_ = SnippetParser::MaximumLength;
+    std::chrono::nanoseconds patternTimeLeft_ = SnippetParser::MaximumPatternTime;
     std::size_t scriptDepth_ = 0;
     bool exhausted_ = false;
     bool timeZoneSettled_ = false;

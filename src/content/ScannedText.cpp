@@ -55,7 +55,7 @@ void PlainScannedText::putBack(const Snippet& nested, const SharedAttributes&) {
 ClipboardValue PlainScannedText::clipboardValue(const SnippetClipboardVariable& variable, ExpansionContext& context) {
     const std::optional<std::u16string>& text = context.clipboardText();
     if (!text || !context.takeUnits(text->size())) return {};
-    std::u16string value = processClipboardVariable(variable, *text, context.environment());
+    std::u16string value = processClipboardVariable(variable, *text, context.environment(), context.patternTimeLeft());
     takeGrowth(text->size(), value.size(), context);
     return {std::move(value), std::nullopt};
 }
@@ -114,7 +114,8 @@ ClipboardValue RichScannedText::clipboardValue(const SnippetClipboardVariable& v
     const std::optional<AttributedString>& richText = context.richClipboard();
     if (!richText) return PlainScannedText::clipboardValue(variable, context);
     if (!context.takeUnits(richText->length())) return {};
-    AttributedString value = processClipboardVariable(variable, *richText, context.environment());
+    AttributedString value =
+        processClipboardVariable(variable, *richText, context.environment(), context.patternTimeLeft());
     takeGrowth(richText->length(), value.length(), context);
     return {std::nullopt, std::move(value)};
 }

@@ -4,6 +4,7 @@
 // is bounded: a content that grows without end (snippets that include each other) is refused and reported.
 #pragma once
 
+#include <chrono>
 #include <memory>
 #include <string>
 #include <vector>
@@ -26,6 +27,9 @@ class SnippetParser {
     // One expansion gives up beyond these.
     static constexpr std::size_t MaximumReplacements = 100'000;
     static constexpr std::size_t MaximumLength = std::size_t{16} * 1024 * 1024;  // UTF-16 units
+    // Find-and-replace with patterns may take this long in one expansion; what comes later leaves the clipboard's text
+    // as it is. The keyboard waits meanwhile.
+    static constexpr std::chrono::milliseconds MaximumPatternTime{200};
 
     explicit SnippetParser(ContentEnvironment environment);
 

@@ -6,6 +6,7 @@
 #include <chrono>
 
 #include "Foundation/Strings.h"
+#include "tests/content/ContentWorld.h"
 
 namespace plume {
 namespace {
@@ -28,9 +29,17 @@ SnippetClipboardVariable variable(const std::u16string& find, const std::u16stri
         {{u"find", find}, {u"replacement", replacement}, {u"flags", fromUtf8(std::to_string(flags))}});
 }
 
+// With all the time that an expansion has.
+template <class Content>
+Content process(const SnippetClipboardVariable& variable, const Content& content,
+                const ContentEnvironment& environment) {
+    std::chrono::nanoseconds timeLeft = SnippetParser::MaximumPatternTime;
+    return processClipboardVariable(variable, content, environment, timeLeft);
+}
+
 std::u16string replaced(const std::u16string& find, const std::u16string& replacement, int flags,
                         const std::u16string& content) {
-    return processClipboardVariable(variable(find, replacement, flags), content, ContentEnvironment());
+    return process(variable(find, replacement, flags), content, ContentEnvironment());
 }
 
 SharedAttributes size(double points) {
@@ -101,7 +110,7 @@ TEST(ClipboardReplacement, ReplacesPlainText) {
 TEST(ClipboardReplacement, DefaultsToRemovingWithoutAReplacement) {
     SnippetClipboardVariable removal;
     removal.find = u"a";
-    EXPECT_EQ(processClipboardVariable(removal, u"banana", ContentEnvironment()), u"bnn");
+    EXPECT_EQ(process(removal, std::u16string(u"banana"), ContentEnvironment()), u"bnn");
 }
 
 TEST(ClipboardReplacement, LeavesTheContentAndReportsOnceWhatCannotWork) {
@@ -115,9 +124,9 @@ TEST(ClipboardReplacement, LeavesTheContentAndReportsOnceWhatCannotWork) {
         Reports reports;
         for (int i = 0; i < 3; ++i) {
             const auto pattern = variable(c.find, c.replacement, c.flags);
-            EXPECT_EQ(processClipboardVariable(pattern, c.content, reports.environment()), c.content) << c.what;
+            EXPECT_EQ(process(pattern, c.content, reports.environment()), c.content) << c.what;
             const AttributedString rich(c.content, size(9));
-            EXPECT_EQ(processClipboardVariable(pattern, rich, reports.environment()), rich) << c.what;
+            EXPECT_EQ(process(pattern, rich, reports.environment()), rich) << c.what;
         }
         EXPECT_EQ(reports.sentences().size(), 1U) << c.what;
     }
@@ -133,10 +142,53 @@ TEST(ClipboardReplacement, GivesUpOnPatternsThatExplode) {
     for (const auto& c : cases) {
         Reports reports;
         const auto start = std::chrono::steady_clock::now();
-        EXPECT_EQ(processClipboardVariable(variable(c.find, u"x", 1), c.content, reports.environment()), c.content);
+        EXPECT_EQ(process(variable(c.find, u"x", 1), c.content, reports.environment()), c.content);
         EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2)) << toUtf8(c.find);
         EXPECT_EQ(reports.sentences().size(), 1U) << toUtf8(c.find);
     }
+}
+
+TEST(ClipboardReplacement, TakesTimeOffForPatternsAlone) {
+    const std::u16string content = std::u16string(5'000, u'a') + u"b";
+    const ContentEnvironment environment;
+    std::chrono::nanoseconds timeLeft = std::chrono::hours(1);
+    processClipboardVariable(variable(u"a", u"x", 8), content, environment, timeLeft);
+    EXPECT_EQ(timeLeft, std::chrono::hours(1));
+    processClipboardVariable(variable(u"(a+)+$", u"x", 1), content, environment, timeLeft);
+    EXPECT_LT(timeLeft, std::chrono::hours(1) - std::chrono::milliseconds(50));
+}
+
+TEST(ClipboardReplacement, SearchesForNoPatternWhenTheTimeIsUp) {
+    Reports reports;
+    std::chrono::nanoseconds timeLeft{0};
+    const auto processed = [&](const SnippetClipboardVariable& variable) {
+        const AttributedString rich =
+            processClipboardVariable(variable, AttributedString(u"up"), reports.environment(), timeLeft);
+        EXPECT_EQ(processClipboardVariable(variable, rich.string(), reports.environment(), timeLeft), rich.string());
+        return toUtf8(rich.string());
+    };
+    EXPECT_EQ(processed(variable(u"u", u"x", 0)), "xp");
+    EXPECT_EQ(processed(variable(u"u", u"x", 1)), "up");
+    EXPECT_EQ(processed(variable(u"u", u"x", 2)), "up");
+    EXPECT_EQ(reports.sentences().size(), 1U);
+}
+
+TEST(ClipboardReplacement, HoldsAnExpansionUpNoLongerForManyPatternsThatExplode) {
+    ContentWorld world;
+    world.pasteboard.plainText = std::string(5'000, 'a') + "b";
+    std::string content;
+    std::string unchanged;
+    for (int i = 0; i < 30; ++i) {
+        content += "【clipboard find:(a+)+" + std::to_string(i) + "$ flags:1】";
+        unchanged += *world.pasteboard.plainText;
+    }
+    for (const ContentType type : {ContentType::PlainText, ContentType::RichText}) {
+        const auto start = std::chrono::steady_clock::now();
+        const auto expansion = world.expand(content, type);
+        EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2));
+        EXPECT_EQ(toUtf8(expansion->string()), unchanged);
+    }
+    EXPECT_GE(world.reports.size(), 30U);
 }
 
 TEST(ClipboardReplacement, FindsLiteralTextInLinearTime) {
@@ -158,9 +210,8 @@ TEST(ClipboardReplacement, RefusesResultsThatGrowWithoutMeasure) {
     for (int i = 0; i < 4'000; ++i) copies += u"$0";
     const std::u16string content(100'000, u'a');
     Reports reports;
-    EXPECT_EQ(processClipboardVariable(variable(u".*grow|.+", copies, 1), content, reports.environment()), content);
-    EXPECT_EQ(processClipboardVariable(variable(u"a", std::u16string(10'000, u'x'), 0), content, reports.environment()),
-              content);
+    EXPECT_EQ(process(variable(u".*grow|.+", copies, 1), content, reports.environment()), content);
+    EXPECT_EQ(process(variable(u"a", std::u16string(10'000, u'x'), 0), content, reports.environment()), content);
     EXPECT_EQ(reports.sentences().size(), 2U);
 }
 
@@ -170,10 +221,8 @@ TEST(ClipboardReplacement, GivesTheReplacementTheLookOfWhatItReplaces) {
     content.append(u" three", size(3));
     AttributedString expected(u"one ", size(1));
     expected.append(u"zwei drei", size(2));
-    EXPECT_EQ(processClipboardVariable(variable(u"two three", u"zwei drei", 0), content, ContentEnvironment()),
-              expected);
-    EXPECT_EQ(processClipboardVariable(variable(u"(two) three", u"zwei drei", 1), content, ContentEnvironment()),
-              expected);
+    EXPECT_EQ(process(variable(u"two three", u"zwei drei", 0), content, ContentEnvironment()), expected);
+    EXPECT_EQ(process(variable(u"(two) three", u"zwei drei", 1), content, ContentEnvironment()), expected);
 }
 
 TEST(ClipboardReplacement, GivesTextAtAnEmptyMatchTheLookOfWhatStandsBefore) {
@@ -181,15 +230,14 @@ TEST(ClipboardReplacement, GivesTextAtAnEmptyMatchTheLookOfWhatStandsBefore) {
     content.append(u"cd", size(2));
     AttributedString expected(u"ab|", size(1));
     expected.append(u"cd", size(2));
-    EXPECT_EQ(processClipboardVariable(variable(u"(?=c)", u"|", 1), content, ContentEnvironment()), expected);
+    EXPECT_EQ(process(variable(u"(?=c)", u"|", 1), content, ContentEnvironment()), expected);
 }
 
 TEST(ClipboardReplacement, PutsNoFileBehindTextThatReplacesOne) {
     TextAttributes file;
     file.attachment = std::make_shared<const TextAttachment>(TextAttachment{u"a.png", "bytes", u""});
     const AttributedString content(u"\uFFFC", std::make_shared<const TextAttributes>(file));
-    EXPECT_EQ(processClipboardVariable(variable(u"\uFFFC", u"x", 0), content, ContentEnvironment()),
-              AttributedString(u"x"));
+    EXPECT_EQ(process(variable(u"\uFFFC", u"x", 0), content, ContentEnvironment()), AttributedString(u"x"));
 }
 
 TEST(ClipboardReplacement, RewritesRichTextOfManyRuns) {
@@ -200,8 +248,8 @@ TEST(ClipboardReplacement, RewritesRichTextOfManyRuns) {
         content.append(u"ab", look);
         expected.append(u"xyb", look);
     }
-    EXPECT_EQ(processClipboardVariable(variable(u"a", u"xy", 1), content, ContentEnvironment()), expected);
-    EXPECT_EQ(processClipboardVariable(variable(u"a", u"xy", 0), content, ContentEnvironment()), expected);
+    EXPECT_EQ(process(variable(u"a", u"xy", 1), content, ContentEnvironment()), expected);
+    EXPECT_EQ(process(variable(u"a", u"xy", 0), content, ContentEnvironment()), expected);
 }
 
 RC_GTEST_PROP(ClipboardReplacement, SaysTheSameInRichAndInPlainText, ()) {
@@ -211,9 +259,8 @@ RC_GTEST_PROP(ClipboardReplacement, SaysTheSameInRichAndInPlainText, ()) {
     for (std::size_t i = 0; i < pieces.size(); ++i) content.append(fromUtf8(pieces[i]), size(static_cast<double>(i)));
     const auto find = fromUtf8(*rc::gen::nonEmpty(texts));
     const auto pattern = variable(find, u"<>", *rc::gen::inRange(0, 16));
-    const AttributedString result = processClipboardVariable(pattern, content, ContentEnvironment());
-    RC_ASSERT(toUtf8(result.string()) ==
-              toUtf8(processClipboardVariable(pattern, content.string(), ContentEnvironment())));
+    const AttributedString result = process(pattern, content, ContentEnvironment());
+    RC_ASSERT(toUtf8(result.string()) == toUtf8(process(pattern, content.string(), ContentEnvironment())));
 }
 
 }  // namespace

@@ -94,7 +94,7 @@ std::size_t InPlaceModel::replace(InPlaceExpansion& expansion, const Range& rang
     }
     if (const auto clipboard = as<SnippetClipboardVariable>(variable)) {
         auto value = environment_.pasteboard->string();
-        if (value) value = processClipboardVariable(*clipboard, *value, environment_);
+        if (value) value = processClipboardVariable(*clipboard, *value, environment_, patternTimeLeft_);
         return clipboard->isOptional ? putInField(expansion, range, *clipboard, {value}, true)
                                      : putIn(expansion, range, value.value_or(u""));
     }

@@ -41,6 +41,7 @@ class InPlaceModel {
     std::shared_ptr<Snippet> snippet_;
     const SnippetParser::Groups& groups_;
     std::size_t left_;
+    std::chrono::nanoseconds patternTimeLeft_ = SnippetParser::MaximumPatternTime;
 };
 
 }  // namespace plume
