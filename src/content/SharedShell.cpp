@@ -78,13 +78,16 @@ Result<SharedShell::Task> SharedShell::prepare(std::string_view script) {
                 toUtf8(Uuid::random().toString())};
 }
 
-// "command" keeps the shell alive when the script has a syntax error, which would otherwise end it; the backslash
-// guards against aliases. Everything is on one line, which the shell has read to its end before it runs any of it:
-// nothing that the script does can keep the end marker from being written, short of ending or stopping the shell.
+// "command" keeps the shell alive when the script has a syntax error, which would otherwise end it. A function of that
+// name would run in its place: "unset", which no function replaces, takes it away first. The backslashes guard against
+// aliases. Everything is on one line, which the shell has read to its end before it runs any of it: what a script does
+// keeps the end marker from being written only when it ends or stops the shell, or, where the shell is bash, makes such
+// a function read-only. A script that no marker ends runs into its time limit, and the next one has a new shell.
 Result<void> SharedShell::hand(const Task& task, const ScriptWatch& watch) {
-    const std::string line = "\\command . " + quoted(task.file->path()) + " </dev/null >" +
-                             quoted(task.output->path()) + " 2>" + quoted(task.error->path()) +
-                             "; \\command printf '%s\\n' " + quoted(task.endMarker) + "\n";
+    const std::string command = "\\unset -f command; \\command ";
+    const std::string line = command + ". " + quoted(task.file->path()) + " </dev/null >" +
+                             quoted(task.output->path()) + " 2>" + quoted(task.error->path()) + "; " + command +
+                             "printf '%s\\n' " + quoted(task.endMarker) + "\n";
     if (shell_ && shell_->exitStatus()) shell_.reset();
     if (shell_ && shell_->write(line, watch.deadline())) return {};
     shell_.reset();

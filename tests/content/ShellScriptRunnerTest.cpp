@@ -189,12 +189,14 @@ TEST_F(ShellScriptRunnerTest, ASyntaxErrorTellsItsMessageAndTheShellGoesOn) {
 }
 
 TEST_F(ShellScriptRunnerTest, ScriptsCannotDisturbHowTheNextOneIsRead) {
-    for (const char* disturbance : {"alias command=false printf=false; alias .=false", "set -f; IFS=/; set -C",
-                                    "set -v", "set -x", "exec >&-", "exec 0<&- 1>&- 2>&-", "trap 'echo trap' EXIT",
-                                    "PATH=/nowhere", "exec 3>/dev/null 4>/dev/null 9>/dev/null"}) {
+    for (const char* disturbance :
+         {"alias command=false printf=false; alias .=false", "set -f; IFS=/; set -C", "set -v", "set -x", "exec >&-",
+          "exec 0<&- 1>&- 2>&-", "trap 'echo trap' EXIT", "PATH=/nowhere", "command() { :; }", "printf() { :; }",
+          "exec 3>/dev/null 4>/dev/null 9>/dev/null"}) {
         run(disturbance);
         EXPECT_EQ(run("echo fine"), "fine") << disturbance;
     }
+    EXPECT_THAT(reports_, IsEmpty());
 }
 
 TEST_F(ShellScriptRunnerTest, AShellThatEndedIsStartedAgain) {
