@@ -11,8 +11,25 @@ namespace plume {
 
 namespace {
 
+constexpr std::string_view BashLine = "#!/bin/bash";
+
+// A bash that is not there cannot run anything: its scripts are tried with what is.
+bool shUnderstandsBash() {
+    static const bool understands = [] {
+        std::error_code problem;
+        return std::filesystem::equivalent("/bin/sh", "/bin/bash", problem) || problem;
+    }();
+    return understands;
+}
+
+bool asksForBash(std::string_view script) {
+    if (!script.starts_with(BashLine)) return false;
+    return script.size() == BashLine.size() || std::string_view(" \t\n").find(script[BashLine.size()]) != script.npos;
+}
+
 bool belongsToSharedShell(std::string_view script) {
-    return !script.starts_with("#!") || script.starts_with("#!/bin/sh") || script.starts_with("#!/bin/bash");
+    if (asksForBash(script)) return shUnderstandsBash();
+    return !script.starts_with("#!") || script.starts_with("#!/bin/sh") || script.starts_with(BashLine);
 }
 
 std::string secondsInWords(double seconds) {

@@ -16,7 +16,8 @@
 namespace plume {
 
 // Made by the composition root and kept for the application's life. Shell scripts share one shell and wait for each
-// other; a script with a process of its own waits for nobody. A script that runs into a limit is ended with everything
+// other; a script with a process of its own waits for nobody. A script that asks for bash has its own where the shared
+// shell, which is /bin/sh, is another one. A script that runs into a limit is ended with everything
 // it started, and delivers what it had written until then when the limit was its time. Its limits count from its start.
 class ShellScriptRunner final : public ScriptRunner {
   public:

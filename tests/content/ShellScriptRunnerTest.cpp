@@ -175,7 +175,23 @@ TEST_F(ShellScriptRunnerTest, TheSharedShellRemembers) {
     EXPECT_EQ(run("cd /usr/bin; name=value; greet() { echo \"hello $1\"; }; umask 027"), "(nothing)");
     EXPECT_EQ(run("pwd; echo $name; greet you; umask"), "/usr/bin\nvalue\nhello you\n0027");
     const std::string shell = run("echo $$");
-    EXPECT_EQ(run("#!/bin/bash\necho $$"), shell);
+    EXPECT_EQ(run("#!/bin/sh\necho $$"), shell);
+    EXPECT_EQ(run("#!/bin/bashful\necho $$"), shell);
+    EXPECT_EQ(run("#!/bin/bash\necho $$") == shell, fs::equivalent("/bin/sh", "/bin/bash"));
+}
+
+TEST_F(ShellScriptRunnerTest, BashScriptsSpeakBash) {
+    const ScriptCase cases[] = {
+        {"an array", "#!/bin/bash\nwords=(one two); echo ${words[1]} ${#words[@]}", "two 2"},
+        {"a condition", "#!/bin/bash\n[[ abc == a* ]] && echo yes", "yes"},
+        {"an option", "#!/bin/bash -e\necho a; false; echo b", "a"},
+        {"a blank after it", "#!/bin/bash \necho ${BASH_VERSION:+bash}", "bash"},
+        {"a tab after it", "#!/bin/bash\t\necho ${BASH_VERSION:+bash}", "bash"},
+        {"input is empty", "#!/bin/bash\ncat; echo end", "end"},
+    };
+    for (const ScriptCase& c : cases) EXPECT_EQ(run(c.script), c.output) << c.name;
+    EXPECT_EQ(run("#!/bin/bash"), "(nothing)");
+    EXPECT_THAT(reports_, IsEmpty());
 }
 
 TEST_F(ShellScriptRunnerTest, ASyntaxErrorTellsItsMessageAndTheShellGoesOn) {
