@@ -180,7 +180,7 @@ class Examination {
     void examineScripts() {
         std::error_code problem;
         if (std::filesystem::exists("/bin/bash", problem)) return good("scripts", "shell scripts can run");
-        warn("scripts", "there is no /bin/bash, so snippets that are shell scripts do not work; install bash.");
+        warn("scripts", "there is no /bin/bash, so shell scripts that are written for it may not work; install bash.");
     }
 
     void examineConflicts() {
