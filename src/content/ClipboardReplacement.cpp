@@ -238,7 +238,8 @@ class LiteralReplacement {
 // As PatternReplacement::visit.
 std::string visitPattern(const SnippetClipboardVariable& variable, std::u16string_view content,
                          std::chrono::nanoseconds& timeLeft, const Visitor& visitor) {
-    if (timeLeft <= timeLeft.zero()) return "is not searched for, because others have taken too much time";
+    if (timeLeft <= std::chrono::nanoseconds::zero())
+        return "is not searched for, because others have taken too much time";
     const Clock::time_point start = Clock::now();
     const Clock::time_point deadline = start + std::min<Clock::duration>(TimeLimit, timeLeft);
     std::string problem = PatternReplacement(variable, content, deadline).visit(visitor);

@@ -24,7 +24,8 @@ bool shUnderstandsBash() {
 
 bool asksForBash(std::string_view script) {
     if (!script.starts_with(BashLine)) return false;
-    return script.size() == BashLine.size() || std::string_view(" \t\n").find(script[BashLine.size()]) != script.npos;
+    const std::string_view rest = script.substr(BashLine.size());
+    return rest.empty() || rest.find_first_of(" \t\n") == 0;
 }
 
 bool belongsToSharedShell(std::string_view script) {

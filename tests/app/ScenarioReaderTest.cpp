@@ -123,8 +123,8 @@ TEST(ScenarioPlayer, FillsFormsInWhereRichTextStood) {
         {"abbreviation": "nn", "contentType": 1, "rtf": "{\\rtf1\\ansi \\b old\\b0 }"},
         {"abbreviation": "q", "contentType": 1,
          "rtf": "{\\rtf1\\ansi A \\u12304 ?snippet:nn optional:1\\u12305 ? B}"}]}], )";
-    for (const auto& [form, text] : {std::pair("\"#0\": \"EDITED\"", "A EDITED B"),
-                                     std::pair("\"#0\": \"old\"", "A old B"), std::pair("", "A old B")}) {
+    for (const auto& [form, text] : {std::pair(R"("#0": "EDITED")", "A EDITED B"),
+                                     std::pair(R"("#0": "old")", "A old B"), std::pair("", "A old B")}) {
         const std::string rest = std::string(R"("steps": [{"type": "q"}, {"form": {)") + form +
                                  R"(}}], "expect": {"text": ")" + text + "\"}}";
         EXPECT_EQ(simulated(library + rest).problems, "") << form;
