@@ -104,7 +104,8 @@ class Search final : public AbbreviationIndex::Visitor {
     void visit(const Candidate& candidate) override {
         const SnippetGroup& group = *candidate.group->group;
         if (way_ == Trigger::Delimiter && !matcher_.delimitersOf(group).contains(trigger_)) return;
-        if (!isUpToDate(candidate) || !(*candidate.snippet)->hasContent() || !isActive(group.availability(), context_)) return;
+        if (!isUpToDate(candidate) || !(*candidate.snippet)->hasContent() || !isActive(group.availability(), context_))
+            return;
         const bool matches = candidate.group->prefix.empty() ? matchesPlain(matcher_, candidate, text_)
                                                              : matchesPrefixed(matcher_, candidate, text_);
         if (matches) found_.push_back({candidate, text_.substr(text_.size() - candidate.length)});

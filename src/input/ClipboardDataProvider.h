@@ -66,8 +66,8 @@ class ClipboardDataProvider final : public PasteboardOwner {
     std::map<std::string, std::string, std::less<>> backupData_;
     std::optional<std::vector<std::string>> types_;
     std::int64_t backupChangeCount_ = 0;  // the clipboard's when the content was remembered
-    bool providedData_ = false;       // the expansion was read
-    bool restoresWhenTaken_ = false;  // a restore is due as soon as it was
+    bool providedData_ = false;           // the expansion was read
+    bool restoresWhenTaken_ = false;      // a restore is due as soon as it was
     bool provideBackupData_ = false;
     RunLoop::CallId pendingRestore_ = 0;
 };

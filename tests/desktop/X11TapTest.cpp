@@ -642,7 +642,8 @@ TEST_F(X11TapTest, HearsClicks) {
     await("they are heard", [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() >= 3; }); });
     tap_->call([](Parts& parts) { parts.mouse->remove(); });
     rig_->click(1, 1);
-    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }), (std::vector<Point>{{201, 300}, {202, 300}, {203, 300}}));
+    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }),
+              (std::vector<Point>{{201, 300}, {202, 300}, {203, 300}}));
 }
 
 }  // namespace
