@@ -106,8 +106,8 @@ void SendingPipeline::onScriptExecuted(EngineState& engine, const PLScript& scri
     output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(*script.result);
     surroundings_.inputService.sendOutput(output);
     playFeedback(feedbackSound_);
-    // What was typed while the script ran stands in front of its output.
-    engine.setLetters(u"");
+    // What was typed while the script ran stands in front of its output, and the kept delimiter behind it.
+    engine.setLetters(script.suffix.value_or(u""));
 }
 
 // ---- Where and when things run ----

@@ -638,12 +638,16 @@ TEST_F(X11TapTest, HearsClicks) {
         [&](Parts& parts) { return parts.mouse->create([&](Point location) { clicks.push_back(location); }); });
     ASSERT_TRUE(created.ok());
     constexpr int wheel = 4;
-    for (const int button : {1, wheel, 2, 3}) rig_->click(200 + button, 300, button);
-    await("they are heard", [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() >= 3; }); });
+    std::vector<Point> expected;
+    for (const int button : {1, wheel, 2, 3}) {
+        rig_->click(200 + button, 300, button);
+        if (button != wheel) expected.push_back({200.0 + button, 300});
+        await("it is heard",
+              [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() >= expected.size(); }); });
+    }
     tap_->call([](Parts& parts) { parts.mouse->remove(); });
     rig_->click(1, 1);
-    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }),
-              (std::vector<Point>{{201, 300}, {202, 300}, {203, 300}}));
+    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }), expected);
 }
 
 }  // namespace
