@@ -50,6 +50,12 @@ class Crash : public Robustness {
         EXPECT_TRUE(expansion.isRight) << expansion.got << '\n' << log();
     }
 
+    static bool expandsWithin(TargetProgram& target, const Sample& sample, Milliseconds bound) {
+        target.clear();
+        rig_->keyboard().type(sample.abbreviation);
+        return target.awaitText(sample.content, bound) == sample.content;
+    }
+
     // Sets a long expansion off with Shift held, which is put aside while it is typed. Both keys stay down.
     static void startExpansionWithShift(TargetProgram& target) {
         target.clear();
@@ -110,6 +116,8 @@ TEST_F(Crash, StoppedForFiveSeconds) {
     EXPECT_TRUE(waitUntil([] { return log().find("Event tap was disabled by timeout") != std::string::npos; }, Bound))
         << log();
     expectKeyboardAtRest(*target);
+    // The keyboard is taken a while after the message.
+    EXPECT_TRUE(waitUntil([&] { return expandsWithin(*target, ShortMixed, Milliseconds(500)); }, Bound)) << log();
     expectExpands(*target, LongMixed);
     expectExpands(*target, ShortMixed);
 }
