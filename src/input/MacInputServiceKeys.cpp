@@ -60,9 +60,13 @@ void MacInputService::readKey(const TapEvent& event, ZDKeyEventArgs& key) const 
     } else if (!event.composing) {
         key.s = stringForKeyCode(event.keyCode, event.flags);
     }
-    // A command is told by the character on its key.
-    const auto named = event.command && !key.s ? stringForKeyCode(event.keyCode, 0) : key.s;
-    if (named && !named->empty()) key.c = named->front();
+    if (key.s && !key.s->empty()) {
+        key.c = key.s->front();
+    } else if (event.command) {
+        // It is told by the character on its key.
+        const auto name = stringForKeyCode(event.keyCode, 0);
+        if (name && !name->empty()) key.c = name->front();
+    }
 }
 
 bool MacInputService::keyUp(const ZDKeyEventArgs& key) {

@@ -83,20 +83,4 @@ TEST(FormModel, HandsOverWhatItShows) {
     EXPECT_TRUE(optional->isSelected);
 }
 
-TEST(FormModel, HandsOverRichTextOnlyWhereNothingElseWasTyped) {
-    const auto untouched = field(u"", FieldType::Singleline, u"Jo");
-    const auto edited = field(u"", FieldType::Singleline, u"Jo");
-    const auto unfilled = field(u"", FieldType::Singleline, u"");
-    unfilled->value.reset();
-    for (const auto& variable : {untouched, edited, unfilled}) variable->richTextValue = AttributedString(u"Jo");
-    FormModel model(contentWith({untouched, edited, unfilled}), "");
-    ASSERT_TRUE(model.fill(0, u"Jo").ok());
-    ASSERT_TRUE(model.fill(1, u"Ada").ok());
-    model.accept();
-    EXPECT_TRUE(untouched->richTextValue);
-    EXPECT_FALSE(edited->richTextValue);
-    EXPECT_TRUE(unfilled->richTextValue);
-    EXPECT_EQ(unfilled->value, u"");
-}
-
 }  // namespace plume

@@ -6,14 +6,23 @@
 
 namespace plume {
 
+namespace {
+
+bool isControl(char32_t character) {
+    return character < U' ' || character == 0x7F;
+}
+
+}  // namespace
+
 void KeyText::assignKey(xkb_state& state, xcb_keycode_t keycode, bool alt) {
     clear();
     char32_t character = xkb_state_key_get_utf32(&state, keycode);
-    // With Control some digits are control characters, an inheritance of terminals.
-    const xkb_keysym_t symbol = xkb_state_key_get_one_sym(&state, keycode);
-    if (symbol >= XKB_KEY_0 && symbol <= XKB_KEY_9) character = symbol;
-    const bool control = character < U' ' || character == 0x7F;
-    if (character != 0 && (control || !alt)) append(character);
+    if (isControl(character)) {
+        // With Control some digits are control characters, too, an inheritance of terminals.
+        const xkb_keysym_t symbol = xkb_state_key_get_one_sym(&state, keycode);
+        if (symbol >= XKB_KEY_0 && symbol <= XKB_KEY_9) character = symbol;
+    }
+    if (character != 0 && (isControl(character) || !alt)) append(character);
 }
 
 void KeyText::assign(std::string_view utf8) {

@@ -118,16 +118,6 @@ TEST(Expand, SaysWhatItCannotDo) {
     EXPECT_THAT(unknown.error, HasSubstr("\"nothing\""));
 }
 
-TEST(Expand, WritesDatesAsTheUserReadsThem) {
-    ProgramHome home;
-    home.set("LANG", "en_US.UTF-8");
-    home.set("LC_TIME", "de_DE.UTF-8");
-    const std::string library =
-        home.write("dates.json", R"([{"items": [{"abbreviation": "era", "content": "【date:G】 【time:G】"}]}])");
-    const ProgramResult result = home.run({"expand", "era", "--library", library});
-    EXPECT_EQ(result.output, "n. Chr. n. Chr.\n") << result.error;
-}
-
 TEST(Search, FindsEveryWordAnywhereInASnippet) {
     const ProgramHome home;
     const ProgramResult arrows = home.run({"search", "ARROW left"});

@@ -5,8 +5,8 @@
 
 namespace plume {
 
-// Returns when there is nothing to offer, or when somebody else holds the clipboard. Otherwise goes on in a process of
-// its own until something new is copied or the X server ends, and returns in the calling one at once.
+// Returns at once. What there is to offer is offered by a process of its own, which ends when somebody else holds the
+// clipboard, now or as soon as something new is copied, and with the X server.
 void offerClipboardLegacy(const std::string& display, int descriptor);
 
 }  // namespace plume
