@@ -72,15 +72,6 @@ TEST_P(DesktopTargetTest, LosesNoKeyWhenKeysRollOver) {
     EXPECT_EQ(target_->awaitText(text, Milliseconds(30'000)), text);
 }
 
-TEST_P(DesktopTargetTest, TypingSendsNoFocusEvents) {
-    FocusCounter counter(rig_->server().display(), target_->window());
-    rig_->keyboard().type("no focus event");
-    EXPECT_EQ(target_->awaitText("no focus event"), "no focus event");
-    EXPECT_EQ(counter.takeCore(), FocusCounter::Counts{});
-    EXPECT_EQ(counter.takeInputExtension(), FocusCounter::Counts{});
-    EXPECT_EQ(target_->focusChanges(), TargetProgram::FocusChanges{});
-}
-
 TEST_P(DesktopTargetTest, FocusThatGoesAndComesBackIsCounted) {
     FocusCounter counter(rig_->server().display(), target_->window());
     const auto other = rig_->startTarget(TargetKind::GtkTextView);
