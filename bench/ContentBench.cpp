@@ -4,11 +4,11 @@
 #include <string>
 
 #include "bench/Figures.h"
-#include "content/ShellScriptRunner.h"
 #include "content/SnippetDateTimeVariable.h"
 #include "content/SnippetParser.h"
+#include "content/scripts/ShellScriptRunner.h"
 #include "library/Snippet.h"
-#include "platform/desktop/PosixProcessLauncher.h"
+#include "ports/posix/PosixProcessLauncher.h"
 
 namespace plume::bench {
 namespace {

@@ -18,8 +18,8 @@
 
 #include "bench/Figures.h"
 #include "bench/PeerProgram.h"
-#include "tests/desktop/PlumeProgram.h"
-#include "tests/desktop/SelectionClients.h"
+#include "testing/rig/PlumeProgram.h"
+#include "testing/rig/SelectionClients.h"
 
 namespace plume::bench {
 

@@ -14,10 +14,10 @@
 
 #include "Foundation/Strings.h"
 #include "bench/Figures.h"
-#include "platform/x11/DesktopFiles.h"
-#include "platform/x11/X11ProcessManager.h"
-#include "tests/desktop/KeyboardPort.h"
-#include "tests/desktop/PlumeProgram.h"
+#include "ports/x11/windows/DesktopFiles.h"
+#include "ports/x11/windows/X11ProcessManager.h"
+#include "testing/rig/KeyboardPort.h"
+#include "testing/rig/PlumeProgram.h"
 
 namespace plume::bench {
 

@@ -6,7 +6,7 @@
 #include <fstream>
 #include <nlohmann/json.hpp>
 
-#include "tests/desktop/Deadline.h"
+#include "testing/rig/Deadline.h"
 
 namespace plume::bench {
 

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "tests/desktop/DesktopRig.h"
+#include "testing/rig/DesktopRig.h"
 
 namespace plume::bench {
 

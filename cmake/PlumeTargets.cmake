@@ -13,9 +13,9 @@ if(PLUME_SANITIZE)
   target_link_options(plume_options INTERFACE -fsanitize=${PLUME_SANITIZE})
 endif()
 
-# plume_library(<name> SOURCES <files…> SEES <libraries…>)
+# plume_add_library(<name> SOURCES <files…> SEES <libraries…>)
 # One library a folder. SEES lists the layers whose headers it may include; tools/check_layers.py holds it to that.
-function(plume_library name)
+function(plume_add_library name)
   cmake_parse_arguments(LIB "" "" "SOURCES;SEES" ${ARGN})
   add_library(${name} STATIC ${LIB_SOURCES})
   target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/src)

@@ -6,28 +6,50 @@ import sys
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent / "src"
 
-# Folder -> the folders whose headers it may include, besides its own. Lower layers never see higher ones.
+FOUNDATION = {"Foundation", "Foundation/archive", "Foundation/json", "Foundation/text"}
+CORE = FOUNDATION | {"platform", "library", "content", "content/scripts", "input", "engine"}
+X11 = {"ports/x11", "ports/x11/clipboard", "ports/x11/keyboard", "ports/x11/watchdog", "ports/x11/windows"}
+PORT = FOUNDATION | {"platform"}
+
+# Folder -> the folders whose headers it may include, besides its own. Lower layers never see higher ones. A folder that
+# is not named here belongs to the one that it lies in.
 MAY_SEE = {
     "Foundation": set(),
-    "platform": {"Foundation"},
-    "library": {"Foundation", "platform"},
-    "content": {"Foundation", "platform", "library"},
-    "input": {"Foundation", "platform", "library", "content"},
-    "engine": {"Foundation", "platform", "library", "content", "input"},
-    "platform/simulated": {"Foundation", "platform", "input"},
-    "platform/desktop": {"Foundation", "platform"},
-    "platform/x11": {"Foundation", "platform", "platform/desktop", "input"},
-    "app": {"Foundation", "platform", "library", "content", "input", "engine", "platform/simulated",
-            "platform/desktop", "platform/x11"},
+    "Foundation/text": {"Foundation"},
+    "Foundation/json": {"Foundation"},
+    "Foundation/archive": {"Foundation", "Foundation/text"},
+    "platform": {"Foundation", "Foundation/text"},
+    "ports/posix": PORT,
+    "ports/simulated": PORT,
+    "ports/atspi": PORT | {"ports/posix"},
+    "ports/x11": PORT | {"ports/posix"},
+    "ports/x11/windows": PORT | {"ports/posix", "ports/x11"},
+    "ports/x11/clipboard": PORT | {"ports/posix", "ports/x11"},
+    "ports/x11/keyboard": PORT | {"ports/posix", "ports/x11", "ports/x11/windows"},
+    "ports/x11/watchdog": PORT | {"ports/posix", "ports/x11", "ports/x11/clipboard", "ports/x11/keyboard"},
+    "library": FOUNDATION | {"platform"},
+    "content/scripts": {"Foundation", "platform"},
+    "content": FOUNDATION | {"platform", "library", "content/scripts"},
+    "input": FOUNDATION | {"platform", "library", "content"},
+    "engine": FOUNDATION | {"platform", "library", "content", "content/scripts", "input"},
+    "app": CORE,
+    "app/linux": CORE | X11 | {"app", "ports/posix", "ports/atspi"},
+    "scenario": CORE | {"app", "ports/simulated", "ports/posix"},
+    "app/cli": CORE | X11 | {"app", "app/linux", "scenario", "ports/posix", "ports/atspi"},
 }
 # Foreign headers by folder; everything else that is included with <…> is the standard library's or the system's.
 FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib|nlohmann/|canberra)")
-# Folder -> what of these it may include; the first entry holds everywhere.
+# Folder, with those inside it -> what of these it may include; the first entry holds everywhere.
 MAY_USE = {
     "": ("unicode/",),
-    "platform/x11": ("xcb/", "X11/", "xkbcommon/"),
-    "platform/desktop": ("canberra", "dbus"),
-    "app": ("CLI/", "nlohmann/", "xcb/"),
+    "ports/x11": ("xcb/", "X11/", "xkbcommon/"),
+    "ports/atspi": ("dbus",),
+    "ports/posix": ("canberra",),
+    "Foundation/json": ("nlohmann/",),
+    "library": ("nlohmann/",),
+    "scenario": ("nlohmann/",),
+    "app/linux": ("xcb/",),
+    "app/cli": ("CLI/", "nlohmann/", "xcb/"),
 }
 
 INCLUDE = re.compile(r'^\s*#\s*include\s+(["<])([^">]+)[">]')
@@ -38,6 +60,10 @@ def folder_of(path: str) -> str:
     while parts and "/".join(parts) not in MAY_SEE:
         parts.pop()
     return "/".join(parts)
+
+
+def foreign_headers_for(folder: str) -> tuple:
+    return sum((use for where, use in MAY_USE.items() if not where or (folder + "/").startswith(where + "/")), ())
 
 
 def faults_in(file: pathlib.Path):
@@ -52,7 +78,7 @@ def faults_in(file: pathlib.Path):
         kind, target = found.groups()
         where = f"{file.relative_to(ROOT.parent)}:{number}"
         if kind == "<":
-            if FOREIGN.match(target) and not target.startswith(MAY_USE[""] + MAY_USE.get(own, ())):
+            if FOREIGN.match(target) and not target.startswith(foreign_headers_for(own)):
                 yield f"{where}: <{target}> belongs to the ports and the application"
             continue
         seen = folder_of(target)

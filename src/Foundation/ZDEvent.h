@@ -1,7 +1,7 @@
 // A multicast event: components announce things through one, listeners are called in the order they registered.
 //
-// Owned by the component that raises it. Observers are not owned: an observer removes itself (removeObservers in its
-// destructor) before it goes away. Registering, removing and raising happen on one thread, the event's own. A handler
+// Owned by the component that raises it. Observers are not owned: each keeps the subscription that it was given, and is
+// not called once that is gone. Registering, removing and raising happen on one thread, the event's own. A handler
 // may add and remove handlers, itself included, while the event is raised: a removed one is not called any more, an
 // added one is called from the next raise on.
 #pragma once
@@ -11,6 +11,8 @@
 #include <functional>
 #include <memory>
 #include <vector>
+
+#include "Foundation/Subscription.h"
 
 namespace plume {
 
@@ -26,8 +28,10 @@ class ZDEvent {
 
     // `selector` is an operation of the observer that takes the argument.
     template <typename Observer>
-    void addObserver(Observer* observer, void (Observer::*selector)(Argument&)) {
-        handlers_.push_back(std::make_shared<MemberHandler<Observer>>(observer, selector));
+    [[nodiscard]] Subscription addObserver(Observer* observer, void (Observer::*selector)(Argument&)) {
+        const auto handler = std::make_shared<MemberHandler<Observer>>(observer, selector);
+        handlers_.push_back(handler);
+        return Subscription(std::shared_ptr<bool>(handler, &handler->removed));
     }
 
     // Removes the first handler with this observer and this operation, if there is one.
@@ -41,15 +45,9 @@ class ZDEvent {
         dropRemoved();
     }
 
-    // Removes every handler of this observer.
-    void removeObservers(const void* observer) {
-        for (const auto& handler : handlers_) {
-            if (handler->observer == observer) handler->removed = true;
-        }
-        dropRemoved();
+    bool isObserved() const {
+        return std::any_of(handlers_.begin(), handlers_.end(), [](const auto& handler) { return !handler->removed; });
     }
-
-    bool isObserved() const { return !handlers_.empty(); }
 
     // Calls every handler, on the caller's thread. Allocates nothing.
     void raise(Argument& argument) {

@@ -53,47 +53,47 @@ Factory orElse(const Factory& given, Factory fallback) {
 
 }  // namespace
 
-Composition::Composition(const Ports& ports, Surroundings surroundings)
+Composition::Composition(const Ports& ports, Dependencies dependencies)
     : ports_(ports),
-      surroundings_(std::move(surroundings)),
+      dependencies_(std::move(dependencies)),
       identifiers_(ports_.processManager),
-      scriptRunner_(ports_.processLauncher, surroundings_.report) {
+      scriptRunner_(ports_.processLauncher, dependencies_.report) {
     makeParts();
 }
 
 void Composition::makeParts() {
-    inputService_ = std::make_unique<MacInputService>(MacInputService::Surroundings{
+    inputService_ = std::make_unique<MacInputService>(MacInputService::Dependencies{
         ports_.keyboardTap, ports_.mouseTap, ports_.poster, ports_.pasteboard, ports_.processManager,
         ports_.inputSources, ports_.accessibility, ports_.secureInput, ports_.systemHotKeys, identifiers_,
-        ports_.tapLoop, ports_.mainLoop, surroundings_.log, surroundings_.vmHelper});
+        ports_.tapLoop, ports_.mainLoop, dependencies_.log, dependencies_.vmHelper});
 
     ContentEnvironment environment;
-    environment.timeZone = surroundings_.timeZone;
-    environment.locale = surroundings_.locale;
+    environment.timeZone = dependencies_.timeZone;
+    environment.locale = dependencies_.locale;
     environment.pasteboard = &inputService_->userPasteboard();
-    environment.report = surroundings_.report;
+    environment.report = dependencies_.report;
     parser_ = std::make_unique<SnippetParser>(std::move(environment));
 
-    sender_ = std::make_unique<SendingPipeline>(SendingPipeline::Surroundings{
+    sender_ = std::make_unique<SendingPipeline>(SendingPipeline::Dependencies{
         *inputService_, *parser_, scriptRunner_, &ports_.sounds,
-        orElse(surroundings_.makeFieldsEditor, windowlessFieldsEditors(surroundings_.report)), surroundings_.report});
-    corrector_ = std::make_unique<AutoCorrection>(AutoCorrection::Surroundings{
+        orElse(dependencies_.makeFieldsEditor, windowlessFieldsEditors(dependencies_.report)), dependencies_.report});
+    corrector_ = std::make_unique<AutoCorrection>(AutoCorrection::Dependencies{
         *inputService_, identifiers_, ports_.inputSources, ports_.accessibility, *sender_});
 
-    const SuggestionSource* source = surroundings_.suggestionSource;
+    const SuggestionSource* source = dependencies_.suggestionSource;
     using ListFactory = std::function<std::unique_ptr<SuggestionController>()>;
     using SearchFactory = std::function<std::unique_ptr<QuickSearchController>()>;
-    engine_ = std::make_unique<AutoText>(AutoText::Surroundings{
-        *inputService_, identifiers_, ports_.inputSources, surroundings_.settings, *sender_,
+    engine_ = std::make_unique<AutoText>(AutoText::Dependencies{
+        *inputService_, identifiers_, ports_.inputSources, dependencies_.settings, *sender_,
         source ? *source : NothingToSuggest, corrector_.get(),
-        orElse<ListFactory>(surroundings_.makeSuggestionController, &makeWindowlessSuggestionController),
-        orElse<SearchFactory>(surroundings_.makeQuickSearchController, &makeWindowlessQuickSearchController)});
+        orElse<ListFactory>(dependencies_.makeSuggestionController, &makeWindowlessSuggestionController),
+        orElse<SearchFactory>(dependencies_.makeQuickSearchController, &makeWindowlessQuickSearchController)});
 
     hotKeys_ = std::make_unique<HotKeyDispatch>(
         *inputService_, HotKeyDispatch::Actions{[this] {
                                                     engine_->setEnabled(!engine_->enabled());
-                                                    if (surroundings_.enabledChanged)
-                                                        surroundings_.enabledChanged(engine_->enabled());
+                                                    if (dependencies_.enabledChanged)
+                                                        dependencies_.enabledChanged(engine_->enabled());
                                                     ports_.sounds.play("Pop");
                                                 },
                                                 [this] { engine_->suggestAbbreviations(); },
@@ -108,7 +108,7 @@ Composition::~Composition() {
 }
 
 void Composition::loadPreferences() {
-    const UserDefaults& settings = surroundings_.settings;
+    const UserDefaults& settings = dependencies_.settings;
     engine_->setEnabled(settings.boolForKey("IsEnabled"));
     applyTo(*corrector_, settings);
     sender_->setPlayFeedbackSound(settings.boolForKey("PlayFeedbackSound"));
@@ -118,8 +118,8 @@ void Composition::loadPreferences() {
 }
 
 void Composition::start() {
-    if (const Result<void> registered = hotKeys_->registerHotKeys(surroundings_.settings); !registered) {
-        surroundings_.report(registered.error().message);
+    if (const Result<void> registered = hotKeys_->registerHotKeys(dependencies_.settings); !registered) {
+        dependencies_.report(registered.error().message);
     }
     inputService_->enableEvents();
 }

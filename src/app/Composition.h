@@ -10,8 +10,8 @@
 #include <string>
 
 #include "app/HotKeyDispatch.h"
-#include "content/ShellScriptRunner.h"
 #include "content/SnippetParser.h"
+#include "content/scripts/ShellScriptRunner.h"
 #include "engine/AutoCorrection.h"
 #include "engine/AutoText.h"
 #include "engine/SendingPipeline.h"
@@ -43,7 +43,7 @@ class Composition {
     };
 
     // What the program around it gives; what is empty or null is done without.
-    struct Surroundings {
+    struct Dependencies {
         // Outlives the composition.
         const UserDefaults& settings;
         // Tells the user, in one sentence. Never empty.
@@ -64,7 +64,7 @@ class Composition {
         std::function<void(bool enabled)> enabledChanged = {};
     };
 
-    Composition(const Ports& ports, Surroundings surroundings);
+    Composition(const Ports& ports, Dependencies dependencies);
     // Ends scripts that run.
     ~Composition();
     Composition(const Composition&) = delete;
@@ -87,7 +87,7 @@ class Composition {
     void makeParts();
 
     const Ports ports_;
-    const Surroundings surroundings_;
+    const Dependencies dependencies_;
     BundleIdentifierResolver identifiers_;
     ShellScriptRunner scriptRunner_;
     std::unique_ptr<MacInputService> inputService_;

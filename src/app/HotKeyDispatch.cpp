@@ -36,11 +36,10 @@ std::optional<GeneralHotKey> HotKeyDispatch::hotKeyIn(const UserDefaults& settin
 
 HotKeyDispatch::HotKeyDispatch(MacInputService& inputService, Actions actions)
     : inputService_(inputService), actions_(std::move(actions)) {
-    inputService_.hotKeysPressed.addObserver(this, &HotKeyDispatch::onMacInputServiceHotKeysPressed);
+    hotKeysPressed_ = inputService_.hotKeysPressed.addObserver(this, &HotKeyDispatch::onMacInputServiceHotKeysPressed);
 }
 
 HotKeyDispatch::~HotKeyDispatch() {
-    inputService_.hotKeysPressed.removeObservers(this);
     for (const auto& [command, hotKey] : hotKeys_) inputService_.unregisterHotKey(hotKey);
     // An empty hot key takes the system's place for it away.
     static_cast<void>(inputService_.registerSystemHotKey(SystemQuickSearchId, {}, [] {}));

@@ -51,6 +51,7 @@ class HotKeyDispatch {
     std::optional<bool> perform(Command command);
 
     MacInputService& inputService_;
+    Subscription hotKeysPressed_;
     const Actions actions_;
     std::vector<std::pair<Command, GeneralHotKey>> hotKeys_;
 };

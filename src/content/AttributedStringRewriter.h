@@ -3,7 +3,7 @@
 
 #include <string_view>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 
 namespace plume {
 

@@ -4,7 +4,7 @@
 #include <chrono>
 #include <string>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/ContentEnvironment.h"
 #include "content/SnippetVariable.h"
 

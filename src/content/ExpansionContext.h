@@ -8,7 +8,7 @@
 #include <string>
 #include <unordered_map>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/ContentEnvironment.h"
 #include "content/SnippetParser.h"
 #include "content/SnippetVariable.h"

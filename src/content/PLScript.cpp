@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "content/ScriptRunner.h"
+#include "content/scripts/ScriptRunner.h"
 
 namespace plume {
 

@@ -7,7 +7,7 @@
 #include <memory>
 #include <string_view>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/ExpansionContext.h"
 #include "content/SnippetExpandedContent.h"
 

@@ -8,7 +8,7 @@
 #include <string_view>
 #include <vector>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/ExpansionContext.h"
 #include "content/SnippetExpandedContent.h"
 #include "content/SnippetVariable.h"

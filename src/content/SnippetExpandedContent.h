@@ -7,7 +7,7 @@
 #include <variant>
 #include <vector>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/SnippetVariable.h"
 
 namespace plume {

@@ -9,8 +9,8 @@
 #include <string>
 #include <vector>
 
-#include "Foundation/AttributedString.h"
 #include "Foundation/Date.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/ContentEnvironment.h"
 #include "content/PLScript.h"
 #include "content/SnippetExpandedContent.h"

@@ -12,7 +12,7 @@
 #include <optional>
 #include <string>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 
 namespace plume {
 

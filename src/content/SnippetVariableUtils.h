@@ -6,7 +6,7 @@
 #include <string>
 #include <string_view>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "content/SnippetVariable.h"
 
 namespace plume {

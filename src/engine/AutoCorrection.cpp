@@ -34,8 +34,8 @@ bool startsWord(char16_t before) {
 
 }  // namespace
 
-AutoCorrection::AutoCorrection(Surroundings surroundings)
-    : surroundings_(surroundings),
+AutoCorrection::AutoCorrection(Dependencies dependencies)
+    : dependencies_(dependencies),
       autocorrectGroup_(SnippetGroup::make()),
       autocorrectSnippet_(std::make_shared<Snippet>()) {
     autocorrectGroup_->setExpandTrigger(ExpandTrigger::DelimiterKept);
@@ -52,19 +52,19 @@ void AutoCorrection::autoCorrect(EngineState& engine, ZDKeyEventArgs& event, std
         return;
     }
     if (!isAllowedHere()) return;
-    const auto text = AXUtils::getTextBeforeCaretWithMaxLength(surroundings_.accessibility, AskedContext);
+    const auto text = AXUtils::getTextBeforeCaretWithMaxLength(dependencies_.accessibility, AskedContext);
     if (!text || text->empty()) return;
     const std::optional<std::u16string> corrected = capitalize(*text + *event.s);
     if (corrected) send(engine, event, text->back(), *corrected);
 }
 
 bool AutoCorrection::isAllowedHere() {
-    InputService& service = surroundings_.inputService;
+    InputService& service = dependencies_.inputService;
     if (service.refreshContextInputSetting()->has(InputFlag::DisableCapitalization)) return false;
     const auto& application =
-        surroundings_.bundleIdentifierResolver.getBundleIdentifier(service.lastProcessReceivedKeyEvent());
+        dependencies_.bundleIdentifierResolver.getBundleIdentifier(service.lastProcessReceivedKeyEvent());
     return autoCorrectAvailability_.admitsApplication(application) &&
-           autoCorrectAvailability_.admitsInputSource(surroundings_.inputSources.currentInputSourceIdentifier());
+           autoCorrectAvailability_.admitsInputSource(dependencies_.inputSources.currentInputSourceIdentifier());
 }
 
 void AutoCorrection::send(EngineState& engine, ZDKeyEventArgs& event, char16_t wrong, const std::u16string& corrected) {
@@ -72,7 +72,7 @@ void AutoCorrection::send(EngineState& engine, ZDKeyEventArgs& event, char16_t w
     autocorrectSnippet_->setAbbreviation(abbreviation);
     autocorrectSnippet_->setPlainTextContent(corrected);
     std::u16string letters = engine.letters();
-    event.cancel = surroundings_.sender.sendSnippet(engine, autocorrectSnippet_, abbreviation, SnippetTrigger::Typed);
+    event.cancel = dependencies_.sender.sendSnippet(engine, autocorrectSnippet_, abbreviation, SnippetTrigger::Typed);
     if (letters.size() >= 2) letters.replace(letters.size() - 2, 1, corrected);
     engine.setLetters(letters);
 }

@@ -24,7 +24,7 @@ namespace plume {
 class AutoCorrection final : public AutoCorrector {
   public:
     // Not owned, and outlives the corrector.
-    struct Surroundings {
+    struct Dependencies {
         InputService& inputService;
         BundleIdentifierResolver& bundleIdentifierResolver;
         const InputSources& inputSources;
@@ -33,7 +33,7 @@ class AutoCorrection final : public AutoCorrector {
     };
 
     // Starts with both corrections off.
-    explicit AutoCorrection(Surroundings surroundings);
+    explicit AutoCorrection(Dependencies dependencies);
 
     void autoCorrect(EngineState& engine, ZDKeyEventArgs& event, std::u16string_view context) override;
 
@@ -65,7 +65,7 @@ class AutoCorrection final : public AutoCorrector {
     bool endsWithExcludedAbbreviation(std::u16string_view text) const;
     void send(EngineState& engine, ZDKeyEventArgs& event, char16_t wrong, const std::u16string& corrected);
 
-    Surroundings surroundings_;
+    Dependencies dependencies_;
     bool capitalizeNewSentences_ = false;
     bool correctDoubleCapitals_ = false;
     PLFunctionAvailability autoCorrectAvailability_;

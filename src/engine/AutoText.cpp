@@ -24,39 +24,37 @@ bool contains(const Rectangle& frame, double x, double y) {
 // Where the last key went.
 class AutoText::LastKeyContext final : public MatchContext {
   public:
-    explicit LastKeyContext(const Surroundings& surroundings) : surroundings_(surroundings) {}
+    explicit LastKeyContext(const Dependencies& dependencies) : dependencies_(dependencies) {}
 
     const std::optional<std::u16string>& bundleIdentifier() const override {
-        return surroundings_.bundleIdentifierResolver.getBundleIdentifier(
-            surroundings_.inputService.lastProcessReceivedKeyEvent());
+        return dependencies_.bundleIdentifierResolver.getBundleIdentifier(
+            dependencies_.inputService.lastProcessReceivedKeyEvent());
     }
     const std::optional<std::u16string>& inputSourceIdentifier() const override {
-        return surroundings_.inputSources.currentInputSourceIdentifier();
+        return dependencies_.inputSources.currentInputSourceIdentifier();
     }
 
   private:
-    const Surroundings& surroundings_;
+    const Dependencies& dependencies_;
 };
 
-AutoText::AutoText(Surroundings surroundings)
-    : surroundings_(std::move(surroundings)),
+AutoText::AutoText(Dependencies dependencies)
+    : dependencies_(std::move(dependencies)),
       matcher_(defaultDelimiters()),
       snippetAdaptToAbbreviationCaseOption_(
-          surroundings_.userDefaults.integerForKey("SnippetAdaptToAbbreviationCaseOption")) {
+          dependencies_.userDefaults.integerForKey("SnippetAdaptToAbbreviationCaseOption")) {
     letters_.reserve(UsualBufferLength);
-    InputService& service = surroundings_.inputService;
-    service.keyDownEvent.addObserver(this, &AutoText::onSystemInputServiceKeyDown);
-    service.inputContextChangedEvent.addObserver(this, &AutoText::onSystemInputServiceInputContextChanged);
-    service.mouseDownEvent.addObserver(this, &AutoText::onSystemInputServiceMouseDown);
-    service.unregisteredHotKeyPressedEvent.addObserver(this, &AutoText::onSystemInputServiceUnregisteredHotKeyPressed);
+    InputService& service = dependencies_.inputService;
+    subscriptions_ = {
+        service.keyDownEvent.addObserver(this, &AutoText::onSystemInputServiceKeyDown),
+        service.inputContextChangedEvent.addObserver(this, &AutoText::onSystemInputServiceInputContextChanged),
+        service.mouseDownEvent.addObserver(this, &AutoText::onSystemInputServiceMouseDown),
+        service.unregisteredHotKeyPressedEvent.addObserver(this,
+                                                           &AutoText::onSystemInputServiceUnregisteredHotKeyPressed)};
 }
 
 AutoText::~AutoText() {
-    InputService& service = surroundings_.inputService;
-    service.keyDownEvent.removeObservers(this);
-    service.inputContextChangedEvent.removeObservers(this);
-    service.mouseDownEvent.removeObservers(this);
-    service.unregisteredHotKeyPressedEvent.removeObservers(this);
+    InputService& service = dependencies_.inputService;
     service.runLoop().cancel(scheduledList_);
     service.runLoop().cancel(scheduledSuggestion_);
 }
@@ -103,11 +101,11 @@ void AutoText::onSystemInputServiceMouseDown(ZDMouseEventArgs& event) {
 }
 
 void AutoText::expandAtHotkey() {
-    if (surroundings_.inputService.isSameProcess() || snippetQuickSearchWindowVisible()) return;
+    if (dependencies_.inputService.isSameProcess() || snippetQuickSearchWindowVisible()) return;
     std::vector<Match> matches = findSnippetsInLetters(letters_, 0, letters_);
     if (matches.size() == 1) {
         hideSnippetSuggestion();
-        surroundings_.sender.sendSnippet(*this, matches[0].first, matches[0].second, SnippetTrigger::HotKey);
+        dependencies_.sender.sendSnippet(*this, matches[0].first, matches[0].second, SnippetTrigger::HotKey);
     } else if (!matches.empty()) {
         offerMatches(std::move(matches));
     }
@@ -115,11 +113,11 @@ void AutoText::expandAtHotkey() {
 
 std::vector<AutoText::Match> AutoText::findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                                              std::u16string_view lettersWithoutSeparator) const {
-    return matcher_.findSnippetsInLetters(letters, trigger, lettersWithoutSeparator, LastKeyContext(surroundings_));
+    return matcher_.findSnippetsInLetters(letters, trigger, lettersWithoutSeparator, LastKeyContext(dependencies_));
 }
 
 AutoText::Groups AutoText::filteredGroupsByApplication() const {
-    const std::optional<std::u16string>& application = LastKeyContext(surroundings_).bundleIdentifier();
+    const std::optional<std::u16string>& application = LastKeyContext(dependencies_).bundleIdentifier();
     Groups admitted;
     std::copy_if(snippetGroups_.begin(), snippetGroups_.end(), std::back_inserter(admitted),
                  [&](const auto& group) { return group->availability().admitsApplication(application); });
@@ -127,7 +125,7 @@ AutoText::Groups AutoText::filteredGroupsByApplication() const {
 }
 
 void AutoText::sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet) {
-    surroundings_.sender.sendSnippet(*this, snippet, std::nullopt, SnippetTrigger::Direct);
+    dependencies_.sender.sendSnippet(*this, snippet, std::nullopt, SnippetTrigger::Direct);
 }
 
 }  // namespace plume

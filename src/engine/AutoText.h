@@ -5,6 +5,7 @@
 // whether the application gets the key. A key that completes nothing costs no copy of the buffer and no allocation.
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -13,6 +14,7 @@
 #include <string_view>
 #include <vector>
 
+#include "Foundation/Subscription.h"
 #include "engine/AutoCorrector.h"
 #include "engine/EngineState.h"
 #include "engine/QuickSearchController.h"
@@ -33,7 +35,7 @@ class AutoText final : public EngineState {
     using Match = SnippetMatcher::Match;
 
     // What the engine works with; not owned, and outlives it.
-    struct Surroundings {
+    struct Dependencies {
         InputService& inputService;
         BundleIdentifierResolver& bundleIdentifierResolver;
         const InputSources& inputSources;
@@ -47,7 +49,7 @@ class AutoText final : public EngineState {
     };
 
     // Starts disabled.
-    explicit AutoText(Surroundings surroundings);
+    explicit AutoText(Dependencies dependencies);
     ~AutoText();
     AutoText(const AutoText&) = delete;
     AutoText& operator=(const AutoText&) = delete;
@@ -86,7 +88,7 @@ class AutoText final : public EngineState {
     // Sends a snippet that was chosen without typing.
     void sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet);
     // Takes the last expansion back, for the hot keys that do that. False when there is nothing to take back.
-    bool undo(bool withTrigger) { return surroundings_.sender.undo(*this, withTrigger); }
+    bool undo(bool withTrigger) { return dependencies_.sender.undo(*this, withTrigger); }
 
     // ---- The list at the caret ----
     const SuggestionList& suggestions() const { return suggestions_; }
@@ -140,8 +142,9 @@ class AutoText final : public EngineState {
     void initSnippetQuickSearchController();
     void snippetQuickSearchSnippetSelectedAction();
 
-    Surroundings surroundings_;
+    Dependencies dependencies_;
     SnippetMatcher matcher_;
+    std::array<Subscription, 4> subscriptions_;
     Groups snippetGroups_;
     std::u16string letters_;
     std::optional<UndoInformation> undoInfo_;

@@ -21,7 +21,7 @@ bool isDigit(char16_t unit) {
 void AutoText::onSystemInputServiceKeyDown(ZDKeyEventArgs& event) {
     if (!enabled_) return;
     undoInfo_.reset();
-    if (surroundings_.inputService.isSameProcess()) return;
+    if (dependencies_.inputService.isSameProcess()) return;
     if (snippetQuickSearchWindowVisible()) {
         if (isSingleUnit(event.s)) processSelectorKey(event);
         return;
@@ -100,7 +100,7 @@ AutoText::Route AutoText::returnPressed(ZDKeyEventArgs& event) {
 }
 
 AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
-    if (surroundings_.inputService.keyModifier() != KeyModifier::Shift) return Route::Character;
+    if (dependencies_.inputService.keyModifier() != KeyModifier::Shift) return Route::Character;
     // Shift is the way to write an abbreviation out: the text is kept, nothing is looked for.
     if (event.s) letters_ += *event.s;
     return Route::Done;
@@ -114,7 +114,7 @@ std::optional<std::int32_t> AutoText::selectorModifiers() const {
 }
 
 void AutoText::processSelectorKey(ZDKeyEventArgs& event) {
-    const InputService& service = surroundings_.inputService;
+    const InputService& service = dependencies_.inputService;
     if (selectorModifiers() != service.keyModifier()) return;
 
     char16_t character = event.c;
@@ -165,7 +165,7 @@ void AutoText::processNormalKeyDown(ZDKeyEventArgs& event) {
 
 void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
     hideSnippetSuggestion();
-    event.cancel = surroundings_.sender.sendSnippet(*this, match.first, match.second, SnippetTrigger::Typed);
+    event.cancel = dependencies_.sender.sendSnippet(*this, match.first, match.second, SnippetTrigger::Typed);
     // The kept delimiter stands behind the expansion, in the text as in the buffer.
     const std::shared_ptr<SnippetGroup> group = match.first->parentGroup();
     if (group && group->expandTrigger() == ExpandTrigger::DelimiterKept) letters_ += *event.s;
@@ -176,15 +176,15 @@ void AutoText::offerMatches(std::vector<Match> matches) {
     for (Match& match : matches) suggestions_.append(std::move(match.first), std::move(match.second));
     selectingSnippet_ = true;
     // Not from inside the callback: the application has to get the key first.
-    RunLoop& loop = surroundings_.inputService.runLoop();
+    RunLoop& loop = dependencies_.inputService.runLoop();
     loop.cancel(scheduledList_);
-    scheduledList_ = loop.performAfterDelay(0, [this] { showSnippetSuggestion(); });
+    scheduledList_ = loop.schedule(0, [this] { showSnippetSuggestion(); });
 }
 
 void AutoText::keyCompletedNothing(ZDKeyEventArgs& event, std::size_t lengthBefore) {
-    if (surroundings_.autoCorrector) {
+    if (dependencies_.autoCorrector) {
         const std::u16string_view context = std::u16string_view(letters_).substr(0, lengthBefore);
-        surroundings_.autoCorrector->autoCorrect(*this, event, context);
+        dependencies_.autoCorrector->autoCorrect(*this, event, context);
     }
     if (selectingSnippet_) {
         hideSnippetSuggestion();

@@ -19,7 +19,7 @@ void AutoText::suggestAbbreviations() {
 void AutoText::refreshSuggestions() {
     suggestions_.clear();
     if (letters_.empty()) return;
-    surroundings_.suggestionSource.appendSuggestions(letters_, filteredGroupsByApplication(), suggestions_);
+    dependencies_.suggestionSource.appendSuggestions(letters_, filteredGroupsByApplication(), suggestions_);
 }
 
 void AutoText::showSnippetSuggestion() {
@@ -27,7 +27,7 @@ void AutoText::showSnippetSuggestion() {
     if (snippetSuggestionController_) {
         snippetSuggestionController_->reloadData();
     } else {
-        snippetSuggestionController_ = surroundings_.makeSuggestionController();
+        snippetSuggestionController_ = dependencies_.makeSuggestionController();
         snippetSuggestionController_->setSnippets(suggestions_);
         snippetSuggestionController_->setSuggestionSelectedAction([this] { snippetSuggestionSuggestionSelected(); });
         snippetSuggestionController_->setSnippetSelectorKeyModifier(snippetSelectorKeyModifier_);
@@ -70,12 +70,12 @@ void AutoText::sendSuggestionAtIndex(std::size_t index, std::uint32_t snippetTri
     const std::u16string typed = std::move(suggestions_.suggestionFilters[index]);
     hideSnippetSuggestion();
     const auto send = [this, snippet, typed, snippetTrigger] {
-        surroundings_.sender.sendSnippet(*this, snippet, typed, snippetTrigger);
+        dependencies_.sender.sendSnippet(*this, snippet, typed, snippetTrigger);
     };
-    InputService& service = surroundings_.inputService;
+    InputService& service = dependencies_.inputService;
     if (!losesKeysWhileActivated(service.contextBundleIdentifier())) return send();
     service.bringLastProcessToFront();
-    scheduledSuggestion_ = service.runLoop().performAfterDelay(ActivationDelay, send);
+    scheduledSuggestion_ = service.runLoop().schedule(ActivationDelay, send);
 }
 
 bool AutoText::snippetQuickSearchWindowVisible() const {
@@ -95,7 +95,7 @@ void AutoText::quickSearchAtTopRightCorner() {
 
 void AutoText::initSnippetQuickSearchController() {
     if (snippetQuickSearchController_) return;
-    snippetQuickSearchController_ = surroundings_.makeQuickSearchController();
+    snippetQuickSearchController_ = dependencies_.makeQuickSearchController();
     snippetQuickSearchController_->setSnippetGroups(snippetGroups_);
     snippetQuickSearchController_->setSnippetSelectedAction([this] { snippetQuickSearchSnippetSelectedAction(); });
     snippetQuickSearchController_->setSnippetSelectorKeyModifier(snippetSelectorKeyModifier_);

@@ -19,7 +19,7 @@ constexpr const char* FormSound = "Pop";
 
 void SendingPipeline::showFieldsEditor(EngineState& engine, const Expansion& content) {
     performAfterDelay(0, [this, &engine, content] {
-        const std::shared_ptr<FieldsEditor> editor = surroundings_.makeFieldsEditor(content, *this);
+        const std::shared_ptr<FieldsEditor> editor = dependencies_.makeFieldsEditor(content, *this);
         forms_.push_back({editor, &engine});
         playFeedback(FormSound);
         performAfterDelay(FormDelay, [form = std::weak_ptr(editor)] {
@@ -47,7 +47,7 @@ void SendingPipeline::fieldsEditorAction(FieldsEditor& editor) {
     if (form == forms_.end()) return;
     EngineState& engine = *form->engine;
     const Expansion& content = editor.content();
-    InputService& service = surroundings_.inputService;
+    InputService& service = dependencies_.inputService;
     if (!losesKeysWhileActivated(service.contextBundleIdentifier())) return fieldsEditorDidClose(engine, content);
     service.bringLastProcessToFront();
     performAfterDelay(ActivationDelay, [this, &engine, content] { fieldsEditorDidClose(engine, content); });
@@ -68,7 +68,7 @@ void SendingPipeline::fieldsEditorDidClose(EngineState& engine, const Expansion&
 
 void SendingPipeline::executeScripts(EngineState& engine, const Expansion& content) {
     performInBackground(
-        [&runner = surroundings_.scriptRunner, content] {
+        [&runner = dependencies_.scriptRunner, content] {
             for (const auto& script : content->scripts) script->execute(runner);
             SnippetParser::mergeScriptResults(*content);
         },
@@ -80,7 +80,7 @@ void SendingPipeline::executeScripts(EngineState& engine, const Expansion& conte
 
 void SendingPipeline::runScriptSnippet(EngineState& engine, const Snippet& snippet, const Expansion& content,
                                        const Output& output) {
-    InputService& service = surroundings_.inputService;
+    InputService& service = dependencies_.inputService;
     const auto script = std::make_shared<PLScript>();
     script->script = content->string();
     script->isAppleScript = snippet.contentType() == ContentType::AppleScript;
@@ -94,7 +94,7 @@ void SendingPipeline::runScriptSnippet(EngineState& engine, const Snippet& snipp
         }
         service.sendOutput(output);
     }
-    performInBackground([&runner = surroundings_.scriptRunner, script] { script->execute(runner); },
+    performInBackground([&runner = dependencies_.scriptRunner, script] { script->execute(runner); },
                         [this, &engine, script] { onScriptExecuted(engine, *script); });
 }
 
@@ -104,7 +104,7 @@ void SendingPipeline::onScriptExecuted(EngineState& engine, const PLScript& scri
     const auto output = std::make_shared<PLOutput>();
     output->trigger = SnippetTrigger::ScriptResult;
     output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(*script.result);
-    surroundings_.inputService.sendOutput(output);
+    dependencies_.inputService.sendOutput(output);
     playFeedback(feedbackSound_);
     // What was typed while the script ran stands in front of its output, and the kept delimiter behind it.
     engine.setLetters(script.suffix.value_or(u""));
@@ -114,14 +114,14 @@ void SendingPipeline::onScriptExecuted(EngineState& engine, const PLScript& scri
 
 void SendingPipeline::performAfterDelay(double delay, std::function<void()> call) {
     const std::weak_ptr<const bool> alive = alive_;
-    surroundings_.inputService.runLoop().performAfterDelay(delay, [alive, call = std::move(call)] {
+    dependencies_.inputService.runLoop().schedule(delay, [alive, call = std::move(call)] {
         if (!alive.expired()) call();
     });
 }
 
 void SendingPipeline::performInBackground(std::function<void()> work, std::function<void()> finish) {
     const std::weak_ptr<const bool> alive = alive_;
-    RunLoop& loop = surroundings_.inputService.runLoop();
+    RunLoop& loop = dependencies_.inputService.runLoop();
     const auto begun =
         backgroundTasks_.run([this, &loop, alive, work = std::move(work), finish = std::move(finish)]() mutable {
             work();
@@ -136,7 +136,7 @@ void SendingPipeline::performInBackground(std::function<void()> work, std::funct
     if (begun) {
         ++pendingScripts_;
     } else {
-        surroundings_.report("A script could not be run: the system gives no further thread.");
+        dependencies_.report("A script could not be run: the system gives no further thread.");
     }
 }
 

@@ -67,14 +67,14 @@ struct SendingPipeline::Delivery {
     }
 };
 
-SendingPipeline::SendingPipeline(Surroundings surroundings) : surroundings_(std::move(surroundings)) {}
+SendingPipeline::SendingPipeline(Dependencies dependencies) : dependencies_(std::move(dependencies)) {}
 
 SendingPipeline::~SendingPipeline() = default;
 
 bool SendingPipeline::sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
                                   const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) {
     engine.clear();
-    const Expansion content = surroundings_.snippetParser.parseSnippet(snippet, engine.snippetGroups());
+    const Expansion content = dependencies_.snippetParser.parseSnippet(snippet, engine.snippetGroups());
     if (!content) return false;
     const std::u16string typed = abbreviation.value_or(u"");
     if (!typed.empty() && snippet->caseSensitivity() == CaseSensitivity::IgnoreCaseAndAdapt) {
@@ -106,7 +106,7 @@ bool SendingPipeline::sendSnippet(EngineState& engine, const std::shared_ptr<Sni
 
 // The abbreviation goes at once, the content comes when the form is filled in.
 void SendingPipeline::sendByForm(const Delivery& delivery) {
-    InputService& service = surroundings_.inputService;
+    InputService& service = dependencies_.inputService;
     service.sendOutput(delivery.output);
     if (delivery.keepsSuffix()) delivery.content->suffix = service.lastKeyString().value_or(u"");
     delivery.engine.setUndoInfo(std::nullopt);
@@ -114,7 +114,7 @@ void SendingPipeline::sendByForm(const Delivery& delivery) {
 }
 
 void SendingPipeline::sendByScripts(const Delivery& delivery) {
-    InputService& service = surroundings_.inputService;
+    InputService& service = dependencies_.inputService;
     delivery.output->cancelTrigger = true;
     service.sendOutput(delivery.output);
     if (delivery.keepsSuffix()) delivery.content->suffix = service.lastKeyString().value_or(u"");
@@ -129,7 +129,7 @@ void SendingPipeline::sendAtOnce(const Delivery& delivery) {
         return;
     }
     delivery.engine.setUndoInfo(
-        undoOf(*delivery.output, delivery.typed, delivery.expandTrigger, surroundings_.inputService.lastKeyString()));
+        undoOf(*delivery.output, delivery.typed, delivery.expandTrigger, dependencies_.inputService.lastKeyString()));
 }
 
 void SendingPipeline::sendContent(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
@@ -151,7 +151,7 @@ void SendingPipeline::sendContent(EngineState& engine, const std::shared_ptr<Sni
 
 void SendingPipeline::sendText(EngineState& engine, const Expansion& content, Output output) {
     output->snippetExpandedContent = content;
-    surroundings_.inputService.sendOutput(std::move(output));
+    dependencies_.inputService.sendOutput(std::move(output));
     playFeedback(feedbackSound_);
     // Typing goes on behind the expanded text, unless the caret may stand elsewhere. What was typed while a form or a
     // script was busy stands in front of the text.
@@ -166,7 +166,7 @@ bool SendingPipeline::undo(EngineState& engine, bool withTrigger) {
     output->trigger = SnippetTrigger::HotKey;
     output->backspaceCount = undo.backspaceCount;
     output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(text);
-    surroundings_.inputService.sendOutput(output);
+    dependencies_.inputService.sendOutput(output);
     playFeedback(feedbackSound_);
     engine.setLetters(text);
     engine.setUndoInfo(std::nullopt);
@@ -174,7 +174,7 @@ bool SendingPipeline::undo(EngineState& engine, bool withTrigger) {
 }
 
 void SendingPipeline::playFeedback(const std::string& name) const {
-    if (playFeedbackSound_ && surroundings_.sounds) surroundings_.sounds->play(name);
+    if (playFeedbackSound_ && dependencies_.sounds) dependencies_.sounds->play(name);
 }
 
 }  // namespace plume

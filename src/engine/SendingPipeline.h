@@ -15,8 +15,8 @@
 #include <string>
 #include <vector>
 
-#include "content/ScriptRunner.h"
 #include "content/SnippetParser.h"
+#include "content/scripts/ScriptRunner.h"
 #include "engine/BackgroundTasks.h"
 #include "engine/FieldsEditor.h"
 #include "engine/SnippetSender.h"
@@ -28,7 +28,7 @@ namespace plume {
 class SendingPipeline final : public SnippetSender, private FieldsEditor::Target {
   public:
     // What the pipeline works with; not owned, and outlives it.
-    struct Surroundings {
+    struct Dependencies {
         InputService& inputService;
         SnippetParser& snippetParser;
         ScriptRunner& scriptRunner;
@@ -38,7 +38,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
         std::function<void(const std::string&)> report;
     };
 
-    explicit SendingPipeline(Surroundings surroundings);
+    explicit SendingPipeline(Dependencies dependencies);
     ~SendingPipeline() override;
     SendingPipeline(const SendingPipeline&) = delete;
     SendingPipeline& operator=(const SendingPipeline&) = delete;
@@ -94,7 +94,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     // On a thread of its own: `work`, then on the run loop, unless the pipeline is gone by then, `finish`.
     void performInBackground(std::function<void()> work, std::function<void()> finish);
 
-    Surroundings surroundings_;
+    Dependencies dependencies_;
     std::weak_ptr<Snippet> lastUsedSnippet_;
     bool playFeedbackSound_ = false;
     std::string feedbackSound_;

@@ -4,7 +4,7 @@
 #include <string_view>
 #include <vector>
 
-#include "Foundation/RTFD.h"
+#include "Foundation/text/RTFD.h"
 
 namespace plume {
 

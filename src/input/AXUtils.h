@@ -11,7 +11,7 @@
 #include <optional>
 #include <string>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "platform/Accessibility.h"
 
 namespace plume {

@@ -3,7 +3,7 @@
 #include <utility>
 
 #include "input/KeyCodes.h"
-#include "input/KeySender.h"
+#include "input/delivery/KeySender.h"
 
 namespace plume {
 
@@ -18,7 +18,7 @@ AclExport::AclExport(KeySender& sender, const Pasteboard& pasteboard, RunLoop& r
     : sender_(sender), pasteboard_(pasteboard), runLoop_(runLoop), copy_(std::move(copy)) {}
 
 void AclExport::after(void (AclExport::*next)()) {
-    runLoop_.performAfterDelay(Pause, [this, next] { (this->*next)(); });
+    runLoop_.schedule(Pause, [this, next] { (this->*next)(); });
 }
 
 void AclExport::start() {

@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "Foundation/HTMLExport.h"
-#include "Foundation/RTFD.h"
+#include "Foundation/text/HTMLExport.h"
+#include "Foundation/text/RTFD.h"
 
 namespace plume {
 

@@ -11,8 +11,8 @@
 
 #include "Foundation/ZDEvent.h"
 #include "content/PLOutput.h"
-#include "input/ContextInputSetting.h"
 #include "input/EventArgs.h"
+#include "input/delivery/ContextInputSetting.h"
 #include "platform/ProcessManager.h"
 #include "platform/RunLoop.h"
 

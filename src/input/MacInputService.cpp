@@ -13,8 +13,8 @@ constexpr std::uint64_t ModifierFlags = EventFlag::Shift | EventFlag::Control | 
 
 }  // namespace
 
-MacInputService::MacInputService(Surroundings surroundings)
-    : around_(std::move(surroundings)),
+MacInputService::MacInputService(Dependencies dependencies)
+    : around_(std::move(dependencies)),
       hotKeys_(hotKeysPressed),
       keyCodeTransformer_(around_.inputSources),
       resolver_(around_.processManager, around_.bundleIdentifierResolver, around_.accessibility, around_.poster),

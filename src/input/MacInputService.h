@@ -20,10 +20,10 @@
 #include "input/AclExport.h"
 #include "input/HotKeyTable.h"
 #include "input/InputService.h"
-#include "input/OutputDelivery.h"
 #include "input/SRKeyCodeTransformer.h"
 #include "input/SecureInputWatch.h"
-#include "input/VMHelperController.h"
+#include "input/delivery/OutputDelivery.h"
+#include "input/delivery/VMHelperController.h"
 #include "platform/KeyboardTap.h"
 #include "platform/MouseTap.h"
 #include "platform/SystemHotKeys.h"
@@ -38,7 +38,7 @@ struct KeyboardTapGivenUp {};
 class MacInputService final : public InputService, private KeyboardTapListener {
   public:
     // Nothing is owned; all of it outlives the service. `log` is called on either thread.
-    struct Surroundings {
+    struct Dependencies {
         KeyboardTap& keyboardTap;
         MouseTap& mouseTap;
         EventPoster& poster;
@@ -55,7 +55,7 @@ class MacInputService final : public InputService, private KeyboardTapListener {
         VMHelperController* vmHelper = nullptr;  // null: no window
     };
 
-    explicit MacInputService(Surroundings surroundings);
+    explicit MacInputService(Dependencies dependencies);
     ~MacInputService() override;
     MacInputService(const MacInputService&) = delete;
     MacInputService& operator=(const MacInputService&) = delete;
@@ -154,7 +154,7 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     void readKey(const TapEvent& event, ZDKeyEventArgs& key) const;
     void layoutChanged();
 
-    Surroundings around_;
+    Dependencies around_;
     HotKeyTable hotKeys_;
     SRKeyCodeTransformer keyCodeTransformer_;
     ContextInputResolver resolver_;

@@ -25,7 +25,7 @@ void SecureInputWatch::startCheckingSecureInputTimer() {
 
 void SecureInputWatch::check() {
     checkSecureInput();
-    timer_ = mainLoop_.performAfterDelay(CheckInterval, [this] { check(); });
+    timer_ = mainLoop_.schedule(CheckInterval, [this] { check(); });
 }
 
 void SecureInputWatch::stop() {

@@ -3,7 +3,7 @@
 #include <utility>
 #include <variant>
 
-#include "Foundation/RTFD.h"
+#include "Foundation/text/RTFD.h"
 #include "library/AbbreviationHash.h"
 #include "library/SnippetGroup.h"
 

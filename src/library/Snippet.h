@@ -11,10 +11,10 @@
 #include <string>
 #include <string_view>
 
-#include "Foundation/AttributedString.h"
 #include "Foundation/Date.h"
-#include "Foundation/KeyedCoding.h"
 #include "Foundation/Uuid.h"
+#include "Foundation/archive/KeyedCoding.h"
+#include "Foundation/text/AttributedString.h"
 #include "library/AbbreviationHash.h"
 
 namespace plume {

@@ -15,8 +15,8 @@
 
 #include "Foundation/CharacterSet.h"
 #include "Foundation/Date.h"
-#include "Foundation/KeyedCoding.h"
 #include "Foundation/Uuid.h"
+#include "Foundation/archive/KeyedCoding.h"
 #include "library/PLFunctionAvailability.h"
 #include "library/Snippet.h"
 

@@ -10,7 +10,7 @@
 #include <string_view>
 #include <vector>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 #include "library/Snippet.h"
 #include "library/SnippetGroup.h"
 

@@ -11,7 +11,7 @@
 #include <string_view>
 #include <vector>
 
-#include "Foundation/AttributedString.h"
+#include "Foundation/text/AttributedString.h"
 
 namespace plume {
 

@@ -57,51 +57,44 @@ class ZDEventTest : public testing::Test {
     Listener a_{"a"};
     Listener b_{"b"};
     std::vector<std::function<void()>> queue_;
+    std::vector<Subscription> subscriptions_;
 };
 
 TEST_F(ZDEventTest, CallsInTheOrderOfRegistration) {
-    event_.addObserver(&b_, &Listener::second);
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::second));
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
     EXPECT_THAT(raise(), ElementsAre("b.second", "a.first", "b.first"));
 }
 
 TEST_F(ZDEventTest, RemovesTheFirstOfTwoEqualHandlers) {
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
-    event_.addObserver(&a_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
     event_.removeObserver(&a_, &Listener::first);
     EXPECT_THAT(raise(), ElementsAre("b.first", "a.first"));
 }
 
 TEST_F(ZDEventTest, RemovesOnlyTheHandlerThatWasNamed) {
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&a_, &Listener::second);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::second));
     event_.removeObserver(&a_, &Listener::second);
     event_.removeObserver(&b_, &Listener::first);
     EXPECT_THAT(raise(), ElementsAre("a.first"));
 }
 
-TEST_F(ZDEventTest, RemovesEveryHandlerOfAnObserver) {
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
-    event_.addObserver(&a_, &Listener::second);
-    event_.removeObservers(&a_);
-    EXPECT_THAT(raise(), ElementsAre("b.first"));
-}
-
 TEST_F(ZDEventTest, AHandlerRemovedWhileTheEventIsRaisedIsNotCalled) {
-    a_.during = [this] { event_.removeObservers(&b_); };
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
-    event_.addObserver(&a_, &Listener::second);
+    a_.during = [this] { event_.removeObserver(&b_, &Listener::first); };
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::second));
     EXPECT_THAT(raise(), ElementsAre("a.first", "a.second"));
 }
 
 TEST_F(ZDEventTest, AHandlerMayRemoveItself) {
     a_.during = [this] { event_.removeObserver(&a_, &Listener::first); };
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
     EXPECT_THAT(raise(), ElementsAre("a.first", "b.first"));
     EXPECT_THAT(raise(), ElementsAre("b.first"));
 }
@@ -111,19 +104,19 @@ TEST_F(ZDEventTest, RemovingTwiceWhileRaisedTakesBothOfTwoEqualHandlers) {
         event_.removeObserver(&b_, &Listener::first);
         event_.removeObserver(&b_, &Listener::first);
     };
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
     EXPECT_THAT(raise(), ElementsAre("a.first"));
 }
 
 TEST_F(ZDEventTest, AHandlerAddedWhileTheEventIsRaisedIsCalledFromTheNextTimeOn) {
     a_.during = [this] {
         a_.during = nullptr;
-        for (int i = 0; i < 100; ++i) event_.addObserver(&b_, &Listener::second);
+        for (int i = 0; i < 100; ++i) subscriptions_.push_back(event_.addObserver(&b_, &Listener::second));
     };
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
     EXPECT_THAT(raise(), ElementsAre("a.first", "b.first"));
     EXPECT_EQ(raise().size(), 102U);
 }
@@ -135,26 +128,39 @@ TEST_F(ZDEventTest, RemovingWhileRaisedWithinAHandlerKeepsThePlacesOfTheOuterRai
         event_.removeObserver(&a_, &Listener::first);
         inner = raise();
     };
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
-    event_.addObserver(&b_, &Listener::second);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::second));
     EXPECT_THAT(raise(), ElementsAre("a.first", "b.first", "b.second"));
     EXPECT_THAT(inner, ElementsAre("b.first", "b.second"));
 }
 
 TEST_F(ZDEventTest, LaterHandlersAndTheRaiserSeeWhatAHandlerSet) {
-    event_.addObserver(&a_, &Listener::readsCancel);
-    event_.addObserver(&a_, &Listener::cancels);
-    event_.addObserver(&b_, &Listener::readsCancel);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::readsCancel));
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::cancels));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::readsCancel));
     Arguments arguments;
     event_.raise(arguments);
     EXPECT_TRUE(arguments.cancel);
     EXPECT_THAT(arguments.calls, ElementsAre("open", "cancelled"));
 }
 
+TEST_F(ZDEventTest, ASubscriptionThatEndsRemovesItsHandlerAlone) {
+    Subscription first = event_.addObserver(&a_, &Listener::first);
+    Subscription second = event_.addObserver(&b_, &Listener::first);
+    first = std::move(second);
+    EXPECT_THAT(raise(), ElementsAre("b.first"));
+    a_.during = [&first] { first.end(); };
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    EXPECT_THAT(raise(), ElementsAre("b.first", "a.first"));
+    EXPECT_THAT(raise(), ElementsAre("a.first"));
+    subscriptions_.clear();
+    EXPECT_FALSE(event_.isObserved());
+}
+
 TEST_F(ZDEventTest, OnTheMainThreadEveryHandlerGetsACallOfItsOwn) {
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
     const auto arguments = std::make_shared<Arguments>();
     raiseLater(arguments);
     EXPECT_EQ(queue_.size(), 2U);
@@ -164,11 +170,11 @@ TEST_F(ZDEventTest, OnTheMainThreadEveryHandlerGetsACallOfItsOwn) {
 }
 
 TEST_F(ZDEventTest, AHandlerRemovedBeforeItsCallArrivesIsNotCalled) {
-    event_.addObserver(&a_, &Listener::first);
-    event_.addObserver(&b_, &Listener::first);
+    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
     const auto arguments = std::make_shared<Arguments>();
     raiseLater(arguments);
-    event_.removeObservers(&a_);
+    event_.removeObserver(&a_, &Listener::first);
     runQueue();
     EXPECT_THAT(arguments->calls, ElementsAre("b.first"));
 }
@@ -178,7 +184,7 @@ TEST_F(ZDEventTest, QueuedCallsKeepTheArgumentAliveAndOutliveTheEvent) {
     const std::weak_ptr<Arguments> watched = arguments;
     {
         Event event;
-        event.addObserver(&a_, &Listener::first);
+        subscriptions_.push_back(event.addObserver(&a_, &Listener::first));
         event.raiseOnMainThread(arguments, [this](std::function<void()> call) { queue_.push_back(std::move(call)); });
     }
     arguments.reset();

@@ -3,9 +3,9 @@
 
 #include <gtest/gtest.h>
 
-#include "app/json/SettingsFile.h"
-#include "platform/desktop/PosixProcessLauncher.h"
-#include "platform/simulated/SimulatedDesktop.h"
+#include "library/SettingsFile.h"
+#include "ports/posix/PosixProcessLauncher.h"
+#include "ports/simulated/SimulatedDesktop.h"
 
 namespace plume {
 

@@ -4,7 +4,7 @@
 
 #include <functional>
 
-#include "content/ScriptRunner.h"
+#include "content/scripts/ScriptRunner.h"
 
 namespace plume {
 namespace {
@@ -122,7 +122,8 @@ TEST(PLScript, TellsThatItRanOnceItsResultStands) {
     auto nested = makeScript(u"nested");
     outer->nestedScripts = {nested};
     outer->suffix = u"!";
-    for (const auto& script : {outer, nested}) script->executed.addObserver(&listener, &Listener::scriptExecuted);
+    const Subscription subscriptions[] = {outer->executed.addObserver(&listener, &Listener::scriptExecuted),
+                                          nested->executed.addObserver(&listener, &Listener::scriptExecuted)};
     outer->execute(runner);
     EXPECT_THAT(listener.results, ElementsAre(u"<nested>", u"<<nested>outer>!"));
 }

@@ -2,8 +2,8 @@
 
 #include <gmock/gmock.h>
 
-#include "Foundation/RTFD.h"
 #include "Foundation/Strings.h"
+#include "Foundation/text/RTFD.h"
 #include "tests/content/ContentWorld.h"
 
 namespace plume {

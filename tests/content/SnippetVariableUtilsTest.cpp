@@ -4,8 +4,8 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
-#include "Foundation/CSVParser.h"
 #include "Foundation/Strings.h"
+#include "Foundation/text/CSVParser.h"
 #include "content/SnippetDateTimeVariable.h"
 
 namespace plume {

@@ -1,5 +1,5 @@
 // The run loop of real threads keeps what platform/RunLoop.h promises.
-#include "platform/desktop/PollRunLoop.h"
+#include "ports/posix/PollRunLoop.h"
 #include "tests/contract/ContractDesk.h"
 
 namespace plume {
@@ -10,7 +10,7 @@ class PollLoop final : public ContractLoop {
   public:
     RunLoop& runLoop() override { return loop_; }
     void run(double seconds) override {
-        loop_.performAfterDelay(seconds, [this] { loop_.stop(); });
+        loop_.schedule(seconds, [this] { loop_.stop(); });
         loop_.run();
     }
 

@@ -8,9 +8,9 @@ namespace plume {
 TEST_P(RunLoopContract, CallsInTheOrderOfTheirMoments) {
     std::string order;
     // Far enough apart for a busy machine, on which time passes between these lines.
-    loop_.performAfterDelay(0.2, [&] { order += 'c'; });
-    loop_.performAfterDelay(0, [&] { order += 'a'; });
-    loop_.performAfterDelay(0.1, [&] { order += 'b'; });
+    loop_.schedule(0.2, [&] { order += 'c'; });
+    loop_.schedule(0, [&] { order += 'a'; });
+    loop_.schedule(0.1, [&] { order += 'b'; });
     EXPECT_EQ(order, "") << "a call from inside performAfterDelay";
     bench_->run(0.3);
     EXPECT_EQ(order, "abc");
@@ -18,7 +18,7 @@ TEST_P(RunLoopContract, CallsInTheOrderOfTheirMoments) {
 
 TEST_P(RunLoopContract, KeepsTheOrderOfCallsForOneMoment) {
     std::string order;
-    for (const char name : {'a', 'b', 'c'}) loop_.performAfterDelay(0, [&order, name] { order += name; });
+    for (const char name : {'a', 'b', 'c'}) loop_.schedule(0, [&order, name] { order += name; });
     bench_->run(0.01);
     EXPECT_EQ(order, "abc");
 }
@@ -26,15 +26,15 @@ TEST_P(RunLoopContract, KeepsTheOrderOfCallsForOneMoment) {
 TEST_P(RunLoopContract, NeverCallsEarly) {
     const double asked = loop_.now();
     double called = 0;
-    loop_.performAfterDelay(0.03, [&] { called = loop_.now(); });
+    loop_.schedule(0.03, [&] { called = loop_.now(); });
     bench_->run(0.05);
     EXPECT_GE(called, asked + 0.03);
 }
 
 TEST_P(RunLoopContract, ForgetsCancelledCalls) {
     std::string order;
-    const RunLoop::CallId kept = loop_.performAfterDelay(0, [&] { order += 'k'; });
-    const RunLoop::CallId cancelled = loop_.performAfterDelay(0, [&] { order += 'x'; });
+    const RunLoop::CallId kept = loop_.schedule(0, [&] { order += 'k'; });
+    const RunLoop::CallId cancelled = loop_.schedule(0, [&] { order += 'x'; });
     loop_.cancel(cancelled);
     loop_.cancel(cancelled);
     loop_.cancel(0);
@@ -46,11 +46,11 @@ TEST_P(RunLoopContract, ForgetsCancelledCalls) {
 TEST_P(RunLoopContract, LetsACallCancelOneThatIsDueWithIt) {
     std::string order;
     RunLoop::CallId second = 0;
-    loop_.performAfterDelay(0, [&] {
+    loop_.schedule(0, [&] {
         order += 'a';
         loop_.cancel(second);
     });
-    second = loop_.performAfterDelay(0, [&] { order += 'b'; });
+    second = loop_.schedule(0, [&] { order += 'b'; });
     bench_->run(0.01);
     EXPECT_EQ(order, "a");
 }

@@ -1,5 +1,5 @@
 // The simulated desktop keeps what the platform's headers promise.
-#include "platform/simulated/SimulatedDesktop.h"
+#include "ports/simulated/SimulatedDesktop.h"
 #include "tests/contract/ContractDesk.h"
 
 namespace plume {

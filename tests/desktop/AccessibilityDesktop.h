@@ -5,9 +5,9 @@
 #include <functional>
 #include <memory>
 
-#include "platform/desktop/AtspiAccessibility.h"
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
+#include "ports/atspi/AtspiAccessibility.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
 
 namespace plume::rig {
 

@@ -8,7 +8,7 @@
 #include <cstddef>
 
 #include "input/AXUtils.h"
-#include "platform/desktop/AccessibilityBus.h"
+#include "ports/atspi/AccessibilityBus.h"
 #include "tests/desktop/AccessibilityDesktop.h"
 #include "tests/desktop/BusMonitor.h"
 #include "tests/desktop/ListedProgram.h"

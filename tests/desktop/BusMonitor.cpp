@@ -1,6 +1,6 @@
 #include "tests/desktop/BusMonitor.h"
 
-#include "tests/desktop/RigError.h"
+#include "testing/rig/RigError.h"
 
 namespace plume::rig {
 

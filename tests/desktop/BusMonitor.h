@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/desktop/AtspiMessages.h"
+#include "ports/atspi/AtspiMessages.h"
 
 namespace plume::rig {
 

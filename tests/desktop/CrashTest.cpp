@@ -1,6 +1,6 @@
 // The whole program when something goes wrong: it is killed or stopped, the program in front hangs, the X server is
 // gone. The keyboard belongs to the user again within a second.
-#include "tests/desktop/KeyWitness.h"
+#include "testing/rig/KeyWitness.h"
 #include "tests/desktop/Robustness.h"
 
 namespace plume::rig {

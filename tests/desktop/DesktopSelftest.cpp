@@ -13,10 +13,10 @@
 #include <nlohmann/json.hpp>
 #include <vector>
 
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/FocusCounter.h"
-#include "tests/desktop/Screenshot.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/FocusCounter.h"
+#include "testing/rig/Screenshot.h"
 
 namespace plume::rig {
 

@@ -2,8 +2,8 @@
 
 #include <array>
 
-#include "platform/desktop/AtspiParts.h"
-#include "tests/desktop/RigError.h"
+#include "ports/atspi/AtspiParts.h"
+#include "testing/rig/RigError.h"
 
 namespace plume::rig {
 

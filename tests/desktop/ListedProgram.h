@@ -7,7 +7,7 @@
 #include <thread>
 #include <vector>
 
-#include "platform/desktop/AtspiMessages.h"
+#include "ports/atspi/AtspiMessages.h"
 
 namespace plume::rig {
 

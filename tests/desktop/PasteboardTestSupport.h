@@ -12,9 +12,9 @@
 #include <string>
 #include <vector>
 
-#include "platform/x11/X11Pasteboard.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/SelectionClients.h"
+#include "ports/x11/clipboard/X11Pasteboard.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/SelectionClients.h"
 #include "tests/desktop/SessionThread.h"
 
 namespace plume::rig {

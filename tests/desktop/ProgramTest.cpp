@@ -5,8 +5,8 @@
 #include <fstream>
 #include <string>
 
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
 
 namespace plume::rig {
 

@@ -10,10 +10,10 @@
 #include <memory>
 #include <string>
 
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/PlumeProgram.h"
-#include "tests/desktop/XcbReply.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/PlumeProgram.h"
+#include "testing/rig/XcbReply.h"
 
 namespace plume::rig {
 

@@ -5,7 +5,7 @@
 #include <ostream>
 #include <vector>
 
-#include "tests/desktop/SelectionClients.h"
+#include "testing/rig/SelectionClients.h"
 
 namespace plume::rig {
 

@@ -9,9 +9,9 @@
 #include <type_traits>
 #include <utility>
 
-#include "platform/desktop/PollRunLoop.h"
-#include "platform/x11/X11Session.h"
-#include "tests/desktop/RigError.h"
+#include "ports/posix/PollRunLoop.h"
+#include "ports/x11/X11Session.h"
+#include "testing/rig/RigError.h"
 
 namespace plume::rig {
 

@@ -9,13 +9,13 @@
 #include <utility>
 #include <vector>
 
-#include "platform/desktop/PollRunLoop.h"
-#include "platform/x11/TapConnection.h"
-#include "platform/x11/X11InputSources.h"
-#include "platform/x11/X11KeyboardTap.h"
-#include "platform/x11/X11MouseTap.h"
-#include "platform/x11/X11Session.h"
-#include "platform/x11/XkbKeyboard.h"
+#include "ports/posix/PollRunLoop.h"
+#include "ports/x11/X11Session.h"
+#include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/X11InputSources.h"
+#include "ports/x11/keyboard/X11KeyboardTap.h"
+#include "ports/x11/keyboard/X11MouseTap.h"
+#include "ports/x11/keyboard/XkbKeyboard.h"
 
 namespace plume::rig {
 

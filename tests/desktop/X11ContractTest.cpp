@@ -7,12 +7,12 @@
 #include <map>
 
 #include "Foundation/Strings.h"
-#include "app/LinuxPort.h"
+#include "app/linux/LinuxPort.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/SelectionClients.h"
+#include "testing/rig/XcbReply.h"
 #include "tests/contract/ContractDesk.h"
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/SelectionClients.h"
-#include "tests/desktop/XcbReply.h"
 
 namespace plume::rig {
 
@@ -109,7 +109,7 @@ class X11Desk final : public ContractDesk {
         PollRunLoop& loop = desktop_.port->tapLoop();
         const Deadline deadline(Bound);
         do {
-            loop.performAfterDelay(Step, [&loop] { loop.stop(); });
+            loop.schedule(Step, [&loop] { loop.stop(); });
             loop.run();
             if (condition()) return true;
         } while (!deadline.passed());

@@ -4,7 +4,7 @@
 #include <thread>
 
 #include "Foundation/Strings.h"
-#include "input/ClipboardDataProvider.h"
+#include "input/delivery/ClipboardDataProvider.h"
 #include "tests/desktop/PasteboardTestSupport.h"
 
 namespace plume::rig {

@@ -8,8 +8,8 @@
 #include <iostream>
 
 #include "Foundation/Strings.h"
-#include "platform/x11/ClipboardLegacy.h"
-#include "platform/x11/X11SelectionTypes.h"
+#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/X11SelectionTypes.h"
 #include "tests/desktop/PasteboardTestSupport.h"
 
 namespace plume::rig {

@@ -8,11 +8,11 @@
 #include <iostream>
 #include <string>
 
-#include "platform/x11/TerminalApplications.h"
-#include "platform/x11/X11KeyCodes.h"
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/KeyboardPort.h"
+#include "ports/x11/keyboard/X11KeyCodes.h"
+#include "ports/x11/windows/TerminalApplications.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/KeyboardPort.h"
 
 namespace plume::rig {
 
@@ -158,7 +158,7 @@ TEST_P(X11PosterTest, ExpansionsInsideUnbrokenTypingAreExact) {
         swallowed = true;
         port_->poster().holdUserKeys();
         // Later, as deliveries are: what is typed until then must wait.
-        port_->loop().performAfterDelay(0.003, [&] {
+        port_->loop().schedule(0.003, [&] {
             auto& poster = port_->poster();
             poster.begin();
             poster.post({.text = utf16(output)}, false);

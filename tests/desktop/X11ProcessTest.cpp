@@ -12,11 +12,11 @@
 #include <iostream>
 #include <mutex>
 
-#include "platform/x11/DesktopFiles.h"
-#include "platform/x11/X11ProcessManager.h"
-#include "platform/x11/X11SecureInput.h"
-#include "platform/x11/X11SystemHotKeys.h"
-#include "tests/desktop/DesktopRig.h"
+#include "ports/x11/keyboard/X11SecureInput.h"
+#include "ports/x11/keyboard/X11SystemHotKeys.h"
+#include "ports/x11/windows/DesktopFiles.h"
+#include "ports/x11/windows/X11ProcessManager.h"
+#include "testing/rig/DesktopRig.h"
 #include "tests/desktop/SessionThread.h"
 
 namespace plume::rig {

@@ -18,13 +18,13 @@
 #include <vector>
 
 #include "Foundation/Strings.h"
-#include "platform/x11/InputDevices.h"
-#include "platform/x11/XcbXkb.h"
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/FocusCounter.h"
+#include "ports/x11/keyboard/InputDevices.h"
+#include "ports/x11/keyboard/XcbXkb.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/FocusCounter.h"
+#include "testing/rig/XcbReply.h"
 #include "tests/desktop/TapThread.h"
-#include "tests/desktop/XcbReply.h"
 
 namespace plume::rig {
 

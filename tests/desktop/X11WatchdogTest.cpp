@@ -10,10 +10,10 @@
 #include <sstream>
 #include <string>
 
-#include "platform/x11/watchdog/Vigil.h"
-#include "tests/desktop/Deadline.h"
-#include "tests/desktop/DesktopRig.h"
-#include "tests/desktop/XcbReply.h"
+#include "ports/x11/watchdog/Vigil.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/DesktopRig.h"
+#include "testing/rig/XcbReply.h"
 
 namespace plume::rig {
 

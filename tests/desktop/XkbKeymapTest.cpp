@@ -1,13 +1,13 @@
 // What the layout of a keyboard says, without a keyboard.
 
-#include "platform/x11/XkbKeymap.h"
+#include "ports/x11/keyboard/XkbKeymap.h"
 
 #include <gtest/gtest.h>
 
 #include <ostream>
 #include <string>
 
-#include "platform/x11/X11KeyCodes.h"
+#include "ports/x11/keyboard/X11KeyCodes.h"
 
 namespace plume {
 

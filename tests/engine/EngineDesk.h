@@ -8,11 +8,11 @@
 #include <vector>
 
 #include "engine/AutoText.h"
-#include "platform/simulated/SimulatedInputService.h"
-#include "platform/simulated/SimulatedInputSources.h"
-#include "platform/simulated/SimulatedProcessManager.h"
-#include "platform/simulated/SimulatedRunLoop.h"
-#include "platform/simulated/SimulatedUserDefaults.h"
+#include "library/MemoryUserDefaults.h"
+#include "ports/simulated/SimulatedInputService.h"
+#include "ports/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedProcessManager.h"
+#include "ports/simulated/SimulatedRunLoop.h"
 
 namespace plume {
 
@@ -103,7 +103,7 @@ class EngineDesk {
 
     SimulatedProcessManager processes;
     SimulatedInputSources sources;
-    SimulatedUserDefaults defaults;
+    MemoryUserDefaults defaults;
     SimulatedRunLoop loop;
     SimulatedInputService service{processes, sources, loop};
     BundleIdentifierResolver resolver{processes};

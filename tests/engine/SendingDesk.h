@@ -12,12 +12,12 @@
 #include "engine/AutoCorrection.h"
 #include "engine/AutoText.h"
 #include "engine/SendingPipeline.h"
-#include "platform/simulated/SimulatedAccessibility.h"
-#include "platform/simulated/SimulatedInputService.h"
-#include "platform/simulated/SimulatedInputSources.h"
-#include "platform/simulated/SimulatedProcessManager.h"
-#include "platform/simulated/SimulatedRunLoop.h"
-#include "platform/simulated/SimulatedUserDefaults.h"
+#include "library/MemoryUserDefaults.h"
+#include "ports/simulated/SimulatedAccessibility.h"
+#include "ports/simulated/SimulatedInputService.h"
+#include "ports/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedProcessManager.h"
+#include "ports/simulated/SimulatedRunLoop.h"
 #include "tests/engine/EngineDesk.h"
 
 namespace plume {
@@ -85,7 +85,7 @@ class SendingDesk {
 
     SimulatedProcessManager processes;
     SimulatedInputSources sources;
-    SimulatedUserDefaults defaults;
+    MemoryUserDefaults defaults;
     SimulatedRunLoop loop;
     SimulatedAccessibility accessibility;
     SimulatedInputService service{processes, sources, loop};

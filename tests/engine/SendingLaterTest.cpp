@@ -232,7 +232,7 @@ TEST(Scripts, ManyAtOnceAllArrive) {
 TEST(Scripts, AndFormsEndWithThePipeline) {
     SimulatedProcessManager processes;
     SimulatedInputSources sources;
-    SimulatedUserDefaults defaults;
+    MemoryUserDefaults defaults;
     SimulatedRunLoop loop;
     SimulatedInputService service{processes, sources, loop};
     BundleIdentifierResolver resolver{processes};

@@ -6,9 +6,9 @@
 #include <string_view>
 #include <vector>
 
-#include "Foundation/CSVParser.h"
-#include "Foundation/CsvWriter.h"
 #include "Foundation/Strings.h"
+#include "Foundation/text/CSVParser.h"
+#include "Foundation/text/CsvWriter.h"
 
 namespace {
 

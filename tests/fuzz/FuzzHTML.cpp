@@ -7,9 +7,9 @@
 #include <string_view>
 #include <vector>
 
-#include "Foundation/HTMLExport.h"
-#include "Foundation/RTFD.h"
 #include "Foundation/Strings.h"
+#include "Foundation/text/HTMLExport.h"
+#include "Foundation/text/RTFD.h"
 
 namespace {
 

@@ -4,8 +4,8 @@
 #include <string>
 #include <string_view>
 
-#include "Foundation/FlatRTFD.h"
-#include "Foundation/RTFD.h"
+#include "Foundation/text/FlatRTFD.h"
+#include "Foundation/text/RTFD.h"
 
 namespace {
 

@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include "Foundation/RTFD.h"
-#include "platform/simulated/SimulatedAccessibility.h"
+#include "Foundation/text/RTFD.h"
+#include "ports/simulated/SimulatedAccessibility.h"
 
 namespace plume {
 namespace {

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
-#include "platform/simulated/SimulatedProcessManager.h"
+#include "ports/simulated/SimulatedProcessManager.h"
 
 namespace plume {
 namespace {

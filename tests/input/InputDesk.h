@@ -9,12 +9,12 @@
 #include <vector>
 
 #include "input/MacInputService.h"
-#include "platform/simulated/SimulatedAccessibility.h"
-#include "platform/simulated/SimulatedInputSources.h"
-#include "platform/simulated/SimulatedPasteboard.h"
-#include "platform/simulated/SimulatedProcessManager.h"
-#include "platform/simulated/SimulatedRunLoop.h"
-#include "tests/input/RecordingPoster.h"
+#include "ports/simulated/SimulatedAccessibility.h"
+#include "ports/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedPasteboard.h"
+#include "ports/simulated/SimulatedProcessManager.h"
+#include "ports/simulated/SimulatedRunLoop.h"
+#include "tests/input/delivery/RecordingPoster.h"
 
 namespace plume {
 

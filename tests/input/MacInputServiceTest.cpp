@@ -18,14 +18,14 @@ using Type = TapEvent::Type;
 // Writes down what the service announces: "key 8 c", "up 8", "context", "shortcut 8/2", "hot 8/2".
 struct Listener {
     explicit Listener(MacInputService& aService) : service(aService) {
-        service.keyDownEvent.addObserver(this, &Listener::keyDown);
-        service.keyUpEvent.addObserver(this, &Listener::keyUp);
-        service.inputContextChangedEvent.addObserver(this, &Listener::contextChanged);
-        service.unregisteredHotKeyPressedEvent.addObserver(this, &Listener::shortcut);
-        service.hotKeysPressed.addObserver(this, &Listener::hotKeys);
-        service.mouseDownEvent.addObserver(this, &Listener::clicked);
-        service.secureInputChangedEvent.addObserver(this, &Listener::secureInputChanged);
-        service.keyboardTapGivenUpEvent.addObserver(this, &Listener::givenUp);
+        subscriptions.push_back(service.keyDownEvent.addObserver(this, &Listener::keyDown));
+        subscriptions.push_back(service.keyUpEvent.addObserver(this, &Listener::keyUp));
+        subscriptions.push_back(service.inputContextChangedEvent.addObserver(this, &Listener::contextChanged));
+        subscriptions.push_back(service.unregisteredHotKeyPressedEvent.addObserver(this, &Listener::shortcut));
+        subscriptions.push_back(service.hotKeysPressed.addObserver(this, &Listener::hotKeys));
+        subscriptions.push_back(service.mouseDownEvent.addObserver(this, &Listener::clicked));
+        subscriptions.push_back(service.secureInputChangedEvent.addObserver(this, &Listener::secureInputChanged));
+        subscriptions.push_back(service.keyboardTapGivenUpEvent.addObserver(this, &Listener::givenUp));
     }
     static std::string name(const GeneralHotKey& hotKey) {
         return std::to_string(hotKey.keyCode) + "/" + std::to_string(hotKey.modifiers);
@@ -57,6 +57,7 @@ struct Listener {
     std::vector<std::string> take() { return std::exchange(heard, {}); }
 
     MacInputService& service;
+    std::vector<Subscription> subscriptions;
     std::vector<std::string> heard;
     char16_t shortcutCharacter = 0;
     bool swallows = false;
@@ -351,7 +352,7 @@ TEST(MacInputService, APlainKeyAllocatesNothing) {
         void key(ZDKeyEventArgs& event) { keys += event.c; }
         int keys = 0;
     } engine;
-    desk.service.keyDownEvent.addObserver(&engine, &Engine::key);
+    const Subscription subscription = desk.service.keyDownEvent.addObserver(&engine, &Engine::key);
     const auto typeAll = [&] {
         for (int i = 0; i < 10; ++i) {
             desk.hold(KeyModifier::Shift);

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "input/KeyCodes.h"
-#include "platform/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedInputSources.h"
 
 namespace plume {
 namespace {

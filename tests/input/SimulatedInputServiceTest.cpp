@@ -1,13 +1,13 @@
 // The simulated keyboard raises what a real one would, in the same order.
-#include "platform/simulated/SimulatedInputService.h"
+#include "ports/simulated/SimulatedInputService.h"
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include "Foundation/Strings.h"
-#include "platform/simulated/SimulatedInputSources.h"
-#include "platform/simulated/SimulatedProcessManager.h"
-#include "platform/simulated/SimulatedRunLoop.h"
+#include "ports/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedProcessManager.h"
+#include "ports/simulated/SimulatedRunLoop.h"
 
 namespace plume {
 namespace {
@@ -18,10 +18,10 @@ class Keyboard : public ::testing::Test {
   protected:
     Keyboard() {
         processes.setFrontProcess(editor);
-        service.keyDownEvent.addObserver(this, &Keyboard::onKey);
-        service.inputContextChangedEvent.addObserver(this, &Keyboard::onContext);
-        service.unregisteredHotKeyPressedEvent.addObserver(this, &Keyboard::onHotKey);
-        service.mouseDownEvent.addObserver(this, &Keyboard::onClick);
+        subscriptions.push_back(service.keyDownEvent.addObserver(this, &Keyboard::onKey));
+        subscriptions.push_back(service.inputContextChangedEvent.addObserver(this, &Keyboard::onContext));
+        subscriptions.push_back(service.unregisteredHotKeyPressedEvent.addObserver(this, &Keyboard::onHotKey));
+        subscriptions.push_back(service.mouseDownEvent.addObserver(this, &Keyboard::onClick));
     }
     void onKey(ZDKeyEventArgs& event) {
         const std::string text = event.s ? toUtf8(*event.s) : "nothing";
@@ -47,6 +47,7 @@ class Keyboard : public ::testing::Test {
     SimulatedInputService service{processes, sources, loop};
     ProcessSerialNumber editor = processes.launch(u"org.example.editor");
     std::vector<std::string> log;
+    std::vector<Subscription> subscriptions;
     std::vector<std::int32_t> modifiers;
     bool swallows = false;
 };

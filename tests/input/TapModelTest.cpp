@@ -140,9 +140,10 @@ bool answerOf(InputDesk& desk, const Step& step) {
 RC_GTEST_PROP(TapModel, AnswersAsTheRulesSay, ()) {
     InputDesk desk;
     Swallowers swallowers;
-    desk.service.keyDownEvent.addObserver(&swallowers, &Swallowers::key);
-    desk.service.unregisteredHotKeyPressedEvent.addObserver(&swallowers, &Swallowers::shortcut);
-    desk.service.hotKeysPressed.addObserver(&swallowers, &Swallowers::hotKeys);
+    const Subscription subscription = desk.service.keyDownEvent.addObserver(&swallowers, &Swallowers::key);
+    const Subscription subscription2 =
+        desk.service.unregisteredHotKeyPressedEvent.addObserver(&swallowers, &Swallowers::shortcut);
+    const Subscription subscription3 = desk.service.hotKeysPressed.addObserver(&swallowers, &Swallowers::hotKeys);
 
     std::vector<GeneralHotKey> hotKeys;
     for (int i = *rc::gen::inRange(0, 12); i > 0; --i) hotKeys.push_back(randomHotKey());

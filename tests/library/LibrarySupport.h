@@ -6,9 +6,9 @@
 #include <string>
 #include <utility>
 
-#include "Foundation/AttributedString.h"
 #include "Foundation/Date.h"
-#include "Foundation/TextAttributes.h"
+#include "Foundation/text/AttributedString.h"
+#include "Foundation/text/TextAttributes.h"
 #include "library/Snippet.h"
 
 namespace plume::test {

@@ -1,7 +1,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "Foundation/RTFD.h"
+#include "Foundation/text/RTFD.h"
 #include "library/AbbreviationHash.h"
 #include "library/Snippet.h"
 #include "tests/library/LibrarySupport.h"

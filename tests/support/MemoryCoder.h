@@ -13,7 +13,7 @@
 #include <variant>
 #include <vector>
 
-#include "Foundation/KeyedCoding.h"
+#include "Foundation/archive/KeyedCoding.h"
 
 namespace plume::test {
 

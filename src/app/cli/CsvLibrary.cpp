@@ -7,8 +7,8 @@
 #include <optional>
 #include <utility>
 
-#include "Foundation/CSVParser.h"
 #include "Foundation/Strings.h"
+#include "Foundation/text/CSVParser.h"
 
 namespace plume {
 

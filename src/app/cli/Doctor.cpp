@@ -20,12 +20,12 @@
 #include "app/cli/InstanceLock.h"
 #include "app/cli/LibraryChoice.h"
 #include "app/cli/Version.h"
-#include "platform/desktop/AtspiAccessibility.h"
-#include "platform/desktop/PollRunLoop.h"
-#include "platform/x11/TapConnection.h"
-#include "platform/x11/X11Pasteboard.h"
-#include "platform/x11/X11SecureInput.h"
-#include "platform/x11/X11Session.h"
+#include "ports/atspi/AtspiAccessibility.h"
+#include "ports/posix/PollRunLoop.h"
+#include "ports/x11/X11Session.h"
+#include "ports/x11/clipboard/X11Pasteboard.h"
+#include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/X11SecureInput.h"
 
 namespace plume {
 

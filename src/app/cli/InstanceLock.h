@@ -6,7 +6,7 @@
 #include <string>
 
 #include "Foundation/Result.h"
-#include "platform/desktop/FileDescriptor.h"
+#include "ports/posix/FileDescriptor.h"
 
 namespace plume {
 

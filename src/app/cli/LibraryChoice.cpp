@@ -7,7 +7,7 @@
 #include "Foundation/Strings.h"
 #include "app/cli/CsvLibrary.h"
 #include "app/cli/Files.h"
-#include "app/json/LibraryFile.h"
+#include "library/LibraryFile.h"
 
 namespace plume {
 

@@ -9,10 +9,10 @@
 #include "Foundation/Strings.h"
 #include "app/cli/CommandLine.h"
 #include "content/PLScript.h"
-#include "content/ShellScriptRunner.h"
 #include "content/SnippetParser.h"
+#include "content/scripts/ShellScriptRunner.h"
 #include "library/SnippetUtils.h"
-#include "platform/desktop/PosixProcessLauncher.h"
+#include "ports/posix/PosixProcessLauncher.h"
 
 namespace plume {
 

@@ -11,11 +11,11 @@
 #include <utility>
 
 #include "app/Composition.h"
-#include "app/LinuxPort.h"
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
 #include "app/cli/InstanceLock.h"
-#include "app/json/SettingsFile.h"
+#include "app/linux/LinuxPort.h"
+#include "library/SettingsFile.h"
 
 namespace plume {
 
@@ -86,12 +86,13 @@ class Run {
     // The tap thread.
     void expand() {
         {
-            Composition composition(port_.ports(), surroundings());
+            Composition composition(port_.ports(), dependencies());
             composition.setSnippetGroups(library_.groups);
             composition.loadPreferences();
             MacInputService& service = composition.inputService();
-            port_.mainLoop().perform(
-                [this, &service] { service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost); });
+            port_.mainLoop().perform([this, &service] {
+                keyboardGivenUp_ = service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost);
+            });
             composition.start();
             // After the start, which waits in the loop, too.
             port_.tapLoop().perform([this, &service] { tellWhetherStarted(service); });
@@ -107,7 +108,7 @@ class Run {
                 << ". Ctrl+C ends it." << std::endl;
     }
 
-    Composition::Surroundings surroundings() {
+    Composition::Dependencies dependencies() {
         const auto say = [this](const std::string& sentence) { voice_.say(sentence); };
         return {.settings = settings_,
                 .report = say,
@@ -134,6 +135,7 @@ class Run {
     std::ostream& output_;
     Voice& voice_;
     std::atomic<int> status_ = ExitStatus::Success;
+    Subscription keyboardGivenUp_;  // of the main thread, like the event
 };
 
 }  // namespace

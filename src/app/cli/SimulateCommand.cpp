@@ -6,7 +6,7 @@
 
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
-#include "app/scenario/ScenarioPlayer.h"
+#include "scenario/ScenarioPlayer.h"
 
 namespace plume {
 

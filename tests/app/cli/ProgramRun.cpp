@@ -6,7 +6,7 @@
 #include <fstream>
 #include <stdexcept>
 
-#include "platform/desktop/PosixProcessLauncher.h"
+#include "ports/posix/PosixProcessLauncher.h"
 
 namespace plume {
 

@@ -1,0 +1,125 @@
+#include "app/linux/LinuxPort.h"
+
+#include <xcb/xproto.h>
+
+#include <algorithm>
+#include <array>
+#include <optional>
+#include <utility>
+
+#include "input/BundleIdentifierResolver.h"
+#include "input/KeyCodes.h"
+#include "ports/x11/keyboard/X11KeyCodes.h"
+#include "ports/x11/windows/TerminalApplications.h"
+
+namespace plume {
+
+namespace {
+
+// Keeps the value of a result, or its error.
+template <typename Part>
+Result<void> keep(Result<std::unique_ptr<Part>> result, std::unique_ptr<Part>& place) {
+    if (!result) return result.error();
+    place = std::move(result).value();
+    return {};
+}
+
+// Keys by which people leave a field or set something off, by themselves or with a modifier.
+bool movesFocus(std::uint16_t keyCode, std::uint64_t flags) {
+    constexpr std::array Keys = {KeyCode::Tab, KeyCode::Return, KeyCode::KeypadEnter, KeyCode::Escape};
+    constexpr std::uint64_t Shortcuts = X11Flag::Control | X11Flag::Option | X11Flag::Command;
+    return (flags & Shortcuts) != 0 || std::ranges::find(Keys, keyCode) != Keys.end();
+}
+
+}  // namespace
+
+Result<std::unique_ptr<LinuxPort>> LinuxPort::open(const std::string& display) {
+    std::unique_ptr<LinuxPort> port(new LinuxPort());
+    if (const auto begun = port->begin(display); !begun) return begun.error();
+    return port;
+}
+
+Result<void> LinuxPort::begin(const std::string& display) {
+    if (auto opened = keep(X11Session::open(display, tapLoop_), session_); !opened) return opened;
+    if (auto opened = openKeyboard(display); !opened) return opened;
+    if (auto opened = openDesktop(display); !opened) return opened;
+    connectParts();
+    return {};
+}
+
+Result<void> LinuxPort::openKeyboard(const std::string& display) {
+    if (auto opened = keep(XkbKeyboard::open(session_->connection()), keyboard_); !opened) return opened;
+    if (auto opened = keep(TapConnection::open(display, *keyboard_), tapConnection_); !opened) return opened;
+    watchdog_ = std::make_unique<Watchdog>(tapLoop_, display, std::string(), legacy_.descriptor());
+    keyboardTap_ = std::make_unique<X11KeyboardTap>(tapLoop_, *tapConnection_, *keyboard_);
+    poster_ = std::make_unique<X11EventPoster>(tapLoop_, *tapConnection_, *keyboard_, *keyboardTap_);
+    return {};
+}
+
+Result<void> LinuxPort::openDesktop(const std::string& display) {
+    const auto focusIsPassword = [this] { return accessibility_.focusIsPassword(); };
+    if (auto opened = keep(X11Pasteboard::open(*session_), pasteboard_); !opened) return opened;
+    if (auto opened = keep(X11SecureInput::open(display, focusIsPassword), secureInput_); !opened) return opened;
+    mouseTap_ = std::make_unique<X11MouseTap>(*session_);
+    processManager_ = std::make_unique<X11ProcessManager>(*session_, DesktopFiles::ofEnvironment());
+    inputSources_ = std::make_unique<X11InputSources>(*keyboard_);
+    systemHotKeys_ =
+        std::make_unique<X11SystemHotKeys>(*session_, [this](std::uint16_t keyCode) -> std::optional<xcb_keycode_t> {
+            const xcb_keycode_t keycode = keyboard_->keymap()->keycodeOf(keyCode);
+            return keycode != 0 ? std::optional(keycode) : std::nullopt;
+        });
+    keyboardTap_->setFocusIsPassword(focusIsPassword);
+    return {};
+}
+
+void LinuxPort::connectParts() {
+    keyboard_->listenTo(*session_);
+    pasteboard_->setLegacy(&legacy_);
+    followFocus();
+    poster_->frontIdentifier = [this] { return frontIdentifier(); };
+    pasteboard_->pastesPrimary = [this] { return pastesPrimary(frontIdentifier().value_or(u"")); };
+    accessibility_.setMainScreenHeight(session_->connection().screen().height_in_pixels);
+
+    // Whoever waits on the tap thread tells the watchdog that this is no hang.
+    session_->heartbeat = [this] { watchdog_->beat(); };
+    poster_->heartbeat = [this] { watchdog_->beat(); };
+    tapConnection_->setReopenedListener([this](xcb_window_t window) { watchdog_->setTapWindow(window); });
+}
+
+// Programs are asked for their focus when it may have moved.
+void LinuxPort::followFocus() {
+    keyboardTap_->setUserTyped([this](std::uint16_t keyCode, std::uint64_t flags) {
+        if (movesFocus(keyCode, flags)) {
+            accessibility_.focusMayHaveMoved();
+        } else {
+            accessibility_.userTypes();
+        }
+    });
+    mouseTap_->clicked = [this] { accessibility_.focusMayHaveMoved(); };
+    processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
+    tapLoop_.perform([this] { tellFrontProcess(); });
+}
+
+void LinuxPort::tellFrontProcess() {
+    const auto application = foregroundApplication(*processManager_);
+    accessibility_.setFrontProcess(application ? static_cast<pid_t>(application->processIdentifier) : 0);
+    accessibility_.focusMayHaveMoved();
+}
+
+Result<void> LinuxPort::startWatchdog() {
+    watchdog_->setTapWindow(tapConnection_->window());
+    return watchdog_->start();
+}
+
+std::optional<std::u16string> LinuxPort::frontIdentifier() const {
+    const auto application = foregroundApplication(*processManager_);
+    return application ? application->bundleIdentifier : std::nullopt;
+}
+
+Composition::Ports LinuxPort::ports() {
+    return {*keyboardTap_,    *mouseTap_,     *poster_,      *pasteboard_,    *processManager_,
+            *inputSources_,   accessibility_, *secureInput_, *systemHotKeys_, sounds_,
+            processLauncher_, tapLoop_,       mainLoop_};
+}
+
+}  // namespace plume

@@ -1,0 +1,83 @@
+// Everything that Plume uses of a Linux desktop with X11: the ports, in the order in which they need each other, and
+// the run loops of the two threads.
+//
+// Owned by whoever runs the program. Opened before either loop runs; then the ports belong to the thread that runs the
+// tap loop, but for secure input, which belongs to the one that runs the main loop. Destroyed when neither runs any
+// more and nobody uses the ports.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+
+#include "Foundation/Result.h"
+#include "app/Composition.h"
+#include "ports/atspi/AtspiAccessibility.h"
+#include "ports/posix/CanberraSounds.h"
+#include "ports/posix/PollRunLoop.h"
+#include "ports/posix/PosixProcessLauncher.h"
+#include "ports/x11/X11Session.h"
+#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/X11Pasteboard.h"
+#include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/X11EventPoster.h"
+#include "ports/x11/keyboard/X11InputSources.h"
+#include "ports/x11/keyboard/X11KeyboardTap.h"
+#include "ports/x11/keyboard/X11MouseTap.h"
+#include "ports/x11/keyboard/X11SecureInput.h"
+#include "ports/x11/keyboard/X11SystemHotKeys.h"
+#include "ports/x11/keyboard/XkbKeyboard.h"
+#include "ports/x11/watchdog/Watchdog.h"
+#include "ports/x11/windows/X11ProcessManager.h"
+
+namespace plume {
+
+class LinuxPort {
+  public:
+    // An empty display means $DISPLAY. The error says what the desktop lacks, and what to install or to switch on.
+    static Result<std::unique_ptr<LinuxPort>> open(const std::string& display);
+    // The watchdog, without which the keyboard must not be taken. On the tap thread, or before its loop runs.
+    Result<void> startWatchdog();
+    LinuxPort(const LinuxPort&) = delete;
+    LinuxPort& operator=(const LinuxPort&) = delete;
+
+    Composition::Ports ports();
+    PollRunLoop& tapLoop() { return tapLoop_; }
+    PollRunLoop& mainLoop() { return mainLoop_; }
+
+    // Called once, on the tap thread, when the X server is gone.
+    void setServerGone(std::function<void()> listener) { session_->serverGone = std::move(listener); }
+    // Last of all, on the tap thread, when its loop has ended: what Plume offers on the clipboard stays there.
+    void leave() { pasteboard_->handOver(); }
+
+  private:
+    LinuxPort() = default;
+    Result<void> begin(const std::string& display);
+    Result<void> openKeyboard(const std::string& display);
+    Result<void> openDesktop(const std::string& display);
+    void connectParts();
+    void followFocus();
+    void tellFrontProcess();
+    std::optional<std::u16string> frontIdentifier() const;
+
+    PollRunLoop mainLoop_;
+    PollRunLoop tapLoop_;
+    PosixProcessLauncher processLauncher_;
+    CanberraSounds sounds_;
+    AtspiAccessibility accessibility_;
+    ClipboardLegacy legacy_;
+    std::unique_ptr<X11Session> session_;
+    std::unique_ptr<XkbKeyboard> keyboard_;
+    std::unique_ptr<Watchdog> watchdog_;
+    std::unique_ptr<TapConnection> tapConnection_;
+    std::unique_ptr<X11KeyboardTap> keyboardTap_;
+    std::unique_ptr<X11EventPoster> poster_;
+    std::unique_ptr<X11MouseTap> mouseTap_;
+    std::unique_ptr<X11ProcessManager> processManager_;
+    std::unique_ptr<X11Pasteboard> pasteboard_;
+    std::unique_ptr<X11InputSources> inputSources_;
+    std::unique_ptr<X11SecureInput> secureInput_;
+    std::unique_ptr<X11SystemHotKeys> systemHotKeys_;
+};
+
+}  // namespace plume

@@ -1,0 +1,141 @@
+#include "input/delivery/ClipboardDataProvider.h"
+
+#include <utility>
+
+#include "Foundation/Strings.h"
+#include "Foundation/text/HTMLExport.h"
+#include "Foundation/text/RTFD.h"
+
+namespace plume {
+
+ClipboardDataProvider::ClipboardDataProvider(Pasteboard& pasteboard, RunLoop& runLoop)
+    : pasteboard_(pasteboard), runLoop_(runLoop) {}
+
+ClipboardDataProvider::~ClipboardDataProvider() {
+    cancelRestore();
+}
+
+void ClipboardDataProvider::prepareSetData() {
+    // What is remembered would pass for the user's latest content while it is older than that.
+    if (types_ && pasteboard_.changeCount() != backupChangeCount_) backup();
+    provideBackupData_ = false;
+    providedData_ = false;
+    stringData_.reset();
+    attributedStringData_.reset();
+}
+
+void ClipboardDataProvider::setString(std::u16string string) {
+    prepareSetData();
+    stringData_ = std::move(string);
+    changeCount_ = pasteboard_.declareTypes({std::string(PasteboardType::String)}, this);
+}
+
+void ClipboardDataProvider::setAttributedString(AttributedString string) {
+    prepareSetData();
+    attributedStringData_ = std::move(string);
+    // No plain text: a target that takes rich text must not settle for less.
+    std::vector<std::string> types = {std::string(PasteboardType::RTFD), std::string(PasteboardType::RTF)};
+    if (includeHTMLData) types.emplace_back(PasteboardType::HTML);
+    changeCount_ = pasteboard_.declareTypes(types, this);
+}
+
+void ClipboardDataProvider::provideData(Pasteboard& pasteboard, std::string_view type) {
+    if (provideBackupData_) {
+        const auto found = backupData_.find(type);
+        if (found != backupData_.end()) pasteboard.setData(found->second, type);
+        return;
+    }
+    provideExpansion(pasteboard, type);
+    // Where takers are named, whoever else reads (a clipboard manager) does not count.
+    if (!pasteboard_.tellsWhenTaken()) providedData_ = true;
+}
+
+void ClipboardDataProvider::dataWasTaken(std::string_view /*type*/) {
+    if (provideBackupData_) return;
+    providedData_ = true;
+    if (restoresWhenTaken_) restoreAfterDelay();
+    if (onTaken) onTaken();
+}
+
+void ClipboardDataProvider::provideExpansion(Pasteboard& pasteboard, std::string_view type) const {
+    if (stringData_) {
+        pasteboard.setString(*stringData_, PasteboardType::String);
+    } else if (!attributedStringData_) {
+        return;
+    } else if (type == PasteboardType::String) {
+        pasteboard.setString(attributedStringData_->string(), type);
+    } else if (type == PasteboardType::RTFD) {
+        pasteboard.setData(rtfdFromAttributedString(*attributedStringData_), type);
+    } else if (type == PasteboardType::RTF) {
+        pasteboard.setData(rtfFromAttributedString(*attributedStringData_), type);
+    } else if (type == PasteboardType::HTML) {
+        auto excluded = defaultExcludedTags();
+        if (excludeParagraphTag) excluded.emplace_back("p");
+        pasteboard.setData(htmlFromAttributedString(*attributedStringData_, excluded), type);
+    }
+}
+
+void ClipboardDataProvider::backup() {
+    if (pasteboard_.changeCount() == changeCount_) return;
+    backupData_.clear();
+    backupChangeCount_ = pasteboard_.changeCount();
+    types_ = pasteboard_.types();
+    for (const auto& type : *types_) {
+        if (auto data = pasteboard_.data(type)) backupData_[type] = std::move(*data);
+    }
+}
+
+void ClipboardDataProvider::restore() {
+    pendingRestore_ = 0;
+    if (!types_) return;
+    // Somebody has copied something since: that is what the user wants to find there.
+    if (pasteboard_.changeCount() != changeCount_) return;
+    if (!providedData_) {
+        if (pasteboard_.tellsWhenTaken()) {
+            restoresWhenTaken_ = true;
+        } else {
+            restoreAfterDelay();
+        }
+        return;
+    }
+    provideBackupData_ = true;
+    changeCount_ = pasteboard_.declareTypes(*types_, this);
+}
+
+void ClipboardDataProvider::restoreAfterDelay() {
+    cancelRestore();
+    pendingRestore_ = runLoop_.schedule(restoreDelay, [this] { restore(); });
+}
+
+bool ClipboardDataProvider::cancelRestore() {
+    const bool wasPending = pendingRestore_ != 0 || restoresWhenTaken_;
+    runLoop_.cancel(pendingRestore_);
+    pendingRestore_ = 0;
+    restoresWhenTaken_ = false;
+    return wasPending;
+}
+
+bool ClipboardDataProvider::isOffering() const {
+    return !provideBackupData_ && types_ && pasteboard_.changeCount() == changeCount_;
+}
+
+std::optional<std::string> ClipboardDataProvider::backupDataForType(std::string_view type) const {
+    const auto found = backupData_.find(type);
+    return found == backupData_.end() ? std::nullopt : std::optional(found->second);
+}
+
+std::vector<std::string> UserPasteboard::types() const {
+    return provider_.isOffering() ? *provider_.backupTypes() : pasteboard_.types();
+}
+
+std::optional<std::u16string> UserPasteboard::string() const {
+    if (!provider_.isOffering()) return pasteboard_.string();
+    const auto bytes = provider_.backupDataForType(PasteboardType::String);
+    return bytes ? std::optional(fromUtf8(*bytes)) : std::nullopt;
+}
+
+std::optional<std::string> UserPasteboard::data(std::string_view type) const {
+    return provider_.isOffering() ? provider_.backupDataForType(type) : pasteboard_.data(type);
+}
+
+}  // namespace plume

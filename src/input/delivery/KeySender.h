@@ -1,0 +1,70 @@
+// The keystrokes that delivery is made of: typed chunks, keys, backspaces, arrows, the paste and copy commands.
+//
+// Owned by the input service; used on the tap thread. While a primitive runs isSending() is true and the tap lets
+// everything pass. Lengths and counts are UTF-16 units and key presses.
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+
+#include "input/delivery/ContextInputSetting.h"
+#include "platform/Accessibility.h"
+#include "platform/EventPoster.h"
+
+namespace plume {
+
+// The keys that type "V" and "C" in the user's keyboard layout.
+struct CommandKeyCodes {
+    std::uint16_t v = 9;
+    std::uint16_t c = 8;
+};
+
+class KeySender {
+  public:
+    KeySender(EventPoster& poster, const Accessibility& accessibility);
+
+    // The setting in force: how long chunks are, which way events go. Null until the first application is resolved.
+    void setContextInputSetting(std::shared_ptr<const ContextInputSetting> setting) { setting_ = std::move(setting); }
+    void setCommandKeyCodes(CommandKeyCodes codes) { commandKeys_ = codes; }
+
+    bool isSending() const { return sending_; }
+
+    // Types the text in chunks, none of the modifiers held.
+    void sendPlainText(std::u16string_view text);
+    // Down and up, `count` times.
+    void sendKey(std::uint16_t keyCode, std::uint64_t flags = 0, std::uint64_t count = 1);
+    // When text is selected, one forward delete comes first: it takes the selection, and the rest what was typed.
+    void sendBackspaces(std::uint64_t count);
+    void sendLeftArrowKeys(std::uint64_t count);
+    void sendShiftTab();
+    void sendCopyCommand(bool withControl);
+    void sendPasteCommand(const ContextInputSetting& setting);
+
+  private:
+    // Marks the time of a primitive.
+    class Sending {
+      public:
+        explicit Sending(KeySender& sender);
+        ~Sending();
+        Sending(const Sending&) = delete;
+        Sending& operator=(const Sending&) = delete;
+
+      private:
+        KeySender& sender_;
+    };
+
+    void post(std::uint16_t keyCode, std::uint64_t flags, bool down, std::u16string_view text = {});
+    void press(std::uint16_t keyCode, std::uint64_t flags);
+    void sendAlternativePaste(const ContextInputSetting& setting, std::uint64_t modifier);
+
+    EventPoster& poster_;
+    const Accessibility& accessibility_;
+    std::shared_ptr<const ContextInputSetting> setting_;
+    CommandKeyCodes commandKeys_;
+    bool sending_ = false;
+};
+
+}  // namespace plume

@@ -1,0 +1,194 @@
+#include "input/delivery/OutputDelivery.h"
+
+#include <utility>
+#include <variant>
+
+namespace plume {
+
+namespace {
+// An application that has not taken what was pasted by then is not waited for.
+constexpr double TakingLimit = 1.0;  // seconds from the keystroke
+}  // namespace
+
+OutputDelivery::OutputDelivery(const Dependencies& dependencies)
+    : dependencies_(dependencies),
+      provider_(dependencies.pasteboard, dependencies.tapLoop),
+      sender_(dependencies.poster, dependencies.accessibility),
+      vmPasting_(dependencies.poster, dependencies.processManager, dependencies.tapLoop, dependencies.mainLoop,
+                 dependencies.vmHelper) {
+    provider_.onTaken = [this] { wasTaken(); };
+}
+
+void OutputDelivery::send(std::shared_ptr<PLOutput> output, const TriggerKey& triggerKey, ProcessSerialNumber target) {
+    ContextInputResolver& resolver = dependencies_.resolver;
+    resolver.prepareSending(output->snippetExpandedContent.get());
+    output->contextInputSetting = resolver.setting();
+    prepareOutput(*output, *resolver.setting(), triggerKey, !isIdle());
+
+    Delivery delivery;
+    delivery.setting = std::make_shared<const ContextInputSetting>(*resolver.setting());
+    delivery.target = target;
+    delivery.restoresClipboard =
+        resolver.preferences.restoreClipboard && !delivery.setting->has(InputFlag::DoNotRestoreClipboard);
+    if (delivery.setting->has(InputFlag::DeleteAfterActivateVM)) {
+        delivery.heldBackspaces = std::exchange(output->backspaceCount, 0);
+    }
+    delivery.output = std::move(output);
+    queue_.push_back(std::move(delivery));
+    startNext();
+}
+
+// What is left is nothing, and comes to its end as always.
+void OutputDelivery::abandon() {
+    queue_.clear();
+    if (!current_) return;
+    PLOutput& rest = *current_->output;
+    rest.fragments.clear();
+    rest.backspaceCount = 0;
+    rest.leftArrowCount = 0;
+    current_->heldBackspaces = 0;
+    nextStep_ = batch_.steps.size();
+}
+
+// Keys that are let go at the end of an output may order the next one: that takes its place in the queue.
+void OutputDelivery::startNext() {
+    if (startsNext_) return;
+    startsNext_ = true;
+    while (!current_ && !queue_.empty()) {
+        current_ = std::move(queue_.front());
+        queue_.pop_front();
+        start();
+    }
+    startsNext_ = false;
+}
+
+void OutputDelivery::start() {
+    dependencies_.poster.holdUserKeys();
+    current_->tookOverRestore = provider_.cancelRestore();
+    // A backup may have to read megabytes from a program: only for what goes through the clipboard.
+    if (current_->restoresClipboard && current_->setting->has(InputFlag::UseClipboard)) provider_.backup();
+    sendBatch();
+}
+
+void OutputDelivery::sendBatch() {
+    sender_.setContextInputSetting(current_->setting);
+    batch_ = takeBatch(*current_->output, *current_->setting);
+    nextStep_ = 0;
+    continueBatch();
+}
+
+void OutputDelivery::continueBatch() {
+    performSteps();
+    if (awaitsTaking_) return;
+    if (!batch_.pause) return finish();
+    dependencies_.tapLoop.schedule(*batch_.pause, [this] { sendBatch(); });
+}
+
+// All in one, so that the port can send it together.
+void OutputDelivery::performSteps() {
+    if (nextStep_ == batch_.steps.size()) return;
+    dependencies_.poster.begin();
+    while (nextStep_ < batch_.steps.size() && !awaitsTaking_) perform(batch_.steps[nextStep_++]);
+    dependencies_.poster.end();
+}
+
+void OutputDelivery::perform(const OutputStep& step) {
+    switch (step.kind) {
+        case OutputStep::Kind::Backspaces:
+            return sender_.sendBackspaces(step.count);
+        case OutputStep::Kind::LeftArrows:
+            return sender_.sendLeftArrowKeys(step.count);
+        case OutputStep::Kind::Text:
+            return sender_.sendPlainText(std::get<std::u16string>(step.fragment));
+        case OutputStep::Kind::Paste:
+            return paste(step.fragment);
+        case OutputStep::Kind::Key: {
+            const auto& key = *std::get<std::shared_ptr<SnippetKeyVariable>>(step.fragment);
+            if (key.keyCode != SnippetKeyVariable::NoKey) sender_.sendKey(key.keyCode, key.modifiers, step.count);
+            return;
+        }
+    }
+}
+
+void OutputDelivery::finish() {
+    const bool pastes = current_->setting->has(InputFlag::UseClipboard);
+    const bool restores = pastes && current_->restoresClipboard;
+    // A restore that was put off for an output without a paste of its own is still owed.
+    const bool owesRestore = current_->tookOverRestore && !current_->pasted;
+    if (restores || owesRestore) provider_.restoreAfterDelay();
+    current_->allSent = true;
+    completeIfDone();
+}
+
+void OutputDelivery::completeIfDone() {
+    if (!current_ || !current_->allSent || keystrokesToCome_ > 0) return;
+    current_.reset();
+    dependencies_.poster.releaseUserKeys();
+    startNext();
+}
+
+void OutputDelivery::paste(const PLOutput::Fragment& fragment) {
+    const bool tells = dependencies_.pasteboard.tellsWhenTaken();
+    const auto* text = std::get_if<std::u16string>(&fragment);
+    // Nobody takes nothing, and it would be waited for.
+    if (tells && text && text->empty()) return;
+    offer(fragment);
+    current_->pasted = true;
+    awaitsTaking_ = tells;
+    ++keystrokesToCome_;
+
+    const ContextInputSetting& setting = *current_->setting;
+    if (pastesByActivation(setting)) return pasteByActivation();
+    if (!setting.has(InputFlag::DelayPasting)) return sendPasteCommand();
+    pasting_ = true;
+    dependencies_.tapLoop.schedule(pasteKeystrokeDelay(setting), [this] { sendPasteCommand(); });
+}
+
+void OutputDelivery::offer(const PLOutput::Fragment& fragment) {
+    if (const auto* text = std::get_if<std::u16string>(&fragment)) {
+        provider_.setString(*text);
+    } else if (const auto* rich = std::get_if<AttributedString>(&fragment)) {
+        provider_.includeHTMLData = current_->setting->has(InputFlag::IncludeHTMLData);
+        provider_.excludeParagraphTag = current_->setting->has(InputFlag::ExcludeParagraphTag);
+        provider_.setAttributedString(*rich);
+    }
+}
+
+void OutputDelivery::pasteByActivation() {
+    VMPasting::Order order;
+    order.setting = current_->setting;
+    order.target = current_->target;
+    // The output is on its way until its last paste keystroke is sent.
+    order.sendBackspaces = [this] { sender_.sendBackspaces(std::exchange(current_->heldBackspaces, 0)); };
+    order.sendPasteCommand = [this] { sendPasteCommand(); };
+    vmPasting_.start(std::move(order));
+}
+
+void OutputDelivery::sendPasteCommand() {
+    pasting_ = false;
+    --keystrokesToCome_;
+    hasAskedForPaste_ = true;
+    sender_.sendPasteCommand(*current_->setting);
+    if (awaitsTaking_ && hasAskedForPaste_) {
+        takingLimit_ = dependencies_.tapLoop.schedule(TakingLimit, [this] { goOnBehindPaste(); });
+    }
+    completeIfDone();
+}
+
+// Inside the pasteboard's call, perhaps inside the keystroke's: goes on from the loop.
+void OutputDelivery::wasTaken() {
+    if (!awaitsTaking_ || !hasAskedForPaste_) return;
+    hasAskedForPaste_ = false;
+    dependencies_.tapLoop.cancel(takingLimit_);
+    dependencies_.tapLoop.schedule(0, [this] { goOnBehindPaste(); });
+}
+
+void OutputDelivery::goOnBehindPaste() {
+    awaitsTaking_ = false;
+    hasAskedForPaste_ = false;
+    const bool pausesForPaste = pauseAfterPaste(*current_->setting) > 0;
+    if (pausesForPaste) batch_.pause = pauseAfterTaking(*current_->setting);
+    continueBatch();
+}
+
+}  // namespace plume

@@ -1,0 +1,67 @@
+#include "input/delivery/OutputFragments.h"
+
+#include <algorithm>
+#include <memory>
+#include <variant>
+
+#include "Foundation/CharacterSet.h"
+
+namespace plume {
+
+namespace {
+
+constexpr std::uint64_t DefaultBlockLength = 20;
+
+bool isOwnChunk(char16_t unit) {
+    return unit == u'\t' || CharacterSet::newlines().contains(unit);
+}
+
+}  // namespace
+
+std::vector<std::u16string> fragmentsForPlainText(std::u16string_view text, const ContextInputSetting& setting) {
+    const std::size_t block = setting.blockLength == 0 ? DefaultBlockLength : setting.blockLength;
+    std::vector<std::u16string> chunks;
+    while (!text.empty()) {
+        // Only the first unit of a chunk is looked at: a newline further on stays inside.
+        const std::size_t length = isOwnChunk(text.front()) ? 1 : std::min(block, text.size());
+        chunks.emplace_back(text.substr(0, length));
+        text.remove_prefix(length);
+    }
+    return chunks;
+}
+
+std::vector<PLOutput::Fragment> fragmentsForOutputFragments(const std::vector<PLOutput::Fragment>& fragments,
+                                                            const ContextInputSetting& setting) {
+    std::vector<PLOutput::Fragment> result;
+    for (const auto& fragment : fragments) {
+        const auto* text = std::get_if<std::u16string>(&fragment);
+        if (!text) {
+            result.push_back(fragment);
+            continue;
+        }
+        for (auto& chunk : fragmentsForPlainText(*text, setting)) result.emplace_back(std::move(chunk));
+    }
+    return result;
+}
+
+void refreshFragmentsForOuput(PLOutput& output, const ContextInputSetting& setting) {
+    const auto& content = output.snippetExpandedContent;
+    // A caret located past the end asks for no arrows.
+    const std::int64_t distance = content ? content->caretDistanceFromEnding() : 0;
+    output.leftArrowCount = static_cast<std::uint64_t>(std::max<std::int64_t>(distance, 0));
+    output.refreshFragments();
+    if (content && !content->isRich() && !setting.has(InputFlag::UseClipboard)) {
+        output.fragments = fragmentsForOutputFragments(output.fragments, setting);
+    }
+}
+
+std::uint64_t eventCountForOutput(const PLOutput& output) {
+    std::uint64_t count = output.backspaceCount + output.leftArrowCount;
+    for (const auto& fragment : output.fragments) {
+        if (std::holds_alternative<std::u16string>(fragment)) ++count;
+        if (const auto* key = std::get_if<std::shared_ptr<SnippetKeyVariable>>(&fragment)) count += (*key)->count;
+    }
+    return count;
+}
+
+}  // namespace plume

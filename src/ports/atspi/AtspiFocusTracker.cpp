@@ -1,0 +1,134 @@
+#include "ports/atspi/AtspiFocusTracker.h"
+
+#include <algorithm>
+#include <array>
+#include <string_view>
+#include <utility>
+
+namespace plume {
+
+namespace {
+
+using std::chrono::milliseconds;
+
+constexpr milliseconds UsualPause{250};
+constexpr milliseconds PauseAfterSilence{1'000};
+constexpr milliseconds PauseWithoutBus{5'000};
+// A program that tells nothing is asked ever more rarely.
+constexpr std::array PausesAfterNothing = {milliseconds(500), milliseconds(1'000), milliseconds(2'000),
+                                           milliseconds(5'000)};
+// Programs move their focus some time after the click or the key that makes them do it. From one look to the next.
+constexpr std::array TimesBetweenLooks = {0.015, 0.045, 0.190, 0.750};
+constexpr milliseconds Fresh{50};
+constexpr milliseconds LookBound{1'000};
+
+// Those of which every text is found by walking.
+bool isWalkedThrough(std::string_view toolkit) {
+    return toolkit == "gtk" || toolkit == "GTK" || toolkit == "Qt";
+}
+
+}  // namespace
+
+AtspiFocusTracker::AtspiFocusTracker(PollRunLoop& loop, AtspiBus& bus, BusAddressSource address)
+    : loop_(loop),
+      bus_(bus),
+      address_(std::move(address)),
+      finder_(bus),
+      listener_(loop, [this](const AtspiPart& part) {
+          bus_.begin(LookBound);
+          becomeFocused(listenedFront_, part, listenedProcess_);
+      }) {}
+
+void AtspiFocusTracker::setFrontProcess(pid_t process) {
+    if (!focus_.setFront(process)) return;
+    loop_.perform([this] {
+        listener_.stop();
+        lookSeveralTimes();
+        look();
+    });
+}
+
+void AtspiFocusTracker::focusMayHaveMoved() {
+    loop_.perform([this] { lookSeveralTimes(); });
+}
+
+void AtspiFocusTracker::userTypes() {
+    const Clock::rep now = Clock::now().time_since_epoch().count();
+    Clock::rep next = nextLook_.load(std::memory_order_relaxed);
+    if (now < next) return;
+    const Clock::rep later = now + Clock::duration(UsualPause).count();
+    if (!nextLook_.compare_exchange_strong(next, later, std::memory_order_relaxed)) return;
+    loop_.perform([this] { look(); });
+}
+
+AtspiPart AtspiFocusTracker::focusedNow() {
+    if (Clock::now() - lookedAt_ > Fresh) look();
+    return focus_.part();
+}
+
+void AtspiFocusTracker::lookSeveralTimes() {
+    misses_ = 0;
+    loop_.cancel(nextOfSeries_);
+    lookAfter(0);
+}
+
+void AtspiFocusTracker::lookAfter(std::size_t step) {
+    nextOfSeries_ = loop_.schedule(TimesBetweenLooks.at(step), [this, step] {
+        nextOfSeries_ = 0;
+        if (step + 1 < TimesBetweenLooks.size()) lookAfter(step + 1);
+        look();
+    });
+}
+
+void AtspiFocusTracker::look() {
+    const AtspiFocus::Front front = focus_.front();
+    lookedAt_ = Clock::now();
+    if (address_() == nullptr) return setPause(PauseWithoutBus);
+    bus_.begin(LookBound);
+    const AtspiPart known = connection_ == bus_.connections() ? focus_.part() : AtspiPart();
+    if (known && hasState(bus_, known, AtspiState::Focused)) return setPause(UsualPause);
+    // What is known stays: a password above all, until the program shows something else.
+    if (known && bus_.leftUnanswered()) return setPause(PauseAfterSilence);
+    search(front);
+}
+
+void AtspiFocusTracker::search(const AtspiFocus::Front& front) {
+    const AtspiFocusFinder::Found found = finder_.find(front.process);
+    if (found.part) {
+        becomeFocused(front, found.part, found.process);
+    } else if (bus_.leftUnanswered()) {
+        setPause(PauseAfterSilence);
+    } else {
+        focus_.forget(front);
+        setPause(PausesAfterNothing.at(std::min(misses_, PausesAfterNothing.size() - 1)));
+        if (nextOfSeries_ == 0) ++misses_;
+    }
+    listenWhereItHelps(front, found);
+}
+
+void AtspiFocusTracker::becomeFocused(const AtspiFocus::Front& front, const AtspiPart& part, pid_t process) {
+    const auto role = roleNumberOf(bus_, part);
+    if (!role) return setPause(PauseAfterSilence);
+    connection_ = bus_.connections();
+    focus_.set(front, part, role == AtspiRole::PasswordText, process);
+    misses_ = 0;
+    setPause(UsualPause);
+}
+
+void AtspiFocusTracker::listenWhereItHelps(const AtspiFocus::Front& front, const AtspiFocusFinder::Found& found) {
+    if (found.program.empty()) return;
+    const std::string& toolkit = finder_.toolkitOf(found.program);
+    if (toolkit.empty()) return;  // one of those that are slow to answer must not become slower
+    if (isWalkedThrough(toolkit)) return listener_.stop();
+    const std::string* address = address_();
+    if (address == nullptr) return;
+    listenedFront_ = front;
+    listenedProcess_ = found.process;
+    listener_.listenTo(found.program, *address);
+}
+
+void AtspiFocusTracker::setPause(milliseconds pause) {
+    nextLook_.store((Clock::now() + pause).time_since_epoch().count(), std::memory_order_relaxed);
+}
+
+}  // namespace plume

@@ -1,0 +1,65 @@
+#include "ports/atspi/AtspiParts.h"
+
+#include <algorithm>
+#include <string_view>
+#include <utility>
+
+namespace plume {
+
+namespace {
+
+constexpr std::string_view NoPart = "/org/a11y/atspi/null";
+
+}  // namespace
+
+AtspiPart partIn(BusReader reader) {
+    auto name = reader.string();
+    auto path = reader.objectPath();
+    // Programs write what they like as a name.
+    if (!name || !path || *path == NoPart || dbus_validate_bus_name(name->c_str(), nullptr) == 0) return {};
+    return {std::move(*name), std::move(*path)};
+}
+
+std::optional<AtspiStates> statesOf(AtspiBus& bus, const AtspiPart& part) {
+    const BusAnswer answer = bus.call(part, AccessibleInterface, "GetState");
+    BusReader words = answer.values().inside();
+    const auto low = words.uint32();
+    const auto high = words.uint32();
+    if (!low) return std::nullopt;
+    return AtspiStates(static_cast<std::uint64_t>(high.value_or(0)) << 32U | *low);
+}
+
+bool hasState(AtspiBus& bus, const AtspiPart& part, AtspiState state) {
+    const auto states = statesOf(bus, part);
+    return states && states->has(state);
+}
+
+std::optional<AtspiRole> roleNumberOf(AtspiBus& bus, const AtspiPart& part) {
+    const auto role = bus.call(part, AccessibleInterface, "GetRole").values().uint32();
+    return role ? std::optional(static_cast<AtspiRole>(*role)) : std::nullopt;
+}
+
+AtspiPart parentOf(AtspiBus& bus, const AtspiPart& part) {
+    const BusAnswer answer = bus.property(part, AccessibleInterface, "Parent");
+    return partIn(answer.values().inside().inside());
+}
+
+std::vector<AtspiPart> childrenOf(AtspiBus& bus, const AtspiPart& part, std::int32_t most) {
+    std::vector<AtspiPart> children;
+    const BusAnswer counted = bus.property(part, AccessibleInterface, "ChildCount");
+    const std::int32_t count = counted.values().inside().int32().value_or(0);
+    if (count > most) {  // perhaps millions, so not all at once
+        for (std::int32_t i = 0; i < most && !bus.leftUnanswered(); ++i) {
+            const BusAnswer answer = bus.call(part, AccessibleInterface, "GetChildAtIndex", {i});
+            if (AtspiPart child = partIn(answer.values().inside())) children.push_back(std::move(child));
+        }
+    } else if (count > 0) {
+        const BusAnswer answer = bus.call(part, AccessibleInterface, "GetChildren");
+        for (BusReader list = answer.values().inside(); !list.isAtEnd();) {
+            if (AtspiPart child = partIn(list.inside())) children.push_back(std::move(child));
+        }
+    }
+    return children;
+}
+
+}  // namespace plume

@@ -1,0 +1,151 @@
+#include "ports/posix/PollRunLoop.h"
+
+#include <sys/eventfd.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cmath>
+#include <ctime>
+#include <limits>
+#include <system_error>
+
+namespace plume {
+
+namespace {
+
+int makeWakeUp() {
+    const int descriptor = eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
+    if (descriptor < 0) throw std::system_error(errno, std::generic_category(), "eventfd");
+    return descriptor;
+}
+
+constexpr double Forever = std::numeric_limits<double>::infinity();
+// poll() takes no longer ones; waking up once a day harms nobody.
+constexpr double LongestWait = 86400;
+
+}  // namespace
+
+PollRunLoop::PollRunLoop() : wakeUp_(makeWakeUp()) {}
+
+PollRunLoop::~PollRunLoop() {
+    close(wakeUp_);
+}
+
+double PollRunLoop::now() const {
+    return std::chrono::duration<double>(std::chrono::steady_clock::now().time_since_epoch()).count();
+}
+
+RunLoop::CallId PollRunLoop::schedule(double delay, Call call) {
+    const double due = now() + std::max(delay, 0.0);
+    const CallId id = ++lastId_;
+    delayed_.emplace(Moment(due, id), std::move(call));
+    dueOf_.emplace(id, due);
+    return id;
+}
+
+void PollRunLoop::cancel(CallId id) {
+    const auto found = dueOf_.find(id);
+    if (found == dueOf_.end()) return;
+    // Kept until the bookkeeping is right: what the call holds may use the loop when it goes.
+    const auto dropped = delayed_.extract(Moment(found->second, id));
+    dueOf_.erase(found);
+}
+
+void PollRunLoop::perform(Call call) {
+    {
+        const std::lock_guard lock(mutex_);
+        handedOver_.push_back(std::move(call));
+    }
+    eventfd_write(wakeUp_, 1);
+}
+
+void PollRunLoop::stop() {
+    stopped_ = true;
+    eventfd_write(wakeUp_, 1);
+}
+
+void PollRunLoop::addSource(int descriptor, Call drain) {
+    sources_.insert_or_assign(descriptor, Source{std::make_shared<const Call>(std::move(drain)), false});
+}
+
+void PollRunLoop::setSourcePaused(int descriptor, bool paused) {
+    const auto found = sources_.find(descriptor);
+    if (found != sources_.end()) found->second.paused = paused;
+}
+
+void PollRunLoop::removeSource(int descriptor) {
+    // Kept until it has returned: a source may remove itself.
+    const auto dropped = sources_.extract(descriptor);
+}
+
+void PollRunLoop::run() {
+    while (!stopped_) {
+        runHandedOver();
+        runDue();
+        // Last: a call that waits for an answer may have made a library read more than that answer.
+        drainSources();
+        if (!stopped_) wait();
+    }
+    stopped_ = false;
+}
+
+void PollRunLoop::drainSources() {
+    // By key, not by iterator: a source may add and remove sources.
+    for (auto next = sources_.begin(); next != sources_.end() && !stopped_;) {
+        const int descriptor = next->first;
+        if (!next->second.paused) {
+            const auto drain = next->second.drain;
+            (*drain)();
+        }
+        next = sources_.upper_bound(descriptor);
+    }
+}
+
+void PollRunLoop::runHandedOver() {
+    std::deque<Call> calls;
+    {
+        const std::lock_guard lock(mutex_);
+        calls.swap(handedOver_);
+    }
+    for (const Call& call : calls) call();
+}
+
+void PollRunLoop::runDue() {
+    // What is asked for now comes later: a call that repeats itself without delay must not keep the sources waiting.
+    const CallId newest = lastId_;
+    const double moment = delayed_.empty() ? 0 : now();
+    while (!delayed_.empty() && !stopped_) {
+        const auto first = delayed_.begin();
+        if (first->first.first > moment || first->first.second > newest) return;
+        const auto due = delayed_.extract(first);
+        dueOf_.erase(due.key().second);
+        due.mapped()();
+    }
+}
+
+double PollRunLoop::secondsToWait() const {
+    if (delayed_.empty()) return Forever;
+    return std::clamp(delayed_.begin()->first.first - now(), 0.0, LongestWait);
+}
+
+void PollRunLoop::wait() {
+    polled_.clear();
+    polled_.push_back({wakeUp_, POLLIN, 0});
+    for (const auto& [descriptor, source] : sources_) {
+        if (!source.paused) polled_.push_back({descriptor, POLLIN, 0});
+    }
+    const double seconds = secondsToWait();
+    timespec limit{};
+    if (seconds != Forever) {
+        limit.tv_sec = static_cast<time_t>(seconds);
+        limit.tv_nsec = static_cast<long>((seconds - std::floor(seconds)) * 1e9);
+    }
+    ppoll(polled_.data(), polled_.size(), seconds == Forever ? nullptr : &limit, nullptr);
+    if (polled_.front().revents != 0) {
+        eventfd_t count = 0;
+        eventfd_read(wakeUp_, &count);
+    }
+}
+
+}  // namespace plume

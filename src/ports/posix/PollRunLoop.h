@@ -1,0 +1,72 @@
+// The run loop of a real thread: delayed calls, calls handed over, and descriptors that wake it.
+//
+// Sleeps in one poll() until something is due, so that a program in which nothing happens never wakes up. Made on any
+// thread; run() decides which one it belongs to.
+#pragma once
+
+#include <poll.h>
+
+#include <atomic>
+#include <cstdint>
+#include <deque>
+#include <functional>
+#include <map>
+#include <memory>
+#include <mutex>
+#include <unordered_map>
+#include <utility>
+#include <vector>
+
+#include "platform/RunLoop.h"
+
+namespace plume {
+
+class PollRunLoop final : public RunLoop {
+  public:
+    PollRunLoop();
+    ~PollRunLoop() override;
+    PollRunLoop(const PollRunLoop&) = delete;
+    PollRunLoop& operator=(const PollRunLoop&) = delete;
+
+    double now() const override;
+    CallId schedule(double delay, Call call) override;
+    void cancel(CallId id) override;
+    void perform(Call call) override;
+
+    // Runs until stop(), also when that came first. What is not due by then stays undone.
+    void run();
+    // From any thread, and from signal handlers.
+    void stop();
+
+    // Calls `drain` when the descriptor can be read, and before every wait: a library that reads ahead may hold input
+    // that no poll() would tell of. It must take all there is. Only on the loop's own thread, or before run().
+    void addSource(int descriptor, Call drain);
+    // A paused source is left alone: what arrives waits in the system's buffers, in order.
+    void setSourcePaused(int descriptor, bool paused);
+    void removeSource(int descriptor);
+
+  private:
+    struct Source {
+        std::shared_ptr<const Call> drain;
+        bool paused = false;
+    };
+    using Moment = std::pair<double, CallId>;
+
+    void drainSources();
+    void runHandedOver();
+    void runDue();
+    void wait();
+    double secondsToWait() const;
+
+    const int wakeUp_;  // an eventfd
+    std::atomic<bool> stopped_ = false;
+    CallId lastId_ = 0;
+    std::map<Moment, Call> delayed_;
+    std::unordered_map<CallId, double> dueOf_;
+    std::map<int, Source> sources_;
+    std::vector<pollfd> polled_;  // kept for its memory
+    std::mutex mutex_;
+    std::deque<Call> handedOver_;  // guarded by mutex_
+};
+
+}  // namespace plume

@@ -1,0 +1,104 @@
+#include "ports/simulated/SimulatedKeyboard.h"
+
+#include <utility>
+
+#include "ports/simulated/SimulatedModifiers.h"
+
+namespace plume {
+
+SimulatedKeyboard::SimulatedKeyboard(RunLoop& runLoop, const InputSources& inputSources, SimulatedKeyboardTap& tap,
+                                     SimulatedSystemHotKeys& hotKeys, Deliver deliver)
+    : runLoop_(runLoop), inputSources_(inputSources), tap_(tap), hotKeys_(hotKeys), deliver_(std::move(deliver)) {}
+
+SimulatedKeyboard::~SimulatedKeyboard() {
+    runLoop_.cancel(holdLimit_);
+}
+
+void SimulatedKeyboard::press(std::uint16_t keyCode) {
+    const bool isModifier = modifierFlagOf(keyCode) != 0;
+    const bool isNew = down_.insert(keyCode).second;
+    if (isModifier) {
+        if (isNew) arrive({TapEvent::Type::FlagsChanged, keyCode, flags(), {}, true});
+        return;
+    }
+    const std::u16string produced = inputSources_.translateKey(keyCode, flags()).value_or(std::u16string());
+    arrive({TapEvent::Type::KeyDown, keyCode, flags(), produced, true});
+}
+
+void SimulatedKeyboard::release(std::uint16_t keyCode) {
+    if (down_.erase(keyCode) == 0) return;
+    if (modifierFlagOf(keyCode) != 0) {
+        arrive({TapEvent::Type::FlagsChanged, keyCode, flags(), {}, false});
+        return;
+    }
+    const std::u16string produced = inputSources_.translateKey(keyCode, flags()).value_or(std::u16string());
+    arrive({TapEvent::Type::KeyUp, keyCode, flags(), produced, false});
+}
+
+void SimulatedKeyboard::pressCharacter(std::u16string_view character) {
+    arrive({TapEvent::Type::KeyDown, UnmappedKeyCode, flags(), std::u16string(character), true});
+}
+
+void SimulatedKeyboard::releaseCharacter(std::u16string_view character) {
+    arrive({TapEvent::Type::KeyUp, UnmappedKeyCode, flags(), std::u16string(character), false});
+}
+
+std::uint64_t SimulatedKeyboard::flags() const {
+    std::uint64_t held = 0;
+    for (const std::uint16_t keyCode : down_) held |= modifierFlagOf(keyCode);
+    return held;
+}
+
+void SimulatedKeyboard::hold() {
+    if (!canHold_) return;
+    holding_ = true;
+    runLoop_.cancel(holdLimit_);
+    holdLimit_ = runLoop_.schedule(LongestHold, [this] { letGo(); });
+}
+
+void SimulatedKeyboard::letGo() {
+    runLoop_.cancel(holdLimit_);
+    holding_ = false;
+    // A key that follows may make the rest wait again, or even let go once more.
+    if (lettingGo_) return;
+    lettingGo_ = true;
+    while (!holding_ && !waiting_.empty()) {
+        const Waiting next = std::move(waiting_.front());
+        waiting_.pop_front();
+        if (next.decided) {
+            pass(next.key);
+        } else {
+            decide(next.key);
+        }
+    }
+    lettingGo_ = false;
+}
+
+void SimulatedKeyboard::arrive(Key key) {
+    if (holding_ || !waiting_.empty()) {
+        waiting_.push_back({std::move(key), false});
+    } else {
+        decide(key);
+    }
+}
+
+void SimulatedKeyboard::decide(const Key& key) {
+    if (tap_.swallows({key.type, key.keyCode, key.flags, key.string})) return;
+    if (holding_) {
+        // Its own output goes first; keys that came during the decision stay behind it.
+        waiting_.push_front({key, true});
+    } else {
+        pass(key);
+    }
+}
+
+void SimulatedKeyboard::pass(const Key& key) {
+    if (key.type == TapEvent::Type::KeyDown && hotKeys_.press(key.keyCode, modifiersFromFlags(key.flags))) {
+        takenBySystem_.insert(key.keyCode);
+        return;
+    }
+    if (key.type == TapEvent::Type::KeyUp && takenBySystem_.erase(key.keyCode) != 0) return;
+    deliver_(key);
+}
+
+}  // namespace plume

@@ -1,0 +1,84 @@
+// The user's keyboard on the simulated desktop: which keys are held, and the way of a key through the tap and the
+// system's hot keys to the program in front.
+#pragma once
+
+#include <cstdint>
+#include <deque>
+#include <functional>
+#include <optional>
+#include <set>
+#include <string>
+
+#include "platform/InputSources.h"
+#include "platform/RunLoop.h"
+#include "ports/simulated/SimulatedKeyboardTap.h"
+#include "ports/simulated/SimulatedSystemHotKeys.h"
+
+namespace plume {
+
+class SimulatedKeyboard {
+  public:
+    // The key code of a character that is on no key.
+    static constexpr std::uint16_t UnmappedKeyCode = 0x7F;
+    // Held keys follow after this time at the latest, in seconds.
+    static constexpr double LongestHold = 2;
+
+    // A key on its way to the program in front.
+    struct Key {
+        TapEvent::Type type = TapEvent::Type::KeyDown;
+        std::uint16_t keyCode = 0;
+        std::uint64_t flags = 0;
+        std::u16string string;
+        bool isDown = true;
+    };
+    using Deliver = std::function<void(const Key& key)>;
+
+    // Nothing is owned; all of it outlives the keyboard.
+    SimulatedKeyboard(RunLoop& runLoop, const InputSources& inputSources, SimulatedKeyboardTap& tap,
+                      SimulatedSystemHotKeys& hotKeys, Deliver deliver);
+    ~SimulatedKeyboard();
+    SimulatedKeyboard(const SimulatedKeyboard&) = delete;
+    SimulatedKeyboard& operator=(const SimulatedKeyboard&) = delete;
+
+    // A key that is down already repeats; a modifier key does not.
+    void press(std::uint16_t keyCode);
+    void release(std::uint16_t keyCode);
+    // A key that stands for a character which the layout has on no key.
+    void pressCharacter(std::u16string_view character);
+    void releaseCharacter(std::u16string_view character);
+
+    bool isDown(std::uint16_t keyCode) const { return down_.contains(keyCode); }
+    // Event flag bits of the modifiers held.
+    std::uint64_t flags() const;
+
+    // Whether the port can make the user's keys wait; it cannot at first.
+    void setCanHold(bool can) { canHold_ = can; }
+    void hold();
+    void letGo();
+
+  private:
+    // A held key, and whether the listener has decided about it.
+    struct Waiting {
+        Key key;
+        bool decided;
+    };
+
+    void arrive(Key key);
+    void decide(const Key& key);
+    void pass(const Key& key);
+
+    RunLoop& runLoop_;
+    const InputSources& inputSources_;
+    SimulatedKeyboardTap& tap_;
+    SimulatedSystemHotKeys& hotKeys_;
+    const Deliver deliver_;
+    std::set<std::uint16_t> down_;
+    std::set<std::uint16_t> takenBySystem_;  // keys whose release the system keeps as well
+    bool canHold_ = false;
+    bool holding_ = false;
+    bool lettingGo_ = false;
+    std::deque<Waiting> waiting_;
+    RunLoop::CallId holdLimit_ = 0;
+};
+
+}  // namespace plume

@@ -1,0 +1,30 @@
+#include "ports/simulated/SimulatedProcessManager.h"
+
+#include <utility>
+
+namespace plume {
+
+SimulatedProcessManager::SimulatedProcessManager() : own_(launch(u"org.plume.Plume", u"Plume")) {}
+
+ProcessSerialNumber SimulatedProcessManager::launch(std::optional<std::u16string> bundleIdentifier,
+                                                    std::optional<std::u16string> localizedName) {
+    ++launched_;
+    const ProcessSerialNumber process{0, launched_};
+    running_[process] = {1000 + static_cast<std::int64_t>(launched_), std::move(bundleIdentifier),
+                         std::move(localizedName), std::nullopt};
+    return process;
+}
+
+void SimulatedProcessManager::terminate(ProcessSerialNumber process) {
+    running_.erase(process);
+    if (front_ == process) front_.reset();
+}
+
+std::optional<RunningApplication> SimulatedProcessManager::runningApplication(ProcessSerialNumber process) const {
+    ++queries_;
+    const auto found = running_.find(process);
+    if (found == running_.end()) return std::nullopt;
+    return found->second;
+}
+
+}  // namespace plume

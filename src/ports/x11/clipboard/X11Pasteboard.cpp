@@ -1,0 +1,208 @@
+#include "ports/x11/clipboard/X11Pasteboard.h"
+
+#include <xcb/xfixes.h>
+
+#include <algorithm>
+#include <cstring>
+#include <utility>
+
+#include "Foundation/Strings.h"
+#include "ports/x11/clipboard/X11PasteboardContent.h"
+#include "ports/x11/clipboard/X11SelectionOwner.h"
+#include "ports/x11/clipboard/X11SelectionReader.h"
+#include "ports/x11/clipboard/X11SelectionTransfers.h"
+#include "ports/x11/clipboard/X11SelectionTypes.h"
+
+namespace plume {
+
+namespace {
+
+constexpr double LongestHandOver = 0.5;  // seconds
+
+// Text in whatever encoding a program gave it.
+std::string utf8FromText(std::string_view bytes, std::string_view target) {
+    const bool isLatin1 =
+        target == SelectionTarget::Latin1String || (target == SelectionTarget::PlainText && !fromStrictUtf8(bytes));
+    return isLatin1 ? utf8FromLatin1(bytes) : std::string(bytes);
+}
+
+}  // namespace
+
+Result<std::unique_ptr<X11Pasteboard>> X11Pasteboard::open(X11Session& session) {
+    if (!session.connection().extension(xcb_xfixes_id)) {
+        return Error{"The X server \"" + session.connection().displayName() +
+                     "\" lacks the XFIXES extension, which Plume needs to follow the clipboard: switch it on."};
+    }
+    const auto cookie = xcb_xfixes_query_version(session.get(), 1, 0);
+    const XcbOwned<xcb_xfixes_query_version_reply_t> version(
+        xcb_xfixes_query_version_reply(session.get(), cookie, nullptr));
+    if (!version) return Error{"The X server is gone."};
+    return std::unique_ptr<X11Pasteboard>(new X11Pasteboard(session));
+}
+
+X11Pasteboard::X11Pasteboard(X11Session& session)
+    : session_(session),
+      transfers_(std::make_unique<X11SelectionTransfers>(session, session.runLoop())),
+      reader_(std::make_unique<X11SelectionReader>(session, session.runLoop(), "CLIPBOARD")),
+      primaryReader_(std::make_unique<X11SelectionReader>(session, session.runLoop(), "PRIMARY")) {
+    clipboard_ =
+        std::make_unique<X11SelectionOwner>(session, *transfers_, "CLIPBOARD", [this](bool ours) { noteChange(ours); });
+    primary_ = std::make_unique<X11SelectionOwner>(session, *transfers_, "PRIMARY",
+                                                   [this](bool) { primaryReader_->ownerChanged(); });
+    const auto counts = [this](xcb_window_t requestor) { return isInFront(requestor); };
+    clipboard_->readingCounts = counts;
+    primary_->readingCounts = counts;
+}
+
+X11Pasteboard::~X11Pasteboard() = default;
+
+void X11Pasteboard::noteChange(bool ours) {
+    ++changeCount_;
+    if (ours) declaredCount_ = changeCount_;
+    if (!ours && legacy_) legacy_->clear();
+    if (!ours && ownershipLost) ownershipLost();
+    reader_->ownerChanged();
+}
+
+void X11Pasteboard::takeUp(const std::vector<ClipboardLegacy::Entry>& entries) {
+    std::vector<std::string> types;
+    for (const auto& entry : entries) {
+        types.push_back(entry.type);
+        forms_.insert_or_assign(entry.type, std::pair(entry.form, entry.format));
+    }
+    declareTypes(types, nullptr);
+    for (const auto& entry : entries) setData(entry.bytes, entry.type);
+}
+
+bool X11Pasteboard::isHeld() const {
+    session_.collect();
+    return clipboard_->hasOwner();
+}
+
+bool X11Pasteboard::isOffering() const {
+    session_.collect();
+    return clipboard_->isOwner();
+}
+
+std::int64_t X11Pasteboard::changeCount() const {
+    session_.collect();
+    return changeCount_;
+}
+
+std::vector<std::string> X11Pasteboard::types() const {
+    if (isOffering()) return content_ ? content_->types() : std::vector<std::string>();
+    return clipboard_->hasOwner() ? typesOfTargets(reader_->targets()) : std::vector<std::string>();
+}
+
+std::optional<std::u16string> X11Pasteboard::string() const {
+    const auto bytes = data(PasteboardType::String);
+    return bytes ? std::optional(fromUtf8(*bytes)) : std::nullopt;
+}
+
+std::optional<std::string> X11Pasteboard::data(std::string_view type) const {
+    if (isOffering()) {
+        const auto content = content_;
+        return content ? content->data(type) : std::nullopt;
+    }
+    if (!clipboard_->hasOwner()) return std::nullopt;
+    const std::string target(targetForType(type, reader_->targets()));
+    if (target.empty() || isMetaTarget(target)) return std::nullopt;
+    const auto value = reader_->read(target);
+    if (!value) return std::nullopt;
+    const bool isText = type == PasteboardType::String;
+    if (!isText) forms_.insert_or_assign(target, std::pair(value->type, value->format));
+    std::string bytes = isText ? utf8FromText(*value->bytes, target) : *value->bytes;
+    if (legacy_) legacy_->add(type, isText ? xcb_atom_t{XCB_ATOM_NONE} : value->type, value->format, bytes);
+    return bytes;
+}
+
+std::int64_t X11Pasteboard::declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) {
+    session_.collect();
+    content_ = std::make_shared<X11PasteboardContent>(session_.connection(), *this, types, owner, forms_);
+    declaredCount_ = 0;
+    if (types.empty()) {
+        clipboard_->release();
+    } else {
+        clipboard_->own(content_);
+    }
+    // The server may have refused, or be gone: even so what was declared is something new.
+    if (declaredCount_ == 0) declaredCount_ = ++changeCount_;
+    offerPrimary();
+    return declaredCount_;
+}
+
+void X11Pasteboard::setString(std::u16string_view string, std::string_view type) {
+    if (content_) content_->set(toUtf8(string), type);
+}
+
+void X11Pasteboard::setData(std::string_view bytes, std::string_view type) {
+    if (content_) content_->set(std::string(bytes), type);
+}
+
+void X11Pasteboard::offerPrimary() {
+    if (content_->isExpansion() && pastesPrimary && pastesPrimary()) {
+        if (!primary_->isOwner()) selectedBefore_ = selectedText();
+        primary_->own(content_);
+    } else if (primary_->isOwner() && primary_->content() != selectedBefore_) {
+        if (selectedBefore_) {
+            primary_->own(selectedBefore_);
+        } else {
+            primary_->release();
+        }
+    }
+}
+
+std::shared_ptr<X11PasteboardContent> X11Pasteboard::selectedText() {
+    if (!primary_->hasOwner()) return nullptr;
+    const auto value = primaryReader_->read(SelectionTarget::Utf8String);
+    if (!value) return nullptr;
+    const std::string type(PasteboardType::String);
+    auto text =
+        std::make_shared<X11PasteboardContent>(session_.connection(), *this, std::vector{type}, nullptr, forms_);
+    text->set(*value->bytes, type);
+    return text;
+}
+
+// The server numbers the windows of one program alike.
+bool X11Pasteboard::isInFront(xcb_window_t requestor) const {
+    xcb_connection_t* const connection = session_.get();
+    const auto focusCookie = xcb_get_input_focus(connection);
+    const auto activeCookie = xcb_get_property(connection, 0, session_.connection().root(),
+                                               session_.connection().atom("_NET_ACTIVE_WINDOW"), XCB_ATOM_WINDOW, 0, 1);
+    const XcbOwned<xcb_get_input_focus_reply_t> focus(xcb_get_input_focus_reply(connection, focusCookie, nullptr));
+    const XcbOwned<xcb_get_property_reply_t> active(xcb_get_property_reply(connection, activeCookie, nullptr));
+    const auto isOfSameProgram = [&](xcb_window_t window) {
+        return ((window ^ requestor) & ~xcb_get_setup(connection)->resource_id_mask) == 0;
+    };
+    if (focus && isOfSameProgram(focus->focus)) return true;
+    if (!active || xcb_get_property_value_length(active.get()) != sizeof(xcb_window_t)) return false;
+    xcb_window_t window = XCB_WINDOW_NONE;
+    std::memcpy(&window, xcb_get_property_value(active.get()), sizeof window);
+    return isOfSameProgram(window);
+}
+
+void X11Pasteboard::handOver() {
+    constexpr std::string_view Property = "PLUME_SAVE_TARGETS";
+    if (!isOffering() || !content_ || content_->isExpansion()) return;
+    XcbConnection& connection = session_.connection();
+    const xcb_atom_t manager = connection.atom("CLIPBOARD_MANAGER");
+    const xcb_atom_t property = connection.atom(Property);
+    const auto targets = content_->targets();
+    xcb_change_property(session_.get(), XCB_PROP_MODE_REPLACE, session_.window(), property, XCB_ATOM_ATOM, 32,
+                        static_cast<std::uint32_t>(targets.size()), targets.data());
+    bool isAnswered = false;
+    const auto observer = session_.addObserver(XCB_SELECTION_NOTIFY, [&](const xcb_generic_event_t& event) {
+        isAnswered |= reinterpret_cast<const xcb_selection_notify_event_t&>(event).selection == manager;
+    });
+    // Without a manager the server itself answers at once.
+    xcb_convert_selection(session_.get(), session_.window(), manager, connection.atom("SAVE_TARGETS"), property,
+                          session_.serverTime());
+    const auto served = [&] {
+        session_.drain();
+        return isAnswered;
+    };
+    session_.waitUntil(served, LongestHandOver);
+    session_.removeHandler(observer);
+}
+
+}  // namespace plume

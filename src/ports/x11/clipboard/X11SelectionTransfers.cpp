@@ -1,0 +1,118 @@
+#include "ports/x11/clipboard/X11SelectionTransfers.h"
+
+#include <algorithm>
+
+namespace plume {
+
+namespace {
+
+constexpr std::size_t UsualPiece = std::size_t{1} << 20;
+constexpr std::size_t RoomForTheRequest = 256;
+constexpr double LongestIdle = 30;  // seconds
+constexpr std::uint32_t RequestorEvents = XCB_EVENT_MASK_PROPERTY_CHANGE | XCB_EVENT_MASK_STRUCTURE_NOTIFY;
+
+std::size_t longestPieceOf(xcb_connection_t* connection) {
+    const std::size_t longestRequest = std::size_t{xcb_get_maximum_request_length(connection)} * 4;
+    return std::min(UsualPiece, longestRequest - RoomForTheRequest) & ~std::size_t{3};
+}
+
+}  // namespace
+
+X11SelectionTransfers::X11SelectionTransfers(X11Session& session, RunLoop& runLoop)
+    : session_(session), runLoop_(runLoop), longestPiece_(longestPieceOf(session.get())) {
+    propertyHandler_ = session_.addHandler(XCB_PROPERTY_NOTIFY, [this](const xcb_generic_event_t& event) {
+        const auto& change = reinterpret_cast<const xcb_property_notify_event_t&>(event);
+        if (change.state == XCB_PROPERTY_DELETE) propertyWasRemoved({change.window, change.atom});
+    });
+    destroyHandler_ = session_.addHandler(XCB_DESTROY_NOTIFY, [this](const xcb_generic_event_t& event) {
+        forgetWindow(reinterpret_cast<const xcb_destroy_notify_event_t&>(event).window);
+    });
+    errorHandler_ = session_.addHandler(0, [this](const xcb_generic_event_t& event) {
+        const auto& error = reinterpret_cast<const xcb_generic_error_t&>(event);
+        if (error.error_code == XCB_WINDOW) forgetWindow(error.resource_id);
+    });
+}
+
+X11SelectionTransfers::~X11SelectionTransfers() {
+    for (const auto handler : {propertyHandler_, destroyHandler_, errorHandler_}) session_.removeHandler(handler);
+    runLoop_.cancel(pendingSweep_);
+    for (const auto& transfer : transfers_) session_.unlisten(transfer.first.first, RequestorEvents);
+}
+
+void X11SelectionTransfers::send(xcb_window_t requestor, xcb_atom_t property, X11SelectionValue value,
+                                 std::function<void()> taken) {
+    const Key key(requestor, property);
+    const auto before = transfers_.find(key);
+    if (before != transfers_.end()) forget(before);
+    // Before the value is written: its removal must not be missed.
+    session_.listen(requestor, RequestorEvents);
+    const auto transfer = transfers_.emplace(key, Transfer{std::move(value), std::move(taken)}).first;
+    begin(key, transfer->second);
+    if (pendingSweep_ == 0) pendingSweep_ = runLoop_.schedule(LongestIdle, [this] { forgetIdle(); });
+}
+
+void X11SelectionTransfers::begin(const Key& key, Transfer& transfer) {
+    transfer.lastMoved = runLoop_.now();
+    const std::size_t size = transfer.value.bytes->size();
+    transfer.isIncremental = size > longestPiece_;
+    if (!transfer.isIncremental) {
+        transfer.isComplete = true;
+        write(key, transfer.value, 0, size);
+        return;
+    }
+    const auto atLeast = static_cast<std::uint32_t>(std::min<std::size_t>(size, 0x7FFFFFFF));
+    xcb_change_property(session_.get(), XCB_PROP_MODE_REPLACE, key.first, key.second,
+                        session_.connection().atom("INCR"), 32, 1, &atLeast);
+}
+
+void X11SelectionTransfers::write(const Key& key, const X11SelectionValue& value, std::size_t from,
+                                  std::size_t count) const {
+    const std::size_t unit = value.format / 8;
+    xcb_change_property(session_.get(), XCB_PROP_MODE_REPLACE, key.first, key.second, value.type, value.format,
+                        static_cast<std::uint32_t>(count / unit), value.bytes->data() + from);
+}
+
+void X11SelectionTransfers::sendPiece(const Key& key, Transfer& transfer) {
+    const std::size_t count = std::min(longestPiece_, transfer.value.bytes->size() - transfer.sent);
+    write(key, transfer.value, transfer.sent, count);
+    transfer.sent += count;
+    transfer.isComplete = count == 0;  // an empty piece is the last
+    transfer.lastMoved = runLoop_.now();
+}
+
+void X11SelectionTransfers::propertyWasRemoved(const Key& key) {
+    const auto found = transfers_.find(key);
+    if (found == transfers_.end()) return;
+    Transfer& transfer = found->second;
+    const bool hasLast = transfer.isIncremental && transfer.sent == transfer.value.bytes->size();
+    const auto taken = transfer.isComplete || hasLast ? std::exchange(transfer.taken, nullptr) : nullptr;
+    if (transfer.isComplete) {
+        forget(found);
+    } else {
+        sendPiece(key, transfer);
+    }
+    session_.flush();
+    if (taken) taken();
+}
+
+void X11SelectionTransfers::forgetWindow(xcb_window_t window) {
+    for (auto next = transfers_.lower_bound({window, 0}); next != transfers_.end() && next->first.first == window;) {
+        forget(next++);
+    }
+}
+
+void X11SelectionTransfers::forget(std::map<Key, Transfer>::iterator transfer) {
+    session_.unlisten(transfer->first.first, RequestorEvents);
+    transfers_.erase(transfer);
+}
+
+void X11SelectionTransfers::forgetIdle() {
+    const double now = runLoop_.now();
+    for (auto next = transfers_.begin(); next != transfers_.end();) {
+        const auto transfer = next++;
+        if (now - transfer->second.lastMoved >= LongestIdle) forget(transfer);
+    }
+    pendingSweep_ = transfers_.empty() ? 0 : runLoop_.schedule(LongestIdle, [this] { forgetIdle(); });
+}
+
+}  // namespace plume

@@ -1,0 +1,67 @@
+// Content on its way to other programs: written into properties of their windows, piece by piece where it is long.
+//
+// Belongs to the tap thread. A requestor that dies or falls asleep costs the memory of its content for half a minute.
+#pragma once
+
+#include <xcb/xcb.h>
+
+#include <cstdint>
+#include <functional>
+#include <map>
+#include <memory>
+#include <string>
+#include <utility>
+
+#include "platform/RunLoop.h"
+#include "ports/x11/X11Session.h"
+
+namespace plume {
+
+// A value as X keeps it in a property.
+struct X11SelectionValue {
+    xcb_atom_t type = XCB_ATOM_NONE;
+    std::uint8_t format = 8;  // bits of one unit
+    std::shared_ptr<const std::string> bytes;
+};
+
+class X11SelectionTransfers {
+  public:
+    X11SelectionTransfers(X11Session& session, RunLoop& runLoop);
+    ~X11SelectionTransfers();
+    X11SelectionTransfers(const X11SelectionTransfers&) = delete;
+    X11SelectionTransfers& operator=(const X11SelectionTransfers&) = delete;
+
+    // Writes the value, in place of what was under way to the same property. `taken` is called when the requestor has
+    // removed the last of it.
+    void send(xcb_window_t requestor, xcb_atom_t property, X11SelectionValue value, std::function<void()> taken);
+
+  private:
+    using Key = std::pair<xcb_window_t, xcb_atom_t>;
+    struct Transfer {
+        X11SelectionValue value;
+        std::function<void()> taken;
+        bool isIncremental = false;
+        bool isComplete = false;  // the last piece is there
+        std::size_t sent = 0;     // bytes
+        double lastMoved = 0;
+    };
+
+    void begin(const Key& key, Transfer& transfer);
+    void sendPiece(const Key& key, Transfer& transfer);
+    void propertyWasRemoved(const Key& key);
+    void forgetWindow(xcb_window_t window);
+    void forget(std::map<Key, Transfer>::iterator transfer);
+    void forgetIdle();
+    void write(const Key& key, const X11SelectionValue& value, std::size_t from, std::size_t count) const;
+
+    X11Session& session_;
+    RunLoop& runLoop_;
+    const std::size_t longestPiece_;  // bytes
+    std::map<Key, Transfer> transfers_;
+    RunLoop::CallId pendingSweep_ = 0;
+    X11Session::HandlerId propertyHandler_;
+    X11Session::HandlerId destroyHandler_;
+    X11Session::HandlerId errorHandler_;
+};
+
+}  // namespace plume

@@ -1,0 +1,272 @@
+#include "ports/x11/keyboard/TapSession.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "ports/x11/keyboard/KeymapMirror.h"
+#include "ports/x11/keyboard/X11KeyCodes.h"
+
+namespace plume {
+
+namespace {
+
+constexpr double LongestHold = 2.0;
+constexpr std::uint64_t ModifierFlags = X11Flag::Shift | X11Flag::Control | X11Flag::Option | X11Flag::Command;
+
+// The left one of the keys that make the lowest of these flags.
+std::uint16_t modifierKeyOf(std::uint64_t flags) {
+    if ((flags & X11Flag::Shift) != 0) return 56;
+    if ((flags & X11Flag::Control) != 0) return 59;
+    if ((flags & X11Flag::Option) != 0) return 58;
+    return 55;
+}
+
+}  // namespace
+
+TapSession::TapSession(Dependencies dependencies)
+    : dependencies_(std::move(dependencies)),
+      keyboards_(dependencies_.connection),
+      keyboardHeld_(std::make_unique<KeyboardHeld>(dependencies_.connection)) {}
+
+Result<void> TapSession::begin() {
+    TapConnection& connection = dependencies_.connection;
+    if (!mirrorAtStart()) {
+        return Error{"The X server of display \"" + connection.connection().displayName() +
+                     "\" refuses to give the keyboard's layout to its XTEST keyboard; without that, keys that Plume "
+                     "passes on would come out wrong. Does setxkbmap with your layout help?"};
+    }
+    if (auto taken = keyboards_.take(); !taken) return taken;
+    connection.userKeys = keyboards_.keysDown();
+    decoder_.setKeymap(dependencies_.keyboard.keymap(), connection.userKeys, dependencies_.keyboard.locks());
+    selectHierarchyEvents();
+    keyboardHeld_->ask(dependencies_.loop.now());
+    connection.connection().sync();
+    addSource();
+    return {};
+}
+
+bool TapSession::mirrorAtStart() const {
+    const TapConnection& connection = dependencies_.connection;
+    const auto keyboards = HardwareKeyboards::list(connection);
+    if (keyboards.empty()) return true;
+    // The one that was typed on last, where the server still knows it.
+    std::uint16_t typedOn = keyboards.front().id;
+    for (const InputDevice& device : inputDevices(connection.connection())) {
+        if (device.id != connection.masterKeyboard()) continue;
+        if (std::ranges::find(keyboards, device.keySource, &InputDevice::id) != keyboards.end()) {
+            typedOn = device.keySource;
+        }
+    }
+    const std::array to{connection.testKeyboard()};
+    return mirrorKeymap(connection.connection().displayName(), typedOn, to);
+}
+
+void TapSession::selectHierarchyEvents() const {
+    struct {
+        xcb_input_event_mask_t header;
+        std::uint32_t events;
+    } const mask{{XCB_INPUT_DEVICE_ALL, 1}, XCB_INPUT_XI_EVENT_MASK_HIERARCHY};
+    XcbConnection& connection = dependencies_.connection.connection();
+    xcb_input_xi_select_events(connection.get(), connection.root(), 1, &mask.header);
+}
+
+void TapSession::addSource() {
+    descriptor_ = dependencies_.connection.connection().descriptor();
+    dependencies_.loop.addSource(descriptor_, [weak = weak_from_this()] {
+        // Kept while it works: the listener may end the session.
+        if (const auto self = weak.lock()) self->drain();
+    });
+}
+
+void TapSession::end() {
+    if (std::exchange(ended_, true)) return;
+    if (descriptor_ >= 0) dependencies_.loop.removeSource(descriptor_);
+    dependencies_.loop.cancel(holdLimit_);
+    TapConnection& connection = dependencies_.connection;
+    keyboards_.giveBack();
+    keyboardHeld_.reset();
+    connection.connection().sync();
+    passOnUnheard();
+    connection.releaseAll();
+    connection.connection().sync();
+    connection.userKeys.reset();
+}
+
+void TapSession::passOnUnheard() {
+    TapConnection& connection = dependencies_.connection;
+    if (waiting_) connection.sendKey(waiting_->keycode, waiting_->down);
+    while (const auto event = connection.connection().pollEvent()) {
+        const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(*event);
+        if (!isKey(*event)) continue;
+        const auto keycode = static_cast<xcb_keycode_t>(key.detail);
+        const bool pressed = key.event_type == XCB_INPUT_KEY_PRESS;
+        if (pressed != connection.keysDown()[keycode]) connection.sendKey(keycode, pressed);
+    }
+}
+
+bool TapSession::isInput(const xcb_generic_event_t& event, std::uint16_t type) const {
+    const auto& generic = reinterpret_cast<const xcb_ge_generic_event_t&>(event);
+    return (generic.response_type & 0x7F) == XCB_GE_GENERIC &&
+           generic.extension == dependencies_.connection.inputOpcode() && generic.event_type == type;
+}
+
+bool TapSession::isKey(const xcb_generic_event_t& event) const {
+    return isInput(event, XCB_INPUT_KEY_PRESS) || isInput(event, XCB_INPUT_KEY_RELEASE);
+}
+
+void TapSession::drain() {
+    const TapConnection& connection = dependencies_.connection;
+    while (!ended_ && !held_) {
+        const auto event = connection.connection().pollEvent();
+        if (!event) break;
+        handle(*event);
+    }
+    if (!ended_ && connection.isBroken()) dependencies_.lost();
+}
+
+void TapSession::handle(const xcb_generic_event_t& event) {
+    const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(event);
+    if (isInput(event, XCB_INPUT_HIERARCHY)) {
+        handleHierarchy(reinterpret_cast<const xcb_input_hierarchy_event_t&>(event));
+    }
+    if (!isKey(event)) return;
+    const auto keycode = static_cast<xcb_keycode_t>(key.detail);
+    if (key.event_type == XCB_INPUT_KEY_PRESS) {
+        devices_[keycode] = key.deviceid;
+        press(keycode, (key.flags & XCB_INPUT_KEY_EVENT_FLAGS_KEY_REPEAT) != 0);
+    } else {
+        release(keycode);
+    }
+    if (ended_) return;
+    dependencies_.connection.flush();
+    // Not behind a press: the answer would come while the program is busy with the key.
+    if (key.event_type == XCB_INPUT_KEY_RELEASE) askWhoHoldsTheKeyboard();
+}
+
+void TapSession::askWhoHoldsTheKeyboard() {
+    keyboardHeld_->ask(dependencies_.loop.now());
+    dependencies_.connection.flush();
+}
+
+void TapSession::handleHierarchy(const xcb_input_hierarchy_event_t& event) {
+    constexpr std::uint32_t came = XCB_INPUT_HIERARCHY_MASK_SLAVE_ADDED | XCB_INPUT_HIERARCHY_MASK_DEVICE_ENABLED |
+                                   XCB_INPUT_HIERARCHY_MASK_SLAVE_ATTACHED;
+    constexpr std::uint32_t went = XCB_INPUT_HIERARCHY_MASK_SLAVE_REMOVED | XCB_INPUT_HIERARCHY_MASK_DEVICE_DISABLED;
+    const auto* const infos = xcb_input_hierarchy_infos(&event);
+    for (int i = 0; i < xcb_input_hierarchy_infos_length(&event); ++i) {
+        if ((infos[i].flags & went) == 0) continue;
+        keyboards_.forget(infos[i].deviceid);
+        releaseKeysOf(infos[i].deviceid);
+    }
+    if ((event.flags & came) != 0) keyboards_.takeNew();
+}
+
+void TapSession::releaseKeysOf(std::uint16_t device) {
+    for (unsigned i = 0; i < devices_.size() && !ended_; ++i) {
+        if (devices_[i] == device && dependencies_.connection.userKeys[i]) release(static_cast<xcb_keycode_t>(i));
+    }
+    dependencies_.connection.flush();
+}
+
+bool TapSession::mayTell() {
+    if (keyboardHeld_->isHeld(dependencies_.loop.now())) return false;
+    return !dependencies_.focusIsPassword || !dependencies_.focusIsPassword();
+}
+
+bool TapSession::tellsKey(const KeyDecoder::Key& key) {
+    if (key.silent) return false;
+    const bool withholdsNow = !mayTell();
+    if (withholdsNow && !std::exchange(withholding_, true)) dependencies_.listener.keysWithheld();
+    if (!withholdsNow) withholding_ = false;
+    return !withholdsNow && !ended_;
+}
+
+void TapSession::press(xcb_keycode_t keycode, bool repeated) {
+    const KeycodeSet& down = dependencies_.connection.keysDown();
+    const std::uint64_t flagsBefore = decoder_.flags();
+    const KeyDecoder::Key key = decoder_.press(keycode);
+    dependencies_.connection.userKeys.set(keycode);
+    seen_.set(keycode);
+    bool swallow = false;
+    told_[keycode] = tellsKey(key);
+    if (told_[keycode]) {
+        tellMissedModifiers(flagsBefore);
+        if (!ended_) swallow = tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyDown);
+    }
+    if (ended_) return;
+    if (swallow) {
+        decoder_.undoLocks();
+        // A repeat of a key that was passed on: let go of it, or it would go on repeating.
+        if (down[keycode]) inject({keycode, false});
+    } else if (!repeated || !down[keycode]) {
+        inject({keycode, true});
+    }
+    if (dependencies_.userTyped) dependencies_.userTyped(key.keyCode, key.flags);
+}
+
+void TapSession::release(xcb_keycode_t keycode) {
+    const KeyDecoder::Key key = decoder_.release(keycode);
+    dependencies_.connection.userKeys.reset(keycode);
+    if (told_[keycode]) {
+        told_.reset(keycode);
+        tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyUp);
+        if (ended_) return;
+    }
+    // Swallowed, or let go of meanwhile: no program has it down. What went down before the tap came has to come up.
+    const bool isUp = seen_[keycode] && !dependencies_.connection.keysDown()[keycode];
+    seen_.reset(keycode);
+    if (!isUp) inject({keycode, false});
+}
+
+void TapSession::tellMissedModifiers(std::uint64_t flags) {
+    const std::uint64_t changed = (flags ^ dependencies_.toldFlags) & ModifierFlags;
+    if (changed == 0) return;
+    dependencies_.toldFlags = flags;
+    dependencies_.listener.keyboardEvent({TapEvent::Type::FlagsChanged, modifierKeyOf(changed), flags, {}});
+}
+
+bool TapSession::tell(const KeyDecoder::Key& key, TapEvent::Type type) {
+    dependencies_.toldFlags = key.flags;
+    // Programs type nothing with Alt.
+    const bool command = !key.modifier && (key.flags & X11Flag::Option) != 0;
+    return dependencies_.listener.keyboardEvent({type, key.keyCode, key.flags, key.string, key.composing, command});
+}
+
+void TapSession::inject(Injection injection) {
+    if (held_) {
+        waiting_ = injection;
+        return;
+    }
+    dependencies_.connection.sendKey(injection.keycode, injection.down);
+}
+
+void TapSession::hold() {
+    if (ended_ || std::exchange(held_, true)) return;
+    dependencies_.loop.setSourcePaused(descriptor_, true);
+    holdLimit_ = dependencies_.loop.schedule(LongestHold, [weak = weak_from_this()] {
+        if (const auto self = weak.lock()) self->release();
+    });
+}
+
+void TapSession::release() {
+    if (ended_ || !std::exchange(held_, false)) return;
+    dependencies_.loop.cancel(holdLimit_);
+    dependencies_.loop.setSourcePaused(descriptor_, false);
+    if (waiting_) inject(*std::exchange(waiting_, {}));
+    dependencies_.connection.flush();
+    // What was read ahead meanwhile makes no descriptor readable.
+    dependencies_.loop.perform([weak = weak_from_this()] {
+        if (const auto self = weak.lock()) self->drain();
+    });
+}
+
+void TapSession::keyboardChanged(XkbKeyboard::Change change) {
+    if (change == XkbKeyboard::Change::Locks) decoder_.adopt(dependencies_.keyboard.locks());
+    if (change != XkbKeyboard::Change::Keymap) return;
+    // The server gave the new layout to every keyboard but those that are taken.
+    const TapConnection& connection = dependencies_.connection;
+    mirrorKeymap(connection.connection().displayName(), connection.testKeyboard(), keyboards_.taken());
+    decoder_.setKeymap(dependencies_.keyboard.keymap(), connection.userKeys, dependencies_.keyboard.locks());
+}
+
+}  // namespace plume

@@ -1,0 +1,99 @@
+// The time in which the tap has the keyboards: from taking them to giving them back, or to losing the connection.
+//
+// Every key of theirs comes here, is decoded, told to the listener, and pressed again on the XTEST keyboard unless the
+// listener swallowed it. What is down there comes up again in any case: a release follows every press that was passed
+// on, whatever the listener says, and releases of keys that were down before the tap are passed on, too. Belongs to the
+// tap thread.
+#pragma once
+
+#include <xcb/xinput.h>
+
+#include <array>
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+
+#include "platform/KeyboardTap.h"
+#include "ports/posix/PollRunLoop.h"
+#include "ports/x11/keyboard/HardwareKeyboards.h"
+#include "ports/x11/keyboard/KeyDecoder.h"
+#include "ports/x11/keyboard/KeyboardHeld.h"
+#include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/XkbKeyboard.h"
+
+namespace plume {
+
+// A key that the user pressed, by its virtual key code and with the flags of the modifiers held.
+using UserTyped = std::function<void(std::uint16_t keyCode, std::uint64_t flags)>;
+
+class TapSession : public std::enable_shared_from_this<TapSession> {
+  public:
+    struct Dependencies {
+        PollRunLoop& loop;
+        TapConnection& connection;
+        const XkbKeyboard& keyboard;
+        KeyboardTapListener& listener;
+        const std::function<bool()>& focusIsPassword;  // may be empty
+        const UserTyped& userTyped;                    // may be empty
+        std::function<void()> lost;                    // the connection is gone
+        std::uint64_t& toldFlags;                      // the modifiers that the listener takes to be held
+    };
+
+    explicit TapSession(Dependencies dependencies);
+    TapSession(const TapSession&) = delete;
+    TapSession& operator=(const TapSession&) = delete;
+
+    // Takes the keyboards; the error says why there is none to take.
+    Result<void> begin();
+    // Gives them back. Nothing is down for the programs afterwards: what the user still holds counts when it is pressed
+    // anew. Nobody is called any more.
+    void end();
+
+    void keyboardChanged(XkbKeyboard::Change change);
+    void hold();
+    void release();
+
+  private:
+    struct Injection {
+        xcb_keycode_t keycode;
+        bool down;
+    };
+
+    bool mirrorAtStart() const;
+    void selectHierarchyEvents() const;
+    void addSource();
+    void passOnUnheard();
+    void drain();
+    bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;
+    bool isKey(const xcb_generic_event_t& event) const;
+    void handle(const xcb_generic_event_t& event);
+    void askWhoHoldsTheKeyboard();
+    void handleHierarchy(const xcb_input_hierarchy_event_t& event);
+    void press(xcb_keycode_t keycode, bool repeated);
+    void release(xcb_keycode_t keycode);
+    void releaseKeysOf(std::uint16_t device);
+    bool mayTell();
+    bool tellsKey(const KeyDecoder::Key& key);
+    void tellMissedModifiers(std::uint64_t flags);
+    bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
+    void inject(Injection injection);
+
+    Dependencies dependencies_;
+    HardwareKeyboards keyboards_;
+    KeyDecoder decoder_;
+    std::unique_ptr<KeyboardHeld> keyboardHeld_;
+    int descriptor_ = -1;
+    bool ended_ = false;
+
+    KeycodeSet seen_;                           // keys that are down and went down here
+    KeycodeSet told_;                           // those of them that the listener was told of
+    std::array<std::uint16_t, 256> devices_{};  // that a key went down on
+    bool withholding_ = false;                  // the latest key went by untold
+
+    bool held_ = false;
+    std::optional<Injection> waiting_;
+    RunLoop::CallId holdLimit_ = 0;
+};
+
+}  // namespace plume

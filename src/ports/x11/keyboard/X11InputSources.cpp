@@ -1,0 +1,42 @@
+#include "ports/x11/keyboard/X11InputSources.h"
+
+#include "Foundation/Strings.h"
+#include "ports/x11/keyboard/KeyText.h"
+#include "ports/x11/keyboard/X11KeyCodes.h"
+
+namespace plume {
+
+X11InputSources::X11InputSources(XkbKeyboard& keyboard) : keyboard_(keyboard) {
+    readIdentifier();
+    keyboard.addListener([this, alive = std::weak_ptr<bool>(alive_)](XkbKeyboard::Change change) {
+        if (change != XkbKeyboard::Change::Locks && !alive.expired()) changed();
+    });
+}
+
+void X11InputSources::changed() {
+    readIdentifier();
+    // Called by a copy: it may set another.
+    if (const auto listener = listener_) listener();
+}
+
+void X11InputSources::readIdentifier() {
+    identifier_.reset();
+    if (!keyboard_.layoutName().empty()) identifier_ = fromUtf8(keyboard_.layoutName());
+}
+
+std::optional<std::u16string> X11InputSources::translateKey(std::uint16_t keyCode, std::uint64_t flags) const {
+    const xcb_keycode_t keycode = keyboard_.keymap()->keycodeOf(keyCode);
+    const XkbOwned<xkb_state> state(xkb_state_new(keyboard_.keymap()->get()));
+    if (keycode == 0 || !state) return std::nullopt;
+    constexpr std::uint32_t numLock = XCB_MOD_MASK_2;
+    std::uint32_t held = 0;
+    if ((flags & X11Flag::Shift) != 0) held |= XCB_MOD_MASK_SHIFT;
+    if ((flags & X11Flag::Control) != 0) held |= XCB_MOD_MASK_CONTROL;
+    xkb_state_update_mask(state.get(), held, 0, numLock, 0, 0, keyboard_.group());
+    KeyText text;
+    text.assignKey(*state, keycode, (flags & X11Flag::Option) != 0);
+    if (text.view().empty()) return std::nullopt;
+    return std::u16string(text.view());
+}
+
+}  // namespace plume

@@ -1,0 +1,40 @@
+// The keyboard layout in force on X11.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <utility>
+
+#include "platform/InputSources.h"
+#include "ports/x11/keyboard/XkbKeyboard.h"
+
+namespace plume {
+
+// On the tap thread. The identifier is the layout, with its variant in parentheses: "us", "de(nodeadkeys)".
+class X11InputSources final : public InputSources {
+  public:
+    // The keyboard outlives it.
+    explicit X11InputSources(XkbKeyboard& keyboard);
+    X11InputSources(const X11InputSources&) = delete;
+    X11InputSources& operator=(const X11InputSources&) = delete;
+
+    const std::optional<std::u16string>& currentInputSourceIdentifier() const override { return identifier_; }
+    // Option changes no text on X11: what types third-level characters is no modifier but a level chooser. Keypad keys
+    // type digits.
+    std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override;
+    void setChangeListener(std::function<void()> listener) override { listener_ = std::move(listener); }
+
+  private:
+    void readIdentifier();
+    void changed();
+
+    const XkbKeyboard& keyboard_;
+    std::optional<std::u16string> identifier_;
+    std::function<void()> listener_;
+    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
+};
+
+}  // namespace plume

@@ -1,0 +1,95 @@
+#include "ports/x11/keyboard/X11KeyboardTap.h"
+
+#include <utility>
+
+namespace plume {
+
+namespace {
+
+constexpr double TryPeriod = 1;  // seconds
+
+}  // namespace
+
+X11KeyboardTap::X11KeyboardTap(PollRunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard)
+    : loop_(loop), connection_(connection), keyboard_(keyboard), display_(connection.connection().displayName()) {
+    keyboard.addListener([this, alive = std::weak_ptr<bool>(alive_)](XkbKeyboard::Change change) {
+        if (!alive.expired() && session_) session_->keyboardChanged(change);
+    });
+}
+
+X11KeyboardTap::~X11KeyboardTap() {
+    remove();
+}
+
+void X11KeyboardTap::setFocusIsPassword(std::function<bool()> focusIsPassword) {
+    focusIsPassword_ = std::move(focusIsPassword);
+}
+
+void X11KeyboardTap::setUserTyped(UserTyped userTyped) {
+    userTyped_ = std::move(userTyped);
+}
+
+Result<void> X11KeyboardTap::create(KeyboardTapListener& listener, bool /*annotatedSession*/) {
+    remove();
+    listener_ = &listener;
+    auto begun = begin();
+    if (!begun) listener_ = nullptr;
+    return begun;
+}
+
+Result<void> X11KeyboardTap::begin() {
+    if (connection_.isBroken()) {
+        if (auto reopened = connection_.reopen(); !reopened) return reopened;
+    }
+    auto session = std::make_shared<TapSession>(TapSession::Dependencies{.loop = loop_,
+                                                                         .connection = connection_,
+                                                                         .keyboard = keyboard_,
+                                                                         .listener = *listener_,
+                                                                         .focusIsPassword = focusIsPassword_,
+                                                                         .userTyped = userTyped_,
+                                                                         .lost = [this] { lost(); },
+                                                                         .toldFlags = toldFlags_});
+    if (auto begun = session->begin(); !begun) return begun;
+    session_ = std::move(session);
+    return {};
+}
+
+bool X11KeyboardTap::exists() const {
+    return session_ != nullptr;
+}
+
+void X11KeyboardTap::lost() {
+    std::exchange(session_, nullptr)->end();
+    listener_->tapDisabledByTimeout();
+}
+
+void X11KeyboardTap::enable() {
+    if (session_ || !listener_) return;
+    loop_.cancel(nextTry_);
+    if (!begin()) tryAgainLater();
+}
+
+// The server may be gone, and Plume with it before long; or another program has the keyboard just now.
+void X11KeyboardTap::tryAgainLater() {
+    nextTry_ = loop_.schedule(TryPeriod, [this] { enable(); });
+}
+
+void X11KeyboardTap::remove() {
+    listener_ = nullptr;
+    loop_.cancel(nextTry_);
+    if (session_) std::exchange(session_, nullptr)->end();
+}
+
+Result<void> X11KeyboardTap::check() const {
+    return TapConnection::check(display_);
+}
+
+void X11KeyboardTap::hold() {
+    if (session_) session_->hold();
+}
+
+void X11KeyboardTap::release() {
+    if (session_) session_->release();
+}
+
+}  // namespace plume

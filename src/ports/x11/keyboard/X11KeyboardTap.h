@@ -1,0 +1,63 @@
+// The keyboard tap on X11: takes the hardware keyboards from the server and gives their keys back through XTEST.
+//
+// Each hardware keyboard is grabbed by itself, so that its keys reach nobody, the window with the focus keeps the
+// focus, and no program notices; a key that passes is pressed again on the XTEST keyboard, which stands in for the
+// hardware with the window manager, with grabs and with auto-repeat. Keys are decoded here, without asking the server.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+
+#include "platform/KeyboardTap.h"
+#include "ports/posix/PollRunLoop.h"
+#include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/TapSession.h"
+#include "ports/x11/keyboard/XkbKeyboard.h"
+
+namespace plume {
+
+class X11KeyboardTap final : public KeyboardTap {
+  public:
+    // All of them outlive the tap. Nothing happens before create().
+    X11KeyboardTap(PollRunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard);
+    ~X11KeyboardTap() override;
+    X11KeyboardTap(const X11KeyboardTap&) = delete;
+    X11KeyboardTap& operator=(const X11KeyboardTap&) = delete;
+
+    // Whether what has the focus now takes a password; asked for every key, so it must be quick. Then, and while
+    // another program holds the keyboard, keys pass unheard.
+    void setFocusIsPassword(std::function<bool()> focusIsPassword);
+    // Told of every press, also of those that pass unheard; it must be quick, too.
+    void setUserTyped(UserTyped userTyped);
+
+    Result<void> create(KeyboardTapListener& listener, bool annotatedSession) override;
+    bool exists() const override;
+    void enable() override;
+    void remove() override;
+    Result<void> check() const override;
+
+    // From hold() to release(), at most 2 seconds, the user's keys wait, with the one that the listener is deciding
+    // about if it passes; then they follow in order.
+    void hold();
+    void release();
+
+  private:
+    Result<void> begin();
+    void lost();
+    void tryAgainLater();
+
+    PollRunLoop& loop_;
+    TapConnection& connection_;
+    XkbKeyboard& keyboard_;
+    const std::string display_;
+    std::function<bool()> focusIsPassword_;
+    UserTyped userTyped_;
+    KeyboardTapListener* listener_ = nullptr;
+    std::uint64_t toldFlags_ = 0;          // the modifiers that the listener takes to be held, across sessions
+    std::shared_ptr<TapSession> session_;  // while the keyboards are taken
+    RunLoop::CallId nextTry_ = 0;
+    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
+};
+
+}  // namespace plume

@@ -1,0 +1,37 @@
+#include "ports/x11/keyboard/X11SecureInput.h"
+
+#include <utility>
+
+namespace plume {
+
+Result<std::unique_ptr<X11SecureInput>> X11SecureInput::open(const std::string& display,
+                                                             std::function<bool()> focusIsPassword) {
+    auto connection = XcbConnection::open(display);
+    if (!connection) return connection.error();
+    return std::unique_ptr<X11SecureInput>(
+        new X11SecureInput(std::move(connection).value(), std::move(focusIsPassword)));
+}
+
+X11SecureInput::X11SecureInput(std::unique_ptr<XcbConnection> connection, std::function<bool()> focusIsPassword)
+    : connection_(std::move(connection)),
+      focusIsPassword_(std::move(focusIsPassword)),
+      neverShown_(xcb_generate_id(connection_->get())) {
+    xcb_create_window(connection_->get(), 0, neverShown_, connection_->root(), -1, -1, 1, 1, 0,
+                      XCB_WINDOW_CLASS_INPUT_ONLY, XCB_COPY_FROM_PARENT, 0, nullptr);
+}
+
+bool X11SecureInput::isSecureEventInputEnabled() const {
+    return (focusIsPassword_ && focusIsPassword_()) || isKeyboardHeld();
+}
+
+// A window that is not shown cannot hold the keyboard, so asking for it changes nothing; the server's reason for
+// refusing tells whether another program holds it.
+bool X11SecureInput::isKeyboardHeld() const {
+    xcb_connection_t* const server = connection_->get();
+    const auto cookie =
+        xcb_grab_keyboard(server, 0, neverShown_, XCB_CURRENT_TIME, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC);
+    const XcbOwned<xcb_grab_keyboard_reply_t> reply(xcb_grab_keyboard_reply(server, cookie, nullptr));
+    return reply && (reply->status == XCB_GRAB_STATUS_ALREADY_GRABBED || reply->status == XCB_GRAB_STATUS_FROZEN);
+}
+
+}  // namespace plume

@@ -1,0 +1,77 @@
+// Who has the keyboard, as the window manager tells it.
+//
+// Belongs to the tap thread. Everything is asked of the X server, never of a program, and kept until the server tells
+// of a change: in between, an answer costs no round trip. Without a window manager the input focus decides.
+#pragma once
+
+#include <functional>
+#include <map>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "platform/ProcessManager.h"
+#include "ports/x11/X11Session.h"
+#include "ports/x11/windows/DesktopFiles.h"
+
+namespace plume {
+
+class X11ProcessManager final : public ProcessManager {
+  public:
+    // The session outlives the process manager.
+    X11ProcessManager(X11Session& session, std::shared_ptr<const DesktopFiles> desktopFiles);
+    ~X11ProcessManager() override;
+    X11ProcessManager(const X11ProcessManager&) = delete;
+    X11ProcessManager& operator=(const X11ProcessManager&) = delete;
+
+    // Another window or program may be in front than the last answer said. Called while events are read, so it may only
+    // take note; not called again until somebody has asked.
+    std::function<void()> frontMayHaveChanged;
+
+    ProcessSerialNumber currentProcess() const override;
+    std::optional<ProcessSerialNumber> frontProcess() const override;
+    std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
+    void bringToFront(ProcessSerialNumber process) override;
+    // X does not tell who reads the keyboard's events: always empty.
+    std::vector<EventTapInformation> eventTaps() const override { return {}; }
+
+    // How often something had to be asked of the server since the start: for tests and measurements.
+    int lookUps() const { return lookUps_; }
+
+  private:
+    struct Application {
+        RunningApplication description;
+        xcb_window_t window = XCB_WINDOW_NONE;  // where it was seen last
+    };
+
+    struct Watched {
+        xcb_window_t window = XCB_WINDOW_NONE;
+        std::uint32_t eventMask = 0;
+    };
+
+    void hear(const xcb_generic_event_t& event);
+    void forgetFront();
+    void lookUp();
+    xcb_window_t activeWindow();
+    xcb_window_t focusedWindow();
+    xcb_window_t focusedApplicationWindow();
+    void watch(Watched& watched, Watched wanted);
+    std::optional<ProcessSerialNumber> processOf(xcb_window_t window);
+    ProcessSerialNumber numberOf(const RunningApplication& application, xcb_window_t window);
+    std::uint32_t clientOf(xcb_window_t window) const;
+    xcb_window_t windowOf(ProcessSerialNumber process);
+
+    X11Session& session_;
+    const std::shared_ptr<const DesktopFiles> desktopFiles_;
+    const std::string hostName_;
+    std::vector<X11Session::HandlerId> observers_;
+    bool isKnown_ = false;  // frontProcess_ is up to date
+    std::optional<ProcessSerialNumber> frontProcess_;
+    Watched manager_;  // the window manager's own window
+    Watched front_;    // the active window
+    Watched focus_;    // the focused window, when there is no active one
+    mutable std::map<ProcessSerialNumber, Application> applications_;
+    int lookUps_ = 0;
+};
+
+}  // namespace plume

@@ -1,0 +1,88 @@
+// One story of typing: what is there, what the user does, and what must be seen afterwards.
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <nlohmann/json.hpp>
+#include <optional>
+#include <string>
+#include <utility>
+#include <variant>
+#include <vector>
+
+#include "Foundation/Date.h"
+#include "Foundation/Result.h"
+#include "Foundation/Strings.h"
+#include "input/GeneralHotKey.h"
+#include "input/delivery/ContextInputSetting.h"
+#include "library/SnippetGroup.h"
+#include "platform/UserDefaults.h"
+
+namespace plume {
+
+struct TypeStep {
+    std::u16string text;
+};
+struct KeyStep {
+    std::uint16_t keyCode = 0;
+    std::int32_t modifiers = 0;  // KeyModifier bits
+    std::int64_t count = 1;
+};
+struct PressStep {
+    std::uint16_t keyCode = 0;
+};
+struct ReleaseStep {
+    std::uint16_t keyCode = 0;
+};
+struct HotKeyStep {
+    GeneralHotKey hotKey;
+};
+struct WaitStep {
+    double seconds = 0;
+};
+struct ClickStep {};
+struct ActivateStep {
+    std::u16string application;
+};
+struct FormStep {
+    // By name, or "#" and an index.
+    std::vector<std::pair<std::u16string, std::u16string>> values;
+    std::vector<std::pair<std::u16string, bool>> ticks;
+    bool accept = true;
+};
+struct SelectStep {
+    Range range;
+};
+struct ChooseStep {
+    std::size_t index = 0;
+};
+
+struct ScenarioStep {
+    using Action = std::variant<TypeStep, KeyStep, PressStep, ReleaseStep, HotKeyStep, WaitStep, ClickStep,
+                                ActivateStep, FormStep, SelectStep, ChooseStep>;
+    Action action;
+    std::string place;  // where it stands in the file, for messages
+};
+
+struct Scenario {
+    std::string fileName;
+    std::string about;
+    std::vector<std::shared_ptr<SnippetGroup>> library;
+    std::shared_ptr<const UserDefaults> settings;
+    std::u16string application = u"org.example.editor";
+    std::u16string inputSource = u"org.example.keylayout.US";
+    std::map<std::u16string, std::shared_ptr<const ContextInputSetting>> applicationSettings;
+    std::optional<Date> now;  // nothing: the real time
+    std::string timeZone;     // empty: the system's
+    std::string locale;       // empty: the user's
+    std::optional<std::u16string> clipboard;
+    std::u16string text;
+    std::vector<ScenarioStep> steps;
+    nlohmann::ordered_json expect = nlohmann::ordered_json::object();
+};
+
+// The error names the file, the place in it and what was expected.
+Result<Scenario> readScenario(std::string_view text, const std::string& fileName);
+
+}  // namespace plume

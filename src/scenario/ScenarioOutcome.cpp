@@ -1,0 +1,157 @@
+#include "scenario/ScenarioOutcome.h"
+
+#include <cmath>
+
+#include "Foundation/Strings.h"
+#include "input/KeyCodes.h"
+#include "ports/simulated/SimulatedModifiers.h"
+#include "scenario/ScenarioStage.h"
+
+namespace plume {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+constexpr std::uint16_t KeyV = 9;
+// What times are given and compared to: sums of delays are not exact beyond it.
+constexpr double Microseconds = 1e6;
+
+Json textOrNull(const std::optional<std::u16string>& text) {
+    return text ? Json(toUtf8(*text)) : Json();
+}
+
+Json modifierNames(std::uint64_t flags) {
+    Json names = Json::array();
+    if ((flags & EventFlag::Shift) != 0) names.push_back("shift");
+    if ((flags & EventFlag::Control) != 0) names.push_back("control");
+    if ((flags & EventFlag::Option) != 0) names.push_back("option");
+    if ((flags & EventFlag::Command) != 0) names.push_back("command");
+    return names;
+}
+
+Json written(const SimulatedKeyEvent& event) {
+    Json json;
+    json["time"] = std::round(event.time * Microseconds) / Microseconds;
+    json["origin"] = event.origin == SimulatedKeyEvent::Origin::User ? "user" : "plume";
+    if (event.keyCode) {
+        json["key"] = *event.keyCode;
+        json["down"] = event.down;
+        json["modifiers"] = modifierNames(event.flags);
+    } else {
+        json["string"] = toUtf8(event.string);
+        json["down"] = event.down;
+    }
+    return json;
+}
+
+Json written(const FormModel& form) {
+    Json fields = Json::array();
+    for (const FormModel::Field& field : form.fields()) {
+        fields.push_back({{"name", textOrNull(field.variable->name)},
+                          {"type", static_cast<std::int64_t>(field.variable->type)},
+                          {"value", toUtf8(field.value)},
+                          {"optional", field.variable->isOptional},
+                          {"selected", field.selected},
+                          {"readonly", field.isReadonly()}});
+    }
+    return fields;
+}
+
+Json suggestions(const ScenarioList& list) {
+    if (!list.visible) return {};
+    Json entries = Json::array();
+    for (const std::u16string& entry : list.entries) entries.push_back(toUtf8(entry));
+    return entries;
+}
+
+struct Counts {
+    std::int64_t events = 0;
+    std::int64_t backspaces = 0;
+    std::int64_t pastes = 0;
+    std::int64_t leftArrows = 0;
+    std::int64_t chunks = 0;
+
+    void add(const std::vector<SimulatedKeyEvent>& received) {
+        std::uint64_t held = 0;  // modifiers that Plume pressed as keys
+        for (const SimulatedKeyEvent& event : received) {
+            if (event.origin != SimulatedKeyEvent::Origin::Plume) continue;
+            const std::uint64_t modifier = event.keyCode ? modifierFlagOf(*event.keyCode) : 0;
+            held = event.down ? held | modifier : held & ~modifier;
+            if (event.down) add(event, event.flags | held);
+        }
+    }
+    void add(const SimulatedKeyEvent& press, std::uint64_t flags) {
+        ++events;
+        if (!press.keyCode) ++chunks;
+        if (press.keyCode == KeyCode::Delete) ++backspaces;
+        if (press.keyCode == KeyCode::Left) ++leftArrows;
+        if (press.keyCode == KeyV && (flags & (EventFlag::Control | EventFlag::Command)) != 0) ++pastes;
+    }
+};
+
+// What the expectation names, against what there is: objects by their named keys, everything else as a whole.
+void compare(const Json& expected, const Json& actual, const std::string& place, std::vector<std::string>& found) {
+    if (expected.is_object() && actual.is_object()) {
+        for (const auto& [key, value] : expected.items()) {
+            std::string member = place;
+            member.append(".").append(key);
+            compare(value, actual.contains(key) ? actual.at(key) : Json(), member, found);
+        }
+        return;
+    }
+    if (expected.is_array() && actual.is_array() && expected.size() == actual.size()) {
+        for (std::size_t i = 0; i < expected.size(); ++i) {
+            std::string element = place;
+            element.append("[").append(std::to_string(i)).append("]");
+            compare(expected[i], actual[i], element, found);
+        }
+        return;
+    }
+    if (expected.is_number() && actual.is_number()) {
+        if (std::abs(expected.get<double>() - actual.get<double>()) * Microseconds < 1) return;
+    } else if (expected == actual) {
+        return;
+    }
+    found.push_back(place + ": expected " + expected.dump() + ", got " + actual.dump());
+}
+
+}  // namespace
+
+ScenarioOutcome outcomeOf(ScenarioStage& stage) {
+    SimulatedDesktop& desktop = stage.desktop();
+    const SimulatedApplication* front = desktop.front();
+    Json json;
+    json["text"] = front ? toUtf8(front->field().text()) : "";
+    json["caret"] = front ? front->field().caret() : 0;
+    json["clipboard"] = textOrNull(desktop.pasteboard().string());
+    json["letters"] = toUtf8(stage.program().engine().letters());
+    json["application"] = front ? toUtf8(front->bundleIdentifier()) : "";
+    json["sounds"] = desktop.sounds().played();
+    json["suggestions"] = suggestions(stage.list());
+    const auto& forms = stage.forms().open;
+    json["form"] = forms.empty() ? Json() : written(*forms.back().model);
+    json["errors"] = stage.errors();
+    json["events"] = Json::array();
+    if (front) {
+        for (const SimulatedKeyEvent& event : front->events()) json["events"].push_back(written(event));
+    }
+
+    Counts counts;
+    for (const SimulatedApplication* application : stage.applications()) counts.add(application->events());
+    return {std::move(json), Json{{"events", counts.events},
+                                  {"backspaces", counts.backspaces},
+                                  {"pastes", counts.pastes},
+                                  {"leftArrows", counts.leftArrows},
+                                  {"chunks", counts.chunks}}};
+}
+
+std::vector<std::string> differences(const Json& expect, const ScenarioOutcome& outcome) {
+    std::vector<std::string> found;
+    for (const auto& [key, value] : expect.items()) {
+        compare(value, key == "counts" ? outcome.counts : outcome.outcome.at(key), key, found);
+    }
+    return found;
+}
+
+}  // namespace plume

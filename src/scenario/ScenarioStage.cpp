@@ -1,0 +1,106 @@
+#include "scenario/ScenarioStage.h"
+
+#include <algorithm>
+#include <chrono>
+#include <utility>
+
+namespace plume {
+
+namespace {
+
+// The scenario's moment moves on with its clock.
+std::function<Date()> movingDate(const Scenario& scenario, SimulatedRunLoop& loop) {
+    const Date start = scenario.now.value_or(currentDate());
+    return [start, &loop] {
+        return start + std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::duration<double>(loop.now()));
+    };
+}
+
+}  // namespace
+
+ScenarioStage::ScenarioStage(const Scenario& scenario)
+    : scenario_(scenario),
+      loop_(desktop_.runLoop(), {[this] { return stamp(); },
+                                 [this] {
+                                     if (program_) program_->sender().waitForScripts();
+                                 }}),
+      date_(movingDate(scenario, desktop_.runLoop())) {
+    for (const auto& [identifier, setting] : scenario_.applicationSettings) {
+        applicationSettings_.set(identifier, setting);
+    }
+    desktop_.inputSources().setIdentifier(scenario_.inputSource);
+    if (scenario_.clipboard) desktop_.pasteboard().copyFromProgram(*scenario_.clipboard);
+    activate(scenario_.application);
+    desktop_.front()->setText(scenario_.text);
+
+    program_ = std::make_unique<Composition>(ports(), dependencies());
+    for (const auto& [identifier, setting] : scenario_.applicationSettings) {
+        program_->inputService().setCustomApplicationSetting(identifier, setting);
+    }
+    program_->setSnippetGroups(scenario_.library);
+    program_->loadPreferences();
+    program_->start();
+    // What the program does all day, with or without the user.
+    loop_.waitForNoneOfThese();
+}
+
+ScenarioStage::~ScenarioStage() = default;
+
+Composition::Ports ScenarioStage::ports() {
+    return {desktop_.keyboardTap(),
+            desktop_.mouseTap(),
+            desktop_.poster(),
+            desktop_.pasteboard(),
+            desktop_.processManager(),
+            desktop_.inputSources(),
+            desktop_.accessibility(),
+            desktop_.secureInput(),
+            desktop_.systemHotKeys(),
+            desktop_.sounds(),
+            launcher_,
+            loop_,
+            loop_};
+}
+
+Composition::Dependencies ScenarioStage::dependencies() {
+    return {*scenario_.settings,
+            [this](const std::string& message) { report(message); },
+            [](const std::string&) {},
+            scenario_.timeZone,
+            scenario_.locale,
+            scenarioFieldsEditors(forms_, scenario_.locale),
+            [this] { return makeScenarioList(list_); },
+            [] { return makeScenarioSearch(); },
+            nullptr,
+            nullptr,
+            nullptr};
+}
+
+void ScenarioStage::activate(const std::u16string& application) {
+    SimulatedApplication& activated = desktop_.activate(application);
+    bool isKnown = false;
+    activated.setUsesControlKey(applicationSettings_.resolve(application, isKnown)->has(InputFlag::UseControlKey));
+    if (std::find(applications_.begin(), applications_.end(), &activated) == applications_.end()) {
+        applications_.push_back(&activated);
+    }
+}
+
+void ScenarioStage::report(const std::string& message) {
+    const std::lock_guard lock(mutex_);
+    errors_.push_back(message);
+}
+
+std::vector<std::string> ScenarioStage::errors() const {
+    const std::lock_guard lock(mutex_);
+    return errors_;
+}
+
+std::uint64_t ScenarioStage::stamp() const {
+    auto& desktop = const_cast<SimulatedDesktop&>(desktop_);
+    auto happened = static_cast<std::uint64_t>(desktop.pasteboard().changeCount());
+    happened += desktop.sounds().played().size() + desktop.poster().clicks().size();
+    for (const SimulatedApplication* application : applications_) happened += application->events().size();
+    return happened;
+}
+
+}  // namespace plume

@@ -1,0 +1,104 @@
+#include "testing/rig/PlumeProgram.h"
+
+#include <poll.h>
+
+#include <algorithm>
+#include <fstream>
+#include <utility>
+
+#include "testing/rig/Deadline.h"
+
+namespace plume::rig {
+
+namespace {
+
+using Seconds = std::chrono::duration<double>;
+
+std::filesystem::path writeFile(const std::filesystem::path& file, const std::string& content) {
+    std::ofstream(file) << content;
+    return file;
+}
+
+std::u32string charactersOf(const std::string& utf8) {
+    std::u32string characters;
+    for (const char byte : utf8) {
+        const auto bits = static_cast<unsigned char>(byte);
+        if ((bits & 0xC0) == 0x80) {
+            characters.back() = (characters.back() << 6) | (bits & 0x3F);
+        } else {
+            characters.push_back(bits < 0x80 ? bits : bits < 0xE0 ? bits & 0x1F : bits < 0xF0 ? bits & 0x0F : bits & 7);
+        }
+    }
+    return characters;
+}
+
+// Follows a text through a target's changes.
+void apply(const TextChange& change, std::u32string& text) {
+    const auto position = std::min(static_cast<std::size_t>(change.position), text.size());
+    text.replace(position, static_cast<std::size_t>(change.removed), charactersOf(change.inserted));
+}
+
+}  // namespace
+
+PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings,
+                           Accessibility accessibility) {
+    const auto program = std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume";
+    std::vector<std::string> arguments{"/usr/bin/env"};
+    if (accessibility == Accessibility::Missing) {
+        arguments.insert(arguments.end(), {"-u", "DBUS_SESSION_BUS_ADDRESS", "AT_SPI_BUS_ADDRESS=unix:path=/nowhere"});
+    }
+    arguments.insert(arguments.end(), {program, "run"});
+    arguments.insert(arguments.end(), {"--settings", writeFile(rig.directory() / "settings.json", settings)});
+    if (!library.empty()) {
+        arguments.insert(arguments.end(), {"--library", writeFile(rig.directory() / "library.json", library)});
+    }
+    const auto started = std::chrono::steady_clock::now();
+    process_ = rig.session().start(arguments, "plume");
+    const Deadline deadline(Milliseconds(20'000));
+    while (process_->logTail().find("Plume is ready") == std::string::npos) {
+        if (deadline.passed() || !process_->isRunning()) throw RigError("plume did not start: " + process_->logTail());
+        poll(nullptr, 0, 1);
+    }
+    secondsToReady_ = Seconds(std::chrono::steady_clock::now() - started).count();
+}
+
+namespace {
+
+// Follows the changes until they have made the expected text.
+Expansion follow(TargetProgram& target, const std::string& expected, std::chrono::steady_clock::time_point start) {
+    std::u32string text;
+    const std::u32string awaited = charactersOf(expected);
+    Expansion result;
+    const Deadline deadline(Milliseconds(10'000));
+    while (!deadline.passed() && !result.isRight) {
+        const auto change = target.takeChange(Milliseconds(500));
+        if (!change) continue;
+        apply(*change, text);
+        // Rich text is told of in larger pieces than what changed, so the target has the last word.
+        const bool couldBeComplete = static_cast<std::size_t>(change->length) == awaited.size();
+        result.isRight = text == awaited || (couldBeComplete && target.text() == expected);
+        result.milliseconds = std::chrono::duration<double, std::milli>(change->time - start).count();
+    }
+    result.got = target.text();
+    result.isRight = result.isRight && result.got == expected;
+    return result;
+}
+
+}  // namespace
+
+Expansion awaitExpansion(TargetProgram& target, const std::string& expected, const std::function<void()>& make) {
+    target.clear();
+    const auto start = std::chrono::steady_clock::now();
+    make();
+    return follow(target, expected, start);
+}
+
+Expansion typeAndAwait(DesktopRig& rig, TargetProgram& target, const std::string& typed, const std::string& expected) {
+    target.clear();
+    rig.keyboard().type(typed.substr(0, typed.size() - 1));
+    const auto pressed = std::chrono::steady_clock::now();
+    rig.keyboard().type(typed.substr(typed.size() - 1));
+    return follow(target, expected, pressed);
+}
+
+}  // namespace plume::rig

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+
+#include "testing/rig/DesktopRig.h"
+
+namespace plume::rig {
+
+// Plume as a user starts it, on a rig's desktop. Hears the keyboard when the constructor returns, and gives it back
+// when it is destroyed.
+class PlumeProgram {
+  public:
+    enum class Accessibility { Found, Missing };
+
+    // The contents of a library and a settings file; an empty library means the sample library. Throws RigError.
+    PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings = "{}",
+                 Accessibility accessibility = Accessibility::Found);
+
+    ChildProcess& process() { return *process_; }
+    // Seconds from the start to the moment it said that it was ready.
+    double secondsToReady() const { return secondsToReady_; }
+
+  private:
+    std::unique_ptr<ChildProcess> process_;
+    double secondsToReady_ = 0;
+};
+
+// What became of a text typed on the keyboard, whose last character sets something off.
+struct Expansion {
+    std::string got;
+    double milliseconds = 0;  // from the press of the last key to the change that made the text complete
+    bool isRight = false;     // it became what was expected
+};
+
+// Clears the target, has somebody make the text, and waits at most ten seconds until it is there. The time counts from
+// the call.
+Expansion awaitExpansion(TargetProgram& target, const std::string& expected, const std::function<void()>& make);
+
+// Types into the target that has the focus; the last character sets something off.
+Expansion typeAndAwait(DesktopRig& rig, TargetProgram& target, const std::string& typed, const std::string& expected);
+
+}  // namespace plume::rig

@@ -1,0 +1,293 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+#include "Foundation/Strings.h"
+#include "Foundation/text/CSVParser.h"
+#include "Foundation/text/CsvWriter.h"
+
+namespace plume {
+namespace {
+
+using testing::ElementsAre;
+using testing::StartsWith;
+
+using Names = std::vector<std::u16string>;
+using Rows = std::vector<CSVParser::Row>;
+
+const Names ImportNames = {u"Name", u"Value", u"Label"};
+
+// Rows as a table of cases writes them: "Name=a;Value=b|Name=c", or "nothing".
+std::string shown(const std::optional<Rows>& rows) {
+    if (!rows) return "nothing";
+    std::string text;
+    for (const CSVParser::Row& row : *rows) {
+        if (!text.empty()) text += "|";
+        std::string fields;
+        for (const auto& [name, value] : row) {
+            if (!fields.empty()) fields += ";";
+            fields += toUtf8(name) + "=" + toUtf8(value);
+        }
+        text += fields;
+    }
+    return text;
+}
+
+std::optional<Rows> parsed(std::u16string text, std::u16string separator = u",") {
+    return CSVParser(std::move(text), std::move(separator), std::nullopt, false, ImportNames).arrayOfParsedRows();
+}
+
+struct Reading {
+    const char16_t* text;
+    const char* expected;
+};
+
+TEST(CSVParser, ReadsTheDialect) {
+    const Reading cases[] = {
+        {u"a,b\nc,d", "Name=a;Value=b|Name=c;Value=d"},
+        {u"a,b\nc,d\n", "Name=a;Value=b|Name=c;Value=d"},
+        {u"a", "Name=a"},
+        {u"a\r\nb\r\n\r\n\nc", "Name=a|Name=b|Name=c"},
+        {u"a\u2028b\u2029c\u0085d\vf\fg", "Name=a|Name=b|Name=c|Name=d|Name=f|Name=g"},
+        {u"", "nothing"},
+        {u"\na,b", "nothing"},
+        {u"\r\n", "nothing"},
+        {u"a,b,c,d", "FIELD_4=d;Label=c;Name=a;Value=b"},
+        {u"a,,c", "Label=c;Name=a;Value="},
+        {u",", "Name=;Value="},
+        {u"a,\nb", "Name=a;Value=|Name=b"},
+        {u" a , b ", "Name= a ;Value= b "},
+        {u"\"a,b\nc\"\"d\",e", "Name=a,b\nc\"d;Value=e"},
+        {u"\"\",\"\"\"\"", "Name=;Value=\""},
+        {u"a,\"b\"\nc", "Name=a;Value=b|Name=c"},
+        // What breaks the rules ends the parse.
+        {u"a,x\"y,b\nc", "Name=a;Value=x"},
+        {u"a,\"x\"y,b\nc", "Name=a;Value=x"},
+        {u"a,\"x\"\"y,b\nc", "Name=a"},
+        {u"\"x", "nothing"},
+        {u"a\n\"x", "Name=a"},
+        {u"a\n\"x\ny\nz", "Name=a"},
+    };
+    for (const Reading& c : cases) EXPECT_EQ(shown(parsed(c.text)), c.expected) << toUtf8(c.text);
+}
+
+TEST(CSVParser, ReadsWithLongSeparators) {
+    const Reading cases[] = {
+        {u"a::b", "Name=a;Value=b"},
+        {u"a:b::c:", "Name=a:b;Value=c:"},
+        {u"a:::b", "Name=a;Value=:b"},
+        {u"::", "Name=;Value="},
+        {u":", "Name=:"},
+        {u"\"a::b\"::c", "Name=a::b;Value=c"},
+    };
+    for (const Reading& c : cases) EXPECT_EQ(shown(parsed(c.text, u"::")), c.expected) << toUtf8(c.text);
+}
+
+TEST(CSVParser, ReadsTheNamesFromAHeader) {
+    const Reading cases[] = {
+        {u"x,y\na,b", "x=a;y=b"},
+        {u"x,y\r\n\r\na,b,c", "FIELD_3=c;x=a;y=b"},
+        {u"\"x,\",y\na,b", "x,=a;y=b"},
+        {u"x,x\na,b", "x=b"},
+        {u"x,y", "nothing"},
+        {u"x,y\n", "nothing"},
+        {u"\nx,y\na,b", "nothing"},
+        {u"x,\"y\na,b", "nothing"},
+        {u"", "nothing"},
+    };
+    for (const Reading& c : cases) {
+        CSVParser parser(c.text, u",", std::nullopt, true, ImportNames);
+        EXPECT_EQ(shown(parser.arrayOfParsedRows()), c.expected) << toUtf8(c.text);
+    }
+}
+
+TEST(CSVParser, TakesItsLineSeparatorsFromTheCaller) {
+    CSVParser parser(u"a\nb;c\rd", u",", CharacterSet::withCharacters(u";\r"), false, ImportNames);
+    EXPECT_EQ(shown(parser.arrayOfParsedRows()), "Name=a\nb|Name=c|Name=d");
+}
+
+TEST(CSVParser, MakesUpNamesForFurtherColumns) {
+    CSVParser parser(u"a,b,c\nd,e", u",", std::nullopt, false, {u"Name"});
+    EXPECT_EQ(shown(parser.arrayOfParsedRows()), "FIELD_2=b;FIELD_3=c;Name=a|FIELD_2=e;Name=d");
+    EXPECT_THAT(parser.fieldNames(), ElementsAre(u"Name", u"FIELD_2", u"FIELD_3"));
+}
+
+TEST(CSVParser, RefusesSeparatorsThatCannotSeparate) {
+    const auto make = [](std::u16string separator, std::optional<CharacterSet> lines) {
+        CSVParser(u"a", std::move(separator), std::move(lines), false, {});
+    };
+    for (const char16_t* separator : {u"", u"\"", u",\"", u"\n", u",\u2028"}) {
+        EXPECT_THROW(make(separator, std::nullopt), std::invalid_argument) << toUtf8(separator);
+    }
+    EXPECT_THROW(make(u";", CharacterSet::withCharacters(u";")), std::invalid_argument);
+    EXPECT_NO_THROW(make(u"\t", std::nullopt));
+    EXPECT_NO_THROW(make(u"\n", CharacterSet::withCharacters(u";")));
+    try {
+        make(u"", std::nullopt);
+    } catch (const std::invalid_argument& error) {
+        EXPECT_STREQ(error.what(),
+                     "CSV separator string must not be empty and must not contain the double quote character or "
+                     "newline characters.");
+    }
+}
+
+TEST(CSVParser, HandsRowsOverOneByOne) {
+    Rows rows;
+    CSVParser parser(u"a,b\nc\n\"", u",", std::nullopt, false, ImportNames);
+    EXPECT_TRUE(parser.parseRowsForReceiver([&](CSVParser::Row row) { rows.push_back(std::move(row)); }));
+    EXPECT_EQ(shown(rows), "Name=a;Value=b|Name=c");
+    CSVParser empty(u"\n", u",", std::nullopt, false, ImportNames);
+    EXPECT_FALSE(empty.parseRowsForReceiver([](const CSVParser::Row&) { FAIL(); }));
+}
+
+TEST(CSVParser, ReadsLargeTexts) {
+    std::u16string text = u"\"";
+    for (int i = 0; i < 1'000'000; ++i) text += u"ab\"\"\n";
+    text += u"\"";
+    for (int i = 0; i < 200'000; ++i) text += u"\nshort,\"a long content\",label";
+    std::size_t count = 0;
+    std::size_t longest = 0;
+    CSVParser parser(std::move(text), u",", std::nullopt, false, ImportNames);
+    parser.parseRowsForReceiver([&](const CSVParser::Row& row) {
+        ++count;
+        longest = std::max(longest, row.at(u"Name").size());
+    });
+    EXPECT_EQ(count, 200'001U);
+    EXPECT_EQ(longest, 4'000'000U);
+}
+
+TEST(CSVParser, ARecordWithTooManyFieldsIsTheLast) {
+    constexpr std::size_t Limit = CSVParser::MaxFieldsPerRecord;
+    const auto rows = parsed(std::u16string(Limit - 1, u',') + u"\na\n" + std::u16string(Limit, u',') + u"\nb");
+    ASSERT_TRUE(rows);
+    ASSERT_EQ(rows->size(), 3U);
+    EXPECT_EQ(rows->front().size(), Limit);
+    EXPECT_EQ(rows->back().size(), Limit);
+}
+
+std::string written(const std::vector<std::vector<CsvWriter::Field>>& lines, char16_t delimiter = u',') {
+    std::ostringstream stream;
+    CsvWriter writer(stream, CsvEncoding::Utf8, delimiter);
+    for (const auto& line : lines) writer.writeLineOfFields(line);
+    return stream.str();
+}
+
+TEST(CsvWriter, QuotesOnlyWhatNeedsIt) {
+    struct Case {
+        const char16_t* field;
+        const char* expected;
+    };
+    const Case cases[] = {
+        {u"plain", "plain"},
+        {u"", ""},
+        {u"   ", "   "},
+        {u"a\tb;c'd", "a\tb;c'd"},
+        {u"a,b", "\"a,b\""},
+        {u"a\rb", "\"a\rb\""},
+        {u"a\nb", "\"a\nb\""},
+        {u"a\u2028b", "\"a\u2028b\""},
+        {u"\"", "\"\"\"\""},
+        {u"say \"hi\"", "\"say \"\"hi\"\"\""},
+        {u"ü\U0001F600", "ü\U0001F600"},
+    };
+    for (const Case& c : cases) EXPECT_EQ(written({{c.field}}), std::string(c.expected) + "\n") << toUtf8(c.field);
+    EXPECT_EQ(written({{u"a,b", u"c;d"}}, u';'), "a,b;\"c;d\"\n");
+}
+
+TEST(CsvWriter, WritesLines) {
+    EXPECT_EQ(written({{u"a", std::nullopt, u"b"}, {}, {std::nullopt}, {u"c"}}), "a,,b\n\n\nc\n");
+}
+
+TEST(CsvWriter, FinishesAStartedLineBeforeTheNext) {
+    std::ostringstream stream;
+    CsvWriter writer(stream, CsvEncoding::Utf8, u',');
+    writer.writeField(u"a");
+    writer.writeField(u"");
+    writer.writeLineOfFields({u"b"});
+    writer.writeField(u"c");
+    writer.writeComment(u"one\r\ntwo\n\nthree");
+    writer.writeComment(u"");
+    writer.writeField(u"d");
+    writer.finishLine();
+    EXPECT_EQ(stream.str(), "a,\nb\nc\n#one\n#two\n#\n#three\n#\nd\n");
+}
+
+TEST(CsvWriter, WritesTheByteOrderMarkOfUtf16Once) {
+    std::ostringstream stream;
+    CsvWriter writer(stream, CsvEncoding::Utf16, u',');
+    writer.writeLineOfFields({u"a", u"ü"});
+    EXPECT_EQ(stream.str(), std::string("\xff\xfe"
+                                        "a\0,\0\xfc\0\n\0",
+                                        10));
+}
+
+class CsvFile : public testing::Test {
+  protected:
+    CsvFile() : folder(std::filesystem::path(testing::TempDir()) / "plume-csv-test") {
+        std::filesystem::remove_all(folder);
+        std::filesystem::create_directory(folder);
+    }
+    ~CsvFile() override { std::filesystem::remove_all(folder); }
+
+    std::filesystem::path folder;
+};
+
+TEST_F(CsvFile, ReplacesWhatWasThere) {
+    const auto path = folder / "export.csv";
+    std::ofstream(path) << "a much longer text than the new one";
+    auto writer = CsvWriter::makeForWritingToCSVFile(path);
+    ASSERT_TRUE(writer);
+    CsvWriter moved = std::move(writer).value();
+    moved.writeLineOfFields({u"ä", u"b"});
+    EXPECT_TRUE(moved.closeStream());
+    std::ostringstream text;
+    text << std::ifstream(path).rdbuf();
+    EXPECT_EQ(text.str(), "ä,b\n");
+}
+
+TEST_F(CsvFile, ReportsAFileThatCannotBeOpened) {
+    const auto writer = CsvWriter::makeForWritingToCSVFile(folder / "missing" / "export.csv");
+    ASSERT_FALSE(writer);
+    EXPECT_THAT(writer.error().message, StartsWith("The file " + (folder / "missing" / "export.csv").string()));
+}
+
+TEST(CsvWriter, ReportsATextThatWasNotWritten) {
+    std::ostringstream stream;
+    CsvWriter writer(stream, CsvEncoding::Utf8, u',');
+    stream.setstate(std::ios::badbit);
+    writer.writeLineOfFields({u"a"});
+    EXPECT_FALSE(writer.closeStream());
+}
+
+// A line of one empty field is an empty line, which readers skip.
+RC_GTEST_PROP(CSV, WhatIsWrittenReadsBackTheSame, ()) {
+    const auto text = rc::gen::scale(0.2, rc::gen::container<std::u16string>(rc::gen::element(
+                                              u'a', u'"', u',', u'\n', u'\r', u'#', u' ', u'\u2028', u'ß', u'\0')));
+    const auto lines =
+        *rc::gen::nonEmpty(rc::gen::container<std::vector<std::vector<std::u16string>>>(rc::gen::suchThat(
+            rc::gen::scale(0.2, rc::gen::container<std::vector<std::u16string>>(text)),
+            [](const auto& line) { return line.size() > 1 || (line.size() == 1 && !line.front().empty()); })));
+    std::ostringstream stream;
+    CsvWriter writer(stream, CsvEncoding::Utf8, u',');
+    for (const auto& line : lines) writer.writeLineOfFields({line.begin(), line.end()});
+    CSVParser parser(fromUtf8(stream.str()), u",", std::nullopt, false, {});
+    const auto rows = parser.arrayOfParsedRows();
+    RC_ASSERT(rows.has_value());
+    RC_ASSERT(rows->size() == lines.size());
+    for (std::size_t i = 0; i < lines.size(); ++i) {
+        RC_ASSERT((*rows)[i].size() == lines[i].size());
+        for (std::size_t j = 0; j < lines[i].size(); ++j) {
+            RC_ASSERT((*rows)[i].at(u"FIELD_" + fromUtf8(std::to_string(j + 1))) == lines[i][j]);
+        }
+    }
+}
+
+}  // namespace
+}  // namespace plume

@@ -1,0 +1,140 @@
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "scenario/ScenarioPlayer.h"
+
+namespace plume {
+
+namespace {
+
+struct Fault {
+    std::string text;
+    std::string message;  // a part of it
+};
+
+void PrintTo(const Fault& fault, std::ostream* stream) {
+    *stream << fault.text;
+}
+
+class ScenarioFault : public testing::TestWithParam<Fault> {};
+
+ScenarioReport simulated(const std::string& text) {
+    return simulate(text, "s.json");
+}
+
+}  // namespace
+
+TEST_P(ScenarioFault, IsNamedWithItsPlace) {
+    const ScenarioReport report = simulated(GetParam().text);
+    EXPECT_EQ(report.exitStatus, 2);
+    EXPECT_EQ(report.output, "") << "something was played";
+    EXPECT_TRUE(report.problems.starts_with("s.json: ")) << report.problems;
+    EXPECT_NE(report.problems.find(GetParam().message), std::string::npos) << report.problems;
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Faults, ScenarioFault,
+    testing::Values(
+        Fault{"", "no JSON"}, Fault{"[]", "at $: expected an object"}, Fault{R"({"steps": []} x)", "no JSON"},
+        Fault{R"({"about": "a", "about": "b"})", "the key \"about\" twice"},
+        Fault{std::string(100, '['), "nested too deeply"}, Fault{"{\"text\": \"\xFF\"}", "no JSON"},
+        Fault{R"({"txet": ""})", "at $.txet: unknown key; expected one of about, library"},
+        Fault{R"({"text": 1})", "at $.text: expected a string"},
+        Fault{R"({"library": [{"items": [{}, {"contentType": 4}]}]})",
+              "at $.library[0].items[1].contentType: expected a whole number from 0 to 3"},
+        Fault{R"({"library": [{"expandAfter": 1.5}]})", "at $.library[0].expandAfter: expected a whole number"},
+        Fault{R"({"library": [{"availability": {"availability": 3}}]})", "availability.availability: expected"},
+        Fault{R"({"library": [{"items": [{"uuid": "x"}]}]})", "items[0].uuid: expected a UUID"},
+        Fault{R"({"library": [{"items": [{"rtf": "{\\rtf1 x}"}]}]})", "items[0].rtf: only contentType 1"},
+        Fault{R"({"library": [{"items": [{"contentType": 1, "rtf": "x"}]}]})", "items[0].rtf: expected RTF"},
+        Fault{R"({"settings": {"Nonsense": 1}})", "at $.settings.Nonsense: unknown setting"},
+        Fault{R"({"settings": {"UseClipboard": 1}})", "at $.settings.UseClipboard: expected true or false"},
+        Fault{R"({"settings": {"UseClipboardIn": 3}})", "UseClipboardIn: expected a whole number from 0 to 2"},
+        Fault{R"({"settings": {"RestoreClipboardDelay": -1}})", "RestoreClipboardDelay: expected a number from 0"},
+        Fault{R"({"settings": {"UndoHotKey": 73014444032}})", "UndoHotKey: expected a packed hot key"},
+        Fault{R"({"settings": {"UseClipboardApplications": ["a", 1]}})",
+              "$.settings.UseClipboardApplications[1]: expected a string"},
+        Fault{R"({"applicationSettings": {"org.x": {"flags": ["usesClipboard"]}}})",
+              "$.applicationSettings[\"org.x\"].flags[0]: expected one of"},
+        Fault{R"({"now": "2026-02-30T10:00:00"})", "at $.now: expected a moment"},
+        Fault{R"({"now": "2026-01-31 10:00"})", "at $.now: expected a moment"},
+        Fault{R"({"timeZone": "Mars/Olympus"})", "at $.timeZone: expected the name of a time zone"},
+        Fault{R"({"steps": [{"type": "a", "wait": 1}]})", "at $.steps[0]: expected an object that says one thing"},
+        Fault{R"({"steps": [{"key": 51, "modifiers": ["alt"]}]})", "at $.steps[0].modifiers[0]: expected one of"},
+        Fault{R"({"steps": [{"key": 128}]})", "at $.steps[0].key: expected"},
+        Fault{R"({"steps": [{"key": 1, "type": "a"}]})", "at $.steps[0].type: unknown key"},
+        Fault{R"({"steps": [{"hotKey": "UndoHotKey"}]})", "at $.steps[0].hotKey: expected a hot key that the settings"},
+        Fault{R"({"steps": [{"hotKey": "Undo"}]})", "at $.steps[0].hotKey: expected the name of a hot-key setting"},
+        Fault{R"({"steps": [{"wait": -1}]})", "at $.steps[0].wait: expected a number"},
+        Fault{R"({"steps": [{"click": false}]})", "at $.steps[0].click: expected true"},
+        Fault{R"({"steps": [{"type": "a"}, {"form": {}}]})", "at $.steps[1]: no form is open"},
+        Fault{R"({"steps": [{"choose": 0}]})", "at $.steps[0]: no list is shown"},
+        Fault{R"({"steps": [{"select": {"start": 1}}]})", "at $.steps[0]: the text in front is too short"},
+        Fault{R"({"library": [{"items": [{"abbreviation": "q", "content": "【field:A】"}]}],
+                 "steps": [{"type": "q"}, {"form": {"B": ""}}]})",
+              "at $.steps[1]: the form has no field \"B\""},
+        Fault{R"({"expect": {"txt": ""}})", "at $.expect.txt: unknown key"},
+        Fault{R"({"expect": {"counts": {"keys": 1}}})", "at $.expect.counts.keys: unknown key"}));
+
+TEST(ScenarioPlayer, ShowsBothSidesOfADifference) {
+    const ScenarioReport report =
+        simulated(R"({"steps": [{"type": "ab"}], "expect": {"text": "abc", "caret": 2, "counts": {"events": 1}}})");
+    EXPECT_EQ(report.exitStatus, 1);
+    EXPECT_EQ(report.problems,
+              "s.json: text: expected \"abc\", got \"ab\"\ns.json: counts.events: expected 1, got 0\n");
+    EXPECT_NE(report.output.find("\"text\": \"ab\""), std::string::npos);
+}
+
+TEST(ScenarioPlayer, ComparesListsAsAWhole) {
+    EXPECT_EQ(simulated(R"({"expect": {"events": [{"key": 0}]}})").exitStatus, 1);
+    EXPECT_EQ(simulated(R"({"steps": [{"press": 0}], "expect": {"events": [{"key": 0}]}})").exitStatus, 0);
+    EXPECT_EQ(simulated(R"({"steps": [{"press": 0}], "expect": {"events": [{"key": 1}]}})").exitStatus, 1);
+    EXPECT_EQ(simulated(R"({"steps": [{"press": 0}], "expect": {"events": []}})").exitStatus, 1);
+}
+
+TEST(ScenarioPlayer, LetsTimePassBetweenKeysAndForWaits) {
+    const std::string times = R"([{"time": 0}, {"time": 0}, {"time": 0.05}, {"time": 0.05}, {"time": 1.05}])";
+    EXPECT_EQ(simulated(R"({"steps": [{"type": "a"}, {"type": "b"}, {"wait": 1}, {"press": 0}],
+                           "expect": {"events": )" +
+                        times + "}}")
+                  .problems,
+              "");
+}
+
+TEST(ScenarioPlayer, DoesNotWaitForTimersThatRepeatForGood) {
+    // The paste comes when a program is in front that pastes with another key: nobody reads it, and the restore, first
+    // tried at 0.9 s, never comes.
+    EXPECT_EQ(simulated(R"({"library": [{"items": [{"abbreviation": "q", "content": "x"}]}], "clipboard": "mine",
+                           "applicationSettings": {
+                             "org.example.editor": {"flags": ["useClipboard", "delayPasting"], "pastingDelay": 0.5},
+                             "org.example.other": {"flags": ["useControlKey"]}},
+                           "steps": [{"type": "q"}, {"wait": 0.1}, {"activate": "org.example.other"}, {"press": 0},
+                                     {"press": 11}, {"press": 8}],
+                           "expect": {"clipboard": "x", "text": "abc", "events": [{"key": 9, "time": 0.5},
+                             {"key": 9, "time": 0.5}, {"key": 0, "time": 0.9}, {"key": 11, "time": 0.95},
+                             {"key": 8, "time": 1.0}]}})")
+                  .problems,
+              "");
+}
+
+TEST(ScenarioPlayer, FillsFormsInWhereRichTextStood) {
+    const std::string library = R"({"library": [{"items": [
+        {"abbreviation": "nn", "contentType": 1, "rtf": "{\\rtf1\\ansi \\b old\\b0 }"},
+        {"abbreviation": "q", "contentType": 1,
+         "rtf": "{\\rtf1\\ansi A \\u12304 ?snippet:nn optional:1\\u12305 ? B}"}]}], )";
+    for (const auto& [form, text] : {std::pair(R"("#0": "EDITED")", "A EDITED B"),
+                                     std::pair(R"("#0": "old")", "A old B"), std::pair("", "A old B")}) {
+        const std::string rest = std::string(R"("steps": [{"type": "q"}, {"form": {)") + form +
+                                 R"(}}], "expect": {"text": ")" + text + "\"}}";
+        EXPECT_EQ(simulated(library + rest).problems, "") << form;
+    }
+}
+
+TEST(ScenarioPlayer, PlaysTheSameTwice) {
+    const std::string text = R"({"library": [{"items": [{"abbreviation": "q", "contentType": 3,
+                                 "content": "echo done"}]}], "steps": [{"type": "x q y"}]})";
+    EXPECT_EQ(simulated(text).output, simulated(text).output);
+}
+
+}  // namespace plume
