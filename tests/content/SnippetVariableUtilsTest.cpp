@@ -5,7 +5,7 @@
 #include <rapidcheck/gtest.h>
 
 #include "Foundation/Strings.h"
-#include "Foundation/text/CSVParser.h"
+#include "Foundation/text/CSV.h"
 #include "content/SnippetDateTimeVariable.h"
 
 namespace plume {

@@ -7,8 +7,7 @@
 #include <vector>
 
 #include "Foundation/Strings.h"
-#include "Foundation/text/CSVParser.h"
-#include "Foundation/text/CsvWriter.h"
+#include "Foundation/text/CSV.h"
 
 namespace {
 

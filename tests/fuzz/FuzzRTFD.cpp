@@ -4,7 +4,6 @@
 #include <string>
 #include <string_view>
 
-#include "Foundation/text/FlatRTFD.h"
 #include "Foundation/text/RTFD.h"
 
 namespace {

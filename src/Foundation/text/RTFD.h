@@ -18,7 +18,11 @@ std::string rtfFromAttributedString(const AttributedString& text);
 Result<AttributedString> attributedStringFromRTF(std::string_view bytes);
 
 std::string rtfdFromAttributedString(const AttributedString& text);
-// Fails when the container is damaged, with the offset in the message. Plain RTF is accepted too.
+// Fails when the blob is damaged, with the offset in the message. Plain RTF is accepted too.
 Result<AttributedString> attributedStringFromRTFD(std::string_view bytes);
+
+// One attached file with its name, in the same kind of blob, as archives keep it.
+std::string flatContainerFromAttachment(const TextAttachment& attachment);
+Result<TextAttachment> attachmentFromFlatContainer(std::string_view bytes);
 
 }  // namespace plume

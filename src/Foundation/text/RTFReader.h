@@ -1,4 +1,4 @@
-// The RTF reader's machine: groups, destinations, and the text that comes out. RTFControls.cpp knows the control words.
+// The RTF reader's machine: groups, destinations, and the text that comes out. RTFControlWords.cpp knows the control words.
 //
 // Internal to the core. One reader reads one document once, on one thread.
 #pragma once
@@ -11,6 +11,7 @@
 
 #include "Foundation/text/AttributedString.h"
 #include "Foundation/text/RTFAttributes.h"
+#include "Foundation/text/RTFCodePages.h"
 #include "Foundation/text/RTFDocument.h"
 #include "Foundation/text/RTFFormats.h"
 #include "Foundation/text/RTFTables.h"

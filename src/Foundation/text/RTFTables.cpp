@@ -1,7 +1,9 @@
 #include "Foundation/text/RTFTables.h"
 
 #include <algorithm>
-#include <array>
+#include <cmath>
+#include <limits>
+#include <tuple>
 #include <utility>
 
 #include "Foundation/Strings.h"
@@ -12,47 +14,6 @@ namespace plume {
 namespace {
 
 constexpr std::size_t MaximumComponents = 5;
-
-// Bytes of symbol fonts are glyph numbers, not characters. The bullet of lists is the one that text needs.
-constexpr int SymbolCodePage = 42;
-constexpr char SymbolBullet = '\xB7';
-
-struct CodePageName {
-    int codePage;
-    const char* name;
-};
-
-constexpr std::array CodePageNames = {
-    CodePageName{437, "ibm-437"},          CodePageName{850, "ibm-850"},
-    CodePageName{852, "ibm-852"},          CodePageName{866, "ibm-866"},
-    CodePageName{874, "windows-874"},      CodePageName{932, "windows-932"},
-    CodePageName{936, "windows-936"},      CodePageName{949, "windows-949"},
-    CodePageName{950, "windows-950"},      CodePageName{1250, "windows-1250"},
-    CodePageName{1251, "windows-1251"},    CodePageName{1252, "windows-1252"},
-    CodePageName{1253, "windows-1253"},    CodePageName{1254, "windows-1254"},
-    CodePageName{1255, "windows-1255"},    CodePageName{1256, "windows-1256"},
-    CodePageName{1257, "windows-1257"},    CodePageName{1258, "windows-1258"},
-    CodePageName{10000, "macintosh"},      CodePageName{10006, "x-mac-greek"},
-    CodePageName{10007, "x-mac-cyrillic"}, CodePageName{10029, "x-mac-centraleurroman"},
-    CodePageName{10081, "x-mac-turkish"},  CodePageName{65001, "UTF-8"},
-};
-
-struct CharacterSetPage {
-    int characterSet;
-    int codePage;
-};
-
-constexpr std::array CharacterSetPages = {
-    CharacterSetPage{2, SymbolCodePage}, CharacterSetPage{77, 10000}, CharacterSetPage{78, 932},
-    CharacterSetPage{79, 949},           CharacterSetPage{80, 936},   CharacterSetPage{81, 950},
-    CharacterSetPage{85, 10006},         CharacterSetPage{86, 10081}, CharacterSetPage{88, 10029},
-    CharacterSetPage{89, 10007},         CharacterSetPage{128, 932},  CharacterSetPage{129, 949},
-    CharacterSetPage{134, 936},          CharacterSetPage{136, 950},  CharacterSetPage{161, 1253},
-    CharacterSetPage{162, 1254},         CharacterSetPage{163, 1258}, CharacterSetPage{177, 1255},
-    CharacterSetPage{178, 1256},         CharacterSetPage{186, 1257}, CharacterSetPage{204, 1251},
-    CharacterSetPage{222, 874},          CharacterSetPage{238, 1250}, CharacterSetPage{254, 437},
-    CharacterSetPage{255, 850},
-};
 
 // Some writers name the face instead of the family.
 struct FaceSuffix {
@@ -67,76 +28,123 @@ constexpr std::array FaceSuffixes = {
     FaceSuffix{u"-Oblique", false, true},   FaceSuffix{u"-Regular", false, false},
 };
 
+constexpr int BulletNumberFormat = 23;
+constexpr int EmptyNumberFormat = 255;
+constexpr std::size_t LongestWrittenMarker = 8;
+
+// How attributes name the marker of a list's level, and the number format that stands for it.
+struct Marker {
+    std::u16string_view name;
+    int numberFormat;
+    std::u16string_view bullet;
+};
+
+constexpr std::array Markers = {
+    Marker{u"{decimal}", 0, {}},
+    Marker{u"{upper-roman}", 1, {}},
+    Marker{u"{lower-roman}", 2, {}},
+    Marker{u"{upper-alpha}", 3, {}},
+    Marker{u"{upper-latin}", 3, {}},
+    Marker{u"{lower-alpha}", 4, {}},
+    Marker{u"{lower-latin}", 4, {}},
+    Marker{u"{disc}", BulletNumberFormat, u"\u2022"},
+    Marker{u"{circle}", BulletNumberFormat, u"\u25E6"},
+    Marker{u"{square}", BulletNumberFormat, u"\u25AA"},
+    Marker{u"{box}", BulletNumberFormat, u"\u25A1"},
+    Marker{u"{check}", BulletNumberFormat, u"\u2713"},
+    Marker{u"{diamond}", BulletNumberFormat, u"\u25C6"},
+    Marker{u"{hyphen}", BulletNumberFormat, u"\u2043"},
+};
+
 // What a level's number format says where no marker is named.
-const char16_t* markerOfNumberFormat(int format) {
-    switch (format) {
-        case 0:
-            return u"{decimal}.";
-        case 1:
-            return u"{upper-roman}.";
-        case 2:
-            return u"{lower-roman}.";
-        case 3:
-            return u"{upper-alpha}.";
-        case 4:
-            return u"{lower-alpha}.";
-        case 255:
-            return u"";
-        default:
-            return u"{disc}";
+std::u16string markerOfNumberFormat(int format) {
+    if (format == EmptyNumberFormat) return {};
+    const auto found =
+        std::find_if(Markers.begin(), Markers.end(), [&](const Marker& m) { return m.numberFormat == format; });
+    if (found == Markers.end() || format == BulletNumberFormat) return u"{disc}";
+    return std::u16string(found->name) + u".";
+}
+
+// The component as its nearest byte says it, when that is exact; else to the precision of the extended table.
+double roundedComponent(double component) {
+    if (!(component > 0)) return 0;
+    if (component >= 1) return 1;
+    const double asByte = std::round(component * 255) / 255;
+    if (std::abs(asByte - component) < 1e-9) return asByte;
+    return std::round(component * RTFExpandedColorUnits) / RTFExpandedColorUnits;
+}
+
+int byteOf(double component) {
+    return static_cast<int>(std::lround(component * 255));
+}
+
+int expandedUnitsOf(double component) {
+    return static_cast<int>(std::lround(component * RTFExpandedColorUnits));
+}
+
+bool fitsBytes(const std::array<double, 4>& color) {
+    return color[3] == 1 && std::all_of(color.begin(), color.end(),
+                                        [](double component) { return byteOf(component) / 255.0 == component; });
+}
+
+// How a level's marker is drawn by readers that do not know its name: text with the place of the number.
+struct LevelText {
+    int numberFormat = BulletNumberFormat;
+    std::u16string_view before;
+    bool hasNumber = false;
+    std::u16string_view after;
+};
+
+LevelText levelTextOf(std::u16string_view markerFormat) {
+    if (markerFormat.size() > RTFMaximumMarkerLength) markerFormat = markerFormat.substr(0, RTFMaximumMarkerLength);
+    for (const Marker& marker : Markers) {
+        const std::size_t place = markerFormat.find(marker.name);
+        if (place == std::u16string_view::npos) continue;
+        if (marker.numberFormat == BulletNumberFormat) return {BulletNumberFormat, marker.bullet, false, {}};
+        return {marker.numberFormat, markerFormat.substr(0, place), true,
+                markerFormat.substr(place + marker.name.size())};
     }
+    const bool isShort = markerFormat.size() <= LongestWrittenMarker;
+    return {BulletNumberFormat, isShort ? markerFormat : u"\u2022", false, {}};
+}
+
+void writeLevelText(RTFOutput& output, const LevelText& level, unsigned char depth) {
+    const std::size_t length = level.before.size() + level.after.size() + (level.hasNumber ? 1 : 0);
+    output.openGroup();
+    output.control("leveltext");
+    output.byte(static_cast<unsigned char>(length));
+    output.text(level.before);
+    if (level.hasNumber) output.byte(depth);
+    output.text(level.after);
+    output.text(u";");
+    output.closeGroup();
+    output.openGroup();
+    output.control("levelnumbers");
+    if (level.hasNumber) output.byte(static_cast<unsigned char>(level.before.size() + 1));
+    output.text(u";");
+    output.closeGroup();
+}
+
+void writeLevel(RTFOutput& output, const TextList& list, unsigned char depth) {
+    constexpr std::int64_t largest = std::numeric_limits<int>::max();
+    const LevelText level = levelTextOf(list.markerFormat);
+    output.openGroup();
+    output.control("listlevel");
+    output.control("levelnfc", level.numberFormat);
+    output.control("levelnfcn", level.numberFormat);
+    output.control("leveljc", 0);
+    output.control("leveljcn", 0);
+    output.control("levelfollow", 0);
+    output.control("levelstartat", static_cast<int>(std::clamp(list.startingItemNumber, -largest, largest)));
+    output.openGroup();
+    output.ignorableControl("levelmarker");
+    output.text(list.markerFormat);
+    output.closeGroup();
+    writeLevelText(output, level, depth);
+    output.closeGroup();
 }
 
 }  // namespace
-
-// ---- Code pages ----
-
-int RTFCodePages::codePageOfCharacterSet(int characterSet) {
-    const auto found = std::find_if(CharacterSetPages.begin(), CharacterSetPages.end(),
-                                    [&](const CharacterSetPage& page) { return page.characterSet == characterSet; });
-    return found == CharacterSetPages.end() ? 0 : found->codePage;
-}
-
-bool RTFCodePages::isKnown(int codePage) {
-    return std::any_of(CodePageNames.begin(), CodePageNames.end(),
-                       [&](const CodePageName& page) { return page.codePage == codePage; });
-}
-
-UConverter* RTFCodePages::converterFor(int codePage) {
-    if (!isKnown(codePage)) codePage = RTFLatinCodePage;
-    auto& converter = converters_[codePage];
-    if (!converter) {
-        const auto page = std::find_if(CodePageNames.begin(), CodePageNames.end(),
-                                       [&](const CodePageName& known) { return known.codePage == codePage; });
-        UErrorCode status = U_ZERO_ERROR;
-        converter.reset(ucnv_open(page->name, &status));
-    }
-    return converter.get();
-}
-
-void RTFCodePages::appendText(int codePage, std::string_view bytes, std::u16string& text) {
-    UConverter* converter = converterFor(codePage);
-    if (converter == nullptr) {
-        text.append(bytes.size(), u'\uFFFD');
-        return;
-    }
-    const std::size_t start = text.size();
-    text.resize(start + bytes.size() * 2);
-    char16_t* target = text.data() + start;
-    const char* source = bytes.data();
-    UErrorCode status = U_ZERO_ERROR;
-    ucnv_resetToUnicode(converter);
-    ucnv_toUnicode(converter, &target, text.data() + text.size(), &source, bytes.data() + bytes.size(), nullptr, true,
-                   &status);
-    text.resize(static_cast<std::size_t>(target - text.data()));
-    // Some pages have a control character of their own for what they cannot convert.
-    std::replace(text.begin() + static_cast<std::ptrdiff_t>(start), text.end(), u'\u001A', u'\uFFFD');
-    if (codePage == SymbolCodePage) {
-        constexpr char16_t latinMeaning = u'\u00B7';
-        static_assert(static_cast<unsigned char>(SymbolBullet) == latinMeaning);
-        std::replace(text.begin() + static_cast<std::ptrdiff_t>(start), text.end(), latinMeaning, u'\u2022');
-    }
-}
 
 // ---- Fonts ----
 
@@ -272,6 +280,125 @@ std::vector<TextList> RTFListTable::listsAt(int number, int level) const {
     const auto& levels = lists_[list->second];
     const std::size_t count = std::min(levels.size(), static_cast<std::size_t>(std::max(level, 0)) + 1);
     return {levels.begin(), levels.begin() + static_cast<std::ptrdiff_t>(count)};
+}
+
+// ---- Written tables ----
+
+bool RTFTableWriter::LevelsBefore::operator()(const std::vector<TextList>& a, const std::vector<TextList>& b) const {
+    return std::lexicographical_compare(a.begin(), a.end(), b.begin(), b.end(), [](const auto& x, const auto& y) {
+        return std::tie(x.markerFormat, x.startingItemNumber) < std::tie(y.markerFormat, y.startingItemNumber);
+    });
+}
+
+int RTFTableWriter::fontNumber(const std::u16string& family) {
+    std::u16string name = family;
+    std::erase_if(name, [](char16_t unit) { return unit < u' ' || unit == u';'; });
+    name = trimmed(name);
+    if (name.empty()) return -1;
+    if (fontNumbers_.size() >= RTFMaximumFonts && !fontNumbers_.contains(name)) return -1;
+    return fontNumbers_.emplace(std::move(name), static_cast<int>(fontNumbers_.size())).first->second;
+}
+
+int RTFTableWriter::colorIndex(const ColorAttribute& color) {
+    const Components components{roundedComponent(color.red), roundedComponent(color.green),
+                                roundedComponent(color.blue), roundedComponent(color.alpha)};
+    const auto known = colorIndices_.find(components);
+    if (known != colorIndices_.end()) return known->second;
+    // Index 0 stands for the automatic colour.
+    if (colors_.size() + 1 >= RTFMaximumColors) return 0;
+    colors_.push_back(components);
+    return colorIndices_.emplace(components, static_cast<int>(colors_.size())).first->second;
+}
+
+int RTFTableWriter::listNumber(const std::vector<TextList>& levels) {
+    if (levels.empty()) return 0;
+    constexpr std::size_t deepest = RTFDeepestListLevel + 1;
+    const std::vector<TextList> written(levels.begin(),
+                                        levels.begin() + static_cast<std::ptrdiff_t>(std::min(levels.size(), deepest)));
+    if (listNumbers_.size() >= RTFMaximumLists && !listNumbers_.contains(written)) return 0;
+    return listNumbers_.emplace(written, static_cast<int>(listNumbers_.size()) + 1).first->second;
+}
+
+void RTFTableWriter::write(RTFOutput& output) const {
+    if (!fontNumbers_.empty()) writeFonts(output);
+    if (!colors_.empty()) writeColors(output);
+    if (!std::all_of(colors_.begin(), colors_.end(), fitsBytes)) writeExpandedColors(output);
+    if (!listNumbers_.empty()) writeLists(output);
+}
+
+void RTFTableWriter::writeFonts(RTFOutput& output) const {
+    output.newline();
+    output.openGroup();
+    output.control("fonttbl");
+    for (const auto& [name, number] : fontNumbers_) {
+        output.openGroup();
+        output.control("f", number);
+        output.control("fnil");
+        output.control("fcharset", 0);
+        output.text(name);
+        output.text(u";");
+        output.closeGroup();
+    }
+    output.closeGroup();
+}
+
+void RTFTableWriter::writeColors(RTFOutput& output) const {
+    output.newline();
+    output.openGroup();
+    output.control("colortbl");
+    output.text(u";");
+    for (const Components& color : colors_) {
+        output.control("red", byteOf(color[0]));
+        output.control("green", byteOf(color[1]));
+        output.control("blue", byteOf(color[2]));
+        output.text(u";");
+    }
+    output.closeGroup();
+}
+
+void RTFTableWriter::writeExpandedColors(RTFOutput& output) const {
+    output.newline();
+    output.openGroup();
+    output.ignorableControl("expandedcolortbl");
+    output.text(u";");
+    for (const Components& color : colors_) {
+        if (!fitsBytes(color)) {
+            output.control("cssrgb");
+            const std::size_t count = color[3] == 1 ? 3 : 4;
+            for (std::size_t i = 0; i < count; ++i) output.control("c", expandedUnitsOf(color[i]));
+        }
+        output.text(u";");
+    }
+    output.closeGroup();
+}
+
+void RTFTableWriter::writeLists(RTFOutput& output) const {
+    output.newline();
+    output.openGroup();
+    output.ignorableControl("listtable");
+    for (const auto& [levels, number] : listNumbers_) {
+        output.openGroup();
+        output.control("list");
+        output.control("listtemplateid", number);
+        output.control("listhybrid");
+        unsigned char depth = 0;
+        for (const TextList& level : levels) writeLevel(output, level, depth++);
+        output.control("listid", number);
+        output.closeGroup();
+    }
+    output.closeGroup();
+    output.newline();
+    output.openGroup();
+    output.ignorableControl("listoverridetable");
+    for (const auto& [levels, number] : listNumbers_) {
+        output.openGroup();
+        output.control("listoverride");
+        output.control("listid", number);
+        output.control("listoverridecount", 0);
+        output.control("ls", number);
+        output.closeGroup();
+    }
+    output.closeGroup();
 }
 
 }  // namespace plume

@@ -1,43 +1,24 @@
-// The tables at the head of an RTF document, as they fill up while it is read: fonts, colours, lists; and the code
-// pages.
+// The tables at the head of an RTF document: fonts, colours, lists, as they fill up while one is read or written.
 //
-// Every table has a limit; what goes beyond it is left out. Internal to the RTF reader; one reader, one thread.
+// Every table has a limit; what goes beyond it is left out. Internal to the RTF reader and writer; one of these, one
+// thread.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <map>
-#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
-#include <unicode/ucnv.h>
-
+#include "Foundation/text/RTFOutput.h"
 #include "Foundation/text/TextAttributes.h"
 
 namespace plume {
 
-inline constexpr int RTFLatinCodePage = 1252;
-
-// Converts the bytes of documents to text. Converters are opened when first needed and kept.
-class RTFCodePages {
-  public:
-    // The page that a font's character set number stands for; 0 when the document's own page holds.
-    static int codePageOfCharacterSet(int characterSet);
-    static bool isKnown(int codePage);
-
-    // Bytes that the page cannot convert become U+FFFD; an unknown page is taken for Latin.
-    void appendText(int codePage, std::string_view bytes, std::u16string& text);
-
-  private:
-    struct Close {
-        void operator()(UConverter* converter) const { ucnv_close(converter); }
-    };
-    UConverter* converterFor(int codePage);
-    std::map<int, std::unique_ptr<UConverter, Close>> converters_;
-};
+// ---- Read ----
 
 struct RTFFont {
     std::u16string family;
@@ -117,6 +98,36 @@ class RTFListTable {
     std::unordered_map<int, std::size_t> byIdentifier_;
     std::unordered_map<int, std::size_t> byNumber_;
     int override_ = 0;
+};
+
+// ---- Written ----
+
+class RTFTableWriter {
+  public:
+    // The number of the font in the table; -1 for a name that RTF cannot hold.
+    int fontNumber(const std::u16string& family);
+    // The index of the colour in the table; 0, the automatic colour, when the table is full.
+    int colorIndex(const ColorAttribute& color);
+    // The number of the list whose levels these are; 0 when there are none or the table is full.
+    int listNumber(const std::vector<TextList>& levels);
+
+    void write(RTFOutput& output) const;
+
+  private:
+    using Components = std::array<double, 4>;
+    struct LevelsBefore {
+        bool operator()(const std::vector<TextList>& a, const std::vector<TextList>& b) const;
+    };
+
+    void writeFonts(RTFOutput& output) const;
+    void writeColors(RTFOutput& output) const;
+    void writeExpandedColors(RTFOutput& output) const;
+    void writeLists(RTFOutput& output) const;
+
+    std::map<std::u16string, int> fontNumbers_;
+    std::map<Components, int> colorIndices_;
+    std::vector<Components> colors_;
+    std::map<std::vector<TextList>, int, LevelsBefore> listNumbers_;
 };
 
 }  // namespace plume

@@ -9,7 +9,7 @@
 #include "Foundation/text/RTFDocument.h"
 #include "Foundation/text/RTFFormats.h"
 #include "Foundation/text/RTFOutput.h"
-#include "Foundation/text/RTFTableWriter.h"
+#include "Foundation/text/RTFTables.h"
 
 namespace plume {
 

@@ -8,7 +8,7 @@
 #include <utility>
 
 #include "Foundation/Strings.h"
-#include "Foundation/text/CSVParser.h"
+#include "Foundation/text/CSV.h"
 
 namespace plume {
 

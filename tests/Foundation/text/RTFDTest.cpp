@@ -9,7 +9,6 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "Foundation/text/FlatRTFD.h"
 #include "tests/Foundation/text/RTFTestSupport.h"
 
 namespace plume {

@@ -1,4 +1,4 @@
-#include "Foundation/text/FlatRTFD.h"
+#include "Foundation/text/RTFD.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "Foundation/Strings.h"
-#include "Foundation/text/RTFD.h"
+#include "Foundation/text/RTFDocument.h"
 
 namespace plume {
 
@@ -193,19 +193,20 @@ Entry* findEntry(std::vector<Entry>& entries, std::string_view name) {
     return found == entries.end() ? nullptr : &*found;
 }
 
-}  // namespace
+// ---- Documents ----
 
-bool isFlatContainer(std::string_view bytes) {
+bool isContainer(std::string_view bytes) {
     return bytes.starts_with(Signature.substr(0, NumberSize));
 }
 
-std::string flatContainerFromDocument(const RTFDocument& document) {
+std::string containerFromDocument(const RTFDocument& document) {
     std::vector<Entry> entries{{std::string(TextEntry), document.rtf}};
     for (const auto& [name, contents] : document.files) entries.push_back({toUtf8(name), contents});
     return containerOf(std::move(entries));
 }
 
-Result<RTFDocument> documentFromFlatContainer(std::string_view bytes) {
+// Folders among the files are left out.
+Result<RTFDocument> documentFromContainer(std::string_view bytes) {
     auto entries = ContainerReader(bytes).read();
     if (!entries) return entries.error();
     RTFDocument document;
@@ -220,6 +221,27 @@ Result<RTFDocument> documentFromFlatContainer(std::string_view bytes) {
     }
     if (!hasText) return Error{"The RTFD data holds no text: expected a file TXT.rtf in it."};
     return document;
+}
+
+}  // namespace
+
+std::string rtfFromAttributedString(const AttributedString& text) {
+    return rtfDocumentFromAttributedString(text, RTFAttachments::Leave).rtf;
+}
+
+Result<AttributedString> attributedStringFromRTF(std::string_view bytes) {
+    return attributedStringFromRTFDocument(bytes, {});
+}
+
+std::string rtfdFromAttributedString(const AttributedString& text) {
+    return containerFromDocument(rtfDocumentFromAttributedString(text, RTFAttachments::Keep));
+}
+
+Result<AttributedString> attributedStringFromRTFD(std::string_view bytes) {
+    if (!isContainer(bytes)) return attributedStringFromRTF(bytes);
+    auto document = documentFromContainer(bytes);
+    if (!document) return document.error();
+    return attributedStringFromRTFDocument(document.value().rtf, document.value().files);
 }
 
 std::string flatContainerFromAttachment(const TextAttachment& attachment) {
@@ -240,27 +262,6 @@ Result<TextAttachment> attachmentFromFlatContainer(std::string_view bytes) {
     if (!name) name = findEntry(entries.value(), NameEntry);
     if (name) attachment.fileName = fromUtf8(name->contents);
     return attachment;
-}
-
-// ---- The interface of RTFD.h ----
-
-std::string rtfFromAttributedString(const AttributedString& text) {
-    return rtfDocumentFromAttributedString(text, RTFAttachments::Leave).rtf;
-}
-
-Result<AttributedString> attributedStringFromRTF(std::string_view bytes) {
-    return attributedStringFromRTFDocument(bytes, {});
-}
-
-std::string rtfdFromAttributedString(const AttributedString& text) {
-    return flatContainerFromDocument(rtfDocumentFromAttributedString(text, RTFAttachments::Keep));
-}
-
-Result<AttributedString> attributedStringFromRTFD(std::string_view bytes) {
-    if (!isFlatContainer(bytes)) return attributedStringFromRTF(bytes);
-    auto document = documentFromFlatContainer(bytes);
-    if (!document) return document.error();
-    return attributedStringFromRTFDocument(document.value().rtf, document.value().files);
 }
 
 }  // namespace plume
