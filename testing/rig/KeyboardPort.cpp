@@ -68,7 +68,7 @@ void KeyboardPort::type(std::u16string_view text) {
 
 void KeyboardPort::tapDisabledByTimeout() {
     if (options_.disabled) options_.disabled();
-    loop_.schedule(0, [this] { tap_->enable(); });
+    enabling_ = loop_.performAfterDelay(0, [this] { tap_->enable(); });
 }
 
 }  // namespace plume::rig

@@ -60,6 +60,7 @@ class KeyboardPort final : private KeyboardTapListener {
     std::unique_ptr<TapConnection> connection_;
     std::unique_ptr<X11KeyboardTap> tap_;
     std::unique_ptr<X11EventPoster> poster_;
+    Timer enabling_;
     std::thread thread_;
 };
 

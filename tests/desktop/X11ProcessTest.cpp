@@ -389,14 +389,18 @@ TEST_F(X11HotKeyTest, ExactlyTheRegisteredCombinationIsHeard) {
     keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
     keyboard.chord({Key::LeftControl, Key::LeftShift}, U'j');
     EXPECT_EQ(awaitHeard("hhjj"), "hhjj");
-    thread_->run([&] { thread_->session().addHandler(XCB_KEY_PRESS, [&](const auto&) { counting('.')(); }); });
+    Subscription presses = thread_->run(
+        [&] { return thread_->session().addHandler(XCB_KEY_PRESS, [&](const auto&) { counting('.')(); }); });
     keyboard.press(Key::LeftControl);
     keyboard.press(Key::LeftShift);
     keyboard.press(keyboard.keycodeOf(U'j'));
     const std::string repeated = awaitHeardAtLeast("hhjjj...").substr(0, 8);
     EXPECT_EQ(repeated, "hhjjj...") << "a held key repeats, a hot key does not";
     keyboard.releaseAll();
-    thread_->run([&] { hotKeys.reset(); });
+    thread_->run([&] {
+        presses.end();
+        hotKeys.reset();
+    });
 }
 
 TEST_F(X11HotKeyTest, ACombinationThatIsTakenIsRefused) {

@@ -61,7 +61,7 @@ class Run {
         : port_(port), library_(library), settings_(settings), output_(output), voice_(voice) {}
 
     int untilAskedToEnd(int signals) {
-        port_.mainLoop().addSource(signals, [this, signals] {
+        const Subscription source = port_.mainLoop().addSource(signals, [this, signals] {
             signalfd_siginfo signal{};
             if (read(signals, &signal, sizeof signal) == sizeof signal) end(ExitStatus::Success);
         });
@@ -73,7 +73,6 @@ class Run {
         port_.mainLoop().run();
         port_.tapLoop().stop();
         tapThread.join();
-        port_.mainLoop().removeSource(signals);
         return status_;
     }
 

@@ -16,13 +16,12 @@ void AtspiFocusListener::listenTo(const std::string& program, const std::string&
     stop();
     if (!begin(program, address)) return bus_.disconnect();
     program_ = program;
-    descriptor_ = bus_.descriptor();
-    loop_.addSource(descriptor_, [this] { takeMessages(); });
+    source_ = loop_.addSource(bus_.descriptor(), [this] { takeMessages(); });
 }
 
 void AtspiFocusListener::stop() {
     if (program_.empty()) return;
-    loop_.removeSource(descriptor_);
+    source_.end();
     bus_.disconnect();
     program_.clear();
 }

@@ -35,7 +35,7 @@ class AtspiFocusListener {
     PollRunLoop& loop_;
     const Heard heard_;
     AtspiBus bus_;
-    int descriptor_ = -1;
+    Subscription source_;
     std::string program_;  // listened to; empty when none is
 };
 

@@ -65,18 +65,15 @@ void PollRunLoop::stop() {
     eventfd_write(wakeUp_, 1);
 }
 
-void PollRunLoop::addSource(int descriptor, Call drain) {
-    sources_.insert_or_assign(descriptor, Source{std::make_shared<const Call>(std::move(drain)), false});
+Subscription PollRunLoop::addSource(int descriptor, Call drain) {
+    auto source = std::make_shared<Source>(Source{.drain = std::move(drain)});
+    sources_.insert_or_assign(descriptor, source);
+    return Subscription(std::shared_ptr<bool>(source, &source->ended));
 }
 
 void PollRunLoop::setSourcePaused(int descriptor, bool paused) {
     const auto found = sources_.find(descriptor);
-    if (found != sources_.end()) found->second.paused = paused;
-}
-
-void PollRunLoop::removeSource(int descriptor) {
-    // Kept until it has returned: a source may remove itself.
-    const auto dropped = sources_.extract(descriptor);
+    if (found != sources_.end()) found->second->paused = paused;
 }
 
 void PollRunLoop::run() {
@@ -91,12 +88,13 @@ void PollRunLoop::run() {
 }
 
 void PollRunLoop::drainSources() {
-    // By key, not by iterator: a source may add and remove sources.
+    // By key, not by iterator: a source may add sources.
     for (auto next = sources_.begin(); next != sources_.end() && !stopped_;) {
-        const int descriptor = next->first;
-        if (!next->second.paused) {
-            const auto drain = next->second.drain;
-            (*drain)();
+        const auto [descriptor, source] = *next;
+        if (source->ended) {
+            sources_.erase(next);
+        } else if (!source->paused) {
+            source->drain();
         }
         next = sources_.upper_bound(descriptor);
     }
@@ -133,7 +131,7 @@ void PollRunLoop::wait() {
     polled_.clear();
     polled_.push_back({wakeUp_, POLLIN, 0});
     for (const auto& [descriptor, source] : sources_) {
-        if (!source.paused) polled_.push_back({descriptor, POLLIN, 0});
+        if (!source->paused && !source->ended) polled_.push_back({descriptor, POLLIN, 0});
     }
     const double seconds = secondsToWait();
     timespec limit{};

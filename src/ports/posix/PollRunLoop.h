@@ -17,6 +17,7 @@
 #include <utility>
 #include <vector>
 
+#include "Foundation/Subscription.h"
 #include "platform/RunLoop.h"
 
 namespace plume {
@@ -39,16 +40,17 @@ class PollRunLoop final : public RunLoop {
     void stop();
 
     // Calls `drain` when the descriptor can be read, and before every wait: a library that reads ahead may hold input
-    // that no poll() would tell of. It must take all there is. Only on the loop's own thread, or before run().
-    void addSource(int descriptor, Call drain);
+    // that no poll() would tell of. It must take all there is. Until the subscription ends, which comes before the
+    // descriptor is closed. Only on the loop's own thread, or before run().
+    [[nodiscard]] Subscription addSource(int descriptor, Call drain);
     // A paused source is left alone: what arrives waits in the system's buffers, in order.
     void setSourcePaused(int descriptor, bool paused);
-    void removeSource(int descriptor);
 
   private:
     struct Source {
-        std::shared_ptr<const Call> drain;
+        Call drain;
         bool paused = false;
+        bool ended = false;
     };
     using Moment = std::pair<double, CallId>;
 
@@ -63,7 +65,7 @@ class PollRunLoop final : public RunLoop {
     CallId lastId_ = 0;
     std::map<Moment, Call> delayed_;
     std::unordered_map<CallId, double> dueOf_;
-    std::map<int, Source> sources_;
+    std::map<int, std::shared_ptr<Source>> sources_;
     std::vector<pollfd> polled_;  // kept for its memory
     std::mutex mutex_;
     std::deque<Call> handedOver_;  // guarded by mutex_

@@ -28,49 +28,53 @@ X11Session::X11Session(std::unique_ptr<XcbConnection> connection, PollRunLoop& r
     : connection_(std::move(connection)), runLoop_(runLoop), window_(xcb_generate_id(connection_->get())) {
     xcb_create_window(get(), 0, window_, connection_->root(), -1, -1, 1, 1, 0, XCB_WINDOW_CLASS_INPUT_ONLY,
                       XCB_COPY_FROM_PARENT, 0, nullptr);
-    listen(window_, XCB_EVENT_MASK_PROPERTY_CHANGE);
+    windowEvents_ = listen(window_, XCB_EVENT_MASK_PROPERTY_CHANGE);
     const xcb_atom_t time = connection_->atom(TimeProperty);
-    addObserver(XCB_PROPERTY_NOTIFY, [this, time](const xcb_generic_event_t& event) {
+    timeObserver_ = addObserver(XCB_PROPERTY_NOTIFY, [this, time](const xcb_generic_event_t& event) {
         const auto& change = reinterpret_cast<const xcb_property_notify_event_t&>(event);
         if (change.window == window_ && change.atom == time) noticedTime_ = change.time;
     });
-    runLoop_.addSource(connection_->descriptor(), [this] { drain(); });
+    source_ = runLoop_.addSource(connection_->descriptor(), [this] { drain(); });
 }
 
-X11Session::~X11Session() {
-    if (!serverIsGone_) runLoop_.removeSource(connection_->descriptor());
+X11Session::WindowEvents::~WindowEvents() {
+    if (session_) session_->unlisten(window_, eventMask_);
 }
 
-X11Session::HandlerId X11Session::addHandler(std::uint8_t eventType, Handler handler) {
-    return add(eventType, false, std::move(handler));
+X11Session::WindowEvents& X11Session::WindowEvents::operator=(WindowEvents&& other) noexcept {
+    const WindowEvents before = std::move(*this);
+    session_ = std::exchange(other.session_, nullptr);
+    window_ = std::exchange(other.window_, XCB_WINDOW_NONE);
+    eventMask_ = other.eventMask_;
+    return *this;
 }
 
-X11Session::HandlerId X11Session::addObserver(std::uint8_t eventType, Handler observer) {
-    return add(eventType, true, std::move(observer));
+Subscription X11Session::addHandler(std::uint8_t eventType, Handler handler) {
+    return add({.eventType = eventType, .observes = false, .handler = std::move(handler)});
 }
 
-X11Session::HandlerId X11Session::add(std::uint8_t eventType, bool observes, Handler handler) {
-    listeners_.emplace(++lastId_, Listener{eventType, observes, std::make_shared<const Handler>(std::move(handler))});
-    return lastId_;
+Subscription X11Session::addObserver(std::uint8_t eventType, Handler observer) {
+    return add({.eventType = eventType, .observes = true, .handler = std::move(observer)});
 }
 
-void X11Session::removeHandler(HandlerId id) {
-    listeners_.erase(id);
+Subscription X11Session::add(Listener listener) {
+    const auto added = std::make_shared<Listener>(std::move(listener));
+    listeners_.emplace(++lastListener_, added);
+    return Subscription(std::shared_ptr<bool>(added, &added->ended));
 }
 
-void X11Session::listen(xcb_window_t window, std::uint32_t eventMask) {
+X11Session::WindowEvents X11Session::listen(xcb_window_t window, std::uint32_t eventMask) {
     ++masks_[window][eventMask];
     setEventMask(window);
+    return {*this, window, eventMask};
 }
 
 void X11Session::unlisten(xcb_window_t window, std::uint32_t eventMask) {
-    const auto masks = masks_.find(window);
-    if (masks == masks_.end()) return;
-    const auto count = masks->second.find(eventMask);
-    if (count == masks->second.end() || --count->second > 0) return;
-    masks->second.erase(count);
+    auto& masks = masks_.at(window);
+    if (--masks.at(eventMask) > 0) return;
+    masks.erase(eventMask);
     setEventMask(window);
-    if (masks->second.empty()) masks_.erase(masks);
+    if (masks.empty()) masks_.erase(window);
 }
 
 void X11Session::setEventMask(xcb_window_t window) const {
@@ -82,14 +86,16 @@ void X11Session::setEventMask(xcb_window_t window) const {
 
 void X11Session::dispatch(const xcb_generic_event_t& event, bool toObservers) {
     const auto type = static_cast<std::uint8_t>(event.response_type & ~SentFlag);
-    // By key, not by iterator: a handler may add and remove handlers.
+    // By key, not by iterator: a handler may add others, and have more events dispatched.
     for (auto next = listeners_.begin(); next != listeners_.end();) {
-        const HandlerId id = next->first;
-        if (next->second.eventType == type && next->second.observes == toObservers) {
-            const auto handler = next->second.handler;
-            (*handler)(event);
+        const auto key = next->first;
+        if (next->second->ended) {
+            listeners_.erase(next);
+        } else if (next->second->eventType == type && next->second->observes == toObservers) {
+            const auto listener = next->second;
+            listener->handler(event);
         }
-        next = listeners_.upper_bound(id);
+        next = listeners_.upper_bound(key);
     }
 }
 
@@ -99,10 +105,8 @@ void X11Session::collect() {
         collected_.push_back(std::move(event));
     }
     // The loop cannot see by itself that there is something to do.
-    if (collected_.empty() || drains_ || std::exchange(drainIsDue_, true)) return;
-    runLoop_.perform([this, alive = std::weak_ptr(alive_)] {
-        if (alive.lock()) drain();
-    });
+    if (collected_.empty() || drains_ || pendingDrain_) return;
+    pendingDrain_ = runLoop_.performAfterDelay(0, [this] { drain(); });
 }
 
 void X11Session::flush() {
@@ -120,9 +124,9 @@ void X11Session::drain() {
         flush();
     }
     drains_ = false;
-    drainIsDue_ = false;
+    pendingDrain_.cancel();
     if (!connection_->isBroken() || std::exchange(serverIsGone_, true)) return;
-    runLoop_.removeSource(connection_->descriptor());
+    source_.end();
     if (serverGone) serverGone();
 }
 

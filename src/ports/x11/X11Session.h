@@ -12,8 +12,10 @@
 #include <map>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "Foundation/Result.h"
+#include "Foundation/Subscription.h"
 #include "ports/posix/PollRunLoop.h"
 #include "ports/x11/XcbConnection.h"
 
@@ -22,11 +24,33 @@ namespace plume {
 class X11Session {
   public:
     using Handler = std::function<void(const xcb_generic_event_t&)>;
-    using HandlerId = std::uint64_t;
+
+    // Events of a window that were asked for, as long as this exists. The session outlives it.
+    class WindowEvents {
+      public:
+        WindowEvents() = default;
+        WindowEvents(WindowEvents&& other) noexcept
+            : session_(std::exchange(other.session_, nullptr)),
+              window_(std::exchange(other.window_, XCB_WINDOW_NONE)),
+              eventMask_(other.eventMask_) {}
+        WindowEvents& operator=(WindowEvents&& other) noexcept;
+        ~WindowEvents();
+
+        // None when no events are asked for.
+        xcb_window_t window() const { return window_; }
+
+      private:
+        friend class X11Session;
+        WindowEvents(X11Session& session, xcb_window_t window, std::uint32_t eventMask)
+            : session_(&session), window_(window), eventMask_(eventMask) {}
+
+        X11Session* session_ = nullptr;
+        xcb_window_t window_ = XCB_WINDOW_NONE;
+        std::uint32_t eventMask_ = 0;
+    };
 
     // An empty name means $DISPLAY. The loop outlives the session.
     static Result<std::unique_ptr<X11Session>> open(const std::string& display, PollRunLoop& runLoop);
-    ~X11Session();
     X11Session(const X11Session&) = delete;
     X11Session& operator=(const X11Session&) = delete;
 
@@ -38,14 +62,12 @@ class X11Session {
 
     // For events of one type (its number without the flag of sent events; 0 hears errors). A handler acts: it is called
     // from the run loop alone. An observer only takes notes: it is called as soon as the event has been read, also
-    // inside collect() and waitUntil(), so what it notes is never behind.
-    HandlerId addHandler(std::uint8_t eventType, Handler handler);
-    HandlerId addObserver(std::uint8_t eventType, Handler observer);
-    void removeHandler(HandlerId id);
+    // inside collect() and waitUntil(), so what it notes is never behind. Both until their subscription ends.
+    [[nodiscard]] Subscription addHandler(std::uint8_t eventType, Handler handler);
+    [[nodiscard]] Subscription addObserver(std::uint8_t eventType, Handler observer);
 
-    // Asks for events of a window, in addition to what others asked for there. Each call has its unlisten().
-    void listen(xcb_window_t window, std::uint32_t eventMask);
-    void unlisten(xcb_window_t window, std::uint32_t eventMask);
+    // Asks for events of a window, in addition to what others asked for there.
+    [[nodiscard]] WindowEvents listen(xcb_window_t window, std::uint32_t eventMask);
 
     // Reads what has arrived, for the observers; the handlers come later, from the run loop. Never waits.
     void collect();
@@ -69,26 +91,30 @@ class X11Session {
     struct Listener {
         std::uint8_t eventType = 0;
         bool observes = false;
-        std::shared_ptr<const Handler> handler;
+        Handler handler;
+        bool ended = false;
     };
 
     X11Session(std::unique_ptr<XcbConnection> connection, PollRunLoop& runLoop);
-    HandlerId add(std::uint8_t eventType, bool observes, Handler handler);
+    Subscription add(Listener listener);
     void dispatch(const xcb_generic_event_t& event, bool toObservers);
+    void unlisten(xcb_window_t window, std::uint32_t eventMask);
     void setEventMask(xcb_window_t window) const;
 
     const std::unique_ptr<XcbConnection> connection_;
     PollRunLoop& runLoop_;
     const xcb_window_t window_;
-    std::map<HandlerId, Listener> listeners_;
-    HandlerId lastId_ = 0;
+    std::map<std::uint64_t, std::shared_ptr<Listener>> listeners_;  // in the order of adding
+    std::uint64_t lastListener_ = 0;
     std::map<xcb_window_t, std::map<std::uint32_t, int>> masks_;  // how often each mask was asked for
     std::deque<XcbOwned<xcb_generic_event_t>> collected_;
     xcb_timestamp_t noticedTime_ = 0;
     bool drains_ = false;
-    bool drainIsDue_ = false;
+    Timer pendingDrain_;
     bool serverIsGone_ = false;
-    const std::shared_ptr<int> alive_ = std::make_shared<int>();  // for calls that come after the end
+    Subscription source_;
+    Subscription timeObserver_;
+    WindowEvents windowEvents_;  // of our own window
 };
 
 }  // namespace plume

@@ -83,7 +83,7 @@ class PipeSource {
 TEST_F(PollRunLoopTest, PausedSourcesKeepTheirInputAndItsOrder) {
     const PipeSource source;
     int waiting = 3;
-    loop.addSource(source.descriptor(), [&] {
+    const Subscription reading = loop.addSource(source.descriptor(), [&] {
         for (; waiting > 0; --waiting) happened.emplace_back(1, source.read());
     });
     for (const char byte : {'a', 'b', 'c'}) source.write(byte);
@@ -96,11 +96,11 @@ TEST_F(PollRunLoopTest, PausedSourcesKeepTheirInputAndItsOrder) {
     EXPECT_THAT(happened, ElementsAre("unpaused", "a", "b", "c"));
 }
 
-TEST_F(PollRunLoopTest, ASourceMayRemoveItself) {
+TEST_F(PollRunLoopTest, ASourceMayEndItself) {
     const PipeSource source;
-    loop.addSource(source.descriptor(), [&] {
+    Subscription reading = loop.addSource(source.descriptor(), [&] {
         note("drained")();
-        loop.removeSource(source.descriptor());
+        reading.end();
     });
     source.write('x');
     runUntil(0.005);

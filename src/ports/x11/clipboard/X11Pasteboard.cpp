@@ -191,7 +191,7 @@ void X11Pasteboard::handOver() {
     xcb_change_property(session_.get(), XCB_PROP_MODE_REPLACE, session_.window(), property, XCB_ATOM_ATOM, 32,
                         static_cast<std::uint32_t>(targets.size()), targets.data());
     bool isAnswered = false;
-    const auto observer = session_.addObserver(XCB_SELECTION_NOTIFY, [&](const xcb_generic_event_t& event) {
+    const Subscription observer = session_.addObserver(XCB_SELECTION_NOTIFY, [&](const xcb_generic_event_t& event) {
         isAnswered |= reinterpret_cast<const xcb_selection_notify_event_t&>(event).selection == manager;
     });
     // Without a manager the server itself answers at once.
@@ -202,7 +202,6 @@ void X11Pasteboard::handOver() {
         return isAnswered;
     };
     session_.waitUntil(served, LongestHandOver);
-    session_.removeHandler(observer);
 }
 
 }  // namespace plume

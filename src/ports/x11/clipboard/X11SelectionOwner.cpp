@@ -40,11 +40,6 @@ X11SelectionOwner::X11SelectionOwner(X11Session& session, X11SelectionTransfers&
     });
 }
 
-X11SelectionOwner::~X11SelectionOwner() {
-    session_.removeHandler(requestHandler_);
-    session_.removeHandler(ownerObserver_);
-}
-
 void X11SelectionOwner::noteOwner(const xcb_generic_event_t& event) {
     const auto& notify = reinterpret_cast<const xcb_xfixes_selection_notify_event_t&>(event);
     if (notify.selection != selection_) return;

@@ -35,7 +35,6 @@ class X11SelectionOwner {
     // Needs XFixes. The session and the transfers outlive the owner.
     X11SelectionOwner(X11Session& session, X11SelectionTransfers& transfers, std::string_view selection,
                       Changed changed);
-    ~X11SelectionOwner();
     X11SelectionOwner(const X11SelectionOwner&) = delete;
     X11SelectionOwner& operator=(const X11SelectionOwner&) = delete;
 
@@ -69,8 +68,8 @@ class X11SelectionOwner {
     xcb_window_t owner_ = XCB_WINDOW_NONE;
     xcb_timestamp_t ownedSince_ = 0;
     bool releases_ = false;
-    X11Session::HandlerId requestHandler_ = 0;
-    X11Session::HandlerId ownerObserver_ = 0;
+    Subscription requestHandler_;
+    Subscription ownerObserver_;
 };
 
 }  // namespace plume

@@ -26,11 +26,6 @@ X11SelectionReader::X11SelectionReader(X11Session& session, RunLoop& runLoop, st
         session_.addObserver(XCB_PROPERTY_NOTIFY, [this](const xcb_generic_event_t& event) { notePiece(event); });
 }
 
-X11SelectionReader::~X11SelectionReader() {
-    session_.removeHandler(answerObserver_);
-    session_.removeHandler(pieceObserver_);
-}
-
 void X11SelectionReader::ownerChanged() {
     ++owners_;
     isSilent_ = false;

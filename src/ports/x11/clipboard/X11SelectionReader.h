@@ -24,7 +24,6 @@ class X11SelectionReader {
   public:
     // The session outlives the reader.
     X11SelectionReader(X11Session& session, RunLoop& runLoop, std::string_view selection);
-    ~X11SelectionReader();
     X11SelectionReader(const X11SelectionReader&) = delete;
     X11SelectionReader& operator=(const X11SelectionReader&) = delete;
 
@@ -65,8 +64,8 @@ class X11SelectionReader {
     std::optional<std::vector<std::string>> targets_;
     // What was read last, unless it is large: one text is asked for under several names.
     std::optional<std::pair<std::string, X11SelectionValue>> last_;
-    X11Session::HandlerId answerObserver_ = 0;
-    X11Session::HandlerId pieceObserver_ = 0;
+    Subscription answerObserver_;
+    Subscription pieceObserver_;
 };
 
 }  // namespace plume

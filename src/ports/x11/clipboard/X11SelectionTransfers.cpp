@@ -33,22 +33,13 @@ X11SelectionTransfers::X11SelectionTransfers(X11Session& session, RunLoop& runLo
     });
 }
 
-X11SelectionTransfers::~X11SelectionTransfers() {
-    for (const auto handler : {propertyHandler_, destroyHandler_, errorHandler_}) session_.removeHandler(handler);
-    runLoop_.cancel(pendingSweep_);
-    for (const auto& transfer : transfers_) session_.unlisten(transfer.first.first, RequestorEvents);
-}
-
 void X11SelectionTransfers::send(xcb_window_t requestor, xcb_atom_t property, X11SelectionValue value,
                                  std::function<void()> taken) {
     const Key key(requestor, property);
-    const auto before = transfers_.find(key);
-    if (before != transfers_.end()) forget(before);
     // Before the value is written: its removal must not be missed.
-    session_.listen(requestor, RequestorEvents);
-    const auto transfer = transfers_.emplace(key, Transfer{std::move(value), std::move(taken)}).first;
-    begin(key, transfer->second);
-    if (pendingSweep_ == 0) pendingSweep_ = runLoop_.schedule(LongestIdle, [this] { forgetIdle(); });
+    Transfer transfer{session_.listen(requestor, RequestorEvents), std::move(value), std::move(taken)};
+    begin(key, transfers_.insert_or_assign(key, std::move(transfer)).first->second);
+    if (!nextSweep_) nextSweep_ = runLoop_.performAfterDelay(LongestIdle, [this] { forgetIdle(); });
 }
 
 void X11SelectionTransfers::begin(const Key& key, Transfer& transfer) {
@@ -87,7 +78,7 @@ void X11SelectionTransfers::propertyWasRemoved(const Key& key) {
     const bool hasLast = transfer.isIncremental && transfer.sent == transfer.value.bytes->size();
     const auto taken = transfer.isComplete || hasLast ? std::exchange(transfer.taken, nullptr) : nullptr;
     if (transfer.isComplete) {
-        forget(found);
+        transfers_.erase(found);
     } else {
         sendPiece(key, transfer);
     }
@@ -96,23 +87,14 @@ void X11SelectionTransfers::propertyWasRemoved(const Key& key) {
 }
 
 void X11SelectionTransfers::forgetWindow(xcb_window_t window) {
-    for (auto next = transfers_.lower_bound({window, 0}); next != transfers_.end() && next->first.first == window;) {
-        forget(next++);
-    }
-}
-
-void X11SelectionTransfers::forget(std::map<Key, Transfer>::iterator transfer) {
-    session_.unlisten(transfer->first.first, RequestorEvents);
-    transfers_.erase(transfer);
+    std::erase_if(transfers_, [window](const auto& transfer) { return transfer.first.first == window; });
 }
 
 void X11SelectionTransfers::forgetIdle() {
     const double now = runLoop_.now();
-    for (auto next = transfers_.begin(); next != transfers_.end();) {
-        const auto transfer = next++;
-        if (now - transfer->second.lastMoved >= LongestIdle) forget(transfer);
-    }
-    pendingSweep_ = transfers_.empty() ? 0 : runLoop_.schedule(LongestIdle, [this] { forgetIdle(); });
+    std::erase_if(transfers_, [now](const auto& transfer) { return now - transfer.second.lastMoved >= LongestIdle; });
+    nextSweep_ = {};
+    if (!transfers_.empty()) nextSweep_ = runLoop_.performAfterDelay(LongestIdle, [this] { forgetIdle(); });
 }
 
 }  // namespace plume

@@ -27,7 +27,6 @@ struct X11SelectionValue {
 class X11SelectionTransfers {
   public:
     X11SelectionTransfers(X11Session& session, RunLoop& runLoop);
-    ~X11SelectionTransfers();
     X11SelectionTransfers(const X11SelectionTransfers&) = delete;
     X11SelectionTransfers& operator=(const X11SelectionTransfers&) = delete;
 
@@ -38,6 +37,7 @@ class X11SelectionTransfers {
   private:
     using Key = std::pair<xcb_window_t, xcb_atom_t>;
     struct Transfer {
+        X11Session::WindowEvents requestorEvents;
         X11SelectionValue value;
         std::function<void()> taken;
         bool isIncremental = false;
@@ -50,7 +50,6 @@ class X11SelectionTransfers {
     void sendPiece(const Key& key, Transfer& transfer);
     void propertyWasRemoved(const Key& key);
     void forgetWindow(xcb_window_t window);
-    void forget(std::map<Key, Transfer>::iterator transfer);
     void forgetIdle();
     void write(const Key& key, const X11SelectionValue& value, std::size_t from, std::size_t count) const;
 
@@ -58,10 +57,10 @@ class X11SelectionTransfers {
     RunLoop& runLoop_;
     const std::size_t longestPiece_;  // bytes
     std::map<Key, Transfer> transfers_;
-    RunLoop::CallId pendingSweep_ = 0;
-    X11Session::HandlerId propertyHandler_;
-    X11Session::HandlerId destroyHandler_;
-    X11Session::HandlerId errorHandler_;
+    Timer nextSweep_;  // of idle transfers, while there are any transfers
+    Subscription propertyHandler_;
+    Subscription destroyHandler_;
+    Subscription errorHandler_;
 };
 
 }  // namespace plume

@@ -72,16 +72,14 @@ void TapSession::selectHierarchyEvents() const {
 
 void TapSession::addSource() {
     descriptor_ = dependencies_.connection.connection().descriptor();
-    dependencies_.loop.addSource(descriptor_, [weak = weak_from_this()] {
-        // Kept while it works: the listener may end the session.
-        if (const auto self = weak.lock()) self->drain();
-    });
+    source_ = dependencies_.loop.addSource(descriptor_, [this] { drain(); });
 }
 
 void TapSession::end() {
     if (std::exchange(ended_, true)) return;
-    if (descriptor_ >= 0) dependencies_.loop.removeSource(descriptor_);
-    dependencies_.loop.cancel(holdLimit_);
+    source_.end();
+    holdLimit_.cancel();
+    nextDrain_.cancel();
     TapConnection& connection = dependencies_.connection;
     keyboards_.giveBack();
     keyboardHeld_.reset();
@@ -115,6 +113,7 @@ bool TapSession::isKey(const xcb_generic_event_t& event) const {
 }
 
 void TapSession::drain() {
+    const auto kept = shared_from_this();  // the listener may end the session
     const TapConnection& connection = dependencies_.connection;
     while (!ended_ && !held_) {
         const auto event = connection.connection().pollEvent();
@@ -243,21 +242,17 @@ void TapSession::inject(Injection injection) {
 void TapSession::hold() {
     if (ended_ || std::exchange(held_, true)) return;
     dependencies_.loop.setSourcePaused(descriptor_, true);
-    holdLimit_ = dependencies_.loop.schedule(LongestHold, [weak = weak_from_this()] {
-        if (const auto self = weak.lock()) self->release();
-    });
+    holdLimit_ = dependencies_.loop.performAfterDelay(LongestHold, [this] { release(); });
 }
 
 void TapSession::release() {
     if (ended_ || !std::exchange(held_, false)) return;
-    dependencies_.loop.cancel(holdLimit_);
+    holdLimit_.cancel();
     dependencies_.loop.setSourcePaused(descriptor_, false);
     if (waiting_) inject(*std::exchange(waiting_, {}));
     dependencies_.connection.flush();
     // What was read ahead meanwhile makes no descriptor readable.
-    dependencies_.loop.perform([weak = weak_from_this()] {
-        if (const auto self = weak.lock()) self->drain();
-    });
+    nextDrain_ = dependencies_.loop.performAfterDelay(0, [this] { drain(); });
 }
 
 void TapSession::keyboardChanged(XkbKeyboard::Change change) {

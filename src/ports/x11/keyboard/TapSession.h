@@ -93,7 +93,10 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
 
     bool held_ = false;
     std::optional<Injection> waiting_;
-    RunLoop::CallId holdLimit_ = 0;
+    Timer holdLimit_;
+
+    Subscription source_;
+    Timer nextDrain_;
 };
 
 }  // namespace plume

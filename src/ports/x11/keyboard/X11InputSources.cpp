@@ -8,12 +8,11 @@ namespace plume {
 
 X11InputSources::X11InputSources(XkbKeyboard& keyboard) : keyboard_(keyboard) {
     readIdentifier();
-    keyboard.addListener([this, alive = std::weak_ptr<bool>(alive_)](XkbKeyboard::Change change) {
-        if (change != XkbKeyboard::Change::Locks && !alive.expired()) changed();
-    });
+    keyboardChanged_ = keyboard.changedEvent.addObserver(this, &X11InputSources::changed);
 }
 
-void X11InputSources::changed() {
+void X11InputSources::changed(const XkbKeyboard::Change& change) {
+    if (change == XkbKeyboard::Change::Locks) return;
     readIdentifier();
     // Called by a copy: it may set another.
     if (const auto listener = listener_) listener();

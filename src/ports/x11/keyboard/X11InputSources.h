@@ -29,12 +29,12 @@ class X11InputSources final : public InputSources {
 
   private:
     void readIdentifier();
-    void changed();
+    void changed(const XkbKeyboard::Change& change);
 
     const XkbKeyboard& keyboard_;
     std::optional<std::u16string> identifier_;
     std::function<void()> listener_;
-    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
+    Subscription keyboardChanged_;
 };
 
 }  // namespace plume

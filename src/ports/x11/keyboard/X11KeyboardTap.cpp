@@ -12,9 +12,7 @@ constexpr double TryPeriod = 1;  // seconds
 
 X11KeyboardTap::X11KeyboardTap(PollRunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard)
     : loop_(loop), connection_(connection), keyboard_(keyboard), display_(connection.connection().displayName()) {
-    keyboard.addListener([this, alive = std::weak_ptr<bool>(alive_)](XkbKeyboard::Change change) {
-        if (!alive.expired() && session_) session_->keyboardChanged(change);
-    });
+    keyboardChanged_ = keyboard.changedEvent.addObserver(this, &X11KeyboardTap::keyboardChanged);
 }
 
 X11KeyboardTap::~X11KeyboardTap() {
@@ -54,6 +52,10 @@ Result<void> X11KeyboardTap::begin() {
     return {};
 }
 
+void X11KeyboardTap::keyboardChanged(const XkbKeyboard::Change& change) {
+    if (session_) session_->keyboardChanged(change);
+}
+
 bool X11KeyboardTap::exists() const {
     return session_ != nullptr;
 }
@@ -65,18 +67,18 @@ void X11KeyboardTap::lost() {
 
 void X11KeyboardTap::enable() {
     if (session_ || !listener_) return;
-    loop_.cancel(nextTry_);
+    nextTry_.cancel();
     if (!begin()) tryAgainLater();
 }
 
 // The server may be gone, and Plume with it before long; or another program has the keyboard just now.
 void X11KeyboardTap::tryAgainLater() {
-    nextTry_ = loop_.schedule(TryPeriod, [this] { enable(); });
+    nextTry_ = loop_.performAfterDelay(TryPeriod, [this] { enable(); });
 }
 
 void X11KeyboardTap::remove() {
     listener_ = nullptr;
-    loop_.cancel(nextTry_);
+    nextTry_.cancel();
     if (session_) std::exchange(session_, nullptr)->end();
 }
 

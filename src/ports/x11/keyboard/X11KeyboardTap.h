@@ -44,6 +44,7 @@ class X11KeyboardTap final : public KeyboardTap {
 
   private:
     Result<void> begin();
+    void keyboardChanged(const XkbKeyboard::Change& change);
     void lost();
     void tryAgainLater();
 
@@ -56,8 +57,8 @@ class X11KeyboardTap final : public KeyboardTap {
     KeyboardTapListener* listener_ = nullptr;
     std::uint64_t toldFlags_ = 0;          // the modifiers that the listener takes to be held, across sessions
     std::shared_ptr<TapSession> session_;  // while the keyboards are taken
-    RunLoop::CallId nextTry_ = 0;
-    std::shared_ptr<bool> alive_ = std::make_shared<bool>(true);
+    Timer nextTry_;
+    Subscription keyboardChanged_;
 };
 
 }  // namespace plume

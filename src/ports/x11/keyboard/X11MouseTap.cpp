@@ -37,7 +37,7 @@ Result<void> X11MouseTap::create(Listener listener) {
 void X11MouseTap::remove() {
     if (!exists()) return;
     select(0);
-    session_.removeHandler(std::exchange(handler_, 0));
+    handler_.end();
     listener_ = nullptr;
 }
 

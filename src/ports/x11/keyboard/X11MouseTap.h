@@ -28,7 +28,7 @@ class X11MouseTap final : public MouseTap {
     void handleEvent(const xcb_generic_event_t& event);
 
     X11Session& session_;
-    X11Session::HandlerId handler_ = 0;
+    Subscription handler_;
     Listener listener_;  // while it exists
     std::uint8_t inputOpcode_ = 0;
 };

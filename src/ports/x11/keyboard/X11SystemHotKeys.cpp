@@ -69,8 +69,6 @@ X11SystemHotKeys::X11SystemHotKeys(X11Session& session, KeyCodeOf keyCodeOf)
 }
 
 X11SystemHotKeys::~X11SystemHotKeys() {
-    session_.removeHandler(pressHandler_);
-    session_.removeHandler(releaseHandler_);
     for (const auto& hotKey : hotKeys_) ungrab(hotKey.second);
     session_.flush();
 }

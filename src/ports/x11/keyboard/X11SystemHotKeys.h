@@ -44,8 +44,8 @@ class X11SystemHotKeys final : public SystemHotKeys {
     const KeyCodeOf keyCodeOf_;
     const std::uint16_t numLock_;  // the modifier that Num Lock sets, or none
     std::map<Id, HotKey> hotKeys_;
-    X11Session::HandlerId pressHandler_ = 0;
-    X11Session::HandlerId releaseHandler_ = 0;
+    Subscription pressHandler_;
+    Subscription releaseHandler_;
     xcb_keycode_t heldKeyCode_ = 0;  // the hot key that is down
 };
 

@@ -122,9 +122,9 @@ void XkbKeyboard::readLayoutName() {
 }
 
 void XkbKeyboard::listenTo(X11Session& session) {
-    session.listen(connection_.root(), XCB_EVENT_MASK_PROPERTY_CHANGE);
+    rootEvents_ = session.listen(connection_.root(), XCB_EVENT_MASK_PROPERTY_CHANGE);
     for (const std::uint8_t type : {firstEvent_, std::uint8_t{XCB_PROPERTY_NOTIFY}}) {
-        session.addHandler(type, [this](const xcb_generic_event_t& event) { handleEvent(event); });
+        handlers_.push_back(session.addHandler(type, [this](const xcb_generic_event_t& event) { handleEvent(event); }));
     }
 }
 
@@ -135,7 +135,7 @@ void XkbKeyboard::handleEvent(const xcb_generic_event_t& event) {
         if (property.window != connection_.root() || property.atom != connection_.atom(RulesProperty)) return;
         const std::string before = std::exchange(layoutName_, {});
         readLayoutName();
-        if (layoutName_ != before) tell(Change::Group);
+        if (layoutName_ != before) changedEvent.raise(Change::Group);
         return;
     }
     // Which device it is about is in the same place in all of them.
@@ -163,7 +163,7 @@ void XkbKeyboard::keymapChanged() {
     keymap_ = std::move(keymap);
     readState();
     readLayoutName();
-    tell(Change::Keymap);
+    changedEvent.raise(Change::Keymap);
 }
 
 void XkbKeyboard::stateChanged(const xcb_generic_event_t& event) {
@@ -175,9 +175,9 @@ void XkbKeyboard::stateChanged(const xcb_generic_event_t& event) {
     group_ = state.group;
     if (switched) {
         readLayoutName();
-        tell(Change::Group);
+        changedEvent.raise(Change::Group);
     }
-    if (locked && state.keycode == 0) tell(Change::Locks);
+    if (locked && state.keycode == 0) changedEvent.raise(Change::Locks);
 }
 
 void XkbKeyboard::willWrite(xcb_keycode_t first, std::span<const xkb_keysym_t> symbols) {
@@ -194,10 +194,6 @@ bool XkbKeyboard::isOwnChange(xcb_keycode_t first, std::uint8_t count) {
     if (own == expected_.end()) return false;
     expected_.erase(expected_.begin(), own + 1);
     return true;
-}
-
-void XkbKeyboard::tell(Change change) const {
-    for (const Listener& listener : listeners_) listener(change);
 }
 
 }  // namespace plume

@@ -9,13 +9,13 @@
 #include <array>
 #include <cstdint>
 #include <deque>
-#include <functional>
 #include <memory>
 #include <span>
 #include <string>
 #include <vector>
 
 #include "Foundation/Result.h"
+#include "Foundation/ZDEvent.h"
 #include "ports/x11/X11Session.h"
 #include "ports/x11/XcbConnection.h"
 #include "ports/x11/keyboard/XkbKeymap.h"
@@ -39,7 +39,6 @@ class XkbKeyboard {
         Group,   // another group of the same layout, or another name for it
         Locks,   // modifiers or a group were locked or latched by a program, not by a key
     };
-    using Listener = std::function<void(Change)>;
 
     // Waits for the server. The error says that the server lacks XKB. The connection outlives the keyboard.
     static Result<std::unique_ptr<XkbKeyboard>> open(XcbConnection& connection);
@@ -54,11 +53,11 @@ class XkbKeyboard {
     // layout itself, or empty.
     const std::string& layoutName() const { return layoutName_; }
 
-    // Called after the change, in the order of adding, as long as the keyboard lives.
-    void addListener(Listener listener) { listeners_.push_back(std::move(listener)); }
+    // Raised after the change.
+    ZDEvent<const Change> changedEvent;
 
-    // Follows changes from now on, by the events of this session, whose connection it was opened with. The keyboard
-    // outlives the session's run.
+    // Follows changes from now on, by the events of this session, whose connection it was opened with and which
+    // outlives the keyboard.
     void listenTo(X11Session& session);
 
     // Whoever gives key codes symbols of Plume's own tells it before: `symbols[i]` comes to `first + i`, and
@@ -79,7 +78,6 @@ class XkbKeyboard {
     void keymapChanged();
     void stateChanged(const xcb_generic_event_t& event);
     bool isOwnChange(xcb_keycode_t first, std::uint8_t count);
-    void tell(Change change) const;
 
     struct Written {
         xcb_keycode_t first;
@@ -97,7 +95,8 @@ class XkbKeyboard {
     std::array<xkb_keysym_t, 256> ownSymbols_{};
     std::deque<Written> expected_;
     unsigned lastRead_ = 0;  // the request before the latest reading of the keymap
-    std::vector<Listener> listeners_;
+    X11Session::WindowEvents rootEvents_;
+    std::vector<Subscription> handlers_;
 };
 
 }  // namespace plume

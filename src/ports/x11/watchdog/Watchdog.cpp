@@ -67,8 +67,7 @@ Watchdog::Watchdog(PollRunLoop& loop, std::string display, std::string program, 
       legacy_(legacy) {}
 
 Watchdog::~Watchdog() {
-    loop_.cancel(laterStart_);
-    if (socket_.isOpen()) loop_.removeSource(socket_.get());
+    source_.end();
     socket_.close();
     reap();
 }
@@ -89,7 +88,7 @@ Result<void> Watchdog::start() {
         return Error{"the watchdog " + program_ + " cannot be started: " + std::generic_category().message(code)};
     }
     socket_ = std::move(mine);
-    loop_.addSource(socket_.get(), [this] { beat(); });
+    source_ = loop_.addSource(socket_.get(), [this] { beat(); });
     return {};
 }
 
@@ -106,7 +105,7 @@ void Watchdog::beat() {
             continue;
         }
         if (std::get<WatchdogSilence>(received) == WatchdogSilence::NothingYet) return;
-        loop_.removeSource(socket_.get());
+        source_.end();
         socket_.close();
         reap();
         replace();
@@ -118,7 +117,7 @@ void Watchdog::replace() {
     while (!starts_.empty() && starts_.front() <= now - StartsPeriod) starts_.pop_front();
     if (starts_.size() < MostStarts && start()) return;
     const double delay = starts_.size() < MostStarts ? StartsPeriod : starts_.front() + StartsPeriod - now;
-    laterStart_ = loop_.schedule(delay, [this] { replace(); });
+    laterStart_ = loop_.performAfterDelay(delay, [this] { replace(); });
 }
 
 void Watchdog::reap() {

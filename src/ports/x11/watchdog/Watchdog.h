@@ -63,7 +63,8 @@ class Watchdog {
     pid_t process_ = 0;
     std::uint32_t tapWindow_ = 0;
     std::deque<double> starts_;  // the moments of the latest ones
-    RunLoop::CallId laterStart_ = 0;
+    Timer laterStart_;
+    Subscription source_;
 };
 
 }  // namespace plume

@@ -90,38 +90,30 @@ X11ProcessManager::X11ProcessManager(X11Session& session, std::shared_ptr<const 
     // Asked now, so that no key waits for it.
     for (const std::string_view name : RootNames) session_.connection().atom(name);
     for (const std::string_view name : WindowNames) session_.connection().atom(name);
-    session_.listen(session_.connection().root(), XCB_EVENT_MASK_PROPERTY_CHANGE);
+    root_ = session_.listen(session_.connection().root(), XCB_EVENT_MASK_PROPERTY_CHANGE);
     for (const int type : {XCB_PROPERTY_NOTIFY, XCB_FOCUS_OUT, XCB_FOCUS_IN, XCB_DESTROY_NOTIFY}) {
         observers_.push_back(session_.addObserver(static_cast<std::uint8_t>(type),
                                                   [this](const xcb_generic_event_t& event) { hear(event); }));
     }
 }
 
-X11ProcessManager::~X11ProcessManager() {
-    for (const auto observer : observers_) session_.removeHandler(observer);
-    session_.unlisten(session_.connection().root(), XCB_EVENT_MASK_PROPERTY_CHANGE);
-    watch(manager_, {});
-    watch(front_, {});
-    watch(focus_, {});
-}
-
 void X11ProcessManager::hear(const xcb_generic_event_t& event) {
     const int type = event.response_type & 0x7F;
     if (type == XCB_DESTROY_NOTIFY) {
         const auto window = reinterpret_cast<const xcb_destroy_notify_event_t&>(event).window;
-        if (window == manager_.window) watch(manager_, {});
-        if (window == front_.window || manager_.window == XCB_WINDOW_NONE) forgetFront();
+        if (window == manager_.window()) manager_ = {};
+        if (window == front_.window() || manager_.window() == XCB_WINDOW_NONE) forgetFront();
         return;
     }
     if (type != XCB_PROPERTY_NOTIFY) {
-        if (reinterpret_cast<const xcb_focus_in_event_t&>(event).event == focus_.window) forgetFront();
+        if (reinterpret_cast<const xcb_focus_in_event_t&>(event).event == focus_.window()) forgetFront();
         return;
     }
     const auto& change = reinterpret_cast<const xcb_property_notify_event_t&>(event);
     const auto matters = [&](std::string_view name) { return session_.connection().atom(name) == change.atom; };
     const bool isOfRoot = change.window == session_.connection().root();
     const bool changes = isOfRoot ? std::any_of(std::begin(RootNames), std::end(RootNames), matters)
-                                  : change.window == front_.window &&
+                                  : change.window == front_.window() &&
                                         std::any_of(std::begin(WindowNames), std::end(WindowNames), matters);
     if (changes) forgetFront();
 }
@@ -148,9 +140,9 @@ void X11ProcessManager::lookUp() {
     // First: what changes from now on makes the answer outdated, also while it is being found.
     isKnown_ = !session_.connection().isBroken();
     xcb_window_t window = activeWindow();
-    watch(front_, {window, XCB_EVENT_MASK_PROPERTY_CHANGE | XCB_EVENT_MASK_STRUCTURE_NOTIFY});
+    watch(front_, window, XCB_EVENT_MASK_PROPERTY_CHANGE | XCB_EVENT_MASK_STRUCTURE_NOTIFY);
     if (window != XCB_WINDOW_NONE) {
-        watch(focus_, {});
+        focus_ = {};
     } else {
         window = focusedApplicationWindow();
     }
@@ -165,13 +157,13 @@ xcb_window_t X11ProcessManager::activeWindow() {
     const PropertyRequest active(connection, connection.root(), "_NET_ACTIVE_WINDOW");
     const xcb_window_t manager = check.word();
     const xcb_window_t window = active.word();
-    if (manager == XCB_WINDOW_NONE || manager != manager_.window) {
-        watch(manager_, {manager, XCB_EVENT_MASK_STRUCTURE_NOTIFY});
+    if (manager == XCB_WINDOW_NONE || manager != manager_.window()) {
+        watch(manager_, manager, XCB_EVENT_MASK_STRUCTURE_NOTIFY);
         const bool isThere =
             manager != XCB_WINDOW_NONE && PropertyRequest(connection, manager, Check).word() == manager;
-        if (!isThere) watch(manager_, {});
+        if (!isThere) manager_ = {};
     }
-    return manager_.window == XCB_WINDOW_NONE ? xcb_window_t{XCB_WINDOW_NONE} : window;
+    return manager_.window() == XCB_WINDOW_NONE ? xcb_window_t{XCB_WINDOW_NONE} : window;
 }
 
 // Asked again once it is watched: it may have changed before.
@@ -182,10 +174,10 @@ xcb_window_t X11ProcessManager::focusedWindow() {
         const XcbOwned<xcb_get_input_focus_reply_t> reply(
             xcb_get_input_focus_reply(server, xcb_get_input_focus(server), nullptr));
         const xcb_window_t window = reply && reply->focus > XCB_INPUT_FOCUS_POINTER_ROOT ? reply->focus : root;
-        if (attempt > 0 && window == focus_.window) break;
-        watch(focus_, {window, XCB_EVENT_MASK_FOCUS_CHANGE});
+        if (attempt > 0 && window == focus_.window()) break;
+        watch(focus_, window, XCB_EVENT_MASK_FOCUS_CHANGE);
     }
-    return focus_.window;
+    return focus_.window();
 }
 
 // The focused window is often one deep inside the application's own.
@@ -204,11 +196,9 @@ xcb_window_t X11ProcessManager::focusedApplicationWindow() {
     return XCB_WINDOW_NONE;
 }
 
-void X11ProcessManager::watch(Watched& watched, Watched wanted) {
-    if (watched.window == wanted.window) return;
-    if (watched.window != XCB_WINDOW_NONE) session_.unlisten(watched.window, watched.eventMask);
-    watched = wanted;
-    if (watched.window != XCB_WINDOW_NONE) session_.listen(watched.window, watched.eventMask);
+void X11ProcessManager::watch(X11Session::WindowEvents& events, xcb_window_t window, std::uint32_t eventMask) {
+    if (events.window() == window) return;
+    events = window == XCB_WINDOW_NONE ? X11Session::WindowEvents() : session_.listen(window, eventMask);
 }
 
 std::optional<ProcessSerialNumber> X11ProcessManager::processOf(xcb_window_t window) {
@@ -273,7 +263,7 @@ void X11ProcessManager::bringToFront(ProcessSerialNumber process) {
     if (window == XCB_WINDOW_NONE) return;
     session_.collect();
     XcbConnection& connection = session_.connection();
-    if (activeWindow() == XCB_WINDOW_NONE && manager_.window == XCB_WINDOW_NONE) {
+    if (activeWindow() == XCB_WINDOW_NONE && manager_.window() == XCB_WINDOW_NONE) {
         xcb_set_input_focus(session_.get(), XCB_INPUT_FOCUS_PARENT, window, XCB_CURRENT_TIME);
         const std::uint32_t above = XCB_STACK_MODE_ABOVE;
         xcb_configure_window(session_.get(), window, XCB_CONFIG_WINDOW_STACK_MODE, &above);

@@ -20,7 +20,6 @@ class X11ProcessManager final : public ProcessManager {
   public:
     // The session outlives the process manager.
     X11ProcessManager(X11Session& session, std::shared_ptr<const DesktopFiles> desktopFiles);
-    ~X11ProcessManager() override;
     X11ProcessManager(const X11ProcessManager&) = delete;
     X11ProcessManager& operator=(const X11ProcessManager&) = delete;
 
@@ -44,18 +43,13 @@ class X11ProcessManager final : public ProcessManager {
         xcb_window_t window = XCB_WINDOW_NONE;  // where it was seen last
     };
 
-    struct Watched {
-        xcb_window_t window = XCB_WINDOW_NONE;
-        std::uint32_t eventMask = 0;
-    };
-
     void hear(const xcb_generic_event_t& event);
     void forgetFront();
     void lookUp();
     xcb_window_t activeWindow();
     xcb_window_t focusedWindow();
     xcb_window_t focusedApplicationWindow();
-    void watch(Watched& watched, Watched wanted);
+    void watch(X11Session::WindowEvents& events, xcb_window_t window, std::uint32_t eventMask);
     std::optional<ProcessSerialNumber> processOf(xcb_window_t window);
     ProcessSerialNumber numberOf(const RunningApplication& application, xcb_window_t window);
     std::uint32_t clientOf(xcb_window_t window) const;
@@ -64,14 +58,15 @@ class X11ProcessManager final : public ProcessManager {
     X11Session& session_;
     const std::shared_ptr<const DesktopFiles> desktopFiles_;
     const std::string hostName_;
-    std::vector<X11Session::HandlerId> observers_;
     bool isKnown_ = false;  // frontProcess_ is up to date
     std::optional<ProcessSerialNumber> frontProcess_;
-    Watched manager_;  // the window manager's own window
-    Watched front_;    // the active window
-    Watched focus_;    // the focused window, when there is no active one
+    X11Session::WindowEvents root_;
+    X11Session::WindowEvents manager_;  // the window manager's own window
+    X11Session::WindowEvents front_;    // the active window
+    X11Session::WindowEvents focus_;    // the focused window, when there is no active one
     mutable std::map<ProcessSerialNumber, Application> applications_;
     int lookUps_ = 0;
+    std::vector<Subscription> observers_;
 };
 
 }  // namespace plume
