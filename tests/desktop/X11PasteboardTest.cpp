@@ -8,7 +8,7 @@
 #include <iostream>
 
 #include "Foundation/Strings.h"
-#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/SharedClipboardCopy.h"
 #include "ports/x11/clipboard/X11SelectionTypes.h"
 #include "tests/desktop/PasteboardTestSupport.h"
 
@@ -350,22 +350,22 @@ TEST_F(X11PasteboardTest, HandingOverWaitsForNoManagerAndForNoneThatHangs) {
 
 std::string typesAndBytes(int descriptor) {
     std::string all;
-    for (const auto& entry : ClipboardLegacy::read(descriptor)) all += entry.type + "=" + entry.bytes + ";";
+    for (const auto& entry : SharedClipboardCopy::read(descriptor)) all += entry.type + "=" + entry.bytes + ";";
     return all;
 }
 
 TEST(ClipboardLegacyTest, HoldsWhatWasReadOfTheNewestContent) {
-    ClipboardLegacy legacy;
-    EXPECT_EQ(typesAndBytes(legacy.descriptor()), "");
-    legacy.add("UTF8_STRING", 300, 8, "one");
-    legacy.add("text/html", 301, 8, std::string("<b>\0</b>", 8));
-    legacy.add("UTF8_STRING", 300, 8, "again");
-    EXPECT_EQ(typesAndBytes(legacy.descriptor()), std::string("UTF8_STRING=one;text/html=<b>\0</b>;", 35));
-    legacy.clear();
-    EXPECT_EQ(typesAndBytes(legacy.descriptor()), "");
-    legacy.add("empty", 302, 32, "");
-    EXPECT_EQ(typesAndBytes(legacy.descriptor()), "empty=;");
-    const auto entries = ClipboardLegacy::read(legacy.descriptor());
+    SharedClipboardCopy copy;
+    EXPECT_EQ(typesAndBytes(copy.descriptor()), "");
+    copy.add("UTF8_STRING", 300, 8, "one");
+    copy.add("text/html", 301, 8, std::string("<b>\0</b>", 8));
+    copy.add("UTF8_STRING", 300, 8, "again");
+    EXPECT_EQ(typesAndBytes(copy.descriptor()), std::string("UTF8_STRING=one;text/html=<b>\0</b>;", 35));
+    copy.clear();
+    EXPECT_EQ(typesAndBytes(copy.descriptor()), "");
+    copy.add("empty", 302, 32, "");
+    EXPECT_EQ(typesAndBytes(copy.descriptor()), "empty=;");
+    const auto entries = SharedClipboardCopy::read(copy.descriptor());
     EXPECT_EQ(entries.at(0).form, 302U);
     EXPECT_EQ(entries.at(0).format, 32);
     EXPECT_EQ(typesAndBytes(-1), "");
@@ -373,19 +373,19 @@ TEST(ClipboardLegacyTest, HoldsWhatWasReadOfTheNewestContent) {
 
 // The writer was killed, or something else is in its place.
 TEST(ClipboardLegacyTest, GivesOnlyWholeEntries) {
-    ClipboardLegacy legacy;
-    legacy.add("first", 300, 8, "one");
-    const off_t afterFirst = lseek(legacy.descriptor(), 0, SEEK_END);
-    legacy.add("second", 300, 8, std::string(100'000, 'x'));
+    SharedClipboardCopy copy;
+    copy.add("first", 300, 8, "one");
+    const off_t afterFirst = lseek(copy.descriptor(), 0, SEEK_END);
+    copy.add("second", 300, 8, std::string(100'000, 'x'));
     for (const off_t size : {afterFirst + 50'000, afterFirst + 3, afterFirst}) {
-        ASSERT_EQ(ftruncate(legacy.descriptor(), size), 0);
-        EXPECT_EQ(typesAndBytes(legacy.descriptor()), "first=one;") << size;
+        ASSERT_EQ(ftruncate(copy.descriptor(), size), 0);
+        EXPECT_EQ(typesAndBytes(copy.descriptor()), "first=one;") << size;
     }
     const std::string nonsense(64, '\xFF');
-    ASSERT_EQ(pwrite(legacy.descriptor(), nonsense.data(), nonsense.size(), 8), 64);
-    EXPECT_EQ(typesAndBytes(legacy.descriptor()), "");
-    ASSERT_EQ(pwrite(legacy.descriptor(), nonsense.data(), nonsense.size(), 0), 64);
-    EXPECT_EQ(typesAndBytes(legacy.descriptor()), "");
+    ASSERT_EQ(pwrite(copy.descriptor(), nonsense.data(), nonsense.size(), 8), 64);
+    EXPECT_EQ(typesAndBytes(copy.descriptor()), "");
+    ASSERT_EQ(pwrite(copy.descriptor(), nonsense.data(), nonsense.size(), 0), 64);
+    EXPECT_EQ(typesAndBytes(copy.descriptor()), "");
 }
 
 }  // namespace

@@ -10,7 +10,7 @@
 #include <sstream>
 #include <string>
 
-#include "ports/x11/watchdog/Vigil.h"
+#include "ports/x11/watchdog/WatchdogSchedule.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/XcbReply.h"
@@ -233,45 +233,45 @@ TEST_F(X11WatchdogTest, AWatchdogThatIsKilledIsReplaced) {
     expectEnded();
 }
 
-TEST(VigilTest, AsksWhileKeysAreTypedAndIsAtRestOtherwise) {
-    Vigil vigil;
-    EXPECT_EQ(vigil.next(100), Vigil::Step::Wait);
-    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
-    vigil.watch(true);
-    EXPECT_EQ(vigil.next(100), Vigil::Step::ListenAndAsk);
-    EXPECT_EQ(vigil.next(100), Vigil::Step::Wait);
-    vigil.answered(vigil.question());
-    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
+TEST(WatchdogScheduleTest, AsksWhileKeysAreTypedAndNotOtherwise) {
+    WatchdogSchedule schedule;
+    EXPECT_EQ(schedule.next(100), WatchdogSchedule::Step::Wait);
+    EXPECT_EQ(schedule.nextMoment(), WatchdogSchedule::Never);
+    schedule.watch(true);
+    EXPECT_EQ(schedule.next(100), WatchdogSchedule::Step::ListenAndAsk);
+    EXPECT_EQ(schedule.next(100), WatchdogSchedule::Step::Wait);
+    schedule.answered(schedule.question());
+    EXPECT_EQ(schedule.nextMoment(), WatchdogSchedule::Never);
 
-    ASSERT_TRUE(vigil.keyHeard(200));
-    EXPECT_FALSE(vigil.keyHeard(200.1));
+    ASSERT_TRUE(schedule.keyHeard(200));
+    EXPECT_FALSE(schedule.keyHeard(200.1));
     int questions = 0;
     double now = 200;
-    auto step = vigil.next(now);
-    for (; step == Vigil::Step::Ask && questions < 100; step = vigil.next(now)) {
+    auto step = schedule.next(now);
+    for (; step == WatchdogSchedule::Step::Ask && questions < 100; step = schedule.next(now)) {
         ++questions;
-        vigil.answered(vigil.question());
-        now = vigil.nextMoment();
+        schedule.answered(schedule.question());
+        now = schedule.nextMoment();
     }
     // The last question covers what was typed before keys were listened to again.
-    EXPECT_EQ(step, Vigil::Step::ListenAndAsk);
+    EXPECT_EQ(step, WatchdogSchedule::Step::ListenAndAsk);
     EXPECT_EQ(now, 210);
     EXPECT_EQ(questions, 40);
-    vigil.answered(vigil.question());
-    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
+    schedule.answered(schedule.question());
+    EXPECT_EQ(schedule.nextMoment(), WatchdogSchedule::Never);
 }
 
-TEST(VigilTest, GivesUpWhenTheAnswerToTheLatestQuestionIsMissing) {
-    Vigil vigil;
-    vigil.watch(true);
-    ASSERT_EQ(vigil.next(0), Vigil::Step::ListenAndAsk);
-    vigil.answered(vigil.question() - 1);
-    EXPECT_EQ(vigil.next(0.5), Vigil::Step::Wait);
-    EXPECT_EQ(vigil.nextMoment(), Vigil::Patience);
-    EXPECT_EQ(vigil.next(0.6), Vigil::Step::GiveUp);
-    EXPECT_EQ(vigil.next(0.7), Vigil::Step::Wait);
-    EXPECT_FALSE(vigil.keyHeard(0.8));
-    EXPECT_EQ(vigil.nextMoment(), Vigil::Never);
+TEST(WatchdogScheduleTest, GivesUpWhenTheAnswerToTheLatestQuestionIsMissing) {
+    WatchdogSchedule schedule;
+    schedule.watch(true);
+    ASSERT_EQ(schedule.next(0), WatchdogSchedule::Step::ListenAndAsk);
+    schedule.answered(schedule.question() - 1);
+    EXPECT_EQ(schedule.next(0.5), WatchdogSchedule::Step::Wait);
+    EXPECT_EQ(schedule.nextMoment(), WatchdogSchedule::AnswerTimeout);
+    EXPECT_EQ(schedule.next(0.6), WatchdogSchedule::Step::GiveUp);
+    EXPECT_EQ(schedule.next(0.7), WatchdogSchedule::Step::Wait);
+    EXPECT_FALSE(schedule.keyHeard(0.8));
+    EXPECT_EQ(schedule.nextMoment(), WatchdogSchedule::Never);
 }
 
 }  // namespace

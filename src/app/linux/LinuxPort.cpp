@@ -50,7 +50,7 @@ Result<void> LinuxPort::begin(const std::string& display) {
 Result<void> LinuxPort::openKeyboard(const std::string& display) {
     if (auto opened = keep(XkbKeyboard::open(session_->connection()), keyboard_); !opened) return opened;
     if (auto opened = keep(TapConnection::open(display, *keyboard_), tapConnection_); !opened) return opened;
-    watchdog_ = std::make_unique<Watchdog>(tapLoop_, display, std::string(), legacy_.descriptor());
+    watchdog_ = std::make_unique<Watchdog>(tapLoop_, display, std::string(), clipboardCopy_.descriptor());
     keyboardTap_ = std::make_unique<X11KeyboardTap>(tapLoop_, *tapConnection_, *keyboard_);
     poster_ = std::make_unique<X11EventPoster>(tapLoop_, *tapConnection_, *keyboard_, *keyboardTap_);
     return {};
@@ -74,7 +74,7 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
 
 void LinuxPort::connectParts() {
     keyboard_->listenTo(*session_);
-    pasteboard_->setLegacy(&legacy_);
+    pasteboard_->setSharedCopy(&clipboardCopy_);
     followFocus();
     poster_->frontIdentifier = [this] { return frontIdentifier(); };
     pasteboard_->pastesPrimary = [this] { return pastesPrimary(frontIdentifier().value_or(u"")); };

@@ -17,7 +17,7 @@
 #include "ports/posix/PollRunLoop.h"
 #include "ports/posix/PosixProcessLauncher.h"
 #include "ports/x11/X11Session.h"
-#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/SharedClipboardCopy.h"
 #include "ports/x11/clipboard/X11Pasteboard.h"
 #include "ports/x11/keyboard/TapConnection.h"
 #include "ports/x11/keyboard/X11EventPoster.h"
@@ -65,7 +65,7 @@ class LinuxPort {
     PosixProcessLauncher processLauncher_;
     CanberraSounds sounds_;
     AtspiAccessibility accessibility_;
-    ClipboardLegacy legacy_;
+    SharedClipboardCopy clipboardCopy_;
     std::unique_ptr<X11Session> session_;
     std::unique_ptr<XkbKeyboard> keyboard_;
     std::unique_ptr<Watchdog> watchdog_;

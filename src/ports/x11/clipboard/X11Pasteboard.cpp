@@ -42,9 +42,9 @@ Result<std::unique_ptr<X11Pasteboard>> X11Pasteboard::open(X11Session& session) 
 
 X11Pasteboard::X11Pasteboard(X11Session& session)
     : session_(session),
-      transfers_(std::make_unique<X11SelectionTransfers>(session, session.runLoop())),
-      reader_(std::make_unique<X11SelectionReader>(session, session.runLoop(), "CLIPBOARD")),
-      primaryReader_(std::make_unique<X11SelectionReader>(session, session.runLoop(), "PRIMARY")) {
+      transfers_(std::make_unique<X11SelectionTransfers>(session)),
+      reader_(std::make_unique<X11SelectionReader>(session, "CLIPBOARD")),
+      primaryReader_(std::make_unique<X11SelectionReader>(session, "PRIMARY")) {
     clipboard_ =
         std::make_unique<X11SelectionOwner>(session, *transfers_, "CLIPBOARD", [this](bool ours) { noteChange(ours); });
     primary_ = std::make_unique<X11SelectionOwner>(session, *transfers_, "PRIMARY",
@@ -59,12 +59,12 @@ X11Pasteboard::~X11Pasteboard() = default;
 void X11Pasteboard::noteChange(bool ours) {
     ++changeCount_;
     if (ours) declaredCount_ = changeCount_;
-    if (!ours && legacy_) legacy_->clear();
+    if (!ours && sharedCopy_) sharedCopy_->clear();
     if (!ours && ownershipLost) ownershipLost();
     reader_->ownerChanged();
 }
 
-void X11Pasteboard::takeUp(const std::vector<ClipboardLegacy::Entry>& entries) {
+void X11Pasteboard::offer(const std::vector<SharedClipboardCopy::Entry>& entries) {
     std::vector<std::string> types;
     for (const auto& entry : entries) {
         types.push_back(entry.type);
@@ -112,7 +112,7 @@ std::optional<std::string> X11Pasteboard::data(std::string_view type) const {
     const bool isText = type == PasteboardType::String;
     if (!isText) forms_.insert_or_assign(target, std::pair(value->type, value->format));
     std::string bytes = isText ? utf8FromText(*value->bytes, target) : *value->bytes;
-    if (legacy_) legacy_->add(type, isText ? xcb_atom_t{XCB_ATOM_NONE} : value->type, value->format, bytes);
+    if (sharedCopy_) sharedCopy_->add(type, isText ? xcb_atom_t{XCB_ATOM_NONE} : value->type, value->format, bytes);
     return bytes;
 }
 

@@ -16,7 +16,7 @@
 
 #include "platform/Pasteboard.h"
 #include "ports/x11/X11Session.h"
-#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/SharedClipboardCopy.h"
 #include "ports/x11/clipboard/X11PasteboardContent.h"
 #include "ports/x11/clipboard/X11SelectionOwner.h"
 #include "ports/x11/clipboard/X11SelectionReader.h"
@@ -37,9 +37,9 @@ class X11Pasteboard final : public Pasteboard {
     std::function<bool()> pastesPrimary;
 
     // Keeps what is read of other programs' content, as long as it is the newest. Outlives the pasteboard.
-    void setLegacy(ClipboardLegacy* legacy) { legacy_ = legacy; }
-    // Offers what another Plume left. Nobody must hold the clipboard.
-    void takeUp(const std::vector<ClipboardLegacy::Entry>& entries);
+    void setSharedCopy(SharedClipboardCopy* copy) { sharedCopy_ = copy; }
+    // Offers what another Plume read before it ended. Nobody must hold the clipboard.
+    void offer(const std::vector<SharedClipboardCopy::Entry>& entries);
     // Somebody else has put something on the clipboard.
     std::function<void()> ownershipLost;
     // Whether anybody holds the clipboard.
@@ -68,7 +68,7 @@ class X11Pasteboard final : public Pasteboard {
     bool isInFront(xcb_window_t requestor) const;
 
     X11Session& session_;
-    ClipboardLegacy* legacy_ = nullptr;
+    SharedClipboardCopy* sharedCopy_ = nullptr;
     std::int64_t changeCount_ = 0;
     std::int64_t declaredCount_ = 0;  // of the last declaration
     // What programs gave along with their data: a backup of it is given back alike.

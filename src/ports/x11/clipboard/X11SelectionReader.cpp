@@ -18,8 +18,8 @@ constexpr std::uint32_t Properties = 8;
 
 }  // namespace
 
-X11SelectionReader::X11SelectionReader(X11Session& session, RunLoop& runLoop, std::string_view selection)
-    : session_(session), runLoop_(runLoop), selection_(session.connection().atom(selection)) {
+X11SelectionReader::X11SelectionReader(X11Session& session, std::string_view selection)
+    : session_(session), selection_(session.connection().atom(selection)) {
     answerObserver_ =
         session_.addObserver(XCB_SELECTION_NOTIFY, [this](const xcb_generic_event_t& event) { noteAnswer(event); });
     pieceObserver_ =
@@ -74,13 +74,13 @@ std::optional<X11SelectionValue> X11SelectionReader::read(std::string_view targe
 }
 
 double X11SelectionReader::secondsLeft() {
-    if (runLoop_.now() - lastAsked_ > ApartFromEarlierQuestions) spent_ = 0;
+    if (session_.runLoop().now() - lastAsked_ > ApartFromEarlierQuestions) spent_ = 0;
     return LongestInAll - spent_;
 }
 
 std::optional<X11SelectionValue> X11SelectionReader::ask(xcb_atom_t target) {
     if (isSilent_ || secondsLeft() <= 0) return std::nullopt;
-    const double start = runLoop_.now();
+    const double start = session_.runLoop().now();
     const auto name = "PLUME_SELECTION_" + std::to_string(lastProperty_++ % Properties);
     question_ = {target, session_.connection().atom(name), session_.serverTime()};
     xcb_delete_property(session_.get(), session_.window(), question_.property);
@@ -88,7 +88,7 @@ std::optional<X11SelectionValue> X11SelectionReader::ask(xcb_atom_t target) {
     auto value = takeAnswer();
     question_ = {};
     session_.collect();
-    lastAsked_ = runLoop_.now();
+    lastAsked_ = session_.runLoop().now();
     spent_ += lastAsked_ - start;
     return value;
 }
@@ -110,11 +110,11 @@ std::optional<X11SelectionValue> X11SelectionReader::takeAnswer() {
 
 std::optional<X11SelectionValue> X11SelectionReader::takePieces() {
     const auto owner = owners_;
-    const double end = runLoop_.now() + secondsLeft();
+    const double end = session_.runLoop().now() + secondsLeft();
     auto bytes = std::make_shared<std::string>();
     X11SelectionValue whole;
     while (true) {
-        session_.waitUntil([&] { return question_.hasNewPiece || owners_ != owner; }, end - runLoop_.now());
+        session_.waitUntil([&] { return question_.hasNewPiece || owners_ != owner; }, end - session_.runLoop().now());
         if (!question_.hasNewPiece) {
             isSilent_ = owners_ == owner;
             return std::nullopt;

@@ -14,7 +14,6 @@
 #include <utility>
 #include <vector>
 
-#include "platform/RunLoop.h"
 #include "ports/x11/X11Session.h"
 #include "ports/x11/clipboard/X11SelectionTransfers.h"
 
@@ -23,7 +22,7 @@ namespace plume {
 class X11SelectionReader {
   public:
     // The session outlives the reader.
-    X11SelectionReader(X11Session& session, RunLoop& runLoop, std::string_view selection);
+    X11SelectionReader(X11Session& session, std::string_view selection);
     X11SelectionReader(const X11SelectionReader&) = delete;
     X11SelectionReader& operator=(const X11SelectionReader&) = delete;
 
@@ -53,7 +52,6 @@ class X11SelectionReader {
     double secondsLeft();
 
     X11Session& session_;
-    RunLoop& runLoop_;
     const xcb_atom_t selection_;
     Question question_;
     std::uint64_t owners_ = 0;  // how many there were

@@ -18,8 +18,8 @@ std::size_t longestPieceOf(xcb_connection_t* connection) {
 
 }  // namespace
 
-X11SelectionTransfers::X11SelectionTransfers(X11Session& session, RunLoop& runLoop)
-    : session_(session), runLoop_(runLoop), longestPiece_(longestPieceOf(session.get())) {
+X11SelectionTransfers::X11SelectionTransfers(X11Session& session)
+    : session_(session), longestPiece_(longestPieceOf(session.get())) {
     propertyHandler_ = session_.addHandler(XCB_PROPERTY_NOTIFY, [this](const xcb_generic_event_t& event) {
         const auto& change = reinterpret_cast<const xcb_property_notify_event_t&>(event);
         if (change.state == XCB_PROPERTY_DELETE) propertyWasRemoved({change.window, change.atom});
@@ -39,11 +39,11 @@ void X11SelectionTransfers::send(xcb_window_t requestor, xcb_atom_t property, X1
     // Before the value is written: its removal must not be missed.
     Transfer transfer{session_.listen(requestor, RequestorEvents), std::move(value), std::move(taken)};
     begin(key, transfers_.insert_or_assign(key, std::move(transfer)).first->second);
-    if (!nextSweep_) nextSweep_ = runLoop_.performAfterDelay(LongestIdle, [this] { forgetIdle(); });
+    if (!nextSweep_) nextSweep_ = session_.runLoop().performAfterDelay(LongestIdle, [this] { forgetIdle(); });
 }
 
 void X11SelectionTransfers::begin(const Key& key, Transfer& transfer) {
-    transfer.lastMoved = runLoop_.now();
+    transfer.lastMoved = session_.runLoop().now();
     const std::size_t size = transfer.value.bytes->size();
     transfer.isIncremental = size > longestPiece_;
     if (!transfer.isIncremental) {
@@ -68,7 +68,7 @@ void X11SelectionTransfers::sendPiece(const Key& key, Transfer& transfer) {
     write(key, transfer.value, transfer.sent, count);
     transfer.sent += count;
     transfer.isComplete = count == 0;  // an empty piece is the last
-    transfer.lastMoved = runLoop_.now();
+    transfer.lastMoved = session_.runLoop().now();
 }
 
 void X11SelectionTransfers::propertyWasRemoved(const Key& key) {
@@ -91,10 +91,10 @@ void X11SelectionTransfers::forgetWindow(xcb_window_t window) {
 }
 
 void X11SelectionTransfers::forgetIdle() {
-    const double now = runLoop_.now();
+    const double now = session_.runLoop().now();
     std::erase_if(transfers_, [now](const auto& transfer) { return now - transfer.second.lastMoved >= LongestIdle; });
     nextSweep_ = {};
-    if (!transfers_.empty()) nextSweep_ = runLoop_.performAfterDelay(LongestIdle, [this] { forgetIdle(); });
+    if (!transfers_.empty()) nextSweep_ = session_.runLoop().performAfterDelay(LongestIdle, [this] { forgetIdle(); });
 }
 
 }  // namespace plume

@@ -12,7 +12,6 @@
 #include <string>
 #include <utility>
 
-#include "platform/RunLoop.h"
 #include "ports/x11/X11Session.h"
 
 namespace plume {
@@ -26,7 +25,7 @@ struct X11SelectionValue {
 
 class X11SelectionTransfers {
   public:
-    X11SelectionTransfers(X11Session& session, RunLoop& runLoop);
+    X11SelectionTransfers(X11Session& session);
     X11SelectionTransfers(const X11SelectionTransfers&) = delete;
     X11SelectionTransfers& operator=(const X11SelectionTransfers&) = delete;
 
@@ -54,7 +53,6 @@ class X11SelectionTransfers {
     void write(const Key& key, const X11SelectionValue& value, std::size_t from, std::size_t count) const;
 
     X11Session& session_;
-    RunLoop& runLoop_;
     const std::size_t longestPiece_;  // bytes
     std::map<Key, Transfer> transfers_;
     Timer nextSweep_;  // of idle transfers, while there are any transfers

@@ -9,9 +9,9 @@
 // that finds its connection gone takes the keyboard again when it is alive.
 //
 // The answer comes from a source of the tap thread's run loop, so that a thread that does not get there does not
-// answer. The process ends by itself as soon as Plume has ended, in whatever way, unless the user's clipboard would be
-// lost with it: see ClipboardLegacy. When it dies first, another one is started, though not more than three in a
-// minute. One owner; used on the tap thread, or before its loop runs.
+// answer. The process ends by itself as soon as Plume has ended, in whatever way; it leaves a ClipboardKeeper behind
+// when nobody else has what the user had on the clipboard. When it dies first, another one is started, though not more
+// than three in a minute. One owner; used on the tap thread, or before its loop runs.
 #pragma once
 
 #include <sys/types.h>
@@ -29,8 +29,8 @@ namespace plume {
 class Watchdog {
   public:
     // The loop outlives the watchdog. An empty display means $DISPLAY, an empty program the one called plume-watchdog
-    // beside this program. `legacy` is what it inherits of the clipboard, nothing when it is -1.
-    Watchdog(PollRunLoop& loop, std::string display, std::string program = {}, int legacy = -1);
+    // beside this program. `clipboard` is the descriptor of the SharedClipboardCopy that it inherits, -1 for none.
+    Watchdog(PollRunLoop& loop, std::string display, std::string program = {}, int clipboard = -1);
     // Ends the process, which frees the keyboard if there still is a tap.
     ~Watchdog();
     Watchdog(const Watchdog&) = delete;
@@ -58,7 +58,7 @@ class Watchdog {
     PollRunLoop& loop_;
     const std::string display_;
     const std::string program_;
-    const int legacy_;
+    const int clipboard_;
     FileDescriptor socket_;
     pid_t process_ = 0;
     std::uint32_t tapWindow_ = 0;

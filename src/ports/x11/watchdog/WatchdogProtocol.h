@@ -21,8 +21,8 @@ struct WatchdogMessage {
 
 // The watchdog finds its end of the pair as its standard input.
 inline constexpr int WatchdogSocket = STDIN_FILENO;
-// Where it finds the memory of the ClipboardLegacy, if there is one.
-inline constexpr int WatchdogLegacy = STDERR_FILENO + 1;
+// Where it finds the memory of the SharedClipboardCopy, if there is one.
+inline constexpr int WatchdogClipboard = STDERR_FILENO + 1;
 
 enum class WatchdogSilence { NothingYet, Ended };
 

@@ -1,7 +1,7 @@
-// The watchdog: frees the keyboard when Plume, which started it, hangs or has ended. See platform/x11/Watchdog.h.
+// The watchdog: frees the keyboard when Plume, which started it, hangs or has ended. See ports/x11/watchdog/Watchdog.h.
 //
 // plume-watchdog <display>, with one end of Plume's pair of sockets as standard input, and the memory of the
-// clipboard's legacy as descriptor 3.
+// SharedClipboardCopy as descriptor 3.
 
 #include <poll.h>
 
@@ -12,10 +12,10 @@
 #include <string>
 #include <utility>
 
-#include "ports/x11/watchdog/ClipboardHeir.h"
-#include "ports/x11/watchdog/KeyboardGuard.h"
-#include "ports/x11/watchdog/Vigil.h"
+#include "ports/x11/watchdog/ClipboardKeeper.h"
+#include "ports/x11/watchdog/WatchdogConnection.h"
 #include "ports/x11/watchdog/WatchdogProtocol.h"
+#include "ports/x11/watchdog/WatchdogSchedule.h"
 
 namespace plume {
 
@@ -27,20 +27,20 @@ double now() {
 
 class WatchdogProcess {
   public:
-    explicit WatchdogProcess(KeyboardGuard& guard) : guard_(guard) {}
+    explicit WatchdogProcess(WatchdogConnection& connection) : connection_(connection) {}
 
     // Until Plume ends, or the display does.
     void run() {
         // What has arrived is looked at before anybody is given up: it may be the watchdog that was late.
-        while (takeMessages() && !guard_.isBroken()) {
+        while (takeMessages() && !connection_.isBroken()) {
             takeSteps();
-            if (guard_.takeKey() && vigil_.keyHeard(now())) {
-                guard_.listen(false);
+            if (connection_.takeKey() && schedule_.keyHeard(now())) {
+                connection_.listen(false);
             } else {
                 wait();
             }
         }
-        if (tapWindow_ != XCB_WINDOW_NONE) guard_.freeKeyboard(tapWindow_);
+        if (tapWindow_ != XCB_WINDOW_NONE) connection_.freeKeyboard(tapWindow_);
     }
 
   private:
@@ -52,42 +52,42 @@ class WatchdogProcess {
                 return *silence == WatchdogSilence::NothingYet;
             }
             const auto& message = std::get<WatchdogMessage>(received);
-            if (message.type == WatchdogMessage::Type::Answer) vigil_.answered(message.value);
+            if (message.type == WatchdogMessage::Type::Answer) schedule_.answered(message.value);
             if (message.type != WatchdogMessage::Type::TapWindow) continue;
             tapWindow_ = message.value;
-            guard_.listen(false);
-            vigil_.watch(tapWindow_ != XCB_WINDOW_NONE);
+            connection_.listen(false);
+            schedule_.watch(tapWindow_ != XCB_WINDOW_NONE);
         }
     }
 
     void takeSteps() {
         for (;;) {
-            switch (vigil_.next(now())) {
-                case Vigil::Step::Wait:
+            switch (schedule_.next(now())) {
+                case WatchdogSchedule::Step::Wait:
                     return;
-                case Vigil::Step::ListenAndAsk:
-                    guard_.listen(true);
+                case WatchdogSchedule::Step::ListenAndAsk:
+                    connection_.listen(true);
                     [[fallthrough]];
-                case Vigil::Step::Ask:
-                    sendWatchdogMessage(WatchdogSocket, {WatchdogMessage::Type::Ping, vigil_.question()});
+                case WatchdogSchedule::Step::Ask:
+                    sendWatchdogMessage(WatchdogSocket, {WatchdogMessage::Type::Ping, schedule_.question()});
                     break;
-                case Vigil::Step::GiveUp:
-                    guard_.freeKeyboard(std::exchange(tapWindow_, XCB_WINDOW_NONE));
-                    guard_.listen(false);
+                case WatchdogSchedule::Step::GiveUp:
+                    connection_.freeKeyboard(std::exchange(tapWindow_, XCB_WINDOW_NONE));
+                    connection_.listen(false);
                     break;
             }
         }
     }
 
     void wait() const {
-        pollfd entries[] = {{WatchdogSocket, POLLIN, 0}, {guard_.descriptor(), POLLIN, 0}};
-        const double seconds = vigil_.nextMoment() - now();
+        pollfd entries[] = {{WatchdogSocket, POLLIN, 0}, {connection_.descriptor(), POLLIN, 0}};
+        const double seconds = schedule_.nextMoment() - now();
         const int bound = std::isinf(seconds) ? -1 : static_cast<int>(std::ceil(std::max(seconds, 0.0) * 1000));
         poll(entries, std::size(entries), bound);
     }
 
-    KeyboardGuard& guard_;
-    Vigil vigil_;
+    WatchdogConnection& connection_;
+    WatchdogSchedule schedule_;
     xcb_window_t tapWindow_ = XCB_WINDOW_NONE;
 };
 
@@ -97,13 +97,13 @@ class WatchdogProcess {
 
 int main(int count, char** arguments) {
     const std::string display = count > 1 ? arguments[1] : "";
-    auto guard = plume::KeyboardGuard::open(display);
-    if (!guard) {
-        static_cast<void>(std::fprintf(stderr, "plume-watchdog: %s\n", guard.error().message.c_str()));
+    auto connection = plume::WatchdogConnection::open(display);
+    if (!connection) {
+        static_cast<void>(std::fprintf(stderr, "plume-watchdog: %s\n", connection.error().message.c_str()));
         return 1;
     }
-    plume::WatchdogProcess(*guard.value()).run();
-    guard.value().reset();
-    plume::offerClipboardLegacy(display, plume::WatchdogLegacy);
+    plume::WatchdogProcess(*connection.value()).run();
+    connection.value().reset();
+    plume::startClipboardKeeper(display, plume::WatchdogClipboard);
     return 0;
 }

@@ -1,4 +1,4 @@
-// When the watchdog asks Plume whether it is alive, and when it gives it up.
+// When the watchdog asks Plume whether it is alive, and when it stops waiting for an answer.
 //
 // Knows nothing of sockets or displays: it is told the time and what happened, and says what to do next.
 #pragma once
@@ -9,11 +9,11 @@
 
 namespace plume {
 
-class Vigil {
+class WatchdogSchedule {
   public:
-    static constexpr double Period = 0.25;     // seconds from one question to the next
-    static constexpr double Patience = 0.6;    // seconds until a missing answer means that Plume hangs
-    static constexpr double WakefulTime = 10;  // seconds of asking after a key
+    static constexpr double AskPeriod = 0.25;     // seconds from one question to the next
+    static constexpr double AnswerTimeout = 0.6;  // seconds until a missing answer means that Plume hangs
+    static constexpr double AskingTime = 10;      // seconds of asking after a key
     static constexpr double Never = std::numeric_limits<double>::infinity();
 
     enum class Step {
@@ -39,7 +39,7 @@ class Vigil {
     bool watching_ = false;
     bool listening_ = false;
     std::uint32_t question_ = 0;
-    double restAt_ = 0;
+    double askUntil_ = 0;
     double askAt_ = Never;
     std::optional<double> askedAt_;  // while the answer is missing
 };

@@ -1,45 +1,45 @@
-#include "ports/x11/watchdog/Vigil.h"
+#include "ports/x11/watchdog/WatchdogSchedule.h"
 
 #include <algorithm>
 
 namespace plume {
 
-void Vigil::watch(bool on) {
+void WatchdogSchedule::watch(bool on) {
     watching_ = on;
     listening_ = false;
     askedAt_.reset();
     // Keys may have gone down already, unheard: one question at once.
-    restAt_ = 0;
+    askUntil_ = 0;
     askAt_ = on ? 0 : Never;
 }
 
-bool Vigil::keyHeard(double now) {
+bool WatchdogSchedule::keyHeard(double now) {
     if (!watching_ || !listening_) return false;
     listening_ = false;
-    restAt_ = now + WakefulTime;
+    askUntil_ = now + AskingTime;
     askAt_ = now;
     return true;
 }
 
-void Vigil::answered(std::uint32_t question) {
+void WatchdogSchedule::answered(std::uint32_t question) {
     if (question == question_) askedAt_.reset();
 }
 
-Vigil::Step Vigil::next(double now) {
-    if (askedAt_ && now >= *askedAt_ + Patience) {
+WatchdogSchedule::Step WatchdogSchedule::next(double now) {
+    if (askedAt_ && now >= *askedAt_ + AnswerTimeout) {
         watch(false);
         return Step::GiveUp;
     }
     if (askedAt_ || now < askAt_) return Step::Wait;
     ++question_;
     askedAt_ = now;
-    listening_ = now >= restAt_;
-    askAt_ = listening_ ? Never : now + Period;
+    listening_ = now >= askUntil_;
+    askAt_ = listening_ ? Never : now + AskPeriod;
     return listening_ ? Step::ListenAndAsk : Step::Ask;
 }
 
-double Vigil::nextMoment() const {
-    return askedAt_ ? *askedAt_ + Patience : askAt_;
+double WatchdogSchedule::nextMoment() const {
+    return askedAt_ ? *askedAt_ + AnswerTimeout : askAt_;
 }
 
 }  // namespace plume

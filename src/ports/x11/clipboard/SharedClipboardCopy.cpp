@@ -1,4 +1,4 @@
-#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/SharedClipboardCopy.h"
 
 #include <sys/mman.h>
 #include <unistd.h>
@@ -20,7 +20,7 @@ struct EntryHeader {
     std::uint64_t size = 0;
 };
 
-constexpr std::uint64_t LargestLegacy = std::uint64_t{256} << 20;
+constexpr std::uint64_t LargestCopy = std::uint64_t{256} << 20;
 
 std::optional<std::string> readAt(int descriptor, std::uint64_t offset, std::uint64_t size) {
     std::string bytes(size, '\0');
@@ -44,20 +44,20 @@ std::optional<Record> readRecord(int descriptor, std::uint64_t offset) {
 
 }  // namespace
 
-ClipboardLegacy::ClipboardLegacy() : memory_(memfd_create("clipboard", MFD_CLOEXEC)) {
+SharedClipboardCopy::SharedClipboardCopy() : memory_(memfd_create("clipboard", MFD_CLOEXEC)) {
     clear();
 }
 
-void ClipboardLegacy::clear() {
+void SharedClipboardCopy::clear() {
     types_.clear();
     end_ = sizeof(Mark);
-    if (memory_.isOpen() && ftruncate(memory_.get(), 0) != 0) end_ = LargestLegacy;
+    if (memory_.isOpen() && ftruncate(memory_.get(), 0) != 0) end_ = LargestCopy;
 }
 
-void ClipboardLegacy::add(std::string_view type, xcb_atom_t form, std::uint8_t format, std::string_view bytes) {
+void SharedClipboardCopy::add(std::string_view type, xcb_atom_t form, std::uint8_t format, std::string_view bytes) {
     const std::uint64_t start = end_;
     if (!memory_.isOpen() || types_.contains(type)) return;
-    if (start + sizeof(EntryHeader) + type.size() + bytes.size() > LargestLegacy) return;
+    if (start + sizeof(EntryHeader) + type.size() + bytes.size() > LargestCopy) return;
     const EntryHeader header{static_cast<std::uint32_t>(type.size()), form, format, bytes.size()};
     if (!write(&header, sizeof header) || !write(type.data(), type.size()) || !write(bytes.data(), bytes.size())) {
         end_ = start;
@@ -68,7 +68,7 @@ void ClipboardLegacy::add(std::string_view type, xcb_atom_t form, std::uint8_t f
     if (pwrite(memory_.get(), &mark, sizeof mark, 0) == sizeof mark) types_.emplace(type);
 }
 
-bool ClipboardLegacy::write(const void* bytes, std::size_t size) {
+bool SharedClipboardCopy::write(const void* bytes, std::size_t size) {
     std::size_t done = 0;
     while (done < size) {
         const ssize_t count =
@@ -80,10 +80,10 @@ bool ClipboardLegacy::write(const void* bytes, std::size_t size) {
     return true;
 }
 
-std::vector<ClipboardLegacy::Entry> ClipboardLegacy::read(int descriptor) {
+std::vector<SharedClipboardCopy::Entry> SharedClipboardCopy::read(int descriptor) {
     std::vector<Entry> entries;
     const auto end = readRecord<Mark>(descriptor, 0);
-    if (!end || *end > LargestLegacy) return entries;
+    if (!end || *end > LargestCopy) return entries;
     for (std::uint64_t at = sizeof(Mark); at < *end;) {
         const auto header = readRecord<EntryHeader>(descriptor, at);
         at += sizeof(EntryHeader);

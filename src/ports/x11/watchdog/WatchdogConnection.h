@@ -1,5 +1,4 @@
-// What the watchdog does with the X server, on a connection of its own: it hears that a key went down, and frees the
-// keyboard.
+// The watchdog's own connection to the X server: by it the watchdog hears that a key went down, and frees the keyboard.
 #pragma once
 
 #include <xcb/xcb.h>
@@ -10,10 +9,10 @@
 
 namespace plume {
 
-class KeyboardGuard {
+class WatchdogConnection {
   public:
     // The error names what the server lacks.
-    static Result<std::unique_ptr<KeyboardGuard>> open(const std::string& display);
+    static Result<std::unique_ptr<WatchdogConnection>> open(const std::string& display);
 
     int descriptor() const { return connection_->descriptor(); }
     bool isBroken() const { return connection_->isBroken(); }
@@ -29,7 +28,7 @@ class KeyboardGuard {
     void freeKeyboard(xcb_window_t window);
 
   private:
-    KeyboardGuard(std::unique_ptr<XcbConnection> connection, std::uint8_t inputOpcode)
+    WatchdogConnection(std::unique_ptr<XcbConnection> connection, std::uint8_t inputOpcode)
         : connection_(std::move(connection)), inputOpcode_(inputOpcode) {}
 
     void releaseKeysOf(std::uint16_t device);

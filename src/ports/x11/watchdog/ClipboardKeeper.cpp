@@ -1,4 +1,4 @@
-#include "ports/x11/watchdog/ClipboardHeir.h"
+#include "ports/x11/watchdog/ClipboardKeeper.h"
 
 #include <unistd.h>
 
@@ -8,7 +8,7 @@
 
 #include "ports/posix/PollRunLoop.h"
 #include "ports/x11/X11Session.h"
-#include "ports/x11/clipboard/ClipboardLegacy.h"
+#include "ports/x11/clipboard/SharedClipboardCopy.h"
 #include "ports/x11/clipboard/X11Pasteboard.h"
 #include "ports/x11/watchdog/WatchdogProtocol.h"
 
@@ -16,10 +16,10 @@ namespace plume {
 
 namespace {
 
-// The server may notice Plume's end later than the watchdog.
-constexpr double LongestDeath = 2;  // seconds
+// Seconds until the server, which may notice Plume's end later than the watchdog, has taken the clipboard from it.
+constexpr double LongestUntilReleased = 2;
 
-void offer(const std::string& display, const std::vector<ClipboardLegacy::Entry>& entries) {
+void offer(const std::string& display, const std::vector<SharedClipboardCopy::Entry>& entries) {
     PollRunLoop loop;
     auto session = X11Session::open(display, loop);
     if (!session) return;
@@ -27,16 +27,16 @@ void offer(const std::string& display, const std::vector<ClipboardLegacy::Entry>
     auto pasteboard = X11Pasteboard::open(*session.value());
     if (!pasteboard) return;
     X11Pasteboard& clipboard = *pasteboard.value();
-    if (!session.value()->waitUntil([&] { return !clipboard.isHeld(); }, LongestDeath)) return;
+    if (!session.value()->waitUntil([&] { return !clipboard.isHeld(); }, LongestUntilReleased)) return;
     clipboard.ownershipLost = [&] { loop.stop(); };
-    clipboard.takeUp(entries);
+    clipboard.offer(entries);
     if (clipboard.isOffering()) loop.run();
 }
 
 }  // namespace
 
-void offerClipboardLegacy(const std::string& display, int descriptor) {
-    const auto entries = ClipboardLegacy::read(descriptor);
+void startClipboardKeeper(const std::string& display, int descriptor) {
+    const auto entries = SharedClipboardCopy::read(descriptor);
     if (entries.empty() || fork() != 0) return;
     setsid();
     close(WatchdogSocket);

@@ -1,8 +1,8 @@
-// What the user had on the clipboard, kept where it outlives Plume.
+// A copy of what the user had on the clipboard, in memory that Plume shares with its watchdog.
 //
-// To put an expansion on the clipboard is to take it from the program that held the user's content; from then on only
-// Plume has a copy. It lies in memory that the watchdog shares, which offers it when Plume has ended and nobody else
-// holds the clipboard. The memory belongs to no file. Written on the tap thread.
+// Putting an expansion on the clipboard takes the clipboard from the program that held the user's content; from then on
+// only Plume has a copy. The watchdog offers it when Plume has ended and nobody else holds the clipboard. The memory
+// belongs to no file. Written on the tap thread.
 #pragma once
 
 #include <xcb/xcb.h>
@@ -17,7 +17,7 @@
 
 namespace plume {
 
-class ClipboardLegacy {
+class SharedClipboardCopy {
   public:
     // One type's content, and the type and format that its program gave for it.
     struct Entry {
@@ -28,11 +28,11 @@ class ClipboardLegacy {
     };
 
     // Without memory to share it keeps nothing.
-    ClipboardLegacy();
-    ClipboardLegacy(const ClipboardLegacy&) = delete;
-    ClipboardLegacy& operator=(const ClipboardLegacy&) = delete;
+    SharedClipboardCopy();
+    SharedClipboardCopy(const SharedClipboardCopy&) = delete;
+    SharedClipboardCopy& operator=(const SharedClipboardCopy&) = delete;
 
-    // What the watchdog inherits; -1 when there is none.
+    // Of the memory, for the watchdog to inherit; -1 when there is none.
     int descriptor() const { return memory_.get(); }
 
     // Somebody else's content is on the clipboard now.
