@@ -25,7 +25,7 @@ MAY_SEE = {
     "ports/x11": PORT | {"ports/posix"},
     "ports/x11/windows": PORT | {"ports/posix", "ports/x11"},
     "ports/x11/clipboard": PORT | {"ports/posix", "ports/x11"},
-    "ports/x11/keyboard": PORT | {"ports/posix", "ports/x11", "ports/x11/windows"},
+    "ports/x11/keyboard": PORT | {"ports/posix", "ports/x11"},
     "ports/x11/watchdog": PORT | {"ports/posix", "ports/x11", "ports/x11/clipboard", "ports/x11/keyboard"},
     "library": FOUNDATION | {"platform"},
     "content/scripts": {"Foundation", "platform"},

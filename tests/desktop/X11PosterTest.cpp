@@ -8,8 +8,8 @@
 #include <iostream>
 #include <string>
 
+#include "ports/x11/keyboard/TerminalApplications.h"
 #include "ports/x11/keyboard/X11KeyCodes.h"
-#include "ports/x11/windows/TerminalApplications.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/KeyboardPort.h"

@@ -9,8 +9,8 @@
 
 #include "input/BundleIdentifierResolver.h"
 #include "input/KeyCodes.h"
+#include "ports/x11/keyboard/TerminalApplications.h"
 #include "ports/x11/keyboard/X11KeyCodes.h"
-#include "ports/x11/windows/TerminalApplications.h"
 
 namespace plume {
 

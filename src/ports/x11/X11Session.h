@@ -1,5 +1,5 @@
 // The connection over which Plume takes part in the desktop: the clipboard, who is in front, hot keys, layout changes.
-// Keys have a connection of their own, so that a long clipboard never stands in the order of keys.
+// Keys have a connection of their own, so that no key waits for a large clipboard.
 //
 // Belongs to the tap thread, whose run loop it wakes; opened on any thread before that loop runs.
 #pragma once

@@ -1,6 +1,6 @@
 // Content on its way to other programs: written into properties of their windows, piece by piece where it is long.
 //
-// Belongs to the tap thread. A requestor that dies or falls asleep costs the memory of its content for half a minute.
+// Belongs to the tap thread. What goes to a requestor that has stopped reading is kept for half a minute.
 #pragma once
 
 #include <xcb/xcb.h>

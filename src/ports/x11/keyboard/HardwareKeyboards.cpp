@@ -7,12 +7,12 @@ namespace plume {
 
 namespace {
 
-// A keyboard that another program has taken hangs on no master as long as it does.
-bool isTakenByAnother(const InputDevice& device) {
+// A keyboard that another program has grabbed is attached to no master meanwhile.
+bool isGrabbedByAnother(const InputDevice& device) {
     return device.type == XCB_INPUT_DEVICE_TYPE_FLOATING_SLAVE && device.keySource != 0;
 }
 
-Error nothingToTake(const TapConnection& connection, const std::string& occupied) {
+Error nothingToGrab(const TapConnection& connection, const std::string& occupied) {
     const std::string& display = connection.connection().displayName();
     if (!occupied.empty()) {
         return Error{"The keyboard \"" + occupied + "\" of display \"" + display +
@@ -35,29 +35,29 @@ std::vector<InputDevice> HardwareKeyboards::list(const TapConnection& connection
 
 Result<void> HardwareKeyboards::check(const TapConnection& connection) {
     const auto devices = inputDevices(connection.connection());
-    if (!list(connection).empty() || std::ranges::any_of(devices, isTakenByAnother)) return {};
-    return nothingToTake(connection, {});
+    if (!list(connection).empty() || std::ranges::any_of(devices, isGrabbedByAnother)) return {};
+    return nothingToGrab(connection, {});
 }
 
-Result<void> HardwareKeyboards::take() {
+Result<void> HardwareKeyboards::grab() {
     std::string occupied;
     for (const InputDevice& device : list(connection_)) {
-        if (!take(device.id)) occupied = device.name;
+        if (!grab(device.id)) occupied = device.name;
     }
-    if (!taken_.empty()) return {};
+    if (!grabbed_.empty()) return {};
     for (const InputDevice& device : inputDevices(connection_.connection())) {
-        if (isTakenByAnother(device)) occupied = device.name;
+        if (isGrabbedByAnother(device)) occupied = device.name;
     }
-    return nothingToTake(connection_, occupied);
+    return nothingToGrab(connection_, occupied);
 }
 
-void HardwareKeyboards::takeNew() {
+void HardwareKeyboards::grabNew() {
     for (const InputDevice& device : list(connection_)) {
-        if (std::ranges::find(taken_, device.id) == taken_.end()) take(device.id);
+        if (std::ranges::find(grabbed_, device.id) == grabbed_.end()) grab(device.id);
     }
 }
 
-bool HardwareKeyboards::take(std::uint16_t device) {
+bool HardwareKeyboards::grab(std::uint16_t device) {
     auto* const connection = connection_.connection().get();
     constexpr std::uint32_t events = XCB_INPUT_XI_EVENT_MASK_KEY_PRESS | XCB_INPUT_XI_EVENT_MASK_KEY_RELEASE;
     const auto cookie = xcb_input_xi_grab_device(
@@ -65,24 +65,24 @@ bool HardwareKeyboards::take(std::uint16_t device) {
         XCB_INPUT_GRAB_MODE_22_ASYNC, XCB_INPUT_GRAB_OWNER_NO_OWNER, 1, &events);
     const XcbOwned<xcb_input_xi_grab_device_reply_t> reply(xcb_input_xi_grab_device_reply(connection, cookie, nullptr));
     if (!reply || reply->status != XCB_GRAB_STATUS_SUCCESS) return false;
-    taken_.push_back(device);
+    grabbed_.push_back(device);
     return true;
 }
 
-void HardwareKeyboards::giveBack() {
-    for (const std::uint16_t device : taken_) {
+void HardwareKeyboards::ungrab() {
+    for (const std::uint16_t device : grabbed_) {
         xcb_input_xi_ungrab_device(connection_.connection().get(), XCB_CURRENT_TIME, device);
     }
-    taken_.clear();
+    grabbed_.clear();
 }
 
 void HardwareKeyboards::forget(std::uint16_t device) {
-    std::erase(taken_, device);
+    std::erase(grabbed_, device);
 }
 
 KeycodeSet HardwareKeyboards::keysDown() const {
     KeycodeSet down;
-    for (const std::uint16_t device : taken_) down |= keysDownOn(connection_.connection(), device);
+    for (const std::uint16_t device : grabbed_) down |= keysDownOn(connection_.connection(), device);
     return down;
 }
 

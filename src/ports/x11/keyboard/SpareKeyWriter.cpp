@@ -115,28 +115,31 @@ void SpareKeyWriter::clearLeftovers() {
 }
 
 void SpareKeyWriter::verify(SpareKeycodes& spares, double since) const {
-    auto& loans = spares.loans();
-    const auto isUsed = [since](const SpareKeycodes::Loan& loan) { return loan.lastUse >= since && loan.written; };
-    const auto first = std::ranges::find_if(loans, isUsed);
-    if (first == loans.end()) return;
-    const auto last = std::ranges::find_if(loans.rbegin(), loans.rend(), isUsed);
+    auto& assignments = spares.assignments();
+    const auto isUsed = [since](const SpareKeycodes::Assignment& assignment) {
+        return assignment.lastUse >= since && assignment.written;
+    };
+    const auto first = std::ranges::find_if(assignments, isUsed);
+    if (first == assignments.end()) return;
+    const auto last = std::ranges::find_if(assignments.rbegin(), assignments.rend(), isUsed);
     const auto count = static_cast<std::uint8_t>(last->keycode - first->keycode + 1);
     const auto map =
         KeySymbols::read(connection_.connection().get(), connection_.testKeyboard(), first->keycode, count);
-    for (auto& loan : loans) {
-        if (!isUsed(loan)) continue;
-        const std::size_t index = loan.keycode - first->keycode;
-        loan.written = index < map.keys.size() && map.keys[index].symbols == std::vector{symbolOf(loan.character)};
+    for (auto& assignment : assignments) {
+        if (!isUsed(assignment)) continue;
+        const std::size_t index = assignment.keycode - first->keycode;
+        assignment.written =
+            index < map.keys.size() && map.keys[index].symbols == std::vector{symbolOf(assignment.character)};
     }
 }
 
 void SpareKeyWriter::write(SpareKeycodes& spares) {
     Symbols changed;
-    for (const auto& loan : spares.loans()) {
-        if (!loan.written) changed[loan.keycode] = symbolOf(loan.character);
+    for (const auto& assignment : spares.assignments()) {
+        if (!assignment.written) changed[assignment.keycode] = symbolOf(assignment.character);
     }
     if (changed.empty() || !change(changed, nullptr)) return;
-    for (auto& loan : spares.loans()) loan.written = true;
+    for (auto& assignment : spares.assignments()) assignment.written = true;
     note(spares);
 }
 
@@ -162,10 +165,10 @@ bool SpareKeyWriter::change(const Symbols& symbols, const Symbols* only) {
 
 void SpareKeyWriter::note(const SpareKeycodes& spares) const {
     std::vector<std::uint32_t> values;
-    for (const auto& loan : spares.loans()) {
-        if (loan.character == 0) continue;
-        values.push_back(loan.keycode);
-        values.push_back(symbolOf(loan.character));
+    for (const auto& assignment : spares.assignments()) {
+        if (assignment.character == 0) continue;
+        values.push_back(assignment.keycode);
+        values.push_back(symbolOf(assignment.character));
     }
     auto& connection = connection_.connection();
     xcb_change_property(connection.get(), XCB_PROP_MODE_REPLACE, connection.root(), connection.atom(NoteProperty),

@@ -1,9 +1,10 @@
-// Puts the symbols of lent key codes into the server's keymap, and takes them away again.
+// Writes the symbols of assigned spare key codes into the server's keymap, and removes them again.
 //
 // A change is written to the main keyboard and what is attached to it, the XTEST keyboard included, with one request
 // over all key codes from the first to the last that change; those in between are written as they are. That takes XKB:
 // the core protocol's request would take the third group and more from them. What is there is noted in a property of
-// the root window, so that a Plume that was killed leaves no key code taken for good. Tap thread; waits for the server.
+// the root window, so that the next Plume can remove what one that was killed has left. Tap thread; waits for the
+// server.
 #pragma once
 
 #include <xcb/xcb.h>

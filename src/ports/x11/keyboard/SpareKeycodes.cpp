@@ -5,39 +5,39 @@
 namespace plume {
 
 void SpareKeycodes::reset(const std::vector<xcb_keycode_t>& keycodes) {
-    std::vector<Loan> loans;
+    std::vector<Assignment> assignments;
     for (const xcb_keycode_t keycode : keycodes) {
-        const auto before = std::ranges::find(loans_, keycode, &Loan::keycode);
-        loans.push_back({keycode, 0, before == loans_.end() ? -Never : before->lastUse, true});
+        const auto before = std::ranges::find(assignments_, keycode, &Assignment::keycode);
+        assignments.push_back({keycode, 0, before == assignments_.end() ? -Never : before->lastUse, true});
     }
-    loans_ = std::move(loans);
+    assignments_ = std::move(assignments);
 }
 
 xcb_keycode_t SpareKeycodes::take(char32_t character, double now) {
-    auto loan = std::ranges::find(loans_, character, &Loan::character);
-    if (loan == loans_.end()) {
-        loan = std::ranges::min_element(loans_, {}, &Loan::lastUse);
-        if (loan == loans_.end() || !isFree(*loan, now)) return 0;
-        loan->character = character;
-        loan->written = false;
+    auto assignment = std::ranges::find(assignments_, character, &Assignment::character);
+    if (assignment == assignments_.end()) {
+        assignment = std::ranges::min_element(assignments_, {}, &Assignment::lastUse);
+        if (assignment == assignments_.end() || !isFree(*assignment, now)) return 0;
+        assignment->character = character;
+        assignment->written = false;
     }
-    loan->lastUse = now;
-    return loan->keycode;
+    assignment->lastUse = now;
+    return assignment->keycode;
 }
 
 void SpareKeycodes::extend(double since, double now) {
-    for (Loan& loan : loans_) {
-        if (loan.lastUse >= since) loan.lastUse = now;
+    for (Assignment& assignment : assignments_) {
+        if (assignment.lastUse >= since) assignment.lastUse = now;
     }
 }
 
 bool SpareKeycodes::canTake(const std::set<char32_t>& characters, double now) const {
     std::size_t missing = characters.size();
     std::size_t free = 0;
-    for (const Loan& loan : loans_) {
-        if (characters.contains(loan.character)) {
+    for (const Assignment& assignment : assignments_) {
+        if (characters.contains(assignment.character)) {
             --missing;
-        } else if (isFree(loan, now)) {
+        } else if (isFree(assignment, now)) {
             ++free;
         }
     }
@@ -45,8 +45,8 @@ bool SpareKeycodes::canTake(const std::set<char32_t>& characters, double now) co
 }
 
 double SpareKeycodes::nextFree() const {
-    const auto loan = std::ranges::min_element(loans_, {}, &Loan::lastUse);
-    return loan == loans_.end() ? Never : loan->lastUse + Rest;
+    const auto assignment = std::ranges::min_element(assignments_, {}, &Assignment::lastUse);
+    return assignment == assignments_.end() ? Never : assignment->lastUse + Rest;
 }
 
 }  // namespace plume

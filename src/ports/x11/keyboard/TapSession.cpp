@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "ports/x11/keyboard/KeymapMirror.h"
+#include "ports/x11/keyboard/KeymapCopy.h"
 #include "ports/x11/keyboard/X11KeyCodes.h"
 
 namespace plume {
@@ -26,26 +26,26 @@ std::uint16_t modifierKeyOf(std::uint64_t flags) {
 TapSession::TapSession(Dependencies dependencies)
     : dependencies_(std::move(dependencies)),
       keyboards_(dependencies_.connection),
-      keyboardHeld_(std::make_unique<KeyboardHeld>(dependencies_.connection)) {}
+      grabCheck_(std::make_unique<KeyboardGrabCheck>(dependencies_.connection)) {}
 
 Result<void> TapSession::begin() {
     TapConnection& connection = dependencies_.connection;
-    if (!mirrorAtStart()) {
+    if (!copyKeymapAtStart()) {
         return Error{"The X server of display \"" + connection.connection().displayName() +
                      "\" refuses to give the keyboard's layout to its XTEST keyboard; without that, keys that Plume "
                      "passes on would come out wrong. Does setxkbmap with your layout help?"};
     }
-    if (auto taken = keyboards_.take(); !taken) return taken;
+    if (auto grabbed = keyboards_.grab(); !grabbed) return grabbed;
     connection.userKeys = keyboards_.keysDown();
     decoder_.setKeymap(dependencies_.keyboard.keymap(), connection.userKeys, dependencies_.keyboard.locks());
     selectHierarchyEvents();
-    keyboardHeld_->ask(dependencies_.loop.now());
+    grabCheck_->ask(dependencies_.loop.now());
     connection.connection().sync();
     addSource();
     return {};
 }
 
-bool TapSession::mirrorAtStart() const {
+bool TapSession::copyKeymapAtStart() const {
     const TapConnection& connection = dependencies_.connection;
     const auto keyboards = HardwareKeyboards::list(connection);
     if (keyboards.empty()) return true;
@@ -58,7 +58,7 @@ bool TapSession::mirrorAtStart() const {
         }
     }
     const std::array to{connection.testKeyboard()};
-    return mirrorKeymap(connection.connection().displayName(), typedOn, to);
+    return copyKeymap(connection.connection().displayName(), typedOn, to);
 }
 
 void TapSession::selectHierarchyEvents() const {
@@ -81,8 +81,8 @@ void TapSession::end() {
     holdLimit_.cancel();
     nextDrain_.cancel();
     TapConnection& connection = dependencies_.connection;
-    keyboards_.giveBack();
-    keyboardHeld_.reset();
+    keyboards_.ungrab();
+    grabCheck_.reset();
     connection.connection().sync();
     passOnUnheard();
     connection.releaseAll();
@@ -139,11 +139,11 @@ void TapSession::handle(const xcb_generic_event_t& event) {
     if (ended_) return;
     dependencies_.connection.flush();
     // Not behind a press: the answer would come while the program is busy with the key.
-    if (key.event_type == XCB_INPUT_KEY_RELEASE) askWhoHoldsTheKeyboard();
+    if (key.event_type == XCB_INPUT_KEY_RELEASE) askForGrabs();
 }
 
-void TapSession::askWhoHoldsTheKeyboard() {
-    keyboardHeld_->ask(dependencies_.loop.now());
+void TapSession::askForGrabs() {
+    grabCheck_->ask(dependencies_.loop.now());
     dependencies_.connection.flush();
 }
 
@@ -157,7 +157,7 @@ void TapSession::handleHierarchy(const xcb_input_hierarchy_event_t& event) {
         keyboards_.forget(infos[i].deviceid);
         releaseKeysOf(infos[i].deviceid);
     }
-    if ((event.flags & came) != 0) keyboards_.takeNew();
+    if ((event.flags & came) != 0) keyboards_.grabNew();
 }
 
 void TapSession::releaseKeysOf(std::uint16_t device) {
@@ -168,7 +168,7 @@ void TapSession::releaseKeysOf(std::uint16_t device) {
 }
 
 bool TapSession::mayTell() {
-    if (keyboardHeld_->isHeld(dependencies_.loop.now())) return false;
+    if (grabCheck_->isGrabbed(dependencies_.loop.now())) return false;
     return !dependencies_.focusIsPassword || !dependencies_.focusIsPassword();
 }
 
@@ -258,9 +258,9 @@ void TapSession::release() {
 void TapSession::keyboardChanged(XkbKeyboard::Change change) {
     if (change == XkbKeyboard::Change::Locks) decoder_.adopt(dependencies_.keyboard.locks());
     if (change != XkbKeyboard::Change::Keymap) return;
-    // The server gave the new layout to every keyboard but those that are taken.
+    // The server gave the new layout to every keyboard but those that are grabbed.
     const TapConnection& connection = dependencies_.connection;
-    mirrorKeymap(connection.connection().displayName(), connection.testKeyboard(), keyboards_.taken());
+    copyKeymap(connection.connection().displayName(), connection.testKeyboard(), keyboards_.grabbed());
     decoder_.setKeymap(dependencies_.keyboard.keymap(), connection.userKeys, dependencies_.keyboard.locks());
 }
 

@@ -1,4 +1,4 @@
-// The time in which the tap has the keyboards: from taking them to giving them back, or to losing the connection.
+// The tap while it has the keyboards: from grabbing them until it gives them back or loses the connection.
 //
 // Every key of theirs comes here, is decoded, told to the listener, and pressed again on the XTEST keyboard unless the
 // listener swallowed it. What is down there comes up again in any case: a release follows every press that was passed
@@ -18,7 +18,7 @@
 #include "ports/posix/PollRunLoop.h"
 #include "ports/x11/keyboard/HardwareKeyboards.h"
 #include "ports/x11/keyboard/KeyDecoder.h"
-#include "ports/x11/keyboard/KeyboardHeld.h"
+#include "ports/x11/keyboard/KeyboardGrabCheck.h"
 #include "ports/x11/keyboard/TapConnection.h"
 #include "ports/x11/keyboard/XkbKeyboard.h"
 
@@ -60,7 +60,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         bool down;
     };
 
-    bool mirrorAtStart() const;
+    bool copyKeymapAtStart() const;
     void selectHierarchyEvents() const;
     void addSource();
     void passOnUnheard();
@@ -68,7 +68,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;
     bool isKey(const xcb_generic_event_t& event) const;
     void handle(const xcb_generic_event_t& event);
-    void askWhoHoldsTheKeyboard();
+    void askForGrabs();
     void handleHierarchy(const xcb_input_hierarchy_event_t& event);
     void press(xcb_keycode_t keycode, bool repeated);
     void release(xcb_keycode_t keycode);
@@ -82,7 +82,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     Dependencies dependencies_;
     HardwareKeyboards keyboards_;
     KeyDecoder decoder_;
-    std::unique_ptr<KeyboardHeld> keyboardHeld_;
+    std::unique_ptr<KeyboardGrabCheck> grabCheck_;
     int descriptor_ = -1;
     bool ended_ = false;
 

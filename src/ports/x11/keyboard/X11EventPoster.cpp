@@ -8,7 +8,7 @@
 #include <set>
 #include <utility>
 
-#include "ports/x11/keyboard/QuietKeyboard.h"
+#include "ports/x11/keyboard/NeutralKeyboard.h"
 #include "ports/x11/keyboard/X11KeyCodes.h"
 
 namespace plume {
@@ -79,11 +79,11 @@ X11EventPoster::X11EventPoster(const RunLoop& loop, TapConnection& connection, X
 
 X11EventPoster::~X11EventPoster() {
     double lastUse = -SpareKeycodes::Never;
-    for (SpareKeycodes::Loan& loan : spares_.loans()) {
-        if (loan.character == 0) continue;
-        lastUse = std::max(lastUse, loan.lastUse);
-        loan.character = 0;
-        loan.written = false;
+    for (SpareKeycodes::Assignment& assignment : spares_.assignments()) {
+        if (assignment.character == 0) continue;
+        lastUse = std::max(lastUse, assignment.lastUse);
+        assignment.character = 0;
+        assignment.written = false;
     }
     // What was typed last may not have been read yet.
     const double wait = lastUse + SpareKeycodes::Rest - loop_.now();
@@ -155,8 +155,8 @@ void X11EventPoster::send(std::span<Item> items) {
     }
     const double start = loop_.now();
     {
-        const QuietKeyboard quiet(connection_, *keymap_);
-        group_ = quiet.group();
+        const NeutralKeyboard neutral(connection_, *keymap_);
+        group_ = neutral.group();
         while (!items.empty()) {
             const std::size_t count = findKeys(items);
             writer_.verify(spares_, start);

@@ -25,9 +25,9 @@
 #include "ports/x11/keyboard/SpareKeyWriter.h"
 #include "ports/x11/keyboard/SpareKeycodes.h"
 #include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/TerminalApplications.h"
 #include "ports/x11/keyboard/X11KeyboardTap.h"
 #include "ports/x11/keyboard/XkbKeyboard.h"
-#include "ports/x11/windows/TerminalApplications.h"
 
 namespace plume {
 

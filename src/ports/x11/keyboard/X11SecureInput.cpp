@@ -2,6 +2,8 @@
 
 #include <utility>
 
+#include "ports/x11/keyboard/KeyboardGrabCheck.h"
+
 namespace plume {
 
 Result<std::unique_ptr<X11SecureInput>> X11SecureInput::open(const std::string& display,
@@ -24,14 +26,12 @@ bool X11SecureInput::isSecureEventInputEnabled() const {
     return (focusIsPassword_ && focusIsPassword_()) || isKeyboardHeld();
 }
 
-// A window that is not shown cannot hold the keyboard, so asking for it changes nothing; the server's reason for
-// refusing tells whether another program holds it.
 bool X11SecureInput::isKeyboardHeld() const {
     xcb_connection_t* const server = connection_->get();
     const auto cookie =
         xcb_grab_keyboard(server, 0, neverShown_, XCB_CURRENT_TIME, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC);
     const XcbOwned<xcb_grab_keyboard_reply_t> reply(xcb_grab_keyboard_reply(server, cookie, nullptr));
-    return reply && (reply->status == XCB_GRAB_STATUS_ALREADY_GRABBED || reply->status == XCB_GRAB_STATUS_FROZEN);
+    return reply && tellsOfGrab(*reply);
 }
 
 }  // namespace plume

@@ -1,4 +1,4 @@
-// Whether somebody else keeps the keyboard on X11: a lock screen, a password prompt, an open menu.
+// Whether another program has grabbed the keyboard, or the focused field takes a password.
 //
 // Belongs to the main thread and has a connection of its own.
 #pragma once

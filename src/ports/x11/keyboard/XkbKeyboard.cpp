@@ -19,7 +19,7 @@ constexpr std::uint16_t WatchedStateParts = XCB_XKB_STATE_PART_MODIFIER_LATCH | 
                                             XCB_XKB_STATE_PART_GROUP_STATE | XCB_XKB_STATE_PART_GROUP_LATCH |
                                             XCB_XKB_STATE_PART_GROUP_LOCK;
 constexpr auto RulesProperty = "_XKB_RULES_NAMES";
-// The server's word of a change that was announced comes with the next few changes, or never.
+// The server's event of a change that was announced is among the next few events, or does not come.
 constexpr std::size_t MostExpected = 8;
 
 // The piece with this number of a list, empty beyond its end.

@@ -61,7 +61,7 @@ class XkbKeyboard {
     void listenTo(X11Session& session);
 
     // Whoever gives key codes symbols of Plume's own tells it before: `symbols[i]` comes to `first + i`, and
-    // XKB_KEY_NoSymbol stands for a key code that is written as it is. The server's word of that change is then no
+    // XKB_KEY_NoSymbol stands for a key code that is written as it is. The server's event of that change is then no
     // change of layout, and the symbols are no part of it.
     void willWrite(xcb_keycode_t first, std::span<const xkb_keysym_t> symbols);
 

@@ -1,12 +1,12 @@
 // Plume's side of the watchdog: a process of its own that frees the keyboard when Plume no longer can.
 //
-// While Plume has a keyboard tap, every key goes through the tap thread; were that thread stopped, hung or looping, the
-// user's keyboard would be dead. The watchdog hears on a connection of its own that a key went down (not which one it
-// was, and it keeps nothing), and then asks the tap thread four times a second whether it is alive, until ten
-// seconds of that are over and the next key starts it anew: while nobody types, nothing wakes up. When an answer does
-// not come within 0.6 s, or when Plume ends with the keyboard held, the watchdog has the X server end the tap's
-// connection, which gives the keyboard back to the programs, and releases the keys that the tap left pressed. A tap
-// that finds its connection gone takes the keyboard again when it is alive.
+// While Plume has a keyboard tap, every key goes through the tap thread; were that thread stopped, hung or looping,
+// the user's keyboard would have no effect. The watchdog hears on a connection of its own that a key went down (not
+// which one it was, and it keeps nothing), and then asks the tap thread four times a second whether it is alive,
+// until ten seconds of that are over and the next key starts it anew: while nobody types, nothing wakes up. When an
+// answer does not come within 0.6 s, or when Plume ends with the keyboard held, the watchdog has the X server end
+// the tap's connection, which gives the keyboard back to the programs, and releases the keys that the tap left
+// pressed. A tap that finds its connection gone takes the keyboard again when it is alive.
 //
 // The answer comes from a source of the tap thread's run loop, so that a thread that does not get there does not
 // answer. The process ends by itself as soon as Plume has ended, in whatever way; it leaves a ClipboardKeeper behind

@@ -1,4 +1,4 @@
-#include "ports/x11/keyboard/KeyboardHeld.h"
+#include "ports/x11/keyboard/KeyboardGrabCheck.h"
 
 #include <xcb/xcbext.h>
 
@@ -9,23 +9,27 @@ namespace plume {
 
 namespace {
 
-// A pause in which another program may have taken the keyboard. Asking takes about 15 microseconds.
+// Seconds of a pause in which another program may have grabbed the keyboard. Asking takes about 15 microseconds.
 constexpr double LongestAge = 0.3;
 
 }  // namespace
 
-KeyboardHeld::~KeyboardHeld() {
+bool tellsOfGrab(const xcb_grab_keyboard_reply_t& refusal) {
+    return refusal.status == XCB_GRAB_STATUS_ALREADY_GRABBED || refusal.status == XCB_GRAB_STATUS_FROZEN;
+}
+
+KeyboardGrabCheck::~KeyboardGrabCheck() {
     if (asked_) xcb_discard_reply(connection_.connection().get(), asked_->sequence);
 }
 
-void KeyboardHeld::ask(double now) {
+void KeyboardGrabCheck::ask(double now) {
     if (asked_) return;
     asked_ = xcb_grab_keyboard(connection_.connection().get(), 0, connection_.window(), XCB_CURRENT_TIME,
                                XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC);
     askedAt_ = now;
 }
 
-bool KeyboardHeld::isHeld(double now) {
+bool KeyboardGrabCheck::isGrabbed(double now) {
     auto* const connection = connection_.connection().get();
     if (asked_) {
         void* answer = nullptr;
@@ -34,19 +38,16 @@ bool KeyboardHeld::isHeld(double now) {
             const XcbOwned<xcb_grab_keyboard_reply_t> reply(static_cast<xcb_grab_keyboard_reply_t*>(answer));
             const XcbOwned<xcb_generic_error_t> ignored(error);
             asked_.reset();
-            held_ = isHeldBy(reply.get());
+            if (reply) grabbed_ = tellsOfGrab(*reply);
         }
     }
-    if (now - askedAt_ <= LongestAge) return held_;
+    if (now - askedAt_ <= LongestAge) return grabbed_;
     if (asked_) xcb_discard_reply(connection, std::exchange(asked_, {})->sequence);
     ask(now);
     const XcbOwned<xcb_grab_keyboard_reply_t> reply(
         xcb_grab_keyboard_reply(connection, *std::exchange(asked_, {}), nullptr));
-    return held_ = isHeldBy(reply.get());
-}
-
-bool KeyboardHeld::isHeldBy(const xcb_grab_keyboard_reply_t* reply) const {
-    return reply ? reply->status == XCB_GRAB_STATUS_ALREADY_GRABBED || reply->status == XCB_GRAB_STATUS_FROZEN : held_;
+    if (reply) grabbed_ = tellsOfGrab(*reply);
+    return grabbed_;
 }
 
 }  // namespace plume

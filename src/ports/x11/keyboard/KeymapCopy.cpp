@@ -1,4 +1,4 @@
-#include "ports/x11/keyboard/KeymapMirror.h"
+#include "ports/x11/keyboard/KeymapCopy.h"
 
 #include <X11/XKBlib.h>
 
@@ -10,12 +10,12 @@ namespace {
 
 // Xlib, because its XCB counterpart cannot send a whole keymap; and Xlib ends the program at an error unless told
 // otherwise, for all displays at once.
-thread_local Display* mirroring = nullptr;
+thread_local Display* copyingFor = nullptr;
 thread_local bool failed = false;
 XErrorHandler handlerBefore = nullptr;
 
 int handleError(Display* display, XErrorEvent* error) {
-    if (display != mirroring) return handlerBefore ? handlerBefore(display, error) : 0;
+    if (display != copyingFor) return handlerBefore ? handlerBefore(display, error) : 0;
     failed = true;
     return 0;
 }
@@ -29,21 +29,21 @@ struct Close {
     void operator()(XkbDescPtr keymap) const { XkbFreeKeyboard(keymap, 0, True); }
 };
 
-class ErrorsKept {
+class ErrorTrap {
   public:
-    ErrorsKept() : before_(XSetErrorHandler(handleError)) {
+    ErrorTrap() : before_(XSetErrorHandler(handleError)) {
         failed = false;
         handlerBefore = before_;
     }
-    ~ErrorsKept() {
+    ~ErrorTrap() {
         XSetErrorHandler(before_);
-        mirroring = nullptr;
+        copyingFor = nullptr;
     }
-    ErrorsKept(const ErrorsKept&) = delete;
-    ErrorsKept& operator=(const ErrorsKept&) = delete;
+    ErrorTrap(const ErrorTrap&) = delete;
+    ErrorTrap& operator=(const ErrorTrap&) = delete;
 
     static void of(Display* display) {
-        mirroring = display;
+        copyingFor = display;
         XSetIOErrorExitHandler(display, surviveLoss, nullptr);
     }
 
@@ -63,11 +63,11 @@ bool give(Display* display, XkbDescPtr keymap, std::uint16_t device) {
 
 }  // namespace
 
-bool mirrorKeymap(const std::string& displayName, std::uint16_t from, std::span<const std::uint16_t> to) {
-    const ErrorsKept errors;
+bool copyKeymap(const std::string& displayName, std::uint16_t from, std::span<const std::uint16_t> to) {
+    const ErrorTrap errors;
     const std::unique_ptr<Display, Close> display(XOpenDisplay(displayName.c_str()));
     if (!display) return false;
-    ErrorsKept::of(display.get());
+    ErrorTrap::of(display.get());
     const std::unique_ptr<XkbDescRec, Close> keymap(XkbGetMap(display.get(), XkbAllMapComponentsMask, from));
     if (!keymap || XkbGetCompatMap(display.get(), XkbAllCompatMask, keymap.get()) != Success) return false;
     bool ok = true;

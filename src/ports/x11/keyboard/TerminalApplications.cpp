@@ -1,4 +1,4 @@
-#include "ports/x11/windows/TerminalApplications.h"
+#include "ports/x11/keyboard/TerminalApplications.h"
 
 #include <algorithm>
 #include <iterator>

@@ -1,4 +1,4 @@
-// Giving keyboards the keymap of another one.
+// Gives keyboards the keymap of another one.
 #pragma once
 
 #include <cstdint>
@@ -9,6 +9,6 @@ namespace plume {
 
 // Copies what the keys of one device do to the others, over a connection of its own that is gone afterwards: a few
 // milliseconds. False when the server refused. Any thread, one at a time.
-bool mirrorKeymap(const std::string& display, std::uint16_t from, std::span<const std::uint16_t> to);
+bool copyKeymap(const std::string& display, std::uint16_t from, std::span<const std::uint16_t> to);
 
 }  // namespace plume

@@ -1,4 +1,4 @@
-// The keyboard as synthesised keys want it, for as long as this lives: nothing pressed, nothing locked.
+// Puts the keyboard into a neutral state for as long as this exists: nothing pressed, nothing locked.
 //
 // Keys that are down on the XTEST keyboard are released; the modifiers among them that the user still holds are pressed
 // again at the end. A shift or a Caps Lock that is locked is unlocked and locked again; a latched modifier is spent.
@@ -16,13 +16,13 @@
 
 namespace plume {
 
-class QuietKeyboard {
+class NeutralKeyboard {
   public:
     // Both outlive it.
-    QuietKeyboard(TapConnection& connection, const XkbKeymap& keymap);
-    ~QuietKeyboard();
-    QuietKeyboard(const QuietKeyboard&) = delete;
-    QuietKeyboard& operator=(const QuietKeyboard&) = delete;
+    NeutralKeyboard(TapConnection& connection, const XkbKeymap& keymap);
+    ~NeutralKeyboard();
+    NeutralKeyboard(const NeutralKeyboard&) = delete;
+    NeutralKeyboard& operator=(const NeutralKeyboard&) = delete;
 
     // In force.
     xkb_layout_index_t group() const { return group_; }

@@ -1,4 +1,4 @@
-#include "ports/x11/keyboard/QuietKeyboard.h"
+#include "ports/x11/keyboard/NeutralKeyboard.h"
 
 #include <algorithm>
 
@@ -15,7 +15,7 @@ constexpr std::uint8_t SuperModifier = XCB_MOD_MASK_4;
 
 }  // namespace
 
-QuietKeyboard::QuietKeyboard(TapConnection& connection, const XkbKeymap& keymap)
+NeutralKeyboard::NeutralKeyboard(TapConnection& connection, const XkbKeymap& keymap)
     : connection_(connection), keymap_(keymap) {
     releaseKeys();
     // Last: the release of a locking key may unlock.
@@ -23,13 +23,13 @@ QuietKeyboard::QuietKeyboard(TapConnection& connection, const XkbKeymap& keymap)
     if ((lockedModifiers_ | latchedModifiers_) != 0) lock(0, latchedModifiers_);
 }
 
-QuietKeyboard::~QuietKeyboard() {
+NeutralKeyboard::~NeutralKeyboard() {
     if (lockedModifiers_ != 0) lock(lockedModifiers_, 0);
     for (const xcb_keycode_t keycode : heldModifiers_) connection_.sendKey(keycode, true);
     keepMenusClosed();
 }
 
-void QuietKeyboard::releaseKeys() {
+void NeutralKeyboard::releaseKeys() {
     const KeycodeSet down = connection_.keysDown();
     if (down.none()) return;
     std::vector<xcb_keycode_t> keys;
@@ -43,7 +43,7 @@ void QuietKeyboard::releaseKeys() {
     for (const xcb_keycode_t keycode : keys) connection_.sendKey(keycode, false);
 }
 
-void QuietKeyboard::readState() {
+void NeutralKeyboard::readState() {
     auto* const connection = connection_.connection().get();
     xcb_discard_reply(connection, xcb_xkb_use_extension(connection, 1, 0).sequence);
     const auto cookie = xcb_xkb_get_state(connection, XCB_XKB_ID_USE_CORE_KBD);
@@ -54,14 +54,14 @@ void QuietKeyboard::readState() {
     group_ = state->group;
 }
 
-void QuietKeyboard::lock(std::uint8_t modifiers, std::uint8_t spentLatches) {
+void NeutralKeyboard::lock(std::uint8_t modifiers, std::uint8_t spentLatches) {
     xcb_xkb_latch_lock_state(connection_.connection().get(), XCB_XKB_ID_USE_CORE_KBD, lockedModifiers_, modifiers, 0, 0,
                              spentLatches, 0, 0);
 }
 
 // Alt or Super pressed and released with nothing in between opens a menu or an overview: a Control in between keeps
 // them shut, and does nothing by itself.
-void QuietKeyboard::keepMenusClosed() {
+void NeutralKeyboard::keepMenusClosed() {
     const bool opens = std::ranges::any_of(heldModifiers_, [this](xcb_keycode_t keycode) {
         return (keymap_.modifiersOf(keycode) & (AltModifier | SuperModifier)) != 0;
     });
