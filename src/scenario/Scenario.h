@@ -1,4 +1,4 @@
-// One story of typing: what is there, what the user does, and what must be seen afterwards.
+// One scenario: what is there, what the user does, and what must be seen afterwards.
 #pragma once
 
 #include <cstdint>
@@ -7,6 +7,7 @@
 #include <nlohmann/json.hpp>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <variant>
 #include <vector>
@@ -66,7 +67,11 @@ struct ScenarioStep {
 };
 
 struct Scenario {
+    // For messages: the file, and which of its cases.
+    std::string title() const { return name.empty() ? fileName : fileName + ": " + name; }
+
     std::string fileName;
+    std::string name;  // of the case; empty for a file that is one scenario
     std::string about;
     std::vector<std::shared_ptr<SnippetGroup>> library;
     std::shared_ptr<const UserDefaults> settings;
@@ -82,7 +87,8 @@ struct Scenario {
     nlohmann::ordered_json expect = nlohmann::ordered_json::object();
 };
 
-// The error names the file, the place in it and what was expected.
-Result<Scenario> readScenario(std::string_view text, const std::string& fileName);
+// The scenarios of a file: one without a name, or one for each of its cases, with names that differ. The error names
+// the file, the place in it and what was expected.
+Result<std::vector<Scenario>> readScenarios(std::string_view text, const std::string& fileName);
 
 }  // namespace plume

@@ -7,44 +7,44 @@ namespace plume {
 
 namespace {
 
-// What asks for itself after less time paces something.
-constexpr double ShortestPeriod = 0.1;
+// Calls that ask for themselves after less time send something piece by piece; they end.
+constexpr double ShortestPeriod = 0.1;  // seconds
 
 }  // namespace
 
 RunLoop::CallId ScenarioLoop::schedule(double delay, Call call) {
-    const auto id = std::make_shared<CallId>(0);
-    *id = loop_.schedule(delay, [this, id, call = std::move(call)] { run(*id, call); });
-    pending_[*id].delay = delay;
-    askedFor_.push_back(*id);
-    return *id;
+    const CallId id = ++lastId_;
+    Timer timer = loop_.performAfterDelay(delay, [this, id, call = std::move(call)] { run(id, call); });
+    pending_.emplace(id, Pending{std::move(timer), delay, false});
+    scheduledByCall_.push_back(id);
+    return id;
 }
 
 void ScenarioLoop::cancel(CallId id) {
-    loop_.cancel(id);
-    pending_.erase(id);
+    // Taken out first: what the call holds may use the loop when it goes.
+    const auto dropped = pending_.extract(id);
 }
 
 void ScenarioLoop::run(CallId id, const Call& call) {
-    const Pending own = pending_[id];
-    pending_.erase(id);
-    askedFor_.clear();
-    const std::uint64_t before = world_.stamp();
+    const auto extracted = pending_.extract(id);
+    const Pending& own = extracted.mapped();
+    scheduledByCall_.clear();
+    const std::uint64_t before = hooks_.visibleChanges();
     call();
-    if (askedFor_.size() != 1 || own.delay < ShortestPeriod) return;
-    const auto next = pending_.find(askedFor_.front());
+    if (scheduledByCall_.size() != 1 || own.delay < ShortestPeriod) return;
+    const auto next = pending_.find(scheduledByCall_.front());
     if (next == pending_.end() || next->second.delay != own.delay) return;
-    next->second.repeats = own.repeats || world_.stamp() == before;
+    next->second.repeats = own.repeats || hooks_.visibleChanges() == before;
 }
 
-void ScenarioLoop::waitForNoneOfThese() {
+void ScenarioLoop::markPendingAsRepeating() {
     runReady();
     for (auto& [id, pending] : pending_) pending.repeats = true;
 }
 
 void ScenarioLoop::runReady() {
     loop_.runReady();
-    world_.awaitOthers();
+    hooks_.waitForScripts();
     loop_.runReady();
 }
 

@@ -1,14 +1,12 @@
-// The scenario's clock: the simulated run loop, with the difference kept between calls that somebody waits for and
+// The clock of a scenario: the simulated run loop, which also knows which calls somebody waits for and which belong to
 // timers that repeat for good.
 //
-// A call repeats for good when all it does is ask for itself again after the same time; such a call runs when time
-// passes, but time does not pass for its sake.
+// A call repeats for good when all it does is ask for itself again after the same time. Such a call runs when time
+// passes, but the scenario does not wait for it.
 #pragma once
 
 #include <functional>
 #include <map>
-#include <memory>
-#include <string>
 #include <vector>
 
 #include "ports/simulated/SimulatedRunLoop.h"
@@ -17,24 +15,22 @@ namespace plume {
 
 class ScenarioLoop final : public RunLoop {
   public:
-    struct World {
-        // Differs when something has happened that can be seen.
-        std::function<std::uint64_t()> stamp;
-        // Blocks until what runs outside of the loop has handed its results over.
-        std::function<void()> awaitOthers;
+    struct Hooks {
+        // Grows with everything that happens on the desktop and can be seen there.
+        std::function<std::uint64_t()> visibleChanges;
+        // Blocks until every script that runs has handed its result over.
+        std::function<void()> waitForScripts;
     };
 
     // The loop is not owned and outlives this one.
-    ScenarioLoop(SimulatedRunLoop& loop, World world) : loop_(loop), world_(std::move(world)) {}
+    ScenarioLoop(SimulatedRunLoop& loop, Hooks hooks) : loop_(loop), hooks_(std::move(hooks)) {}
 
     double now() const override { return loop_.now(); }
-    CallId schedule(double delay, Call call) override;
-    void cancel(CallId id) override;
     void perform(Call call) override { loop_.perform(std::move(call)); }
 
-    // From now on the calls that wait count as timers that repeat for good.
-    void waitForNoneOfThese();
-    // Runs what is due, then what is due next, until nothing that counts is left or this many seconds have passed.
+    // The calls that wait now count as timers that repeat for good.
+    void markPendingAsRepeating();
+    // Runs what is due, then what is due next, until only repeating calls are left or this many seconds have passed.
     void runUntilIdle(double maximumSeconds);
     // Lets this time pass, or until this moment.
     void advance(double seconds) { advanceTo(loop_.now() + seconds); }
@@ -42,18 +38,23 @@ class ScenarioLoop final : public RunLoop {
 
   private:
     struct Pending {
+        Timer timer;
         double delay = 0;
         bool repeats = false;
     };
+
+    CallId schedule(double delay, Call call) override;
+    void cancel(CallId id) override;
 
     void run(CallId id, const Call& call);
     void runReady();
     bool isIdle() const;
 
     SimulatedRunLoop& loop_;
-    const World world_;
+    const Hooks hooks_;
+    CallId lastId_ = 0;
     std::map<CallId, Pending> pending_;
-    std::vector<CallId> askedFor_;  // by the call that runs
+    std::vector<CallId> scheduledByCall_;  // what the call that runs has asked for
 };
 
 }  // namespace plume

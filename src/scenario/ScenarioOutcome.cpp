@@ -5,7 +5,7 @@
 #include "Foundation/Strings.h"
 #include "input/KeyCodes.h"
 #include "ports/simulated/SimulatedModifiers.h"
-#include "scenario/ScenarioStage.h"
+#include "scenario/ScenarioRun.h"
 
 namespace plume {
 
@@ -14,7 +14,7 @@ namespace {
 using Json = nlohmann::ordered_json;
 
 constexpr std::uint16_t KeyV = 9;
-// What times are given and compared to: sums of delays are not exact beyond it.
+// Times are written and compared to the microsecond: sums of delays are not exact beyond it.
 constexpr double Microseconds = 1e6;
 
 Json textOrNull(const std::optional<std::u16string>& text) {
@@ -90,7 +90,7 @@ struct Counts {
     }
 };
 
-// What the expectation names, against what there is: objects by their named keys, everything else as a whole.
+// Of objects only the keys that are expected count, everything else is compared as a whole.
 void compare(const Json& expected, const Json& actual, const std::string& place, std::vector<std::string>& found) {
     if (expected.is_object() && actual.is_object()) {
         for (const auto& [key, value] : expected.items()) {
@@ -118,27 +118,27 @@ void compare(const Json& expected, const Json& actual, const std::string& place,
 
 }  // namespace
 
-ScenarioOutcome outcomeOf(ScenarioStage& stage) {
-    SimulatedDesktop& desktop = stage.desktop();
+ScenarioOutcome outcomeOf(ScenarioRun& run) {
+    SimulatedDesktop& desktop = run.desktop();
     const SimulatedApplication* front = desktop.front();
     Json json;
     json["text"] = front ? toUtf8(front->field().text()) : "";
     json["caret"] = front ? front->field().caret() : 0;
     json["clipboard"] = textOrNull(desktop.pasteboard().string());
-    json["letters"] = toUtf8(stage.program().engine().letters());
+    json["letters"] = toUtf8(run.program().engine().letters());
     json["application"] = front ? toUtf8(front->bundleIdentifier()) : "";
     json["sounds"] = desktop.sounds().played();
-    json["suggestions"] = suggestions(stage.list());
-    const auto& forms = stage.forms().open;
+    json["suggestions"] = suggestions(run.list());
+    const auto& forms = run.forms().open;
     json["form"] = forms.empty() ? Json() : written(*forms.back().model);
-    json["errors"] = stage.errors();
+    json["errors"] = run.errors();
     json["events"] = Json::array();
     if (front) {
         for (const SimulatedKeyEvent& event : front->events()) json["events"].push_back(written(event));
     }
 
     Counts counts;
-    for (const SimulatedApplication* application : stage.applications()) counts.add(application->events());
+    for (const SimulatedApplication* application : run.applications()) counts.add(application->events());
     return {std::move(json), Json{{"events", counts.events},
                                   {"backspaces", counts.backspaces},
                                   {"pastes", counts.pastes},

@@ -1,13 +1,25 @@
-// What is to be seen on a stage when its scenario is over.
+// What can be seen when a run is over, and how it differs from what the scenario expects.
 #pragma once
 
-#include "scenario/ScenarioPlayer.h"
+#include <nlohmann/json.hpp>
+#include <string>
+#include <vector>
 
 namespace plume {
 
-class ScenarioStage;
+class ScenarioRun;
+
+struct ScenarioOutcome {
+    // As documented for users: "text", "caret", …, "events".
+    nlohmann::ordered_json outcome;
+    // What Plume sent: "events", "backspaces", …
+    nlohmann::ordered_json counts;
+};
 
 // Reads the clipboard, so it comes last.
-ScenarioOutcome outcomeOf(ScenarioStage& stage);
+ScenarioOutcome outcomeOf(ScenarioRun& run);
+
+// Where the outcome is not what the scenario expects, one entry each: the place, and both sides.
+std::vector<std::string> differences(const nlohmann::ordered_json& expect, const ScenarioOutcome& outcome);
 
 }  // namespace plume

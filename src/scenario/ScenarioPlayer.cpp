@@ -5,8 +5,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "scenario/ScenarioOutcome.h"
-#include "scenario/ScenarioStage.h"
+#include "scenario/ScenarioRun.h"
 
 namespace plume {
 
@@ -17,25 +16,25 @@ constexpr double LongestRun = 60;         // seconds
 
 class Player {
   public:
-    explicit Player(ScenarioStage& stage) : stage_(stage), desktop_(stage.desktop()) {}
+    explicit Player(ScenarioRun& run) : run_(run), desktop_(run.desktop()) {}
 
     Result<void> play(const std::vector<ScenarioStep>& steps) {
         for (const ScenarioStep& step : steps) {
             const bool waits = std::holds_alternative<WaitStep>(step.action);
-            if (!waits && !waited_) stage_.loop().runUntilIdle(LongestRun);
+            if (!waits && !waited_) run_.loop().runUntilIdle(LongestRun);
             if (!waits && waited_) lastPress_.reset();
             const Result<void> done = std::visit([this](const auto& action) { return perform(action); }, step.action);
             if (!done) return Error{step.place + ": " + done.error().message};
             waited_ = waits;
         }
-        if (!waited_) stage_.loop().runUntilIdle(LongestRun);
+        if (!waited_) run_.loop().runUntilIdle(LongestRun);
         return {};
     }
 
   private:
     // A person needs a moment from one key to the next.
     void beforeKey() {
-        if (lastPress_) stage_.loop().advanceTo(std::max(desktop_.runLoop().now(), *lastPress_ + TimeBetweenKeys));
+        if (lastPress_) run_.loop().advanceTo(std::max(desktop_.runLoop().now(), *lastPress_ + TimeBetweenKeys));
         lastPress_ = desktop_.runLoop().now();
     }
 
@@ -75,7 +74,7 @@ class Player {
         return {};
     }
     Result<void> perform(const WaitStep& step) {
-        stage_.loop().advance(step.seconds);
+        run_.loop().advance(step.seconds);
         return {};
     }
     Result<void> perform(const ClickStep& /*step*/) {
@@ -83,7 +82,7 @@ class Player {
         return {};
     }
     Result<void> perform(const ActivateStep& step) {
-        stage_.activate(step.application);
+        run_.activate(step.application);
         return {};
     }
     Result<void> perform(const SelectStep& step) {
@@ -96,7 +95,7 @@ class Player {
         return {};
     }
     Result<void> perform(const ChooseStep& step) {
-        ScenarioList& list = stage_.list();
+        ScenarioList& list = run_.list();
         if (!list.visible) return Error{"no list is shown to choose from"};
         if (step.index >= list.entries.size()) {
             return Error{"the list has " + std::to_string(list.entries.size()) + " entries, counted from 0"};
@@ -106,8 +105,8 @@ class Player {
         return {};
     }
     Result<void> perform(const FormStep& step) {
-        if (stage_.forms().open.empty()) return Error{"no form is open"};
-        FormModel& model = *stage_.forms().open.back().model;
+        if (run_.forms().open.empty()) return Error{"no form is open"};
+        FormModel& model = *run_.forms().open.back().model;
         for (const auto& [name, value] : step.values) {
             Result<void> filled = fill(model, name, value);
             if (!filled) return filled;
@@ -116,7 +115,7 @@ class Player {
             Result<void> ticked = setTick(model, name, tick);
             if (!ticked) return ticked;
         }
-        const auto close = stage_.forms().open.back().close;
+        const auto close = run_.forms().open.back().close;
         close(step.accept);
         return {};
     }
@@ -154,7 +153,7 @@ class Player {
         return Error{"the form has no optional field \"" + toUtf8(name) + "\""};
     }
 
-    ScenarioStage& stage_;
+    ScenarioRun& run_;
     SimulatedDesktop& desktop_;
     std::optional<double> lastPress_;
     bool waited_ = false;
@@ -163,27 +162,10 @@ class Player {
 }  // namespace
 
 Result<ScenarioOutcome> playScenario(const Scenario& scenario) {
-    ScenarioStage stage(scenario);
-    const Result<void> played = Player(stage).play(scenario.steps);
-    if (!played) return Error{scenario.fileName + ": at " + played.error().message};
-    return outcomeOf(stage);
-}
-
-ScenarioReport simulate(std::string_view text, const std::string& fileName) {
-    constexpr int different = 1;
-    constexpr int unplayable = 2;
-    const Result<Scenario> scenario = readScenario(text, fileName);
-    if (!scenario) return {"", scenario.error().message + "\n", unplayable};
-    const Result<ScenarioOutcome> outcome = playScenario(scenario.value());
-    if (!outcome) return {"", outcome.error().message + "\n", unplayable};
-
-    ScenarioReport report;
-    report.output = outcome.value().outcome.dump(2) + "\n";
-    for (const std::string& difference : differences(scenario.value().expect, outcome.value())) {
-        report.problems.append(fileName).append(": ").append(difference).append("\n");
-        report.exitStatus = different;
-    }
-    return report;
+    ScenarioRun run(scenario);
+    const Result<void> played = Player(run).play(scenario.steps);
+    if (!played) return Error{scenario.title() + ": at " + played.error().message};
+    return outcomeOf(run);
 }
 
 }  // namespace plume

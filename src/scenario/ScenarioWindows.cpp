@@ -9,7 +9,7 @@ namespace plume {
 
 namespace {
 
-// Somewhere the pointer is not.
+// Places where the pointer is not.
 constexpr Rectangle ListFrame{{100, 100}, {200, 50}};
 constexpr Rectangle SearchFrame{{400, 100}, {200, 50}};
 

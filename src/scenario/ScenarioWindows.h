@@ -1,4 +1,4 @@
-// The windows of a scenario: what they show, and the user's hand on them.
+// The windows of a scenario: records of what they show, and what a user can do with them.
 //
 // On the scenario's thread.
 #pragma once

@@ -1,8 +1,9 @@
 #include <gtest/gtest.h>
 
+#include <nlohmann/json.hpp>
 #include <string>
 
-#include "scenario/ScenarioPlayer.h"
+#include "scenario/ScenarioReport.h"
 
 namespace plume {
 
@@ -75,7 +76,18 @@ INSTANTIATE_TEST_SUITE_P(
                  "steps": [{"type": "q"}, {"form": {"B": ""}}]})",
               "at $.steps[1]: the form has no field \"B\""},
         Fault{R"({"expect": {"txt": ""}})", "at $.expect.txt: unknown key"},
-        Fault{R"({"expect": {"counts": {"keys": 1}}})", "at $.expect.counts.keys: unknown key"}));
+        Fault{R"({"expect": {"counts": {"keys": 1}}})", "at $.expect.counts.keys: unknown key"},
+        Fault{R"({"name": "a"})", "at $.name: unknown key"},
+        Fault{R"({"cases": []})", "at $.cases: expected at least one case"},
+        Fault{R"({"cases": {}})", "at $.cases: expected a list"},
+        Fault{R"({"cases": [{"name": "a"}], "steps": []})", "at $.steps: expected inside the cases"},
+        Fault{R"({"cases": [{"name": "a"}], "expect": {}})", "at $.expect: expected inside the cases"},
+        Fault{R"({"cases": [{"about": "a"}]})", "at $.cases[0]: expected a \"name\""},
+        Fault{R"({"cases": [{"name": ""}]})", "at $.cases[0].name: expected a name"},
+        Fault{R"({"cases": [{"name": "a"}, {"name": "a"}]})", "at $.cases[1].name: expected a name that no case"},
+        Fault{R"({"cases": [{"name": "a", "cases": []}]})", "at $.cases[0].cases: unknown key"},
+        Fault{R"({"cases": [{"name": "a"}, {"name": "b", "steps": [{"wait": -1}]}]})", "at $.cases[1].steps[0].wait"},
+        Fault{R"({"text": 1, "cases": [{"name": "a"}]})", "at $.text: expected a string"}));
 
 TEST(ScenarioPlayer, ShowsBothSidesOfADifference) {
     const ScenarioReport report =
@@ -129,6 +141,41 @@ TEST(ScenarioPlayer, FillsFormsInWhereRichTextStood) {
                                  R"(}}], "expect": {"text": ")" + text + "\"}}";
         EXPECT_EQ(simulated(library + rest).problems, "") << form;
     }
+}
+
+TEST(ScenarioCases, TakeWholeKeysFromTheFileForThoseThatTheyLeaveOut) {
+    const ScenarioReport report = simulated(R"({"about": "shared", "text": "x ", "clipboard": "mine",
+        "library": [{"items": [{"abbreviation": "q", "content": "shared"}, {"abbreviation": "r", "content": "R"}]}],
+        "cases": [
+          {"name": "all", "steps": [{"type": "q"}], "expect": {"text": "x shared", "clipboard": "mine"}},
+          {"name": "none", "text": "", "clipboard": null, "library": [{"items": [{"abbreviation": "q", "content": "own"}]}],
+           "steps": [{"type": "q r"}], "expect": {"text": "own r", "clipboard": null}}]})");
+    EXPECT_EQ(report.problems, "");
+    const auto outcomes = nlohmann::json::parse(report.output);
+    EXPECT_EQ(outcomes.size(), 2u);
+    EXPECT_EQ(outcomes.at("all").at("text"), "x shared");
+    EXPECT_EQ(outcomes.at("none").at("text"), "own r");
+}
+
+TEST(ScenarioCases, ArePlayedApartAndNamedInMessages) {
+    const std::string text = R"({"cases": [
+        {"name": "a", "steps": [{"type": "one"}, {"activate": "org.example.other"}, {"type": "two"}],
+         "expect": {"text": "two"}},
+        {"name": "b", "steps": [{"type": "s"}], "expect": {"text": "t"}},
+        {"name": "c", "steps": [{"type": "u"}, {"choose": 0}]},
+        {"name": "d", "expect": {"text": "", "letters": "", "application": "org.example.editor"}}]})";
+    const ScenarioReport report = simulated(text);
+    EXPECT_EQ(report.exitStatus, 2);
+    EXPECT_EQ(report.problems,
+              "s.json: b: text: expected \"t\", got \"s\"\n"
+              "s.json: c: at $.cases[2].steps[1]: no list is shown to choose from\n");
+    const auto outcomes = nlohmann::json::parse(report.output);
+    EXPECT_TRUE(outcomes.contains("a") && outcomes.contains("b") && outcomes.contains("d"));
+    EXPECT_FALSE(outcomes.contains("c")) << "it did not come to its end";
+
+    EXPECT_EQ(simulate(text, "s.json", "b").problems, "s.json: b: text: expected \"t\", got \"s\"\n");
+    EXPECT_EQ(simulate(text, "s.json", "d").exitStatus, 0);
+    EXPECT_EQ(simulate(text, "s.json", "e").problems, "s.json: no case has the name \"e\"\n");
 }
 
 TEST(ScenarioPlayer, PlaysTheSameTwice) {

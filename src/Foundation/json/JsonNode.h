@@ -48,6 +48,8 @@ class JsonNode {
     // With any keys, in the document's order.
     std::vector<std::pair<std::string, JsonNode>> members() const;
     const nlohmann::ordered_json& value() const { return *value_; }
+    // Where it stands in the document, such as "$[0].items[2].rtf".
+    const std::string& path() const { return path_; }
 
     // "library.json: at $[0].items[2].rtf: expected …".
     [[noreturn]] void fail(const std::string& expected) const;

@@ -28,8 +28,8 @@ constexpr std::array Forms = {
                 "Print what an abbreviation expands to; its scripts are run"},
     CommandForm{Command::Doctor, "doctor", "plume doctor",
                 "Check what Plume needs of this desktop, and say what to do about what is missing"},
-    CommandForm{Command::Simulate, "simulate", "plume simulate FILE...",
-                "Play stories of typing on a simulated desktop and compare what comes out"},
+    CommandForm{Command::Simulate, "simulate", "plume simulate FILE... [--case NAME]",
+                "Play scenarios of typing on a simulated desktop and compare what comes out"},
 };
 
 constexpr const char* GeneralForm = "plume run|list|search|expand|doctor|simulate ...";
@@ -96,6 +96,7 @@ class Parser {
                 break;
             case Command::Simulate:
                 command->add_option("FILE", result_.files, "Scenarios")->required();
+                command->add_option("--case", result_.onlyCase, "Play only the case of this name")->type_name("NAME");
                 break;
             case Command::Doctor:
                 break;

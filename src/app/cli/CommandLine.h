@@ -23,6 +23,7 @@ struct CommandLine {
     std::optional<std::string> library;   // for Run, List, Search and Expand
     std::optional<std::string> settings;  // for Run
     std::vector<std::string> files;       // for Simulate
+    std::optional<std::string> onlyCase;  // for Simulate
     std::string text;                     // what to search for, or the abbreviation to expand
 };
 

@@ -6,7 +6,7 @@
 
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
-#include "scenario/ScenarioPlayer.h"
+#include "scenario/ScenarioReport.h"
 
 namespace plume {
 
@@ -19,7 +19,8 @@ void writeLine(std::ostream& stream, std::string_view text) {
 
 }  // namespace
 
-int simulateFiles(const std::vector<std::string>& files, std::ostream& output, std::ostream& error) {
+int simulateFiles(const std::vector<std::string>& files, const std::optional<std::string>& onlyCase,
+                  std::ostream& output, std::ostream& error) {
     int status = ExitStatus::Success;
     for (const std::string& file : files) {
         const Result<std::string> text = readWholeFile(file);
@@ -28,7 +29,7 @@ int simulateFiles(const std::vector<std::string>& files, std::ostream& output, s
             status = std::max(status, ExitStatus::WrongInput);
             continue;
         }
-        const ScenarioReport report = simulate(text.value(), file);
+        const ScenarioReport report = simulate(text.value(), file, onlyCase);
         writeLine(output, report.output);
         writeLine(error, report.problems);
         status = std::max(status, report.exitStatus);

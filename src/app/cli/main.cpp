@@ -44,7 +44,9 @@ int run(int argc, const char* const* argv) {
     }
     const auto& line = std::get<CommandLine>(parsed);
     if (line.command == Command::Doctor) return plume::examineDesktop(std::cout);
-    if (line.command == Command::Simulate) return plume::simulateFiles(line.files, std::cout, std::cerr);
+    if (line.command == Command::Simulate) {
+        return plume::simulateFiles(line.files, line.onlyCase, std::cout, std::cerr);
+    }
     return withLibrary(line);
 }
 

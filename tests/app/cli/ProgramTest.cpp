@@ -53,7 +53,7 @@ INSTANTIATE_TEST_SUITE_P(
                       WrongArguments{{"expand"}, "ABBREVIATION", "plume expand ABBREVIATION"},
                       WrongArguments{{"expand", "a", "b"}, "b", "plume expand ABBREVIATION"},
                       WrongArguments{{"doctor", "--all"}, "--all", "plume doctor"},
-                      WrongArguments{{"simulate"}, "FILE", "plume simulate FILE..."}));
+                      WrongArguments{{"simulate"}, "FILE", "plume simulate FILE... [--case NAME]"}));
 
 TEST(Help, HasExamplesOfEveryKind) {
     const ProgramHome home;
@@ -213,6 +213,11 @@ TEST(Simulate, TellsTheOutcomeAndTheGravestFault) {
     const ProgramResult different = home.run({"simulate", right, other});
     EXPECT_EQ(different.status, 1);
     EXPECT_THAT(different.error, AllOf(HasSubstr("Jo"), HasSubstr("No")));
+
+    const std::string cases = home.write("cases.json", "{" + library + R"(, "cases": [{"name": "right", )" + steps +
+                                                           R"(}, {"name": "other", "expect": {"text": "No"}}]})");
+    EXPECT_EQ(home.run({"simulate", cases}).status, 1);
+    EXPECT_EQ(home.run({"simulate", cases, "--case", "right"}).status, 0);
 
     const ProgramResult faulty = home.run({"simulate", wrong, other, right, "/no/such/file.json"});
     EXPECT_EQ(faulty.status, 2);

@@ -1,4 +1,4 @@
-#include "scenario/ScenarioStage.h"
+#include "scenario/ScenarioRun.h"
 
 #include <algorithm>
 #include <chrono>
@@ -8,7 +8,7 @@ namespace plume {
 
 namespace {
 
-// The scenario's moment moves on with its clock.
+// The date moves on with the scenario's clock.
 std::function<Date()> movingDate(const Scenario& scenario, SimulatedRunLoop& loop) {
     const Date start = scenario.now.value_or(currentDate());
     return [start, &loop] {
@@ -18,9 +18,9 @@ std::function<Date()> movingDate(const Scenario& scenario, SimulatedRunLoop& loo
 
 }  // namespace
 
-ScenarioStage::ScenarioStage(const Scenario& scenario)
+ScenarioRun::ScenarioRun(const Scenario& scenario)
     : scenario_(scenario),
-      loop_(desktop_.runLoop(), {[this] { return stamp(); },
+      loop_(desktop_.runLoop(), {[this] { return visibleChanges(); },
                                  [this] {
                                      if (program_) program_->sender().waitForScripts();
                                  }}),
@@ -40,13 +40,13 @@ ScenarioStage::ScenarioStage(const Scenario& scenario)
     program_->setSnippetGroups(scenario_.library);
     program_->loadPreferences();
     program_->start();
-    // What the program does all day, with or without the user.
-    loop_.waitForNoneOfThese();
+    // What the program has asked for by now are its timers that repeat for good.
+    loop_.markPendingAsRepeating();
 }
 
-ScenarioStage::~ScenarioStage() = default;
+ScenarioRun::~ScenarioRun() = default;
 
-Composition::Ports ScenarioStage::ports() {
+Composition::Ports ScenarioRun::ports() {
     return {desktop_.keyboardTap(),
             desktop_.mouseTap(),
             desktop_.poster(),
@@ -62,7 +62,7 @@ Composition::Ports ScenarioStage::ports() {
             loop_};
 }
 
-Composition::Dependencies ScenarioStage::dependencies() {
+Composition::Dependencies ScenarioRun::dependencies() {
     return {*scenario_.settings,
             [this](const std::string& message) { report(message); },
             [](const std::string&) {},
@@ -76,7 +76,7 @@ Composition::Dependencies ScenarioStage::dependencies() {
             nullptr};
 }
 
-void ScenarioStage::activate(const std::u16string& application) {
+void ScenarioRun::activate(const std::u16string& application) {
     SimulatedApplication& activated = desktop_.activate(application);
     bool isKnown = false;
     activated.setUsesControlKey(applicationSettings_.resolve(application, isKnown)->has(InputFlag::UseControlKey));
@@ -85,22 +85,22 @@ void ScenarioStage::activate(const std::u16string& application) {
     }
 }
 
-void ScenarioStage::report(const std::string& message) {
+void ScenarioRun::report(const std::string& message) {
     const std::lock_guard lock(mutex_);
     errors_.push_back(message);
 }
 
-std::vector<std::string> ScenarioStage::errors() const {
+std::vector<std::string> ScenarioRun::errors() const {
     const std::lock_guard lock(mutex_);
     return errors_;
 }
 
-std::uint64_t ScenarioStage::stamp() const {
+std::uint64_t ScenarioRun::visibleChanges() const {
     auto& desktop = const_cast<SimulatedDesktop&>(desktop_);
-    auto happened = static_cast<std::uint64_t>(desktop.pasteboard().changeCount());
-    happened += desktop.sounds().played().size() + desktop.poster().clicks().size();
-    for (const SimulatedApplication* application : applications_) happened += application->events().size();
-    return happened;
+    auto changes = static_cast<std::uint64_t>(desktop.pasteboard().changeCount());
+    changes += desktop.sounds().played().size() + desktop.poster().clicks().size();
+    for (const SimulatedApplication* application : applications_) changes += application->events().size();
+    return changes;
 }
 
 }  // namespace plume

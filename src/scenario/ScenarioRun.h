@@ -1,6 +1,6 @@
-// A simulated desktop with the whole program on it, set as a scenario says.
+// One run of a scenario: a simulated desktop of its own, set as the scenario says, with the whole program on it.
 //
-// On one thread; scripts alone run on others, and are waited for.
+// On one thread. Only scripts run on others, and the clock waits for them.
 #pragma once
 
 #include <mutex>
@@ -17,12 +17,13 @@
 
 namespace plume {
 
-class ScenarioStage {
+class ScenarioRun {
   public:
-    explicit ScenarioStage(const Scenario& scenario);
-    ~ScenarioStage();
-    ScenarioStage(const ScenarioStage&) = delete;
-    ScenarioStage& operator=(const ScenarioStage&) = delete;
+    // The scenario is not owned and outlives the run.
+    explicit ScenarioRun(const Scenario& scenario);
+    ~ScenarioRun();
+    ScenarioRun(const ScenarioRun&) = delete;
+    ScenarioRun& operator=(const ScenarioRun&) = delete;
 
     SimulatedDesktop& desktop() { return desktop_; }
     ScenarioLoop& loop() { return loop_; }
@@ -41,7 +42,7 @@ class ScenarioStage {
     Composition::Ports ports();
     Composition::Dependencies dependencies();
     void report(const std::string& message);
-    std::uint64_t stamp() const;
+    std::uint64_t visibleChanges() const;
 
     const Scenario& scenario_;
     SimulatedDesktop desktop_;
