@@ -105,44 +105,6 @@ TEST(ScenarioPlayer, ComparesListsAsAWhole) {
     EXPECT_EQ(simulated(R"({"steps": [{"press": 0}], "expect": {"events": []}})").exitStatus, 1);
 }
 
-TEST(ScenarioPlayer, LetsTimePassBetweenKeysAndForWaits) {
-    const std::string times = R"([{"time": 0}, {"time": 0}, {"time": 0.05}, {"time": 0.05}, {"time": 1.05}])";
-    EXPECT_EQ(simulated(R"({"steps": [{"type": "a"}, {"type": "b"}, {"wait": 1}, {"press": 0}],
-                           "expect": {"events": )" +
-                        times + "}}")
-                  .problems,
-              "");
-}
-
-TEST(ScenarioPlayer, DoesNotWaitForTimersThatRepeatForGood) {
-    // The paste comes when a program is in front that pastes with another key: nobody reads it, and the restore, first
-    // tried at 0.9 s, never comes.
-    EXPECT_EQ(simulated(R"({"library": [{"items": [{"abbreviation": "q", "content": "x"}]}], "clipboard": "mine",
-                           "applicationSettings": {
-                             "org.example.editor": {"flags": ["useClipboard", "delayPasting"], "pastingDelay": 0.5},
-                             "org.example.other": {"flags": ["useControlKey"]}},
-                           "steps": [{"type": "q"}, {"wait": 0.1}, {"activate": "org.example.other"}, {"press": 0},
-                                     {"press": 11}, {"press": 8}],
-                           "expect": {"clipboard": "x", "text": "abc", "events": [{"key": 9, "time": 0.5},
-                             {"key": 9, "time": 0.5}, {"key": 0, "time": 0.9}, {"key": 11, "time": 0.95},
-                             {"key": 8, "time": 1.0}]}})")
-                  .problems,
-              "");
-}
-
-TEST(ScenarioPlayer, FillsFormsInWhereRichTextStood) {
-    const std::string library = R"({"library": [{"items": [
-        {"abbreviation": "nn", "contentType": 1, "rtf": "{\\rtf1\\ansi \\b old\\b0 }"},
-        {"abbreviation": "q", "contentType": 1,
-         "rtf": "{\\rtf1\\ansi A \\u12304 ?snippet:nn optional:1\\u12305 ? B}"}]}], )";
-    for (const auto& [form, text] : {std::pair(R"("#0": "EDITED")", "A EDITED B"),
-                                     std::pair(R"("#0": "old")", "A old B"), std::pair("", "A old B")}) {
-        const std::string rest = std::string(R"("steps": [{"type": "q"}, {"form": {)") + form +
-                                 R"(}}], "expect": {"text": ")" + text + "\"}}";
-        EXPECT_EQ(simulated(library + rest).problems, "") << form;
-    }
-}
-
 TEST(ScenarioCases, TakeWholeKeysFromTheFileForThoseThatTheyLeaveOut) {
     const ScenarioReport report = simulated(R"({"about": "shared", "text": "x ", "clipboard": "mine",
         "library": [{"items": [{"abbreviation": "q", "content": "shared"}, {"abbreviation": "r", "content": "R"}]}],
