@@ -110,8 +110,8 @@ void measureSynthesised(DesktopRig& rig, KeyboardPort& port) {
         nanoseconds = medianNanoseconds(5, [&] {
             port.poster().begin();
             for (int i = 0; i < Keys; ++i) {
-                port.poster().post({.keyCode = 0, .flags = 0, .down = true, .text = {}}, false);
-                port.poster().post({.keyCode = 0, .flags = 0, .down = false, .text = {}}, false);
+                port.poster().post({.keyCode = KeyCode::A, .flags = {}, .down = true, .text = {}}, false);
+                port.poster().post({.keyCode = KeyCode::A, .flags = {}, .down = false, .text = {}}, false);
             }
             port.poster().end();
             port.connection().connection().sync();

@@ -28,9 +28,11 @@ class Flags {
     constexpr bool containsAny(Flags flags) const { return (bits_ & flags.bits_) != 0; }
 
     constexpr Flags& operator|=(Flags flags) { return *this = *this | flags; }
+    constexpr Flags& operator-=(Flags flags) { return *this = *this - flags; }
     constexpr Flags& operator&=(Flags flags) { return *this = *this & flags; }
     friend constexpr Flags operator|(Flags a, Flags b) { return fromBits(static_cast<Bits>(a.bits_ | b.bits_)); }
     friend constexpr Flags operator&(Flags a, Flags b) { return fromBits(static_cast<Bits>(a.bits_ & b.bits_)); }
+    friend constexpr Flags operator^(Flags a, Flags b) { return fromBits(static_cast<Bits>(a.bits_ ^ b.bits_)); }
     friend constexpr Flags operator-(Flags a, Flags b) { return fromBits(static_cast<Bits>(a.bits_ & ~b.bits_)); }
     friend constexpr bool operator==(Flags, Flags) = default;
 

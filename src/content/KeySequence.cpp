@@ -6,16 +6,6 @@
 
 namespace plume {
 
-namespace {
-
-constexpr std::uint16_t ReturnKey = 36;
-constexpr std::uint16_t TabKey = 48;
-constexpr std::uint16_t KeypadEnterKey = 76;
-constexpr std::uint16_t FirstArrowKey = 123;
-constexpr std::uint16_t LastArrowKey = 126;
-
-}  // namespace
-
 std::vector<DeliveryStep> deliverySteps(const std::vector<std::shared_ptr<SnippetKeyVariable>>& keys,
                                         std::size_t textLength) {
     std::vector<DeliveryStep> steps;
@@ -34,15 +24,15 @@ std::vector<DeliveryStep> deliverySteps(const std::vector<std::shared_ptr<Snippe
 }
 
 bool isArrowKey(const SnippetKeyVariable& key) {
-    return key.keyCode >= FirstArrowKey && key.keyCode <= LastArrowKey;
+    return key.keyCode >= KeyCode::Left && key.keyCode <= KeyCode::Up;
 }
 
 bool isReturnOrTab(const SnippetKeyVariable& key) {
-    return key.keyCode == ReturnKey || key.keyCode == TabKey;
+    return key.keyCode == KeyCode::Return || key.keyCode == KeyCode::Tab;
 }
 
 bool movesCaret(const SnippetKeyVariable& key) {
-    return isReturnOrTab(key) || key.keyCode == KeypadEnterKey;
+    return isReturnOrTab(key) || key.keyCode == KeyCode::KeypadEnter;
 }
 
 }  // namespace plume

@@ -25,7 +25,7 @@ struct OldPlaceholder {
     std::size_t length = 0;  // in the old text, from the first marker on; 0: none
 };
 
-std::u16string keyBody(View label, std::uint16_t code) {
+std::u16string keyBody(View label, KeyCode code) {
     return SnippetKeyVariable(std::u16string(label), code).toString();
 }
 
@@ -40,22 +40,22 @@ View findKeyword(View text) {
 std::u16string bodyForSign(View keyword) {
     switch (keyword.front()) {
         case u'<':
-            return keyBody(u"\u2190", 123);
+            return keyBody(u"\u2190", KeyCode::Left);
         case u'^':
-            return keyBody(u"\u2191", 126);
+            return keyBody(u"\u2191", KeyCode::Up);
         case u'>':
-            return keyBody(u"\u2192", 124);
+            return keyBody(u"\u2192", KeyCode::Right);
         case u'v':
-            return keyBody(u"\u2193", 125);
+            return keyBody(u"\u2193", KeyCode::Down);
         default:  // the clipboard and the caret, written as before
             return std::u16string(keyword);
     }
 }
 
 std::u16string bodyForKey(View name) {
-    if (name == u"enter") return keyBody(u"\u21A9", 36);
-    if (name == u"tab") return keyBody(u"\u21E5", 48);
-    if (name == u"esc") return keyBody(u"\u238B", 53);
+    if (name == u"enter") return keyBody(u"\u21A9", KeyCode::Return);
+    if (name == u"tab") return keyBody(u"\u21E5", KeyCode::Tab);
+    if (name == u"esc") return keyBody(u"\u238B", KeyCode::Escape);
     return u"key:(null) code:0";
 }
 

@@ -8,21 +8,11 @@
 #include <vector>
 
 #include "content/SnippetExpandedContent.h"
+#include "content/SnippetTrigger.h"
 
 namespace plume {
 
 struct ContextInputSetting;
-
-// Why an output is made: a set of bits.
-namespace SnippetTrigger {
-inline constexpr std::uint32_t Direct = 1;
-inline constexpr std::uint32_t Typed = 2;
-inline constexpr std::uint32_t Suggestion = 4;
-inline constexpr std::uint32_t Digit = 8;
-inline constexpr std::uint32_t FromSeveralMatches = 16;
-inline constexpr std::uint32_t ScriptResult = 32;
-inline constexpr std::uint32_t HotKey = 64;
-}  // namespace SnippetTrigger
 
 class PLOutput {
   public:
@@ -30,7 +20,7 @@ class PLOutput {
     using Fragment = std::variant<std::u16string, AttributedString, std::shared_ptr<SnippetKeyVariable>>;
 
     std::shared_ptr<const ContextInputSetting> contextInputSetting;
-    std::uint32_t trigger = 0;
+    SnippetTriggers trigger;
     bool cancelTrigger = false;  // the triggering key is not passed on
     std::uint64_t backspaceCount = 0;
     std::uint64_t leftArrowCount = 0;

@@ -16,9 +16,10 @@ namespace {
 
 struct Arrow {
     char16_t character;
-    std::uint16_t keyCode;
+    KeyCode keyCode;
 };
-constexpr Arrow Arrows[] = {{u'\u25C0', 123}, {u'\u25B2', 126}, {u'\u25B6', 124}, {u'\u25BC', 125}};
+constexpr Arrow Arrows[] = {
+    {u'\u25C0', KeyCode::Left}, {u'\u25B2', KeyCode::Up}, {u'\u25B6', KeyCode::Right}, {u'\u25BC', KeyCode::Down}};
 
 // An arrow is located by its place in the table, at the very start of the content, wherever it was written.
 std::shared_ptr<SnippetVariable> arrowKey(char16_t character) {

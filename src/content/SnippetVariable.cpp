@@ -9,19 +9,19 @@
 namespace plume {
 namespace {
 
-constexpr std::uint64_t ShiftBit = 0x20000;
-constexpr std::uint64_t ControlBit = 0x40000;
-constexpr std::uint64_t OptionBit = 0x80000;
-constexpr std::uint64_t CommandBit = 0x100000;
-
 constexpr std::int64_t DefaultWidth = 30;
 constexpr std::int64_t DefaultHeight = 5;
 
 // A code that no keyboard has must not press some other key: it counts as no key.
-std::uint16_t keyCodeParam(const VariableParams& params) {
-    if (!params.contains(u"code")) return SnippetKeyVariable::NoKey;
+KeyCode keyCodeParam(const VariableParams& params) {
+    if (!params.contains(u"code")) return KeyCode::None;
     const std::int64_t code = integerParam(params, u"code");
-    return code < 0 || code > SnippetKeyVariable::NoKey ? SnippetKeyVariable::NoKey : static_cast<std::uint16_t>(code);
+    return code < 0 || code > numberOf(KeyCode::None) ? KeyCode::None : KeyCode{static_cast<std::uint16_t>(code)};
+}
+
+EventFlags modifiersParam(const VariableParams& params) {
+    return EventFlags::fromBits(
+        static_cast<std::uint64_t>(std::max<std::int64_t>(integerParam(params, u"modifiers"), 0)));
 }
 
 std::uint64_t countParam(const VariableParams& params) {
@@ -96,29 +96,28 @@ SnippetKeyVariable::SnippetKeyVariable(const VariableParams& params)
       keyCode(keyCodeParam(params)),
       count(countParam(params)),
       delay(delayParam(params)),
-      modifiers(static_cast<std::uint64_t>(std::max<std::int64_t>(integerParam(params, u"modifiers"), 0))) {}
+      modifiers(modifiersParam(params)) {}
 
-SnippetKeyVariable::SnippetKeyVariable(std::u16string label, std::uint16_t code)
-    : key(std::move(label)), keyCode(code) {}
+SnippetKeyVariable::SnippetKeyVariable(std::u16string label, KeyCode code) : key(std::move(label)), keyCode(code) {}
 
 bool SnippetKeyVariable::shift() const {
-    return (modifiers & ShiftBit) != 0;
+    return modifiers.contains(EventFlag::Shift);
 }
 bool SnippetKeyVariable::control() const {
-    return (modifiers & ControlBit) != 0;
+    return modifiers.contains(EventFlag::Control);
 }
 bool SnippetKeyVariable::option() const {
-    return (modifiers & OptionBit) != 0;
+    return modifiers.contains(EventFlag::Option);
 }
 bool SnippetKeyVariable::command() const {
-    return (modifiers & CommandBit) != 0;
+    return modifiers.contains(EventFlag::Command);
 }
 
 std::u16string SnippetKeyVariable::toString() const {
     BodyWriter writer;
     writer.param(u"key", key.value_or(std::u16string()));
-    writer.param(u"code", keyCode);
-    if (modifiers != 0) writer.unsignedParam(u"modifiers", modifiers);
+    writer.param(u"code", numberOf(keyCode));
+    if (!modifiers.isEmpty()) writer.unsignedParam(u"modifiers", modifiers.bits());
     if (count >= 2) writer.unsignedParam(u"count", count);
     if (delay > 0) writer.param(u"delay", textFromDelay(delay));
     return writer.take();

@@ -12,6 +12,8 @@
 #include <optional>
 #include <string>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/text/AttributedString.h"
 
 namespace plume {
@@ -87,7 +89,6 @@ class SnippetFieldVariable final : public SnippetVariable {
 // A key pressed in the middle of the text.
 class SnippetKeyVariable final : public SnippetVariable {
   public:
-    static constexpr std::uint16_t NoKey = 65535;
     // What a body may ask for at most; more is brought down to it when it is read.
     static constexpr std::uint64_t MaximumCount = 10'000;
     static constexpr double MaximumDelay = 24 * 60 * 60;
@@ -95,7 +96,7 @@ class SnippetKeyVariable final : public SnippetVariable {
     SnippetKeyVariable() = default;
     // A code outside 16 bits is no key; a count below 1 or unreadable is 1; a negative or unreadable delay is 0.
     explicit SnippetKeyVariable(const VariableParams& params);
-    SnippetKeyVariable(std::u16string label, std::uint16_t code);
+    SnippetKeyVariable(std::u16string label, KeyCode code);
     std::u16string toString() const override;
 
     bool shift() const;
@@ -104,10 +105,10 @@ class SnippetKeyVariable final : public SnippetVariable {
     bool command() const;
 
     Text key;  // the label shown to the user
-    std::uint16_t keyCode = NoKey;
+    KeyCode keyCode = KeyCode::None;
     std::uint64_t count = 1;
-    double delay = 0;             // seconds
-    std::uint64_t modifiers = 0;  // event flag bits
+    double delay = 0;  // seconds
+    EventFlags modifiers;
 };
 
 // The clipboard's content, after find-and-replace.

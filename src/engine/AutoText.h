@@ -105,7 +105,7 @@ class AutoText final : public EngineState {
     // Sends the selected entry.
     void acceptSuggestion();
     // An index past the end closes the list.
-    void sendSuggestionAtIndex(std::size_t index, std::uint32_t snippetTrigger);
+    void sendSuggestionAtIndex(std::size_t index, SnippetTriggers snippetTrigger);
 
     // ---- Quick search ----
     bool snippetQuickSearchWindowVisible() const;
@@ -129,7 +129,7 @@ class AutoText final : public EngineState {
     Route spacePressed(const ZDKeyEventArgs& event);
 
     // The modifier set that picks entries; nothing when the setting names none.
-    std::optional<std::int32_t> selectorModifiers() const;
+    std::optional<KeyModifiers> selectorModifiers() const;
     void processSelectorKey(ZDKeyEventArgs& event);
     bool processSnippetSelectorHotKey(char16_t digit);
 

@@ -106,11 +106,11 @@ AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
     return Route::Done;
 }
 
-std::optional<std::int32_t> AutoText::selectorModifiers() const {
+std::optional<KeyModifiers> AutoText::selectorModifiers() const {
     constexpr std::int64_t lastModifier = 31;
     if (snippetSelectorKeyModifier_ < 0 || snippetSelectorKeyModifier_ > lastModifier) return std::nullopt;
-    if (snippetSelectorKeyModifier_ == 0) return 0;
-    return std::int32_t{1} << (snippetSelectorKeyModifier_ - 1);
+    if (snippetSelectorKeyModifier_ == 0) return KeyModifiers();
+    return KeyModifiers::fromBits(std::int32_t{1} << (snippetSelectorKeyModifier_ - 1));
 }
 
 void AutoText::processSelectorKey(ZDKeyEventArgs& event) {
@@ -119,8 +119,8 @@ void AutoText::processSelectorKey(ZDKeyEventArgs& event) {
 
     char16_t character = event.c;
     // These two change what the key produces; the digit is what it would be without them.
-    if ((service.keyModifier() & (KeyModifier::Shift | KeyModifier::Option)) != 0) {
-        const std::optional<std::u16string> plain = service.stringForKeyCode(event.key, 0);
+    if (service.keyModifier().containsAny(KeyModifier::Shift | KeyModifier::Option)) {
+        const std::optional<std::u16string> plain = service.stringForKeyCode(event.key, {});
         character = plain && !plain->empty() ? plain->front() : u'\0';
     }
     if (isDigit(character)) event.cancel = processSnippetSelectorHotKey(character);

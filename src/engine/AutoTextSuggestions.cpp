@@ -60,7 +60,7 @@ void AutoText::snippetSuggestionSuggestionSelected() {
     sendSuggestionAtIndex(snippetSuggestionController_->selectedSuggestionIndex(), SnippetTrigger::Digit);
 }
 
-void AutoText::sendSuggestionAtIndex(std::size_t index, std::uint32_t snippetTrigger) {
+void AutoText::sendSuggestionAtIndex(std::size_t index, SnippetTriggers snippetTrigger) {
     if (selectingSnippet_) snippetTrigger |= SnippetTrigger::FromSeveralMatches;
     if (index >= suggestions_.size()) {
         hideSnippetSuggestion();

@@ -17,14 +17,14 @@ ExpandTrigger expandTriggerOf(const Snippet& snippet) {
 }
 
 // What stands in the text of the abbreviation, and of the key that triggered it, and has to go.
-std::uint64_t backspaceCount(std::size_t typedLength, ExpandTrigger expandTrigger, std::uint32_t snippetTrigger) {
+std::uint64_t backspaceCount(std::size_t typedLength, ExpandTrigger expandTrigger, SnippetTriggers snippetTrigger) {
     if (expandTrigger == ExpandTrigger::Immediately) {
         // The last key of the abbreviation is being swallowed: the application never got it.
         return snippetTrigger == SnippetTrigger::Typed && typedLength > 0 ? typedLength - 1 : typedLength;
     }
     // The delimiter went through when the list of matches opened.
     const bool delimiterStands =
-        (snippetTrigger & SnippetTrigger::FromSeveralMatches) != 0 && expandTrigger != ExpandTrigger::HotKey;
+        snippetTrigger.contains(SnippetTrigger::FromSeveralMatches) && expandTrigger != ExpandTrigger::HotKey;
     return delimiterStands ? typedLength + 1 : typedLength;
 }
 
@@ -56,7 +56,7 @@ struct SendingPipeline::Delivery {
     EngineState& engine;
     std::shared_ptr<Snippet> snippet;
     std::u16string typed;
-    std::uint32_t snippetTrigger;
+    SnippetTriggers snippetTrigger;
     ExpandTrigger expandTrigger;
     Expansion content;
     Output output;
@@ -72,7 +72,7 @@ SendingPipeline::SendingPipeline(Dependencies dependencies) : dependencies_(std:
 SendingPipeline::~SendingPipeline() = default;
 
 bool SendingPipeline::sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                                  const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) {
+                                  const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) {
     engine.clear();
     const Expansion content = dependencies_.snippetParser.parseSnippet(snippet, engine.snippetGroups());
     if (!content) return false;
@@ -133,7 +133,7 @@ void SendingPipeline::sendAtOnce(const Delivery& delivery) {
 }
 
 void SendingPipeline::sendContent(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                                  const Expansion& content, std::uint32_t snippetTrigger, Output output) {
+                                  const Expansion& content, SnippetTriggers snippetTrigger, Output output) {
     lastUsedSnippet_ = snippet;
     switch (snippet->contentType()) {
         case ContentType::PlainText:

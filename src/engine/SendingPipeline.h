@@ -44,7 +44,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
     SendingPipeline& operator=(const SendingPipeline&) = delete;
 
     bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                     const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) override;
+                     const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) override;
     bool undo(EngineState& engine, bool withTrigger) override;
 
     // The snippet sent last, as long as it exists; else null.
@@ -76,7 +76,7 @@ class SendingPipeline final : public SnippetSender, private FieldsEditor::Target
 
     // By content type. Without an output, as after a form, one is made for the trigger.
     void sendContent(EngineState& engine, const std::shared_ptr<Snippet>& snippet, const Expansion& content,
-                     std::uint32_t snippetTrigger, Output output);
+                     SnippetTriggers snippetTrigger, Output output);
     void sendText(EngineState& engine, const Expansion& content, Output output);
     void runScriptSnippet(EngineState& engine, const Snippet& snippet, const Expansion& content, const Output& output);
     void onScriptExecuted(EngineState& engine, const PLScript& script);

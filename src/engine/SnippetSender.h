@@ -4,11 +4,11 @@
 // the key callback: what takes longer goes on after the call has returned.
 #pragma once
 
-#include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
 
+#include "content/SnippetTrigger.h"
 #include "engine/EngineState.h"
 #include "library/Snippet.h"
 
@@ -19,10 +19,10 @@ class SnippetSender {
     virtual ~SnippetSender() = default;
 
     // `abbreviation` is the text that was typed for the snippet and is erased, nothing when it was chosen in another
-    // way; `snippetTrigger` is a set of SnippetTrigger bits. Clears the engine first, and may fill its buffer with what
+    // way. Clears the engine first, and may fill its buffer with what
     // now stands before the caret. Whether the key that triggered it must be swallowed; false when nothing was sent.
     virtual bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                             const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) = 0;
+                             const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) = 0;
 
     // Takes the last expansion back, as the engine's record tells, and types what stood there before; with or without
     // the key that triggered it. False when there is no record.

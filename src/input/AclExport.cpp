@@ -2,7 +2,8 @@
 
 #include <utility>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "input/delivery/KeySender.h"
 
 namespace plume {

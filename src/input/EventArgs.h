@@ -15,7 +15,7 @@ struct ZDCancelEventArgs {
 };
 
 struct ZDKeyEventArgs : ZDCancelEventArgs {
-    std::uint16_t key = 0;            // virtual key code
+    KeyCode key = KeyCode::None;
     char16_t c = 0;                   // first unit of `s`; 0 when there is none
     std::optional<std::u16string> s;  // what the key produces
 };

@@ -3,17 +3,19 @@
 
 #include <cstdint>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 
 namespace plume {
 
 struct GeneralHotKey {
-    std::int32_t modifiers = 0;            // KeyModifier bits
-    std::int32_t keyCode = KeyCode::None;  // None: the modifiers alone
+    KeyModifiers modifiers;
+    KeyCode keyCode = KeyCode::None;  // None: the modifiers alone
 
-    bool isValid() const { return modifiers != 0 || keyCode != KeyCode::None; }
+    bool isValid() const { return !modifiers.isEmpty() || keyCode != KeyCode::None; }
 
-    // The form kept in the settings: the modifiers in the upper, the key code in the lower 32 bits.
+    // The form kept in the settings: the modifiers in the upper, the key code in the lower 32 bits. A code
+    // that is none makes an invalid hot key.
     std::int64_t getValue() const;
     void setValue(std::int64_t packed);
 

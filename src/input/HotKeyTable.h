@@ -22,20 +22,20 @@ class HotKeyTable {
     void unregisterHotKey(const GeneralHotKey& hotKey);
 
     // A key went down; whether a hot key swallows it.
-    bool keyDown(std::uint16_t keyCode);
-    // The held modifiers are these from now on (KeyModifier bits); whether a hot key swallows the change.
-    bool modifiersChanged(std::int32_t modifiers);
+    bool keyDown(KeyCode keyCode);
+    // The held modifiers are these from now on; whether a hot key swallows the change.
+    bool modifiersChanged(KeyModifiers modifiers);
     // The modifiers held now have served their purpose: their release is no hot key.
     void ignoreNextHotKey() { dontCheckHotKeysOnKeyUp_ = true; }
     // Whether to swallow the key; KeyCode::None asks for the held modifiers alone.
-    bool checkHotKeys(std::uint16_t keyCode);
+    bool checkHotKeys(KeyCode keyCode);
 
-    std::int32_t keyModifier() const { return keyModifier_; }
+    KeyModifiers keyModifier() const { return keyModifier_; }
 
   private:
     ZDEvent<ZDHotKeysPressedEventArgs>& hotKeysPressed_;
     std::vector<GeneralHotKey> hotKeys_;
-    std::int32_t keyModifier_ = 0;
+    KeyModifiers keyModifier_;
     bool dontCheckHotKeysOnKeyUp_ = false;
 };
 

@@ -30,13 +30,13 @@ class InputService {
 
     virtual ~InputService() = default;
 
-    // The modifiers held now (KeyModifier bits).
-    virtual std::int32_t keyModifier() const = 0;
+    // The modifiers held now.
+    virtual KeyModifiers keyModifier() const = 0;
     // The last key went to Plume itself.
     virtual bool isSameProcess() const = 0;
     virtual ProcessSerialNumber lastProcessReceivedKeyEvent() const = 0;
     // What a key code produces with the modifiers of these event flags.
-    virtual std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const = 0;
+    virtual std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const = 0;
     // What the last key produced; nothing when it produced nothing.
     virtual const std::optional<std::u16string>& lastKeyString() const = 0;
 

@@ -9,7 +9,6 @@ namespace {
 
 constexpr std::size_t TimeoutsToGiveUp = 3;
 constexpr double TimeoutPeriod = 60;  // seconds
-constexpr std::uint64_t ModifierFlags = EventFlag::Shift | EventFlag::Control | EventFlag::Option | EventFlag::Command;
 
 }  // namespace
 
@@ -98,7 +97,7 @@ void MacInputService::tapDisabledByTimeout() {
     around_.log("Event tap was disabled by timeout");
     delivery_.abandon();
     // What becomes of the modifiers meanwhile is no hot key.
-    if (hotKeys_.keyModifier() != 0) hotKeys_.ignoreNextHotKey();
+    if (!hotKeys_.keyModifier().isEmpty()) hotKeys_.ignoreNextHotKey();
     const double now = around_.tapLoop.now();
     std::erase_if(timeouts_, [&](double moment) { return now - moment >= TimeoutPeriod; });
     timeouts_.push_back(now);
@@ -127,12 +126,12 @@ void MacInputService::layoutChanged() {
 Result<void> MacInputService::registerSystemHotKey(SystemHotKeys::Id id, const GeneralHotKey& hotKey,
                                                    std::function<void()> pressed) {
     around_.systemHotKeys.unregisterHotKey(id);
-    const auto keyCode = static_cast<std::uint16_t>(hotKey.keyCode);
-    if (keyCode == KeyCode::None) return {};
-    return around_.systemHotKeys.registerHotKey(id, keyCode, hotKey.modifiers, [this, pressed = std::move(pressed)] {
-        ignoreNextHotKey();
-        pressed();
-    });
+    if (hotKey.keyCode == KeyCode::None) return {};
+    return around_.systemHotKeys.registerHotKey(id, hotKey.keyCode, hotKey.modifiers,
+                                                [this, pressed = std::move(pressed)] {
+                                                    ignoreNextHotKey();
+                                                    pressed();
+                                                });
 }
 
 void MacInputService::setRestoreClipboardDelay(double seconds) {
@@ -171,7 +170,7 @@ bool MacInputService::isSameProcess() const {
     return lastProcessReceivedKeyEvent_ == around_.processManager.currentProcess();
 }
 
-std::optional<std::u16string> MacInputService::stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const {
+std::optional<std::u16string> MacInputService::stringForKeyCode(KeyCode keyCode, EventFlags flags) const {
     auto text = around_.inputSources.translateKey(keyCode, flags & ModifierFlags);
     if (text && text->size() > 1) text->resize(1);
     return text;

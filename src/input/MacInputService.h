@@ -87,7 +87,7 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     // The release of the modifiers held now is no hot key.
     void ignoreNextHotKey() { hotKeys_.ignoreNextHotKey(); }
     // Whether to swallow the key; KeyCode::None checks the held modifiers alone.
-    bool checkHotKeys(std::uint16_t keyCode) { return hotKeys_.checkHotKeys(keyCode); }
+    bool checkHotKeys(KeyCode keyCode) { return hotKeys_.checkHotKeys(keyCode); }
     // A hot key that the system recognises, in place of the previous one under this id; one without a key is none. The
     // error says what is in the way.
     Result<void> registerSystemHotKey(SystemHotKeys::Id id, const GeneralHotKey& hotKey, std::function<void()> pressed);
@@ -122,10 +122,10 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     // Every output has been delivered.
     bool isIdle() const { return delivery_.isIdle(); }
 
-    std::int32_t keyModifier() const override { return hotKeys_.keyModifier(); }
+    KeyModifiers keyModifier() const override { return hotKeys_.keyModifier(); }
     bool isSameProcess() const override;
     ProcessSerialNumber lastProcessReceivedKeyEvent() const override { return lastProcessReceivedKeyEvent_; }
-    std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const override;
+    std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const override;
     const std::optional<std::u16string>& lastKeyString() const override { return lastKeyString_; }
     const std::optional<std::u16string>& contextBundleIdentifier() const override;
     std::shared_ptr<const ContextInputSetting> refreshContextInputSetting() override;
@@ -167,9 +167,9 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     std::atomic<bool> keyUpObserved_ = false;
     bool active_ = false;
     bool listenMouseDownEvents_ = false;
-    std::optional<std::uint16_t> lastKeyCode_;
+    std::optional<KeyCode> lastKeyCode_;
     std::optional<std::u16string> lastKeyString_;
-    std::uint16_t canceledKeyCode_ = KeyCode::None;  // its key down was swallowed, its key up will be
+    KeyCode canceledKeyCode_ = KeyCode::None;  // its key down was swallowed, its key up will be
     ProcessSerialNumber lastProcessReceivedKeyEvent_;
     bool isLastProcessReceivedKeyEventNull_ = true;
     std::deque<double> timeouts_;  // when the tap was lost, within the last minute

@@ -64,7 +64,7 @@ void MacInputService::readKey(const TapEvent& event, ZDKeyEventArgs& key) const 
         key.c = key.s->front();
     } else if (event.command) {
         // It is told by the character on its key.
-        const auto name = stringForKeyCode(event.keyCode, 0);
+        const auto name = stringForKeyCode(event.keyCode, {});
         if (name && !name->empty()) key.c = name->front();
     }
 }
@@ -81,9 +81,9 @@ bool MacInputService::keyUp(const ZDKeyEventArgs& key) {
 bool MacInputService::keyDown(ZDKeyEventArgs& key, bool isCommand) {
     bool swallow = hotKeys_.keyDown(key.key);
     if (!swallow) {
-        const std::int32_t held = keyModifier();
-        const bool isShortcut = isCommand || (held & (KeyModifier::Control | KeyModifier::Command)) != 0;
-        const bool deletesWord = (held & KeyModifier::Option) != 0 && key.c == u'\b';
+        const KeyModifiers held = keyModifier();
+        const bool isShortcut = isCommand || held.containsAny(KeyModifier::Control | KeyModifier::Command);
+        const bool deletesWord = held.contains(KeyModifier::Option) && key.c == u'\b';
         if (isShortcut || deletesWord) {
             swallow = unregisteredHotKey(key);
         } else {

@@ -4,13 +4,13 @@
 // regenerates the map when that changes.
 #pragma once
 
-#include <cstdint>
 #include <functional>
 #include <map>
 #include <optional>
 #include <string>
 #include <string_view>
 
+#include "Foundation/KeyCode.h"
 #include "platform/InputSources.h"
 
 namespace plume {
@@ -26,17 +26,17 @@ class SRKeyCodeTransformer {
     // The input sources are not owned and outlive the transformer.
     explicit SRKeyCodeTransformer(const InputSources& inputSources, KeyNameTexts texts = {});
 
-    // Nothing for a key that has no name, and for a code that is negative as 16 bits.
-    std::optional<std::u16string> transformedValue(std::int64_t keyCode) const;
-    std::optional<std::uint16_t> reverseTransformedValue(std::u16string_view name) const;
+    // Nothing for a key that has no name, or a code of 32768 and above.
+    std::optional<std::u16string> transformedValue(KeyCode keyCode) const;
+    std::optional<KeyCode> reverseTransformedValue(std::u16string_view name) const;
     // KeyCode::None for an unknown name.
-    std::uint16_t keyCodeForString(std::u16string_view name) const;
+    KeyCode keyCodeForString(std::u16string_view name) const;
     void regenerateStringToKeyCodeMapping();
 
   private:
     const InputSources& inputSources_;
     KeyNameTexts texts_;
-    std::map<std::u16string, std::uint16_t, std::less<>> keyCodes_;
+    std::map<std::u16string, KeyCode, std::less<>> keyCodes_;
 };
 
 }  // namespace plume

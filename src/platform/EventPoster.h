@@ -4,27 +4,28 @@
 // was posted reaches the program in front in that order, and the tap never reports it as typed.
 #pragma once
 
-#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "platform/Accessibility.h"
 
 namespace plume {
 
 // One key going down or up: a key by its code, or, with a text, a key that produces just that text.
 struct SynthesisedKey {
-    std::uint16_t keyCode = 0;
-    std::uint64_t flags = 0;  // event flag bits of the held modifiers
+    KeyCode keyCode = KeyCode::None;
+    EventFlags flags = {};  // of the held modifiers
     bool down = true;
     std::u16string_view text;
 };
 
 // A key with modifiers that does what a command does.
 struct CommandKeystroke {
-    std::uint16_t keyCode = 0;
-    std::uint64_t flags = 0;
+    KeyCode keyCode = KeyCode::None;
+    EventFlags flags = {};
 
     bool operator==(const CommandKeystroke&) const = default;
 };
@@ -42,7 +43,7 @@ class EventPoster {
     virtual bool canType(std::u16string_view text) const = 0;
 
     // Whether the user holds this key now.
-    virtual bool isKeyDown(std::uint16_t keyCode) const = 0;
+    virtual bool isKeyDown(KeyCode keyCode) const = 0;
 
     // What pastes and copies in the program in front where that is not the usual keystroke (terminals), else nothing.
     virtual std::optional<CommandKeystroke> pasteKeystroke() const = 0;

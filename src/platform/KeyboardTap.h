@@ -5,9 +5,10 @@
 // enable().
 #pragma once
 
-#include <cstdint>
 #include <string_view>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/Result.h"
 
 namespace plume {
@@ -17,8 +18,8 @@ struct TapEvent {
     enum class Type { KeyDown, KeyUp, FlagsChanged };
 
     Type type = Type::KeyDown;
-    std::uint16_t keyCode = 0;
-    std::uint64_t flags = 0;     // event flag bits of the modifiers held; for FlagsChanged: from now on
+    KeyCode keyCode = KeyCode::None;
+    EventFlags flags = {};       // the modifiers held; for FlagsChanged: from now on
     std::u16string_view string;  // what the key produces, at most 10 units; valid during the call
     // Part of a sequence of keys that has produced nothing yet: what the key would produce by itself does not count.
     bool composing = false;

@@ -4,6 +4,8 @@
 #include <cstdint>
 #include <functional>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/Result.h"
 
 namespace plume {
@@ -14,9 +16,8 @@ class SystemHotKeys {
     using Id = std::uint32_t;
 
     virtual ~SystemHotKeys() = default;
-    // In place of what was registered under this id. `modifiers` is a set of 1 Shift, 2 Control, 4 Option, 8 Command.
-    // The error says who or what is in the way.
-    virtual Result<void> registerHotKey(Id id, std::uint16_t keyCode, std::int32_t modifiers,
+    // In place of what was registered under this id. The error says who or what is in the way.
+    virtual Result<void> registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers,
                                         std::function<void()> handler) = 0;
     // Nothing registered under the id is no error.
     virtual void unregisterHotKey(Id id) = 0;

@@ -26,15 +26,15 @@ struct TypeStep {
     std::u16string text;
 };
 struct KeyStep {
-    std::uint16_t keyCode = 0;
-    std::int32_t modifiers = 0;  // KeyModifier bits
+    KeyCode keyCode = KeyCode::None;
+    KeyModifiers modifiers;
     std::int64_t count = 1;
 };
 struct PressStep {
-    std::uint16_t keyCode = 0;
+    KeyCode keyCode = KeyCode::None;
 };
 struct ReleaseStep {
-    std::uint16_t keyCode = 0;
+    KeyCode keyCode = KeyCode::None;
 };
 struct HotKeyStep {
     GeneralHotKey hotKey;

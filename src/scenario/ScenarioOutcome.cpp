@@ -2,8 +2,9 @@
 
 #include <cmath>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/Strings.h"
-#include "input/KeyCodes.h"
 #include "ports/simulated/SimulatedModifiers.h"
 #include "scenario/ScenarioRun.h"
 
@@ -13,7 +14,6 @@ namespace {
 
 using Json = nlohmann::ordered_json;
 
-constexpr std::uint16_t KeyV = 9;
 // Times are written and compared to the microsecond: sums of delays are not exact beyond it.
 constexpr double Microseconds = 1e6;
 
@@ -21,12 +21,12 @@ Json textOrNull(const std::optional<std::u16string>& text) {
     return text ? Json(toUtf8(*text)) : Json();
 }
 
-Json modifierNames(std::uint64_t flags) {
+Json modifierNames(EventFlags flags) {
     Json names = Json::array();
-    if ((flags & EventFlag::Shift) != 0) names.push_back("shift");
-    if ((flags & EventFlag::Control) != 0) names.push_back("control");
-    if ((flags & EventFlag::Option) != 0) names.push_back("option");
-    if ((flags & EventFlag::Command) != 0) names.push_back("command");
+    if (flags.contains(EventFlag::Shift)) names.push_back("shift");
+    if (flags.contains(EventFlag::Control)) names.push_back("control");
+    if (flags.contains(EventFlag::Option)) names.push_back("option");
+    if (flags.contains(EventFlag::Command)) names.push_back("command");
     return names;
 }
 
@@ -35,7 +35,7 @@ Json written(const SimulatedKeyEvent& event) {
     json["time"] = std::round(event.time * Microseconds) / Microseconds;
     json["origin"] = event.origin == SimulatedKeyEvent::Origin::User ? "user" : "plume";
     if (event.keyCode) {
-        json["key"] = *event.keyCode;
+        json["key"] = numberOf(*event.keyCode);
         json["down"] = event.down;
         json["modifiers"] = modifierNames(event.flags);
     } else {
@@ -73,20 +73,20 @@ struct Counts {
     std::int64_t chunks = 0;
 
     void add(const std::vector<SimulatedKeyEvent>& received) {
-        std::uint64_t held = 0;  // modifiers that Plume pressed as keys
+        EventFlags held;  // modifiers that Plume pressed as keys
         for (const SimulatedKeyEvent& event : received) {
             if (event.origin != SimulatedKeyEvent::Origin::Plume) continue;
-            const std::uint64_t modifier = event.keyCode ? modifierFlagOf(*event.keyCode) : 0;
-            held = event.down ? held | modifier : held & ~modifier;
+            const EventFlags modifier = event.keyCode ? modifierFlagOf(*event.keyCode) : EventFlags();
+            held = event.down ? held | modifier : held - modifier;
             if (event.down) add(event, event.flags | held);
         }
     }
-    void add(const SimulatedKeyEvent& press, std::uint64_t flags) {
+    void add(const SimulatedKeyEvent& press, EventFlags flags) {
         ++events;
         if (!press.keyCode) ++chunks;
         if (press.keyCode == KeyCode::Delete) ++backspaces;
         if (press.keyCode == KeyCode::Left) ++leftArrows;
-        if (press.keyCode == KeyV && (flags & (EventFlag::Control | EventFlag::Command)) != 0) ++pastes;
+        if (press.keyCode == KeyCode::V && flags.containsAny(EventFlag::Control | EventFlag::Command)) ++pastes;
     }
 };
 

@@ -67,10 +67,8 @@ class Player {
     }
     Result<void> perform(const HotKeyStep& step) {
         beforeKey();
-        desktop_.pressCombination(step.hotKey.modifiers,
-                                  step.hotKey.keyCode == KeyCode::None
-                                      ? std::nullopt
-                                      : std::optional(static_cast<std::uint16_t>(step.hotKey.keyCode)));
+        const auto [modifiers, keyCode] = step.hotKey;
+        desktop_.pressCombination(modifiers, keyCode == KeyCode::None ? std::nullopt : std::optional(keyCode));
         return {};
     }
     Result<void> perform(const WaitStep& step) {

@@ -75,7 +75,7 @@ std::shared_ptr<const ContextInputSetting> readApplicationSetting(const JsonNode
     const JsonObject object = node.object({"flags", "pastingDelay", "afterPastingDelay", "blockLength"});
     auto setting = std::make_shared<ContextInputSetting>();
     object.whenSet("flags", [&](const JsonNode& n) {
-        for (const JsonNode& element : n.elements()) setting->flags.set(flag(element));
+        for (const JsonNode& element : n.elements()) setting->flags |= flag(element);
     });
     object.whenSet("pastingDelay", [&](const JsonNode& n) { setting->pastingDelay = n.number(0, LongestDelay); });
     object.whenSet("afterPastingDelay",

@@ -14,7 +14,7 @@ constexpr double LongestWait = 24 * 60 * 60;  // seconds
 
 struct NamedModifier {
     std::string_view name;
-    std::int32_t modifier;
+    KeyModifier modifier;
 };
 
 constexpr auto Modifiers = std::to_array<NamedModifier>({
@@ -24,7 +24,7 @@ constexpr auto Modifiers = std::to_array<NamedModifier>({
     {"command", KeyModifier::Command},
 });
 
-std::int32_t modifier(const JsonNode& node) {
+KeyModifier modifier(const JsonNode& node) {
     const std::string name = toUtf8(node.string());
     for (const NamedModifier& named : Modifiers) {
         if (named.name == name) return named.modifier;
@@ -32,8 +32,8 @@ std::int32_t modifier(const JsonNode& node) {
     node.fail("expected one of shift control option command");
 }
 
-std::uint16_t keyCode(const JsonNode& node) {
-    return static_cast<std::uint16_t>(node.integer(0, LastKeyCode));
+KeyCode keyCode(const JsonNode& node) {
+    return KeyCode{static_cast<std::uint16_t>(node.integer(0, LastKeyCode))};
 }
 
 KeyStep readKeyStep(const JsonNode& node) {

@@ -30,7 +30,8 @@ std::string describe(const SnippetVariable& variable) {
     if (const auto* field = dynamic_cast<const SnippetFieldVariable*>(&variable)) {
         text = describeField(*field);
     } else if (const auto* key = dynamic_cast<const SnippetKeyVariable*>(&variable)) {
-        text = "key" + std::to_string(key->keyCode) + (key->count == 1 ? "" : "x" + std::to_string(key->count));
+        text =
+            "key" + std::to_string(numberOf(key->keyCode)) + (key->count == 1 ? "" : "x" + std::to_string(key->count));
     } else if (dynamic_cast<const SnippetContentCaret*>(&variable) != nullptr) {
         text = "caret";
     } else if (const auto* nested = dynamic_cast<const SnippetAbbreviationVariable*>(&variable)) {

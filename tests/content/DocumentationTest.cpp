@@ -98,10 +98,10 @@ std::string shown(const SnippetFieldVariable& field) {
 
 std::string shown(const SnippetKeyVariable& key) {
     std::ostringstream text;
-    text << "⟨key " << key.keyCode;
+    text << "⟨key " << numberOf(key.keyCode);
     if (key.count != 1) text << ", " << key.count << " times";
     if (key.delay > 0) text << ", after " << key.delay << " s";
-    if (key.modifiers != 0) text << ", modifiers " << key.modifiers;
+    if (!key.modifiers.isEmpty()) text << ", modifiers " << key.modifiers.bits();
     text << "⟩";
     return text.str();
 }

@@ -70,7 +70,7 @@ InPlaceExpansion InPlaceModel::expand(const std::u16string& text) {
 std::size_t InPlaceModel::replace(InPlaceExpansion& expansion, const Range& range) {
     const std::u16string body = expansion.text.substr(range.location + 1, range.length - 2);
     const std::u16string arrows = u"\u25C0\u25B2\u25B6\u25BC";
-    const std::uint16_t arrowCodes[] = {123, 126, 124, 125};
+    const KeyCode arrowCodes[] = {KeyCode::Left, KeyCode::Up, KeyCode::Right, KeyCode::Down};
     const auto variable = SnippetVariableUtils::parseVariable(body);
     const bool isArrow = body.size() == 1 && arrows.find(body) != std::u16string::npos;
     if (!variable && body != u"|" && !isArrow) return range.end();

@@ -12,19 +12,13 @@
 namespace plume {
 namespace {
 
-constexpr std::uint16_t Return = 36;
-constexpr std::uint16_t Tab = 48;
-constexpr std::uint16_t Escape = 53;
-constexpr std::uint16_t KeypadEnter = 76;
-constexpr std::uint16_t RightArrow = 124;
-
 std::shared_ptr<SnippetVariable> caret(std::size_t location) {
     auto variable = std::make_shared<SnippetContentCaret>();
     variable->location = location;
     return variable;
 }
 
-std::shared_ptr<SnippetVariable> key(std::uint16_t code, std::size_t location, std::uint64_t count = 1) {
+std::shared_ptr<SnippetVariable> key(KeyCode code, std::size_t location, std::uint64_t count = 1) {
     auto variable = std::make_shared<SnippetKeyVariable>(u"k", code);
     variable->location = location;
     variable->count = count;
@@ -41,7 +35,7 @@ std::string describe(const std::vector<PLOutput::Fragment>& fragments) {
         } else if (const auto* richText = std::get_if<AttributedString>(&fragment)) {
             text += notation(*richText);
         } else {
-            text += "key" + std::to_string(std::get<2>(fragment)->keyCode);
+            text += "key" + std::to_string(numberOf(std::get<2>(fragment)->keyCode));
         }
     }
     return text;
@@ -61,14 +55,20 @@ TEST(SnippetExpandedContent, CaretArithmeticCopyStringAndFragments) {
     const Case cases[] = {
         {"abc", {}, -1, 0, 0, "abc", "abc"},
         {"", {}, -1, 0, 0, "", ""},
-        {"ab", {key(Return, 1), caret(2)}, 3, 0, 0, "a b", "a|key36|b"},
-        {"abc", {caret(1), key(Tab, 3, 2)}, 2, 4, 2, "abc ", "abc|key48"},
+        {"ab", {key(KeyCode::Return, 1), caret(2)}, 3, 0, 0, "a b", "a|key36|b"},
+        {"abc", {caret(1), key(KeyCode::Tab, 3, 2)}, 2, 4, 2, "abc ", "abc|key48"},
         {"abc", {caret(1), caret(2)}, 2, 1, 1, "abc", "abc"},
-        {"abc", {key(Return, 0)}, 0, 0, 0, " abc", "key36|abc"},
-        {"abc", {caret(0), key(KeypadEnter, 1, 3), key(Escape, 2)}, 0, 6, 3, "abc", "a|key76|b|key53|c"},
-        {"abc", {key(Return, 1), key(Tab, 1)}, 1, 0, 0, "a  bc", "a|key36|key48|bc"},
-        {"abcd", {key(Tab, 3), key(RightArrow, 2)}, 0, 0, 0, "abc cd", "abc|key48|key124|cd"},
-        {"ab", {key(RightArrow, 3)}, -1, 0, 0, "ab", "ab|key124"},
+        {"abc", {key(KeyCode::Return, 0)}, 0, 0, 0, " abc", "key36|abc"},
+        {"abc",
+         {caret(0), key(KeyCode::KeypadEnter, 1, 3), key(KeyCode::Escape, 2)},
+         0,
+         6,
+         3,
+         "abc",
+         "a|key76|b|key53|c"},
+        {"abc", {key(KeyCode::Return, 1), key(KeyCode::Tab, 1)}, 1, 0, 0, "a  bc", "a|key36|key48|bc"},
+        {"abcd", {key(KeyCode::Tab, 3), key(KeyCode::Right, 2)}, 0, 0, 0, "abc cd", "abc|key48|key124|cd"},
+        {"ab", {key(KeyCode::Right, 3)}, -1, 0, 0, "ab", "ab|key124"},
         {"ab", {caret(5)}, 5, -3, -3, "ab", "ab"},
     };
     for (const Case& example : cases) {
@@ -99,12 +99,12 @@ TEST(SnippetExpandedContent, SaysWhatItHolds) {
     EXPECT_FALSE(content.hasCaret() || content.hasCaretLocationOrKeys() || content.hasCaretLocationOrArrowKeys() ||
                  content.hasCaretOrFields() || content.hasDelayedKey());
 
-    content.variables = {key(122, 0)};
+    content.variables = {key(KeyCode::F1, 0)};
     EXPECT_TRUE(content.hasCaretLocationOrKeys());
     EXPECT_FALSE(content.hasCaret() || content.hasCaretLocationOrArrowKeys() || content.hasCaretOrFields());
-    content.variables = {key(127, 0)};
+    content.variables = {key(KeyCode{127}, 0)};
     EXPECT_FALSE(content.hasCaretLocationOrArrowKeys());
-    for (std::uint16_t code = 123; code <= 126; ++code) {
+    for (const KeyCode code : {KeyCode::Left, KeyCode::Right, KeyCode::Down, KeyCode::Up}) {
         content.variables = {key(code, 0)};
         EXPECT_TRUE(content.hasCaretLocationOrArrowKeys());
     }
@@ -140,7 +140,7 @@ TEST(SnippetExpandedContent, AppendsItsSuffixUnstyled) {
 
 TEST(PLOutput, CutsRichContentWithItsLook) {
     SnippetExpandedContent content(rich("a*bc*d"));
-    content.variables = {key(Return, 2)};
+    content.variables = {key(KeyCode::Return, 2)};
     EXPECT_EQ(describe(PLOutput::fragmentsForRichTextSnippet(content)), "a*b*|key36|*c*d");
 }
 
@@ -154,8 +154,8 @@ TEST(PLOutput, WithoutContentHasNoFragments) {
 TEST(PLOutput, WhatIsSentAgainHasAnEnd) {
     SnippetExpandedContent content(std::u16string(1'000'000, u'x'));
     for (int count = 0; count < 1'000; ++count) {
-        content.variables.push_back(key(Return, 1'000'000));
-        content.variables.push_back(key(RightArrow, 0));
+        content.variables.push_back(key(KeyCode::Return, 1'000'000));
+        content.variables.push_back(key(KeyCode::Right, 0));
     }
     std::size_t length = 0;
     std::size_t keys = 0;
@@ -177,7 +177,7 @@ RC_GTEST_PROP(PLOutput, FragmentsJoinedAgainAreTheContent, ()) {
     auto locations = *rc::gen::container<std::vector<std::size_t>>(rc::gen::inRange<std::size_t>(0, text.size() + 1));
     std::sort(locations.begin(), locations.end());
     SnippetExpandedContent content(text);
-    for (const std::size_t location : locations) content.variables.push_back(key(Escape, location));
+    for (const std::size_t location : locations) content.variables.push_back(key(KeyCode::Escape, location));
 
     std::u16string joined;
     std::size_t keys = 0;

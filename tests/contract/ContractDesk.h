@@ -61,8 +61,8 @@ class ContractDesk {
     virtual bool runUntil(const std::function<bool()>& condition) = 0;
 
     // The user's keyboard: a, b, c, Shift and Control.
-    virtual void press(std::uint16_t keyCode) = 0;
-    virtual void release(std::uint16_t keyCode) = 0;
+    virtual void press(KeyCode keyCode) = 0;
+    virtual void release(KeyCode keyCode) = 0;
     // The user moves the mouse there and clicks; no program minds it.
     virtual void click(Button button, Point place) = 0;
     virtual void activate(Program program) = 0;

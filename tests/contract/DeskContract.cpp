@@ -2,7 +2,8 @@
 #include <memory>
 #include <string>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "tests/contract/ContractDesk.h"
 
 namespace plume {
@@ -42,23 +43,20 @@ TEST_P(ProcessManagerContract, KnowsNothingOfProcessesThatAreNone) {
 
 TEST_P(InputSourcesContract, TranslatesKeysOfTheUSLayout) {
     struct Case {
-        std::uint16_t keyCode;
-        std::uint64_t flags;
+        KeyCode keyCode;
+        EventFlags flags;
         std::u16string produced;
     };
-    const Case cases[] = {{0, 0, u"a"},
-                          {0, EventFlag::Shift, u"A"},
-                          {18, 0, u"1"},
-                          {18, EventFlag::Shift, u"!"},
-                          {KeyCode::Space, 0, u" "},
-                          {KeyCode::Return, 0, u"\r"},
-                          {KeyCode::Tab, 0, u"\t"},
-                          {KeyCode::Delete, 0, u"\b"},
-                          {83, 0, u"1"}};
+    const Case cases[] = {{KeyCode::A, {}, u"a"},      {KeyCode::A, EventFlag::Shift, u"A"},
+                          {KeyCode::Digit1, {}, u"1"}, {KeyCode::Digit1, EventFlag::Shift, u"!"},
+                          {KeyCode::Space, {}, u" "},  {KeyCode::Return, {}, u"\r"},
+                          {KeyCode::Tab, {}, u"\t"},   {KeyCode::Delete, {}, u"\b"},
+                          {KeyCode::Keypad1, {}, u"1"}};
     for (const Case& c : cases) {
-        EXPECT_EQ(desk_->inputSources().translateKey(c.keyCode, c.flags), c.produced) << c.keyCode << ' ' << c.flags;
+        EXPECT_EQ(desk_->inputSources().translateKey(c.keyCode, c.flags), c.produced)
+            << numberOf(c.keyCode) << ' ' << c.flags.bits();
     }
-    EXPECT_EQ(desk_->inputSources().translateKey(KeyCode::None, 0), std::nullopt);
+    EXPECT_EQ(desk_->inputSources().translateKey(KeyCode::None, {}), std::nullopt);
 }
 
 TEST_P(InputSourcesContract, HasANameForTheLayout) {
@@ -68,7 +66,7 @@ TEST_P(InputSourcesContract, HasANameForTheLayout) {
 }
 
 TEST_P(AccessibilityContract, TellsTheSelectionAndTheTextBeforeIt) {
-    for (const std::uint16_t key : {std::uint16_t{0}, std::uint16_t{11}, std::uint16_t{8}}) {
+    for (const KeyCode key : {KeyCode::A, KeyCode::B, KeyCode::C}) {
         desk_->press(key);
         desk_->release(key);
     }

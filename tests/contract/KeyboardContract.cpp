@@ -3,25 +3,21 @@
 #include <string>
 #include <vector>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "tests/contract/ContractDesk.h"
 
 namespace plume {
 
 namespace {
 
-constexpr std::uint16_t KeyA = 0;
-constexpr std::uint16_t KeyB = 11;
-constexpr std::uint16_t KeyC = 8;
-constexpr std::uint16_t ShiftKey = 56;
-
 // Writes down what it hears, and swallows one key.
 class Listener final : public KeyboardTapListener {
   public:
     struct Heard {
         TapEvent::Type type;
-        std::uint16_t keyCode;
-        std::uint64_t flags;
+        KeyCode keyCode;
+        EventFlags flags;
         std::u16string string;
         bool operator==(const Heard&) const = default;
     };
@@ -38,19 +34,19 @@ class Listener final : public KeyboardTapListener {
     std::vector<Heard> heard;
     std::u16string downs;                            // the texts of all presses
     std::function<void(const TapEvent&)> whenHeard;  // during the decision; may be empty
-    std::uint16_t swallowed = KeyCode::None;
+    KeyCode swallowed = KeyCode::None;
 };
 
 using Type = TapEvent::Type;
 
-void strike(ContractDesk& desk, std::uint16_t keyCode) {
+void strike(ContractDesk& desk, KeyCode keyCode) {
     desk.press(keyCode);
     desk.release(keyCode);
 }
 
 void postText(EventPoster& poster, std::u16string_view text) {
     poster.begin();
-    for (const bool down : {true, false}) poster.post({0, 0, down, text}, false);
+    for (const bool down : {true, false}) poster.post({KeyCode::A, {}, down, text}, false);
     poster.end();
 }
 
@@ -59,15 +55,15 @@ void postText(EventPoster& poster, std::u16string_view text) {
 TEST_P(KeyboardContract, HearsKeysWithTheirTextAndModifiers) {
     Listener listener;
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
-    desk_->press(ShiftKey);
-    desk_->press(KeyA);
-    desk_->release(KeyA);
-    desk_->release(ShiftKey);
+    desk_->press(KeyCode::Shift);
+    desk_->press(KeyCode::A);
+    desk_->release(KeyCode::A);
+    desk_->release(KeyCode::Shift);
     EXPECT_TRUE(desk_->runUntil([&] { return listener.heard.size() == 4; }));
-    const std::vector<Listener::Heard> expected{{Type::FlagsChanged, ShiftKey, EventFlag::Shift, u""},
-                                                {Type::KeyDown, KeyA, EventFlag::Shift, u"A"},
-                                                {Type::KeyUp, KeyA, EventFlag::Shift, u"A"},
-                                                {Type::FlagsChanged, ShiftKey, 0, u""}};
+    const std::vector<Listener::Heard> expected{{Type::FlagsChanged, KeyCode::Shift, EventFlag::Shift, u""},
+                                                {Type::KeyDown, KeyCode::A, EventFlag::Shift, u"A"},
+                                                {Type::KeyUp, KeyCode::A, EventFlag::Shift, u"A"},
+                                                {Type::FlagsChanged, KeyCode::Shift, {}, u""}};
     EXPECT_EQ(listener.heard, expected);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"A"; }));
     desk_->keyboardTap().remove();
@@ -75,9 +71,9 @@ TEST_P(KeyboardContract, HearsKeysWithTheirTextAndModifiers) {
 
 TEST_P(KeyboardContract, KeepsSwallowedKeysFromPrograms) {
     Listener listener;
-    listener.swallowed = KeyA;
+    listener.swallowed = KeyCode::A;
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
-    for (const std::uint16_t key : {KeyA, KeyB, KeyA, KeyB}) {
+    for (const KeyCode key : {KeyCode::A, KeyCode::B, KeyCode::A, KeyCode::B}) {
         desk_->press(key);
         desk_->release(key);
     }
@@ -88,7 +84,7 @@ TEST_P(KeyboardContract, KeepsSwallowedKeysFromPrograms) {
 
 TEST_P(KeyboardContract, LeavesKeysAloneOnceRemoved) {
     Listener listener;
-    listener.swallowed = KeyA;
+    listener.swallowed = KeyCode::A;
     EXPECT_FALSE(desk_->keyboardTap().exists());
     EXPECT_TRUE(desk_->keyboardTap().check().ok());
     EXPECT_FALSE(desk_->keyboardTap().exists()) << "checking creates no tap";
@@ -96,8 +92,8 @@ TEST_P(KeyboardContract, LeavesKeysAloneOnceRemoved) {
     EXPECT_TRUE(desk_->keyboardTap().exists());
     desk_->keyboardTap().remove();
     EXPECT_FALSE(desk_->keyboardTap().exists());
-    desk_->press(KeyA);
-    desk_->release(KeyA);
+    desk_->press(KeyCode::A);
+    desk_->release(KeyCode::A);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"a"; }));
     EXPECT_TRUE(listener.heard.empty());
 }
@@ -109,15 +105,16 @@ TEST_P(KeyboardContract, PostsKeysAndTextsInOrderAndUnheard) {
     const std::u16string text = u"x na\u00EFve \u65E5\u672C";
     ASSERT_TRUE(poster.canType(text));
     poster.begin();
-    for (const bool down : {true, false}) poster.post({0, 0, down, text}, false);
-    for (const bool down : {true, false}) poster.post({KeyCode::Delete, 0, down, {}}, false);
-    for (const bool down : {true, false}) poster.post({KeyA, EventFlag::Shift, down, {}}, false);
+    for (const bool down : {true, false}) poster.post({KeyCode::A, {}, down, text}, false);
+    for (const bool down : {true, false}) poster.post({KeyCode::Delete, {}, down, {}}, false);
+    for (const bool down : {true, false}) poster.post({KeyCode::A, EventFlag::Shift, down, {}}, false);
     poster.end();
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"x na\u00EFve \u65E5A"; }));
-    desk_->press(KeyB);
-    desk_->release(KeyB);
+    desk_->press(KeyCode::B);
+    desk_->release(KeyCode::B);
     EXPECT_TRUE(desk_->runUntil([&] { return listener.heard.size() >= 2; }));
-    const std::vector<Listener::Heard> expected{{Type::KeyDown, KeyB, 0, u"b"}, {Type::KeyUp, KeyB, 0, u"b"}};
+    const std::vector<Listener::Heard> expected{{Type::KeyDown, KeyCode::B, {}, u"b"},
+                                                {Type::KeyUp, KeyCode::B, {}, u"b"}};
     EXPECT_EQ(listener.heard, expected) << "posted keys come before this one, and would have been heard by now";
     desk_->keyboardTap().remove();
 }
@@ -128,7 +125,7 @@ TEST_P(KeyboardContract, LetsAPassedKeyFollowWhatWasPostedDuringTheDecision) {
         bool keyboardEvent(const TapEvent& event) override {
             if (event.type != Type::KeyDown) return false;
             poster.begin();
-            for (const bool down : {true, false}) poster.post({0, 0, down, u"12"}, false);
+            for (const bool down : {true, false}) poster.post({KeyCode::A, {}, down, u"12"}, false);
             poster.end();
             return false;
         }
@@ -137,8 +134,8 @@ TEST_P(KeyboardContract, LetsAPassedKeyFollowWhatWasPostedDuringTheDecision) {
         EventPoster& poster;
     } listener(desk_->poster());
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
-    desk_->press(KeyA);
-    desk_->release(KeyA);
+    desk_->press(KeyCode::A);
+    desk_->release(KeyCode::A);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"12a"; }));
     desk_->keyboardTap().remove();
 }
@@ -146,11 +143,11 @@ TEST_P(KeyboardContract, LetsAPassedKeyFollowWhatWasPostedDuringTheDecision) {
 TEST_P(KeyboardContract, KnowsWhichKeysTheUserHolds) {
     Listener listener;
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
-    desk_->press(KeyB);
-    EXPECT_TRUE(desk_->runUntil([&] { return desk_->poster().isKeyDown(KeyB); }));
-    EXPECT_FALSE(desk_->poster().isKeyDown(KeyA));
-    desk_->release(KeyB);
-    EXPECT_TRUE(desk_->runUntil([&] { return !desk_->poster().isKeyDown(KeyB); }));
+    desk_->press(KeyCode::B);
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->poster().isKeyDown(KeyCode::B); }));
+    EXPECT_FALSE(desk_->poster().isKeyDown(KeyCode::A));
+    desk_->release(KeyCode::B);
+    EXPECT_TRUE(desk_->runUntil([&] { return !desk_->poster().isKeyDown(KeyCode::B); }));
     desk_->keyboardTap().remove();
 }
 
@@ -159,10 +156,10 @@ TEST_P(KeyboardContract, KnowsWhichKeysTheUserHolds) {
 TEST_P(KeyboardContract, LetsTheDecidedKeyAndThoseAfterItFollowTheOutput) {
     Listener listener;
     listener.whenHeard = [&](const TapEvent& event) {
-        if (event.type == Type::KeyDown && event.keyCode == KeyC) desk_->poster().holdUserKeys();
+        if (event.type == Type::KeyDown && event.keyCode == KeyCode::C) desk_->poster().holdUserKeys();
     };
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
-    for (const std::uint16_t key : {KeyC, KeyA, KeyB}) strike(*desk_, key);
+    for (const KeyCode key : {KeyCode::C, KeyCode::A, KeyCode::B}) strike(*desk_, key);
     const bool canHold = desk_->canHoldUserKeys();
     const std::u16string heardAtOnce = canHold ? u"c" : u"cab";
     ASSERT_TRUE(desk_->runUntil([&] { return listener.downs == heardAtOnce; }));
@@ -180,10 +177,10 @@ TEST_P(KeyboardContract, KeepsTheModifiersOfHeldKeysOutOfTheOutput) {
     Listener listener;
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
     desk_->poster().holdUserKeys();
-    desk_->press(ShiftKey);
-    strike(*desk_, KeyA);
-    desk_->release(ShiftKey);
-    strike(*desk_, KeyB);
+    desk_->press(KeyCode::Shift);
+    strike(*desk_, KeyCode::A);
+    desk_->release(KeyCode::Shift);
+    strike(*desk_, KeyCode::B);
     const bool canHold = desk_->canHoldUserKeys();
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == (canHold ? u"" : u"Ab"); }));
     postText(desk_->poster(), u"x");
@@ -197,10 +194,10 @@ TEST_P(KeyboardContract, LosesNoKeyWhenNobodyReleasesThem) {
     Listener listener;
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
     desk_->poster().holdUserKeys();
-    for (const std::uint16_t key : {KeyA, KeyB}) strike(*desk_, key);
+    for (const KeyCode key : {KeyCode::A, KeyCode::B}) strike(*desk_, key);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"ab"; }));
     desk_->poster().releaseUserKeys();
-    strike(*desk_, KeyC);
+    strike(*desk_, KeyCode::C);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"abc"; }));
     desk_->keyboardTap().remove();
 }

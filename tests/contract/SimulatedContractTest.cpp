@@ -42,8 +42,8 @@ class SimulatedDesk final : public ContractDesk {
         return false;
     }
 
-    void press(std::uint16_t keyCode) override { desktop_.keyboard().press(keyCode); }
-    void release(std::uint16_t keyCode) override { desktop_.keyboard().release(keyCode); }
+    void press(KeyCode keyCode) override { desktop_.keyboard().press(keyCode); }
+    void release(KeyCode keyCode) override { desktop_.keyboard().release(keyCode); }
     void click(Button, Point place) override {
         desktop_.poster().setPointerLocation(place);
         desktop_.click();

@@ -3,23 +3,19 @@
 #include <string>
 #include <vector>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "tests/contract/ContractDesk.h"
 
 namespace plume {
 
 namespace {
 
-constexpr std::uint16_t KeyA = 0;
-constexpr std::uint16_t KeyB = 11;
-constexpr std::uint16_t ShiftKey = 56;
-constexpr std::uint16_t ControlKey = 59;
-
-void chord(ContractDesk& desk, std::initializer_list<std::uint16_t> modifiers, std::uint16_t keyCode) {
-    for (const std::uint16_t modifier : modifiers) desk.press(modifier);
+void chord(ContractDesk& desk, std::initializer_list<KeyCode> modifiers, KeyCode keyCode) {
+    for (const KeyCode modifier : modifiers) desk.press(modifier);
     desk.press(keyCode);
     desk.release(keyCode);
-    for (const std::uint16_t modifier : modifiers) desk.release(modifier);
+    for (const KeyCode modifier : modifiers) desk.release(modifier);
 }
 
 class PassingListener final : public KeyboardTapListener {
@@ -50,7 +46,7 @@ TEST_P(SecureInputContract, IsOnWhileAnotherProgramHoldsTheKeyboard) {
 TEST_P(SecureInputContract, DoesNotMistakeTheKeyboardTapForAnotherProgram) {
     PassingListener listener;
     ASSERT_TRUE(desk_->keyboardTap().create(listener, false).ok());
-    chord(*desk_, {}, KeyA);
+    chord(*desk_, {}, KeyCode::A);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"a"; }));
     EXPECT_FALSE(desk_->secureInput().isSecureEventInputEnabled());
     desk_->keyboardTap().remove();
@@ -58,16 +54,17 @@ TEST_P(SecureInputContract, DoesNotMistakeTheKeyboardTapForAnotherProgram) {
 
 TEST_P(SystemHotKeysContract, CallsTheHandlerForExactlyItsCombination) {
     int called = 0;
-    ASSERT_TRUE(desk_->systemHotKeys().registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { ++called; }).ok());
-    chord(*desk_, {}, KeyB);
-    chord(*desk_, {ShiftKey}, KeyB);
-    chord(*desk_, {ControlKey, ShiftKey}, KeyB);
-    chord(*desk_, {ShiftKey}, KeyA);
+    ASSERT_TRUE(
+        desk_->systemHotKeys().registerHotKey(FirstId, KeyCode::B, KeyModifier::Control, [&] { ++called; }).ok());
+    chord(*desk_, {}, KeyCode::B);
+    chord(*desk_, {KeyCode::Shift}, KeyCode::B);
+    chord(*desk_, {KeyCode::Control, KeyCode::Shift}, KeyCode::B);
+    chord(*desk_, {KeyCode::Shift}, KeyCode::A);
     EXPECT_TRUE(desk_->runUntil([&] { return desk_->text(Program::First) == u"bBA"; }));
     EXPECT_EQ(called, 0);
-    chord(*desk_, {ControlKey}, KeyB);
+    chord(*desk_, {KeyCode::Control}, KeyCode::B);
     EXPECT_TRUE(desk_->runUntil([&] { return called > 0; }));
-    chord(*desk_, {ControlKey}, KeyB);
+    chord(*desk_, {KeyCode::Control}, KeyCode::B);
     EXPECT_TRUE(desk_->runUntil([&] { return called > 1; }));
     EXPECT_EQ(called, 2);
 }
@@ -75,27 +72,27 @@ TEST_P(SystemHotKeysContract, CallsTheHandlerForExactlyItsCombination) {
 TEST_P(SystemHotKeysContract, ReplacesWhatHadTheSameId) {
     SystemHotKeys& hotKeys = desk_->systemHotKeys();
     std::string called;
-    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { called += 'x'; }).ok());
-    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyA, KeyModifier::Control, [&] { called += 'x'; }).ok());
-    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyA, KeyModifier::Control, [&] { called += 'a'; }).ok());
-    chord(*desk_, {ControlKey}, KeyB);
-    chord(*desk_, {ControlKey}, KeyA);
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyCode::B, KeyModifier::Control, [&] { called += 'x'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyCode::A, KeyModifier::Control, [&] { called += 'x'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyCode::A, KeyModifier::Control, [&] { called += 'a'; }).ok());
+    chord(*desk_, {KeyCode::Control}, KeyCode::B);
+    chord(*desk_, {KeyCode::Control}, KeyCode::A);
     EXPECT_TRUE(desk_->runUntil([&] { return !called.empty(); }));
     EXPECT_EQ(called, "a");
-    EXPECT_TRUE(hotKeys.registerHotKey(SecondId, KeyB, KeyModifier::Control, [&] { called += 'b'; }).ok())
+    EXPECT_TRUE(hotKeys.registerHotKey(SecondId, KeyCode::B, KeyModifier::Control, [&] { called += 'b'; }).ok())
         << "what was replaced is free";
-    chord(*desk_, {ControlKey}, KeyB);
+    chord(*desk_, {KeyCode::Control}, KeyCode::B);
     EXPECT_TRUE(desk_->runUntil([&] { return called == "ab"; }));
 }
 
 TEST_P(SystemHotKeysContract, RefusesACombinationThatAnotherIdHas) {
     SystemHotKeys& hotKeys = desk_->systemHotKeys();
     std::string called;
-    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { called += '1'; }).ok());
-    const auto refused = hotKeys.registerHotKey(SecondId, KeyB, KeyModifier::Control, [&] { called += '2'; });
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyCode::B, KeyModifier::Control, [&] { called += '1'; }).ok());
+    const auto refused = hotKeys.registerHotKey(SecondId, KeyCode::B, KeyModifier::Control, [&] { called += '2'; });
     ASSERT_FALSE(refused.ok());
     EXPECT_FALSE(refused.error().message.empty());
-    chord(*desk_, {ControlKey}, KeyB);
+    chord(*desk_, {KeyCode::Control}, KeyCode::B);
     EXPECT_TRUE(desk_->runUntil([&] { return called == "1"; }));
 }
 
@@ -103,12 +100,12 @@ TEST_P(SystemHotKeysContract, ForgetsWhatWasUnregistered) {
     SystemHotKeys& hotKeys = desk_->systemHotKeys();
     std::string called;
     hotKeys.unregisterHotKey(FirstId);
-    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyB, KeyModifier::Control, [&] { called += 'x'; }).ok());
-    ASSERT_TRUE(hotKeys.registerHotKey(SecondId, KeyA, KeyModifier::Control, [&] { called += 'a'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(FirstId, KeyCode::B, KeyModifier::Control, [&] { called += 'x'; }).ok());
+    ASSERT_TRUE(hotKeys.registerHotKey(SecondId, KeyCode::A, KeyModifier::Control, [&] { called += 'a'; }).ok());
     hotKeys.unregisterHotKey(FirstId);
     hotKeys.unregisterHotKey(FirstId);
-    chord(*desk_, {ControlKey}, KeyB);
-    chord(*desk_, {ControlKey}, KeyA);
+    chord(*desk_, {KeyCode::Control}, KeyCode::B);
+    chord(*desk_, {KeyCode::Control}, KeyCode::A);
     EXPECT_TRUE(desk_->runUntil([&] { return !called.empty(); }));
     EXPECT_EQ(called, "a");
 }

@@ -22,8 +22,11 @@ constexpr Milliseconds Bound{10'000};
 constexpr double Step = 0.005;  // seconds between two looks at a condition
 
 // The keys that the suites press, as a US keyboard has them.
-const std::map<std::uint16_t, int> Keycodes{
-    {0, 38}, {11, 56}, {8, 54}, {56, static_cast<int>(Key::LeftShift)}, {59, static_cast<int>(Key::LeftControl)}};
+const std::map<KeyCode, int> Keycodes{{KeyCode::A, 38},
+                                      {KeyCode::B, 56},
+                                      {KeyCode::C, 54},
+                                      {KeyCode::Shift, static_cast<int>(Key::LeftShift)},
+                                      {KeyCode::Control, static_cast<int>(Key::LeftControl)}};
 
 // What is expensive to bring up, and what a process can have only once.
 struct Desktop {
@@ -117,11 +120,11 @@ class X11Desk final : public ContractDesk {
     }
 
     // The server has taken the key when these return: whoever may read it then, will.
-    void press(std::uint16_t keyCode) override {
+    void press(KeyCode keyCode) override {
         desktop_.rig.keyboard().press(Keycodes.at(keyCode));
         desktop_.rig.keyboard().sync();
     }
-    void release(std::uint16_t keyCode) override {
+    void release(KeyCode keyCode) override {
         desktop_.rig.keyboard().release(Keycodes.at(keyCode));
         desktop_.rig.keyboard().sync();
     }

@@ -9,7 +9,6 @@
 #include <string>
 
 #include "ports/x11/keyboard/TerminalApplications.h"
-#include "ports/x11/keyboard/X11KeyCodes.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/KeyboardPort.h"
@@ -210,33 +209,30 @@ INSTANTIATE_TEST_SUITE_P(All, X11PosterTest,
 using X11PosterKeysTest = X11PosterTest;
 
 TEST_P(X11PosterKeysTest, PostsKeysWithExactlyTheirModifiers) {
-    constexpr std::uint16_t A = 0;
-    constexpr std::uint16_t Left = 123;
-    constexpr std::uint16_t Home = 115;
-    constexpr std::uint16_t Backspace = 51;
     startPort();
     rig_->keyboard().type("abcd");
     ASSERT_EQ(target_->awaitText("abcd"), "abcd");
-    const auto press = [&](std::uint16_t key, std::uint64_t flags) {
+    const auto press = [&](KeyCode key, EventFlags flags) {
         port_->poster().post({.keyCode = key, .flags = flags, .down = true, .text = {}}, false);
-        port_->poster().post({.keyCode = key, .flags = 0, .down = false, .text = {}}, false);
+        port_->poster().post({.keyCode = key, .flags = {}, .down = false, .text = {}}, false);
     };
     // The user holds Shift: an arrow would select, were it not for the poster.
     rig_->keyboard().press(Key::LeftShift);
     rig_->keyboard().sync();
     const Deadline deadline(Milliseconds(10'000));
     bool shiftIsDown = false;
-    while (!shiftIsDown && !deadline.passed()) port_->run([&] { shiftIsDown = port_->poster().isKeyDown(56); });
+    while (!shiftIsDown && !deadline.passed())
+        port_->run([&] { shiftIsDown = port_->poster().isKeyDown(KeyCode::Shift); });
     port_->run([&] {
         auto& poster = port_->poster();
         poster.begin();
-        press(Left, 0);
+        press(KeyCode::Left, {});
         poster.post({.text = u"-"}, false);
-        press(Left, X11Flag::Shift);
-        press(Backspace, 0);
-        press(Home, X11Flag::Shift);
+        press(KeyCode::Left, EventFlag::Shift);
+        press(KeyCode::Delete, {});
+        press(KeyCode::Home, EventFlag::Shift);
         poster.post({.text = u"X"}, false);
-        press(A, X11Flag::Control);
+        press(KeyCode::A, EventFlag::Control);
         poster.post({.text = u"all\r\n\tü"}, false);
         poster.end();
     });
@@ -257,7 +253,6 @@ TEST_P(X11PosterKeysTest, AKeyThatTheUserHoldsNeitherRepeatsIntoTheTextNorHidesI
 }
 
 TEST_P(X11PosterKeysTest, CopiesAndPastesAsTheProgramInFrontWantsIt) {
-    constexpr std::uint16_t End = 119;
     startPort();
     std::optional<std::u16string> front;
     port_->run([&] { port_->poster().frontIdentifier = [&] { return front; }; });
@@ -283,7 +278,7 @@ TEST_P(X11PosterKeysTest, CopiesAndPastesAsTheProgramInFrontWantsIt) {
     rig_->client().await("the copy", Milliseconds(5'000), [&] {
         return rig_->client().areOfSameClient(rig_->client().selectionOwner("CLIPBOARD"), target_->window());
     });
-    port_->run([&] { port_->poster().post({.keyCode = End, .flags = 0, .down = true, .text = {}}, false); });
+    port_->run([&] { port_->poster().post({.keyCode = KeyCode::End, .flags = {}, .down = true, .text = {}}, false); });
     send(true);
     EXPECT_EQ(target_->awaitText("copiedcopied"), "copiedcopied");
     selectAll();  // which is what the terminal pastes

@@ -329,16 +329,12 @@ TEST(X11SecureInput, NamesTheDisplayThatCannotBeOpened) {
 
 class X11HotKeyTest : public X11ProcessTest {
   protected:
-    static constexpr std::int32_t Shift = 1;
-    static constexpr std::int32_t Control = 2;
-    static constexpr std::int32_t Option = 4;
-
     std::unique_ptr<X11SystemHotKeys> make(SessionThread& thread) {
         return thread.run([&] {
             return std::make_unique<X11SystemHotKeys>(
-                thread.session(), [this](std::uint16_t keyCode) -> std::optional<xcb_keycode_t> {
-                    if (keyCode > 0x7F) return std::nullopt;
-                    return static_cast<xcb_keycode_t>(rig_->keyboard().keycodeOf(keyCode));
+                thread.session(), [this](KeyCode keyCode) -> std::optional<xcb_keycode_t> {
+                    if (numberOf(keyCode) > 0x7F) return std::nullopt;
+                    return static_cast<xcb_keycode_t>(rig_->keyboard().keycodeOf(numberOf(keyCode)));
                 });
         });
     }
@@ -370,8 +366,9 @@ TEST_F(X11HotKeyTest, ExactlyTheRegisteredCombinationIsHeard) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     auto hotKeys = make(*thread_);
     const auto result = thread_->run([&] {
-        return std::pair(hotKeys->registerHotKey(1, u'h', Control | Option, counting('h')).ok(),
-                         hotKeys->registerHotKey(2, u'j', Control | Shift, counting('j')).ok());
+        return std::pair(
+            hotKeys->registerHotKey(1, KeyCode{'h'}, KeyModifier::Control | KeyModifier::Option, counting('h')).ok(),
+            hotKeys->registerHotKey(2, KeyCode{'j'}, KeyModifier::Control | KeyModifier::Shift, counting('j')).ok());
     });
     EXPECT_TRUE(result.first && result.second);
     TestKeyboard& keyboard = rig_->keyboard();
@@ -407,21 +404,22 @@ TEST_F(X11HotKeyTest, ACombinationThatIsTakenIsRefused) {
     SessionThread other(rig_->server().display());
     auto theirs = make(other);
     auto ours = make(*thread_);
-    const auto take = [&](SessionThread& thread, X11SystemHotKeys& hotKeys, SystemHotKeys::Id id, std::uint16_t key) {
+    const auto take = [&](SessionThread& thread, X11SystemHotKeys& hotKeys, SystemHotKeys::Id id, KeyCode key) {
         return thread.run([&] {
-            const auto result = hotKeys.registerHotKey(id, key, Control | Option, counting('x'));
+            const auto result =
+                hotKeys.registerHotKey(id, key, KeyModifier::Control | KeyModifier::Option, counting('x'));
             return result.ok() ? std::string() : result.error().message;
         });
     };
-    EXPECT_EQ(take(other, *theirs, 1, u'k'), "");
-    EXPECT_THAT(take(*thread_, *ours, 1, u'k'), testing::HasSubstr("Another program"));
-    EXPECT_EQ(take(*thread_, *ours, 1, u'l'), "");
-    EXPECT_THAT(take(*thread_, *ours, 2, u'l'), testing::HasSubstr("Another hot key"));
-    EXPECT_THAT(take(*thread_, *ours, 3, 0xFFFF), testing::HasSubstr("no key"));
-    EXPECT_EQ(take(*thread_, *ours, 1, u'l'), "") << "in place of what was there";
+    EXPECT_EQ(take(other, *theirs, 1, KeyCode{'k'}), "");
+    EXPECT_THAT(take(*thread_, *ours, 1, KeyCode{'k'}), testing::HasSubstr("Another program"));
+    EXPECT_EQ(take(*thread_, *ours, 1, KeyCode{'l'}), "");
+    EXPECT_THAT(take(*thread_, *ours, 2, KeyCode{'l'}), testing::HasSubstr("Another hot key"));
+    EXPECT_THAT(take(*thread_, *ours, 3, KeyCode::None), testing::HasSubstr("no key"));
+    EXPECT_EQ(take(*thread_, *ours, 1, KeyCode{'l'}), "") << "in place of what was there";
     other.run([&] { theirs.reset(); });
     rig_->client().await("the other's letting go", Milliseconds(10'000),
-                         [&] { return take(*thread_, *ours, 4, u'k').empty(); });
+                         [&] { return take(*thread_, *ours, 4, KeyCode{'k'}).empty(); });
     thread_->run([&] { ours.reset(); });
 }
 

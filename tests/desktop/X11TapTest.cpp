@@ -33,16 +33,12 @@ namespace {
 using Parts = TapThread::Parts;
 using Type = TapEvent::Type;
 
-constexpr std::uint64_t ShiftFlag = 0x20000;
-constexpr std::uint64_t ControlFlag = 0x40000;
-constexpr std::uint64_t OptionFlag = 0x80000;
-constexpr std::uint64_t CommandFlag = 0x100000;
 constexpr Milliseconds Bound{10'000};
 
 struct Heard {
     Type type = Type::KeyDown;
-    std::uint16_t keyCode = 0;
-    std::uint64_t flags = 0;
+    KeyCode keyCode = KeyCode::None;
+    EventFlags flags;
     std::u16string string;
     bool composing = false;
     bool command = false;
@@ -50,7 +46,8 @@ struct Heard {
     bool operator==(const Heard&) const = default;
     friend std::ostream& operator<<(std::ostream& out, const Heard& heard) {
         constexpr std::array<const char*, 3> names{"down", "up", "flags"};
-        out << names[static_cast<std::size_t>(heard.type)] << ' ' << heard.keyCode << ' ' << std::hex << heard.flags;
+        out << names[static_cast<std::size_t>(heard.type)] << ' ' << numberOf(heard.keyCode) << ' ' << std::hex
+            << heard.flags.bits();
         for (const char16_t unit : heard.string) out << " U+" << static_cast<unsigned>(unit);
         return out << std::dec << (heard.composing ? " composing" : "") << (heard.command ? " command" : "");
     }
@@ -126,7 +123,7 @@ class X11TapTest : public testing::Test {
         const auto name = tap_->call([](Parts& parts) { return parts.inputSources->currentInputSourceIdentifier(); });
         return name ? toUtf8(*name) : "";
     }
-    std::optional<std::u16string> translate(std::uint16_t keyCode, std::uint64_t flags) {
+    std::optional<std::u16string> translate(KeyCode keyCode, EventFlags flags) {
         return tap_->call([=](Parts& parts) { return parts.inputSources->translateKey(keyCode, flags); });
     }
 
@@ -194,25 +191,27 @@ TEST_F(X11TapTest, TellsWhatKeysProduceAndWhichModifiersAreHeld) {
         std::vector<Key> held = {};
     };
     const std::vector<Case> cases{
-        {38, {Type::KeyDown, 0, 0, u"a"}},
-        {38, {Type::KeyDown, 0, ShiftFlag, u"A"}, {Key::LeftShift}},
-        {54, {Type::KeyDown, 8, ControlFlag, u"\x03"}, {Key::LeftControl}},
-        {11, {Type::KeyDown, 19, ControlFlag, u"2"}, {Key::LeftControl}},
-        {17, {Type::KeyDown, 28, ControlFlag, u"8"}, {Key::LeftControl}},
-        {53, {Type::KeyDown, 7, OptionFlag, u"", false, true}, {Key::LeftAlt}},
-        {22, {Type::KeyDown, 51, OptionFlag, u"\b", false, true}, {Key::LeftAlt}},
-        {29, {Type::KeyDown, 16, CommandFlag, u"y"}, {Key::LeftSuper}},
-        {29, {Type::KeyDown, 16, ControlFlag | ShiftFlag, u"\x19"}, {Key::LeftControl, Key::LeftShift}},
-        {36, {Type::KeyDown, 36, 0, u"\r"}},
-        {104, {Type::KeyDown, 76, 0, u"\r"}},
-        {23, {Type::KeyDown, 48, 0, u"\t"}},
-        {9, {Type::KeyDown, 53, 0, u"\x1B"}},
-        {119, {Type::KeyDown, 117, 0, u"\x7F"}},
-        {113, {Type::KeyDown, 123, 0, u""}},
-        {83, {Type::KeyDown, 123, 0, u""}},   // keypad 4 while Num Lock is off
-        {71, {Type::KeyDown, 96, 0, u""}},    // F5
-        {123, {Type::KeyDown, 72, 0, u""}},   // louder
-        {180, {Type::KeyDown, 436, 0, u""}},  // a browser key, which Apple keyboards do not have
+        {38, {Type::KeyDown, KeyCode::A, {}, u"a"}},
+        {38, {Type::KeyDown, KeyCode::A, EventFlag::Shift, u"A"}, {Key::LeftShift}},
+        {54, {Type::KeyDown, KeyCode::C, EventFlag::Control, u"\x03"}, {Key::LeftControl}},
+        {11, {Type::KeyDown, KeyCode::Digit2, EventFlag::Control, u"2"}, {Key::LeftControl}},
+        {17, {Type::KeyDown, KeyCode::Digit8, EventFlag::Control, u"8"}, {Key::LeftControl}},
+        {53, {Type::KeyDown, KeyCode::X, EventFlag::Option, u"", false, true}, {Key::LeftAlt}},
+        {22, {Type::KeyDown, KeyCode::Delete, EventFlag::Option, u"\b", false, true}, {Key::LeftAlt}},
+        {29, {Type::KeyDown, KeyCode::Y, EventFlag::Command, u"y"}, {Key::LeftSuper}},
+        {29,
+         {Type::KeyDown, KeyCode::Y, EventFlag::Control | EventFlag::Shift, u"\x19"},
+         {Key::LeftControl, Key::LeftShift}},
+        {36, {Type::KeyDown, KeyCode::Return, {}, u"\r"}},
+        {104, {Type::KeyDown, KeyCode::KeypadEnter, {}, u"\r"}},
+        {23, {Type::KeyDown, KeyCode::Tab, {}, u"\t"}},
+        {9, {Type::KeyDown, KeyCode::Escape, {}, u"\x1B"}},
+        {119, {Type::KeyDown, KeyCode::ForwardDelete, {}, u"\x7F"}},
+        {113, {Type::KeyDown, KeyCode::Left, {}, u""}},
+        {83, {Type::KeyDown, KeyCode::Left, {}, u""}},  // keypad 4 while Num Lock is off
+        {71, {Type::KeyDown, KeyCode::F5, {}, u""}},
+        {123, {Type::KeyDown, KeyCode::VolumeUp, {}, u""}},
+        {180, {Type::KeyDown, KeyCode{436}, {}, u""}},  // a browser key, which Apple keyboards do not have
     };
     createTap();
     for (const Case& each : cases) {
@@ -230,17 +229,19 @@ TEST_F(X11TapTest, TellsWhatKeysProduceAndWhichModifiersAreHeld) {
 TEST_F(X11TapTest, TellsEachModifierByItsKey) {
     struct Case {
         int keycode;
-        std::uint16_t keyCode;
-        std::uint64_t flags;
+        KeyCode keyCode;
+        EventFlags flags;
     };
-    const std::vector<Case> cases{{50, 56, ShiftFlag},    {62, 60, ShiftFlag},   {37, 59, ControlFlag},
-                                  {105, 62, ControlFlag}, {64, 58, OptionFlag},  {108, 61, OptionFlag},
-                                  {133, 55, CommandFlag}, {134, 54, CommandFlag}};
+    const std::vector<Case> cases{
+        {50, KeyCode::Shift, EventFlag::Shift},      {62, KeyCode::RightShift, EventFlag::Shift},
+        {37, KeyCode::Control, EventFlag::Control},  {105, KeyCode::RightControl, EventFlag::Control},
+        {64, KeyCode::Option, EventFlag::Option},    {108, KeyCode::RightOption, EventFlag::Option},
+        {133, KeyCode::Command, EventFlag::Command}, {134, KeyCode::RightCommand, EventFlag::Command}};
     createTap();
     for (const Case& each : cases) {
         tapKey(each.keycode);
         EXPECT_THAT(takeHeard(2), testing::ElementsAre(Heard{Type::FlagsChanged, each.keyCode, each.flags, u""},
-                                                       Heard{Type::FlagsChanged, each.keyCode, 0, u""}));
+                                                       Heard{Type::FlagsChanged, each.keyCode, {}, u""}));
     }
 }
 
@@ -252,34 +253,34 @@ TEST_F(X11TapTest, CapsLockLocks) {
     rig_->keyboard().tap(Key::CapsLock);
     rig_->keyboard().type("b");
     EXPECT_EQ(target->awaitText("Ab"), "Ab");
-    constexpr std::uint64_t locked = 0x10000;
+    constexpr EventFlag locked = EventFlag::CapsLock;
     const auto all = takeHeard(8);
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 0, locked, u"A"}));
-    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, 11, 0, u"b"}));
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::A, locked, u"A"}));
+    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, KeyCode::B, {}, u"b"}));
 }
 
 TEST_F(X11TapTest, FollowsTheLayout) {
     const auto target = rig_->startTarget(TargetKind::QtTextEdit);
     createTap();
     EXPECT_EQ(identifier(), "us");
-    EXPECT_EQ(translate(16, 0), u"y");
-    EXPECT_EQ(translate(16, ShiftFlag), u"Y");
-    EXPECT_EQ(translate(16, OptionFlag), std::nullopt);
-    EXPECT_EQ(translate(83, 0), u"1") << "on the keypad";
-    EXPECT_EQ(translate(51, OptionFlag), u"\b");
+    EXPECT_EQ(translate(KeyCode::Y, {}), u"y");
+    EXPECT_EQ(translate(KeyCode::Y, EventFlag::Shift), u"Y");
+    EXPECT_EQ(translate(KeyCode::Y, EventFlag::Option), std::nullopt);
+    EXPECT_EQ(translate(KeyCode::Keypad1, {}), u"1") << "on the keypad";
+    EXPECT_EQ(translate(KeyCode::Delete, EventFlag::Option), u"\b");
 
     setLayout({"de"});
     await("the layout is de", [&] { return identifier() == "de"; });
-    EXPECT_EQ(translate(16, 0), u"z");
-    EXPECT_EQ(translate(24, 0), std::nullopt) << "a dead key";
+    EXPECT_EQ(translate(KeyCode::Y, {}), u"z");
+    EXPECT_EQ(translate(KeyCode::Equal, {}), std::nullopt) << "a dead key";
     tapKey(29);
     EXPECT_EQ(target->awaitText("z"), "z");
-    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, 16, 0, u"z"}));
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Y, {}, u"z"}));
     rig_->keyboard().press(Key::AltGr);
     tapKey(24);
     rig_->keyboard().releaseAll();
     EXPECT_EQ(target->awaitText("z@"), "z@");
-    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, 12, 0, u"@"})) << "AltGr is not told of";
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Q, {}, u"@"})) << "AltGr is not told of";
 
     removeTap();
     tapKey(29);
@@ -287,7 +288,7 @@ TEST_F(X11TapTest, FollowsTheLayout) {
     createTap();
     setLayout({"de", "-variant", "nodeadkeys"});
     await("the variant is told", [&] { return identifier() == "de(nodeadkeys)"; });
-    EXPECT_EQ(translate(24, 0), u"\u00B4");
+    EXPECT_EQ(translate(KeyCode::Equal, {}), u"\u00B4");
 }
 
 TEST_F(X11TapTest, FollowsTheGroup) {
@@ -303,7 +304,7 @@ TEST_F(X11TapTest, FollowsTheGroup) {
     EXPECT_EQ(target->awaitText("z"), "z");
     await("the other layout is named", [&] { return identifier() == "de"; });
     const auto all = heard();
-    EXPECT_THAT(all, testing::Contains(Heard{Type::KeyDown, 16, 0, u"z"}));
+    EXPECT_THAT(all, testing::Contains(Heard{Type::KeyDown, KeyCode::Y, {}, u"z"}));
 
     // A program that switches layouts does it so.
     XClient switcher(rig_->server().display());
@@ -315,7 +316,7 @@ TEST_F(X11TapTest, FollowsTheGroup) {
     takeHeard(2);
     tapKey(29);
     EXPECT_EQ(target->awaitText("zy"), "zy");
-    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, 16, 0, u"y"}));
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Y, {}, u"y"}));
 }
 
 TEST_F(X11TapTest, ComposesDeadKeys) {
@@ -327,9 +328,9 @@ TEST_F(X11TapTest, ComposesDeadKeys) {
     tapKey(26);  // e
     tapKey(26);
     const auto all = takeHeard(6);
-    EXPECT_EQ(all.at(0), (Heard{Type::KeyDown, 24, 0, u"", true}));
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 14, 0, u"\u00E9"}));
-    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, 14, 0, u"e"}));
+    EXPECT_EQ(all.at(0), (Heard{Type::KeyDown, KeyCode::Equal, {}, u"", true}));
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::E, {}, u"\u00E9"}));
+    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, KeyCode::E, {}, u"e"}));
     EXPECT_EQ(target->awaitText("ée"), "ée");
 }
 
@@ -345,9 +346,9 @@ TEST_F(X11TapTest, ComposesSequences) {
     tapKey(54);
     const auto all = takeHeard(8);
     EXPECT_TRUE(all.at(0).composing);
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, 43, 0, u"", true}));
-    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, 8, 0, u"\u00E7"}));
-    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, 8, 0, u"c"}));
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::Comma, {}, u"", true}));
+    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, KeyCode::C, {}, u"\u00E7"}));
+    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, KeyCode::C, {}, u"c"}));
     EXPECT_EQ(target->awaitText("çc"), "çc");
 }
 
@@ -362,8 +363,8 @@ TEST_F(X11TapTest, HeldKeysRepeat) {
     rig_->keyboard().type("b");
     EXPECT_EQ(target->awaitText(text + "b"), text + "b");
     const auto all = heard();
-    EXPECT_GE(std::ranges::count(all, Heard{Type::KeyDown, 0, 0, u"a"}), 3);
-    EXPECT_EQ(std::ranges::count(all, Heard{Type::KeyUp, 0, 0, u"a"}), 1);
+    EXPECT_GE(std::ranges::count(all, Heard{Type::KeyDown, KeyCode::A, {}, u"a"}), 3);
+    EXPECT_EQ(std::ranges::count(all, Heard{Type::KeyUp, KeyCode::A, {}, u"a"}), 1);
 }
 
 TEST_F(X11TapTest, AKeyWhoseRepeatIsSwallowedStopsRepeating) {
@@ -478,14 +479,15 @@ TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     rig_->keyboard().releaseAll();
     EXPECT_EQ(target->awaitText("SeA"), "SeA");
     const auto all = takeHeard(3);
-    EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, 56, ShiftFlag, u""})) << "what was missed is made up for";
-    EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, 0, ShiftFlag, u"A"}));
+    EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, KeyCode::Shift, EventFlag::Shift, u""}))
+        << "what was missed is made up for";
+    EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, KeyCode::A, EventFlag::Shift, u"A"}));
 }
 
 TEST_F(X11TapTest, MakesUpForModifiersThatCameUpWhileItWasLost) {
     createTap();
     rig_->keyboard().press(Key::LeftControl);
-    EXPECT_EQ(takeHeard(1).front(), (Heard{Type::FlagsChanged, 59, ControlFlag, u""}));
+    EXPECT_EQ(takeHeard(1).front(), (Heard{Type::FlagsChanged, KeyCode::Control, EventFlag::Control, u""}));
     const auto window = tap_->call([](Parts& parts) { return parts.connection->window(); });
     xcb_kill_client(rig_->client().connection(), window);
     rig_->client().focusedWindow();
@@ -495,8 +497,8 @@ TEST_F(X11TapTest, MakesUpForModifiersThatCameUpWhileItWasLost) {
     tap_->call([](Parts& parts) { parts.tap->enable(); });
     tapKey(38);
     const auto all = takeHeard(3);
-    EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, 59, 0, u""}));
-    EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, 0, 0, u"a"}));
+    EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, KeyCode::Control, {}, u""}));
+    EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, KeyCode::A, {}, u"a"}));
 }
 
 TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEnded) {
@@ -519,7 +521,7 @@ TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEnded) {
     takeHeard(1);
     rig_->keyboard().type("b");
     EXPECT_EQ(target->awaitText(text + "b"), text + "b");
-    EXPECT_THAT(takeHeard(2), testing::Contains(Heard{Type::KeyDown, 11, 0, u"b"}));
+    EXPECT_THAT(takeHeard(2), testing::Contains(Heard{Type::KeyDown, KeyCode::B, {}, u"b"}));
     tap_->call([&](Parts& parts) {
         EXPECT_EQ(windows.size(), 2U);
         EXPECT_EQ(windows.back(), parts.connection->window());
@@ -596,7 +598,8 @@ TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThat
     for (const bool down : {true, false}) keys.sendKey(56, down);
     EXPECT_EQ(target->awaitText("b"), "b");
     const auto heard = tap.call([&](Parts& /*parts*/) { return listener.heard; });
-    EXPECT_THAT(heard, testing::ElementsAre(Heard{Type::KeyDown, 11, 0, u"b"}, Heard{Type::KeyUp, 11, 0, u"b"}));
+    EXPECT_THAT(heard, testing::ElementsAre(Heard{Type::KeyDown, KeyCode::B, {}, u"b"},
+                                            Heard{Type::KeyUp, KeyCode::B, {}, u"b"}));
 
     keys.sendKey(50, true);  // Shift
     keys.sync();
@@ -627,7 +630,7 @@ TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
     tap_->call([&](Parts& parts) { parts.keyboard->willWrite(spare, std::array{own}); });
     write(spare, {own, own});
     write(38, {XKB_KEY_q, XKB_KEY_Q});  // the user's change
-    await("the layout has changed", [&] { return translate(0, 0) == u"q"; });
+    await("the layout has changed", [&] { return translate(KeyCode::A, {}) == u"q"; });
     tap_->call([&](Parts& parts) {
         counting.end();
         EXPECT_EQ(changes.count, 1);

@@ -62,14 +62,14 @@ TEST(XkbKeymapTest, CharactersOnNoKeyHaveNoStroke) {
 
 TEST(XkbKeymapTest, KeysAreWhatTheUserMadeOfThem) {
     const auto swapped = keymapOf("us", "", "caps:swapescape");
-    EXPECT_EQ(swapped.keycodeOf(53), 66);
-    EXPECT_EQ(swapped.keycodeOf(57), 9);
-    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_Escape), 53);
+    EXPECT_EQ(swapped.keycodeOf(KeyCode::Escape), 66);
+    EXPECT_EQ(swapped.keycodeOf(KeyCode::CapsLock), 9);
+    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_Escape), KeyCode::Escape);
     const auto control = keymapOf("us", "", "ctrl:nocaps");
-    EXPECT_EQ(control.keycodeOf(57), 0) << "there is no Caps Lock left";
-    EXPECT_EQ(control.keycodeOf(59), 37);
-    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_Control_L), 59);
-    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_a), FirstForeignKeyCode + 66) << "no longer Caps Lock";
+    EXPECT_EQ(control.keycodeOf(KeyCode::CapsLock), 0) << "there is no Caps Lock left";
+    EXPECT_EQ(control.keycodeOf(KeyCode::Control), 37);
+    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_Control_L), KeyCode::Control);
+    EXPECT_EQ(XkbKeymap::virtualKeyOf(66, XKB_KEY_a), foreignKeyCode(66)) << "no longer Caps Lock";
 }
 
 TEST(XkbKeymapTest, ModifiersHaveKeys) {
@@ -107,8 +107,8 @@ TEST(X11KeyCodesTest, EveryKeyHasOneCodeAndBack) {
         const auto key = static_cast<xcb_keycode_t>(keycode);
         EXPECT_EQ(placeOfVirtualKey(virtualKeyAt(key)), key);
     }
-    EXPECT_EQ(placeOfVirtualKey(65535), 0);
-    EXPECT_EQ(placeOfVirtualKey(127), 0);
+    EXPECT_EQ(placeOfVirtualKey(KeyCode::None), 0);
+    EXPECT_EQ(placeOfVirtualKey(KeyCode{127}), 0);
 }
 
 }  // namespace

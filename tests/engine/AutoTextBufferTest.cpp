@@ -33,7 +33,7 @@ TEST(Buffer, IsKeptByKeysThatDoNotProduceOneUnit) {
     for (const TextCase& one : cases) {
         EngineDesk desk;
         desk.service.typeText(u"ab");
-        EXPECT_FALSE(desk.service.pressKeyProducing(14, one.produced)) << one.about;
+        EXPECT_FALSE(desk.service.pressKeyProducing(KeyCode::E, one.produced)) << one.about;
         EXPECT_EQ(desk.engine.letters(), u"ab") << one.about;
     }
 }
@@ -141,7 +141,7 @@ RC_GTEST_PROP(BufferModel, AgreesWithTheEngine, ()) {
                 model += u' ';
                 break;
             case Act::TwoUnits:
-                desk.service.pressKeyProducing(14, u"xy");
+                desk.service.pressKeyProducing(KeyCode::E, u"xy");
                 break;
             case Act::Click:
                 desk.service.click(0, 0);
@@ -152,7 +152,7 @@ RC_GTEST_PROP(BufferModel, AgreesWithTheEngine, ()) {
                 model.clear();
                 break;
             case Act::Nothing:
-                desk.service.pressKey(122);
+                desk.service.pressKey(KeyCode::F1);
                 break;
         }
         RC_ASSERT(desk.engine.letters() == model);

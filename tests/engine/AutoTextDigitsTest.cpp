@@ -11,17 +11,12 @@ namespace {
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 using ::testing::SizeIs;
-
-constexpr std::int32_t Shift = KeyModifier::Shift;
-constexpr std::int32_t Control = KeyModifier::Control;
-constexpr std::int32_t Option = KeyModifier::Option;
-constexpr std::int32_t Command = KeyModifier::Command;
-
+using enum KeyModifier;
 struct DigitCase {
     const char* about;
     std::int64_t setting;
     char16_t key;
-    std::int32_t held;
+    KeyModifiers held;
     bool swallowed;
     std::u16string sent;  // of "aba", "abb" and "abc"; empty for none
     bool visible;         // the list, afterwards
@@ -52,28 +47,28 @@ TEST_P(DigitWithAList, PicksAnEntry) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Settings, DigitWithAList,
-                         ::testing::Values(DigitCase{"first", 0, u'1', 0, true, u"aba", false},
-                                           DigitCase{"last", 0, u'3', 0, true, u"abc", false},
-                                           DigitCase{"one past the end closes the list", 0, u'4', 0, true, u"", false},
-                                           DigitCase{"two past the end is typed", 0, u'5', 0, false, u"", false},
-                                           DigitCase{"0 stands for the tenth", 0, u'0', 0, false, u"", false},
+                         ::testing::Values(DigitCase{"first", 0, u'1', {}, true, u"aba", false},
+                                           DigitCase{"last", 0, u'3', {}, true, u"abc", false},
+                                           DigitCase{"one past the end closes the list", 0, u'4', {}, true, u"", false},
+                                           DigitCase{"two past the end is typed", 0, u'5', {}, false, u"", false},
+                                           DigitCase{"0 stands for the tenth", 0, u'0', {}, false, u"", false},
                                            DigitCase{"not with a modifier", 0, u'1', Option, false, u"", false},
-                                           DigitCase{"not a digit", 0, u'x', 0, false, u"", false},
+                                           DigitCase{"not a digit", 0, u'x', {}, false, u"", false},
                                            DigitCase{"Shift", 1, u'1', Shift, true, u"aba", false},
-                                           DigitCase{"Shift is missing", 1, u'1', 0, false, u"", false},
+                                           DigitCase{"Shift is missing", 1, u'1', {}, false, u"", false},
                                            DigitCase{"Shift and more", 1, u'1', Shift | Option, false, u"", false},
                                            DigitCase{"Control", 2, u'2', Control, true, u"abb", false},
                                            DigitCase{"Control and more", 2, u'2', Control | Shift, false, u"", false},
                                            DigitCase{"Option", 3, u'3', Option, true, u"abc", false},
                                            DigitCase{"Command", 4, u'1', Command, true, u"aba", false},
                                            DigitCase{"another than Command", 4, u'1', Control, false, u"", false},
-                                           DigitCase{"no such modifier", -1, u'1', 0, false, u"", false},
+                                           DigitCase{"no such modifier", -1, u'1', {}, false, u"", false},
                                            DigitCase{"no such bit", 64, u'1', Command, false, u"", false}));
 
 TEST(Digits, ReachTheTenthEntry) {
     EngineDesk desk;
     desk.openListOf(10);
-    EXPECT_TRUE(desk.press(u'0', 0));
+    EXPECT_TRUE(desk.press(u'0', {}));
     ASSERT_THAT(desk.sender.sent, SizeIs(1));
     EXPECT_EQ(desk.sender.sent[0].trigger, SnippetTrigger::Digit | SnippetTrigger::FromSeveralMatches);
 }
@@ -81,7 +76,7 @@ TEST(Digits, ReachTheTenthEntry) {
 TEST(Digits, ThatPickNothingAreTyped) {
     EngineDesk desk;
     desk.openListOf(3);
-    EXPECT_FALSE(desk.press(u'0', 0));
+    EXPECT_FALSE(desk.press(u'0', {}));
     EXPECT_EQ(desk.engine.letters(), u"ab0");
 }
 
@@ -105,7 +100,7 @@ struct SearchCase {
     const char* about;
     std::int64_t setting;
     char16_t key;
-    std::int32_t held;
+    KeyModifiers held;
     bool swallowed;
 };
 
@@ -134,10 +129,10 @@ TEST_P(DigitWithQuickSearch, PicksAResult) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Settings, DigitWithQuickSearch,
-                         ::testing::Values(SearchCase{"plain", 0, u'2', 0, true},
-                                           SearchCase{"past the end", 0, u'3', 0, false},
+                         ::testing::Values(SearchCase{"plain", 0, u'2', {}, true},
+                                           SearchCase{"past the end", 0, u'3', {}, false},
                                            SearchCase{"Shift", 1, u'2', Shift, true},
-                                           SearchCase{"Shift is missing", 1, u'2', 0, false},
+                                           SearchCase{"Shift is missing", 1, u'2', {}, false},
                                            SearchCase{"Command", 4, u'2', Command, true}));
 
 TEST(Digits, AnythingElseTypedIntoQuickSearchLeavesTheEngineAlone) {

@@ -13,8 +13,8 @@ using ::testing::SizeIs;
 
 struct KeyCase {
     const char* about;
-    std::uint16_t key;
-    std::int32_t modifiers;
+    KeyCode key;
+    KeyModifiers modifiers;
     std::u16string letters;  // the buffer afterwards, from "abc"
 };
 
@@ -33,24 +33,30 @@ TEST_P(KeysWithoutAList, EditTheBufferAndReachTheApplication) {
 
 INSTANTIATE_TEST_SUITE_P(
     Codes, KeysWithoutAList,
-    ::testing::Values(KeyCase{"Delete", 51, 0, u"ab"}, KeyCase{"Shift+Delete", 51, KeyModifier::Shift, u"ab"},
-                      KeyCase{"Escape", 53, 0, u""}, KeyCase{"Return", 36, 0, u"abc\r"},
-                      KeyCase{"Shift+Return", 36, KeyModifier::Shift, u"abc\r"}, KeyCase{"Enter", 76, 0, u"abc\x03"},
-                      KeyCase{"Space", 49, 0, u"abc "}, KeyCase{"Shift+Space", 49, KeyModifier::Shift, u"abc "},
-                      KeyCase{"Option+Space", 49, KeyModifier::Option, u"abc\u00A0"}, KeyCase{"Home", 115, 0, u""},
-                      KeyCase{"Page Up", 116, 0, u""}, KeyCase{"End", 119, 0, u""}, KeyCase{"Page Down", 121, 0, u""},
-                      KeyCase{"Left", 123, 0, u""}, KeyCase{"Shift+Right", 124, KeyModifier::Shift, u""},
-                      KeyCase{"Down", 125, 0, u""}, KeyCase{"Up", 126, 0, u""},
-                      KeyCase{"Forward Delete", 117, 0, u"abc"}, KeyCase{"Tab", 48, 0, u"abc\t"},
-                      KeyCase{"keypad 7", 89, 0, u"abc7"}, KeyCase{"a key that types nothing", 122, 0, u"abc"},
-                      KeyCase{"Option+Delete", 51, KeyModifier::Option, u""},
-                      KeyCase{"Command+Left", 123, KeyModifier::Command, u""},
-                      KeyCase{"Control+A", 0, KeyModifier::Control, u""}));
+    ::testing::Values(KeyCase{"Delete", KeyCode::Delete, {}, u"ab"},
+                      KeyCase{"Shift+Delete", KeyCode::Delete, KeyModifier::Shift, u"ab"},
+                      KeyCase{"Escape", KeyCode::Escape, {}, u""}, KeyCase{"Return", KeyCode::Return, {}, u"abc\r"},
+                      KeyCase{"Shift+Return", KeyCode::Return, KeyModifier::Shift, u"abc\r"},
+                      KeyCase{"Enter", KeyCode::KeypadEnter, {}, u"abc\x03"},
+                      KeyCase{"Space", KeyCode::Space, {}, u"abc "},
+                      KeyCase{"Shift+Space", KeyCode::Space, KeyModifier::Shift, u"abc "},
+                      KeyCase{"Option+Space", KeyCode::Space, KeyModifier::Option, u"abc\u00A0"},
+                      KeyCase{"Home", KeyCode::Home, {}, u""}, KeyCase{"Page Up", KeyCode::PageUp, {}, u""},
+                      KeyCase{"End", KeyCode::End, {}, u""}, KeyCase{"Page Down", KeyCode::PageDown, {}, u""},
+                      KeyCase{"Left", KeyCode::Left, {}, u""},
+                      KeyCase{"Shift+Right", KeyCode::Right, KeyModifier::Shift, u""},
+                      KeyCase{"Down", KeyCode::Down, {}, u""}, KeyCase{"Up", KeyCode::Up, {}, u""},
+                      KeyCase{"Forward Delete", KeyCode::ForwardDelete, {}, u"abc"},
+                      KeyCase{"Tab", KeyCode::Tab, {}, u"abc\t"}, KeyCase{"keypad 7", KeyCode::Keypad7, {}, u"abc7"},
+                      KeyCase{"a key that types nothing", KeyCode::F1, {}, u"abc"},
+                      KeyCase{"Option+Delete", KeyCode::Delete, KeyModifier::Option, u""},
+                      KeyCase{"Command+Left", KeyCode::Left, KeyModifier::Command, u""},
+                      KeyCase{"Control+A", KeyCode::A, KeyModifier::Control, u""}));
 
 struct ListKeyCase {
     const char* about;
-    std::uint16_t key;
-    std::int32_t modifiers;
+    KeyCode key;
+    KeyModifiers modifiers;
     bool swallowed;
     bool visible;          // the list, afterwards
     std::size_t selected;  // from entry 1 of 3
@@ -81,16 +87,17 @@ TEST_P(KeysWithAList, DriveIt) {
 
 INSTANTIATE_TEST_SUITE_P(
     Codes, KeysWithAList,
-    ::testing::Values(ListKeyCase{"Down", 125, 0, true, true, 2, {}}, ListKeyCase{"Up", 126, 0, true, true, 0, {}},
-                      ListKeyCase{"Return", 36, 0, true, false, 1, {u"abd"}},
-                      ListKeyCase{"Shift+Return", 36, KeyModifier::Shift, true, false, 1, {u"abd"}},
-                      ListKeyCase{"Enter", 76, 0, true, false, 1, {u"abd"}},
-                      ListKeyCase{"Escape", 53, 0, true, false, 1, {}},
-                      ListKeyCase{"Left", 123, 0, false, false, 1, {}},
-                      ListKeyCase{"Forward Delete", 117, 0, false, true, 1, {}},
-                      ListKeyCase{"Shift+Space", 49, KeyModifier::Shift, false, true, 1, {}},
-                      ListKeyCase{"Space, which begins nothing", 49, 0, false, false, 1, {}},
-                      ListKeyCase{"Delete, back to a shorter beginning", 51, 0, false, true, 0, {}}));
+    ::testing::Values(ListKeyCase{"Down", KeyCode::Down, {}, true, true, 2, {}},
+                      ListKeyCase{"Up", KeyCode::Up, {}, true, true, 0, {}},
+                      ListKeyCase{"Return", KeyCode::Return, {}, true, false, 1, {u"abd"}},
+                      ListKeyCase{"Shift+Return", KeyCode::Return, KeyModifier::Shift, true, false, 1, {u"abd"}},
+                      ListKeyCase{"Enter", KeyCode::KeypadEnter, {}, true, false, 1, {u"abd"}},
+                      ListKeyCase{"Escape", KeyCode::Escape, {}, true, false, 1, {}},
+                      ListKeyCase{"Left", KeyCode::Left, {}, false, false, 1, {}},
+                      ListKeyCase{"Forward Delete", KeyCode::ForwardDelete, {}, false, true, 1, {}},
+                      ListKeyCase{"Shift+Space", KeyCode::Space, KeyModifier::Shift, false, true, 1, {}},
+                      ListKeyCase{"Space, which begins nothing", KeyCode::Space, {}, false, false, 1, {}},
+                      ListKeyCase{"Delete, back to a shorter beginning", KeyCode::Delete, {}, false, true, 0, {}}));
 
 TEST(Keys, EscapeThatClosesTheListKeepsTheBuffer) {
     EngineDesk desk;
@@ -113,7 +120,7 @@ TEST(Keys, ReturnSendsTheSelectedEntryAsASuggestion) {
     EXPECT_EQ(desk.sender.sent[0], (RecordingSender::Sent{u"abd", u"ab", SnippetTrigger::Suggestion, u"ab", false}));
 }
 
-class ShiftWithSpaceLikeKeys : public ::testing::TestWithParam<std::uint16_t> {};
+class ShiftWithSpaceLikeKeys : public ::testing::TestWithParam<KeyCode> {};
 
 TEST_P(ShiftWithSpaceLikeKeys, NeverExpand) {
     EngineDesk desk;
@@ -169,7 +176,7 @@ TEST(Undo, EndsWithTheNextKeyButNotWithClicksAndShortcuts) {
     const UndoCase cases[] = {
         {"letter", [](EngineDesk& desk) { desk.service.typeText(u"a"); }, false},
         {"Forward Delete", [](EngineDesk& desk) { desk.service.pressKey(KeyCode::ForwardDelete); }, false},
-        {"key without text", [](EngineDesk& desk) { desk.service.pressKey(122); }, false},
+        {"key without text", [](EngineDesk& desk) { desk.service.pressKey(KeyCode::F1); }, false},
         {"click", [](EngineDesk& desk) { desk.service.click(1, 1); }, true},
         {"Command+S", [](EngineDesk& desk) { desk.press(u's', KeyModifier::Command); }, true},
     };

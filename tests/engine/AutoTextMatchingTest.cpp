@@ -187,7 +187,7 @@ TEST(HotKey, DoesNothingInPlumeOrInQuickSearchOrWithoutAMatch) {
     desk.engine.expandAtHotkey();
     desk.search.visible = false;
     desk.processes.setFrontProcess(desk.processes.currentProcess());
-    desk.service.pressKey(122);
+    desk.service.pressKey(KeyCode::F1);
     desk.engine.setLetters(u"sig");
     desk.engine.expandAtHotkey();
     EXPECT_THAT(desk.sender.sent, IsEmpty());

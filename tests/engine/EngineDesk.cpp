@@ -84,7 +84,7 @@ std::unique_ptr<QuickSearchController> makeRecordedSearch(SearchWindow& window) 
 }
 
 bool RecordingSender::sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                                  const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) {
+                                  const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) {
     sent.push_back({*snippet->abbreviation(), abbreviation, snippetTrigger, engine.letters(), *listVisible});
     engine.clear();
     engine.setLetters(lettersAfter);
@@ -132,7 +132,7 @@ void EngineDesk::openListOf(int count, const std::u16string& abbreviation) {
     loop.runReady();
 }
 
-bool EngineDesk::press(char16_t character, std::int32_t modifiers) {
+bool EngineDesk::press(char16_t character, KeyModifiers modifiers) {
     return service.pressKey(SimulatedInputSources::strokeFor(character)->keyCode, modifiers);
 }
 

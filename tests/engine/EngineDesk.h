@@ -22,14 +22,14 @@ class RecordingSender final : public SnippetSender {
     struct Sent {
         std::u16string abbreviation;  // of the snippet
         std::optional<std::u16string> typed;
-        std::uint32_t trigger;
+        SnippetTriggers trigger;
         std::u16string lettersBefore;
         bool listVisible;
         bool operator==(const Sent&) const = default;
     };
 
     bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                     const std::optional<std::u16string>& abbreviation, std::uint32_t snippetTrigger) override;
+                     const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) override;
     bool undo(EngineState& /*engine*/, bool /*withTrigger*/) override { return false; }
 
     std::vector<Sent> sent;
@@ -99,7 +99,7 @@ class EngineDesk {
     // Types what several snippets with this abbreviation match, and lets the list open.
     void openListOf(int count, const std::u16string& abbreviation = u"ab");
     // The key that types this character, with these modifiers held.
-    bool press(char16_t character, std::int32_t modifiers);
+    bool press(char16_t character, KeyModifiers modifiers);
 
     SimulatedProcessManager processes;
     SimulatedInputSources sources;

@@ -9,7 +9,7 @@ namespace {
 TEST(GeneralHotKey, IsValidWithAKeyOrWithModifiers) {
     EXPECT_FALSE(GeneralHotKey().isValid());
     EXPECT_TRUE((GeneralHotKey{KeyModifier::Shift, KeyCode::None}).isValid());
-    EXPECT_TRUE((GeneralHotKey{0, 0}).isValid());
+    EXPECT_TRUE((GeneralHotKey{{}, KeyCode::A}).isValid());
 }
 
 struct PackedCase {
@@ -31,11 +31,19 @@ TEST(GeneralHotKey, PacksModifiersAboveTheKeyCode) {
     }
 }
 
-RC_GTEST_PROP(GeneralHotKeyValue, IsReadBackAsItWas, (std::int32_t modifiers, std::int32_t keyCode)) {
-    const GeneralHotKey hotKey{modifiers, keyCode};
+RC_GTEST_PROP(GeneralHotKeyValue, IsReadBackAsItWas, (std::int32_t modifiers, std::uint16_t keyCode)) {
+    const GeneralHotKey hotKey{KeyModifiers::fromBits(modifiers), KeyCode{keyCode}};
     GeneralHotKey read;
     read.setValue(hotKey.getValue());
     RC_ASSERT(read == hotKey);
+}
+
+TEST(GeneralHotKey, IsNoneWithACodeThatNoKeyHas) {
+    for (const std::int64_t packed : {(std::int64_t{2} << 32) + 65536, std::int64_t{-1}}) {
+        GeneralHotKey read{KeyModifier::Control, KeyCode::A};
+        read.setValue(packed);
+        EXPECT_FALSE(read.isValid()) << packed;
+    }
 }
 
 struct FlagCase {
@@ -49,7 +57,9 @@ TEST(Modifiers, AreFourBitsOfTheEventFlags) {
         {0x20102, 1},  // the left Shift key, as a device reports it
         {0x200000, 0}  // keypad
     };
-    for (const FlagCase& one : cases) EXPECT_EQ(modifiersFromFlags(one.flags), one.modifiers) << one.flags;
+    for (const FlagCase& one : cases) {
+        EXPECT_EQ(modifiersFromFlags(EventFlags::fromBits(one.flags)).bits(), one.modifiers) << one.flags;
+    }
 }
 
 }  // namespace

@@ -57,7 +57,7 @@ class HandSecureInput final : public SecureInput {
 
 class HandSystemHotKeys final : public SystemHotKeys {
   public:
-    Result<void> registerHotKey(Id id, std::uint16_t keyCode, std::int32_t modifiers,
+    Result<void> registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers,
                                 std::function<void()> handler) override {
         registered[id] = {{modifiers, keyCode}, std::move(handler)};
         return {};
@@ -107,16 +107,16 @@ struct InputDesk {
         processes.setFrontProcess(process);
         return process;
     }
-    bool send(TapEvent::Type type, std::uint16_t keyCode, std::u16string_view text = {}, std::uint64_t flags = 0) {
+    bool send(TapEvent::Type type, KeyCode keyCode, std::u16string_view text = {}, EventFlags flags = {}) {
         return tap.listener->keyboardEvent({type, keyCode, flags, text});
     }
-    bool keyDown(std::uint16_t keyCode, std::u16string_view text = {}) {
+    bool keyDown(KeyCode keyCode, std::u16string_view text = {}) {
         return send(TapEvent::Type::KeyDown, keyCode, text, heldFlags);
     }
-    bool keyUp(std::uint16_t keyCode) { return send(TapEvent::Type::KeyUp, keyCode, {}, heldFlags); }
-    bool hold(std::int32_t modifiers) {
-        heldFlags = static_cast<std::uint64_t>(modifiers) << 17;
-        return send(TapEvent::Type::FlagsChanged, 0, {}, heldFlags);
+    bool keyUp(KeyCode keyCode) { return send(TapEvent::Type::KeyUp, keyCode, {}, heldFlags); }
+    bool hold(KeyModifiers modifiers) {
+        heldFlags = flagsFromModifiers(modifiers);
+        return send(TapEvent::Type::FlagsChanged, KeyCode::None, {}, heldFlags);
     }
 
     // A plain output.
@@ -140,7 +140,7 @@ struct InputDesk {
     HandSystemHotKeys systemHotKeys;
     BundleIdentifierResolver identifiers{processes};
     std::vector<std::string> log;
-    std::uint64_t heldFlags = 0;
+    EventFlags heldFlags;
     MacInputService service{{tap, mouse, poster, pasteboard, processes, sources, accessibility, secure, systemHotKeys,
                              identifiers, loop, loop, [this](const std::string& line) { log.push_back(line); }}};
 };

@@ -28,15 +28,15 @@ struct Listener {
         subscriptions.push_back(service.keyboardTapGivenUpEvent.addObserver(this, &Listener::givenUp));
     }
     static std::string name(const GeneralHotKey& hotKey) {
-        return std::to_string(hotKey.keyCode) + "/" + std::to_string(hotKey.modifiers);
+        return std::to_string(numberOf(hotKey.keyCode)) + "/" + std::to_string(hotKey.modifiers.bits());
     }
     void keyDown(ZDKeyEventArgs& event) {
-        heard.push_back("key " + std::to_string(event.key) + " " + toUtf8(event.s.value_or(u"-")));
+        heard.push_back("key " + std::to_string(numberOf(event.key)) + " " + toUtf8(event.s.value_or(u"-")));
         EXPECT_EQ(event.c, event.s && !event.s->empty() ? event.s->front() : u'\0');
         EXPECT_EQ(service.lastKeyString(), event.s);
         event.cancel = swallows;
     }
-    void keyUp(ZDKeyEventArgs& event) { heard.push_back("up " + std::to_string(event.key)); }
+    void keyUp(ZDKeyEventArgs& event) { heard.push_back("up " + std::to_string(numberOf(event.key))); }
     void contextChanged(InputContextChange&) { heard.emplace_back("context"); }
     void shortcut(ZDUnregisteredHotKeyPressedEventArgs& event) {
         heard.push_back("shortcut " + name(event.hotKey));
@@ -80,120 +80,120 @@ struct MacInputServiceTest : ::testing::Test {
 };
 
 TEST_F(MacInputServiceTest, ReadsWhatAKeyTypes) {
-    desk.keyDown(8, u"c");
-    desk.keyDown(8, u"ch");
-    desk.keyDown(8);
-    desk.heldFlags = EventFlag::Shift | 0x10000;
-    desk.keyDown(8);
-    desk.keyDown(10);
+    desk.keyDown(KeyCode::C, u"c");
+    desk.keyDown(KeyCode::C, u"ch");
+    desk.keyDown(KeyCode::C);
+    desk.heldFlags = EventFlag::Shift | EventFlag::CapsLock;
+    desk.keyDown(KeyCode::C);
+    desk.keyDown(KeyCode::Section);
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "key 8 ch", "key 8 c", "key 8 C", "key 10 -"));
 }
 
 TEST_F(MacInputServiceTest, ForgetsTheLastKeyAtTheNextEvent) {
-    desk.keyDown(8, u"c");
+    desk.keyDown(KeyCode::C, u"c");
     EXPECT_EQ(desk.service.lastKeyString(), u"c");
-    desk.hold(1);
+    desk.hold(KeyModifier::Shift);
     EXPECT_EQ(desk.service.lastKeyString(), std::nullopt);
 }
 
 TEST_F(MacInputServiceTest, ASwallowedKeyIsSwallowedWithItsRelease) {
-    EXPECT_FALSE(desk.keyDown(8, u"c"));
-    EXPECT_FALSE(desk.keyUp(8));
+    EXPECT_FALSE(desk.keyDown(KeyCode::C, u"c"));
+    EXPECT_FALSE(desk.keyUp(KeyCode::C));
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "up 8"));
     listener.swallows = true;
-    EXPECT_TRUE(desk.keyDown(8, u"c"));
-    EXPECT_FALSE(desk.keyUp(9)) << "another key";
-    EXPECT_TRUE(desk.keyUp(8));
-    EXPECT_FALSE(desk.keyUp(8)) << "once";
+    EXPECT_TRUE(desk.keyDown(KeyCode::C, u"c"));
+    EXPECT_FALSE(desk.keyUp(KeyCode::V)) << "another key";
+    EXPECT_TRUE(desk.keyUp(KeyCode::C));
+    EXPECT_FALSE(desk.keyUp(KeyCode::C)) << "once";
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "up 9", "up 8"));
 }
 
 TEST_F(MacInputServiceTest, ShortcutsAreNoText) {
     desk.hold(KeyModifier::Command);
-    EXPECT_FALSE(desk.keyDown(8, u"c"));
+    EXPECT_FALSE(desk.keyDown(KeyCode::C, u"c"));
     EXPECT_THAT(heard(), ElementsAre("shortcut 8/8", "context"));
     listener.swallows = true;
-    EXPECT_TRUE(desk.keyDown(8, u"c"));
-    EXPECT_TRUE(desk.keyUp(8));
+    EXPECT_TRUE(desk.keyDown(KeyCode::C, u"c"));
+    EXPECT_TRUE(desk.keyUp(KeyCode::C));
     EXPECT_THAT(heard(), ElementsAre("shortcut 8/8"));
     listener.swallows = false;
     desk.hold(KeyModifier::Option);
-    desk.keyDown(8, u"ç");
-    desk.keyDown(51, u"\b");
+    desk.keyDown(KeyCode::C, u"ç");
+    desk.keyDown(KeyCode::Delete, u"\b");
     EXPECT_THAT(heard(), ElementsAre("key 8 ç", "shortcut 51/4", "context"));
 }
 
 TEST_F(MacInputServiceTest, ACommandOfThePortIsAShortcutWhateverItTypes) {
     desk.hold(KeyModifier::Option);
-    const auto press = [&](std::uint16_t keyCode, std::u16string_view text) {
+    const auto press = [&](KeyCode keyCode, std::u16string_view text) {
         desk.tap.listener->keyboardEvent(
             {.keyCode = keyCode, .flags = desk.heldFlags, .string = text, .command = true});
     };
-    press(8, u"");
+    press(KeyCode::C, u"");
     EXPECT_EQ(listener.shortcutCharacter, u'c') << "what the key is called";
-    press(36, u"\r");
+    press(KeyCode::Return, u"\r");
     EXPECT_THAT(heard(), ElementsAre("shortcut 8/4", "context", "shortcut 36/4", "context"));
 }
 
 TEST_F(MacInputServiceTest, AKeyInTheMiddleOfASequenceTypesNothing) {
-    desk.tap.listener->keyboardEvent({.keyCode = 8, .string = {}, .composing = true});
+    desk.tap.listener->keyboardEvent({.keyCode = KeyCode::C, .string = {}, .composing = true});
     EXPECT_THAT(heard(), ElementsAre("key 8 -"));
 }
 
 TEST_F(MacInputServiceTest, WhatIsTypedAfterWithheldKeysStandsAlone) {
-    desk.keyDown(8, u"c");
+    desk.keyDown(KeyCode::C, u"c");
     desk.tap.listener->keysWithheld();
-    desk.keyDown(9, u"v");
+    desk.keyDown(KeyCode::V, u"v");
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "context", "key 9 v"));
 }
 
 TEST_F(MacInputServiceTest, HotKeysComeBeforeTheEngine) {
-    desk.service.registerHotKey({KeyModifier::Control, 40});
-    desk.service.registerHotKey({KeyModifier::Control, 40});
+    desk.service.registerHotKey({KeyModifier::Control, KeyCode::K});
+    desk.service.registerHotKey({KeyModifier::Control, KeyCode::K});
     desk.hold(KeyModifier::Control);
-    EXPECT_FALSE(desk.keyDown(40, u"k"));
+    EXPECT_FALSE(desk.keyDown(KeyCode::K, u"k"));
     EXPECT_THAT(heard(), ElementsAre("hot 40/2", "hot 40/2", "shortcut 40/2", "context"));
     listener.swallows = true;
-    EXPECT_TRUE(desk.keyDown(40, u"k"));
-    EXPECT_TRUE(desk.keyUp(40));
+    EXPECT_TRUE(desk.keyDown(KeyCode::K, u"k"));
+    EXPECT_TRUE(desk.keyUp(KeyCode::K));
     EXPECT_THAT(heard(), ElementsAre("hot 40/2", "hot 40/2"));
-    desk.service.unregisterHotKey({KeyModifier::Control, 40});
-    desk.service.unregisterHotKey({KeyModifier::Control, 40});
-    desk.service.unregisterHotKey({KeyModifier::Control, 40});
-    desk.keyDown(40, u"k");
+    desk.service.unregisterHotKey({KeyModifier::Control, KeyCode::K});
+    desk.service.unregisterHotKey({KeyModifier::Control, KeyCode::K});
+    desk.service.unregisterHotKey({KeyModifier::Control, KeyCode::K});
+    desk.keyDown(KeyCode::K, u"k");
     EXPECT_THAT(heard(), ElementsAre("shortcut 40/2"));
 }
 
 TEST_F(MacInputServiceTest, ModifiersAloneAreAHotKey) {
-    constexpr std::int32_t Both = KeyModifier::Control | KeyModifier::Option;
+    constexpr KeyModifiers Both = KeyModifier::Control | KeyModifier::Option;
     desk.service.registerHotKey({Both, KeyCode::None});
     desk.hold(KeyModifier::Control);
     desk.hold(Both);
     desk.hold(KeyModifier::Option);
-    desk.hold(0);
+    desk.hold({});
     EXPECT_THAT(heard(), ElementsAre("hot 65535/6"));
 
     desk.hold(Both);
-    desk.keyDown(40, u"k");
+    desk.keyDown(KeyCode::K, u"k");
     heard();
-    desk.hold(0);
+    desk.hold({});
     EXPECT_THAT(heard(), IsEmpty()) << "they were held for the key";
 
     desk.hold(Both);
     desk.service.ignoreNextHotKey();
-    desk.hold(0);
+    desk.hold({});
     EXPECT_THAT(heard(), IsEmpty());
 }
 
 TEST_F(MacInputServiceTest, NoticesAnotherProgramBeforeItsFirstKey) {
-    desk.keyDown(8, u"c");
+    desk.keyDown(KeyCode::C, u"c");
     const auto other = desk.activate(u"other");
-    desk.keyDown(8, u"c");
+    desk.keyDown(KeyCode::C, u"c");
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "context", "key 8 c"));
     EXPECT_EQ(desk.service.lastProcessReceivedKeyEvent(), other);
     EXPECT_FALSE(desk.service.isSameProcess());
     desk.processes.setFrontProcess(desk.processes.currentProcess());
-    desk.keyUp(8);
+    desk.keyUp(KeyCode::C);
     EXPECT_THAT(heard(), ElementsAre("context", "up 8"));
     EXPECT_TRUE(desk.service.isSameProcess());
 }
@@ -229,10 +229,10 @@ TEST_F(MacInputServiceTest, FollowsSecureInput) {
     desk.secure.on = true;
     desk.service.checkSecureInput();
     EXPECT_THAT(heard(), ElementsAre("secure"));
-    desk.hold(1);
+    desk.hold(KeyModifier::Shift);
     EXPECT_THAT(heard(), IsEmpty());
-    desk.keyDown(8, u"c");
-    desk.keyDown(9, u"v");
+    desk.keyDown(KeyCode::C, u"c");
+    desk.keyDown(KeyCode::V, u"v");
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "key 9 v", "not secure"));
     desk.service.disableEvents();
     desk.loop.runReady();
@@ -243,10 +243,10 @@ TEST_F(MacInputServiceTest, ModifiersHeldWhenTheTapIsLostAreNoHotKey) {
     desk.service.registerHotKey({KeyModifier::Command, KeyCode::None});
     desk.hold(KeyModifier::Command);
     desk.tap.listener->tapDisabledByTimeout();
-    desk.hold(0);
+    desk.hold({});
     EXPECT_THAT(heard(), IsEmpty());
     desk.hold(KeyModifier::Command);
-    desk.hold(0);
+    desk.hold({});
     EXPECT_THAT(heard(), ElementsAre("hot 65535/8"));
 }
 
@@ -294,11 +294,11 @@ TEST_F(MacInputServiceTest, TheSystemsHotKeyIsNoHotKeyOfModifiers) {
         EXPECT_TRUE(desk.service.registerSystemHotKey(1, hotKey, [&] { ++pressed; }));
         return desk.systemHotKeys.registered.size();
     };
-    ASSERT_EQ(registered({KeyModifier::Command, 49}), 1U);
-    EXPECT_EQ(desk.systemHotKeys.registered[1].first, (GeneralHotKey{KeyModifier::Command, 49}));
+    ASSERT_EQ(registered({KeyModifier::Command, KeyCode::Space}), 1U);
+    EXPECT_EQ(desk.systemHotKeys.registered[1].first, (GeneralHotKey{KeyModifier::Command, KeyCode::Space}));
     desk.hold(KeyModifier::Command);
     desk.systemHotKeys.registered[1].second();
-    desk.hold(0);
+    desk.hold({});
     EXPECT_EQ(pressed, 1);
     EXPECT_THAT(heard(), IsEmpty());
     EXPECT_EQ(registered({KeyModifier::Command, KeyCode::None}), 0U) << "without a key there is none";
@@ -330,7 +330,7 @@ TEST_F(MacInputServiceTest, CopiesAsTheApplicationInFrontWantsIt) {
 }
 
 TEST_F(MacInputServiceTest, TheTriggerKeyIsTypedAgainBehindLongOutput) {
-    desk.keyDown(36, u"\r");
+    desk.keyDown(KeyCode::Return, u"\r");
     auto group = SnippetGroup::make();
     group->setExpandTrigger(ExpandTrigger::DelimiterKept);
     auto snippet = std::make_shared<Snippet>();
@@ -356,11 +356,11 @@ TEST(MacInputService, APlainKeyAllocatesNothing) {
     const auto typeAll = [&] {
         for (int i = 0; i < 10; ++i) {
             desk.hold(KeyModifier::Shift);
-            desk.keyDown(8, u"C");
-            desk.keyUp(8);
-            desk.hold(0);
-            desk.keyDown(8);
-            desk.keyUp(8);
+            desk.keyDown(KeyCode::C, u"C");
+            desk.keyUp(KeyCode::C);
+            desk.hold({});
+            desk.keyDown(KeyCode::C);
+            desk.keyUp(KeyCode::C);
         }
     };
     typeAll();

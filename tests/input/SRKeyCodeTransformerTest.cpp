@@ -2,7 +2,8 @@
 
 #include <gtest/gtest.h>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "ports/simulated/SimulatedInputSources.h"
 
 namespace plume {
@@ -14,10 +15,13 @@ class OtherLayout final : public InputSources {
     const std::optional<std::u16string>& currentInputSourceIdentifier() const override {
         return us_.currentInputSourceIdentifier();
     }
-    std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override {
+    std::optional<std::u16string> translateKey(KeyCode keyCode, EventFlags flags) const override {
         if (!changed) return us_.translateKey(keyCode, flags);
-        if (keyCode == 16) return std::nullopt;
-        return us_.translateKey(keyCode == 9 ? 40 : keyCode == 40 ? 9 : keyCode, flags);
+        if (keyCode == KeyCode::Y) return std::nullopt;
+        return us_.translateKey(keyCode == KeyCode::V   ? KeyCode::K
+                                : keyCode == KeyCode::K ? KeyCode::V
+                                                        : keyCode,
+                                flags);
     }
     void setChangeListener(std::function<void()>) override {}
 
@@ -31,40 +35,39 @@ TEST(SRKeyCodeTransformer, NamesKeys) {
     const SimulatedInputSources us;
     const SRKeyCodeTransformer transformer(us, {u"Leertaste", u"Ziffernblock %@"});
     struct Case {
-        std::int64_t keyCode;
+        KeyCode keyCode;
         std::optional<std::u16string> name;
     };
     const Case cases[] = {
-        {0, u"A"},
-        {9, u"V"},
-        {18, u"1"},
-        {49, u"Leertaste"},
-        {51, u"\u232B"},
-        {36, u"\u21A9"},
-        {76, u"\u2305"},
-        {122, u"F1"},
-        {80, u"F19"},
-        {83, u"Ziffernblock 1"},
-        {114, u"?"},
-        {65535, std::nullopt},
-        {-1, std::nullopt},
-        {10, std::nullopt},
-        {40000, std::nullopt},
+        {KeyCode::A, u"A"},
+        {KeyCode::V, u"V"},
+        {KeyCode::Digit1, u"1"},
+        {KeyCode::Space, u"Leertaste"},
+        {KeyCode::Delete, u"\u232B"},
+        {KeyCode::Return, u"\u21A9"},
+        {KeyCode::KeypadEnter, u"\u2305"},
+        {KeyCode::F1, u"F1"},
+        {KeyCode::F19, u"F19"},
+        {KeyCode::Keypad1, u"Ziffernblock 1"},
+        {KeyCode::Help, u"?"},
+        {KeyCode::None, std::nullopt},
+        {KeyCode::Section, std::nullopt},
+        {KeyCode{40000}, std::nullopt},
     };
-    for (const Case& c : cases) EXPECT_EQ(transformer.transformedValue(c.keyCode), c.name) << c.keyCode;
+    for (const Case& c : cases) EXPECT_EQ(transformer.transformedValue(c.keyCode), c.name) << numberOf(c.keyCode);
 }
 
 TEST(SRKeyCodeTransformer, FindsKeysByTheirNames) {
     const SimulatedInputSources us;
     const SRKeyCodeTransformer transformer(us);
-    EXPECT_EQ(transformer.keyCodeForString(u"V"), 9);
+    EXPECT_EQ(transformer.keyCodeForString(u"V"), KeyCode::V);
     EXPECT_EQ(transformer.keyCodeForString(u"v"), KeyCode::None);
-    EXPECT_EQ(transformer.keyCodeForString(u"Pad 1"), 83);
-    EXPECT_EQ(transformer.keyCodeForString(u"1"), 18);
-    EXPECT_EQ(transformer.keyCodeForString(u"Space"), 49);
+    EXPECT_EQ(transformer.keyCodeForString(u"Pad 1"), KeyCode::Keypad1);
+    EXPECT_EQ(transformer.keyCodeForString(u"1"), KeyCode::Digit1);
+    EXPECT_EQ(transformer.keyCodeForString(u"Space"), KeyCode::Space);
     EXPECT_EQ(transformer.reverseTransformedValue(u"nothing"), std::nullopt);
     for (std::uint16_t code = 0; code < 128; ++code) {
-        const auto name = transformer.transformedValue(code);
+        const auto name = transformer.transformedValue(KeyCode{code});
         if (!name) continue;
         EXPECT_EQ(transformer.transformedValue(transformer.keyCodeForString(*name)), name) << code;
     }
@@ -73,11 +76,11 @@ TEST(SRKeyCodeTransformer, FindsKeysByTheirNames) {
 TEST(SRKeyCodeTransformer, FollowsTheLayout) {
     OtherLayout layout;
     SRKeyCodeTransformer transformer(layout);
-    EXPECT_EQ(transformer.keyCodeForString(u"V"), 9);
+    EXPECT_EQ(transformer.keyCodeForString(u"V"), KeyCode::V);
     layout.changed = true;
     transformer.regenerateStringToKeyCodeMapping();
-    EXPECT_EQ(transformer.keyCodeForString(u"V"), 40);
-    EXPECT_EQ(transformer.keyCodeForString(u"K"), 9);
+    EXPECT_EQ(transformer.keyCodeForString(u"V"), KeyCode::K);
+    EXPECT_EQ(transformer.keyCodeForString(u"K"), KeyCode::V);
     EXPECT_EQ(transformer.keyCodeForString(u"Y"), KeyCode::None) << "a name of the layout before";
 }
 

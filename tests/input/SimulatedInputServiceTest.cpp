@@ -25,14 +25,15 @@ class Keyboard : public ::testing::Test {
     }
     void onKey(ZDKeyEventArgs& event) {
         const std::string text = event.s ? toUtf8(*event.s) : "nothing";
-        log.push_back("key " + std::to_string(event.key) + " " + text);
-        modifiers.push_back(service.keyModifier());
+        log.push_back("key " + std::to_string(numberOf(event.key)) + " " + text);
+        modifiers.push_back(service.keyModifier().bits());
         EXPECT_EQ(event.c, event.s && !event.s->empty() ? event.s->front() : u'\0');
         event.cancel = swallows;
     }
     void onContext(InputContextChange& /*change*/) { log.emplace_back("context"); }
     void onHotKey(ZDUnregisteredHotKeyPressedEventArgs& event) {
-        log.push_back("hot key " + std::to_string(event.hotKey.keyCode) + " " + std::to_string(event.hotKey.modifiers));
+        log.push_back("hot key " + std::to_string(numberOf(event.hotKey.keyCode)) + " " +
+                      std::to_string(event.hotKey.modifiers.bits()));
         EXPECT_EQ(event.key, event.hotKey.keyCode);
         event.cancel = swallows;
     }
@@ -56,7 +57,7 @@ TEST_F(Keyboard, TypesWithShiftWhereACharacterNeedsIt) {
     EXPECT_EQ(service.typeText(u"aA1!\n\t"), u"aA1!\n\t");
     EXPECT_THAT(log, ElementsAre("key 0 a", "key 0 A", "key 18 1", "key 18 !", "key 36 \r", "key 48 \t"));
     EXPECT_THAT(modifiers, ElementsAre(0, 1, 0, 1, 0, 0));
-    EXPECT_EQ(service.keyModifier(), 0);
+    EXPECT_TRUE(service.keyModifier().isEmpty());
 }
 
 TEST_F(Keyboard, TypesCharactersThatAreOnNoKeyInOnePiece) {
@@ -68,7 +69,7 @@ TEST_F(Keyboard, TellsWhatWasSwallowed) {
     swallows = true;
     EXPECT_EQ(service.typeText(u"ab"), u"");
     EXPECT_TRUE(service.pressKey(KeyCode::Left));
-    EXPECT_TRUE(service.pressKey(0, KeyModifier::Command));
+    EXPECT_TRUE(service.pressKey(KeyCode::A, KeyModifier::Command));
 }
 
 TEST_F(Keyboard, NoticesAnotherProgramAtItsFirstKey) {
@@ -84,20 +85,20 @@ TEST_F(Keyboard, NoticesAnotherProgramAtItsFirstKey) {
 }
 
 TEST_F(Keyboard, ShortcutsAreNoKeysAndChangeTheContextUnlessSwallowed) {
-    EXPECT_FALSE(service.pressKey(1, KeyModifier::Command | KeyModifier::Shift));
+    EXPECT_FALSE(service.pressKey(KeyCode::S, KeyModifier::Command | KeyModifier::Shift));
     EXPECT_FALSE(service.pressKey(KeyCode::Delete, KeyModifier::Option));
     swallows = true;
-    EXPECT_TRUE(service.pressKey(18, KeyModifier::Control));
+    EXPECT_TRUE(service.pressKey(KeyCode::Digit1, KeyModifier::Control));
     EXPECT_THAT(log, ElementsAre("hot key 1 9", "context", "hot key 51 4", "context", "hot key 18 2"));
 }
 
 TEST_F(Keyboard, OptionChangesWhatAKeyProduces) {
-    service.pressKey(18, KeyModifier::Option);
+    service.pressKey(KeyCode::Digit1, KeyModifier::Option);
     EXPECT_THAT(log, ElementsAre("key 18 \u00A1"));
-    EXPECT_EQ(service.stringForKeyCode(18, 0), u"1");
-    EXPECT_EQ(service.stringForKeyCode(18, EventFlag::Shift), u"!");
-    EXPECT_EQ(service.stringForKeyCode(8, EventFlag::Control), u"\x03");
-    EXPECT_EQ(service.stringForKeyCode(122, 0), std::nullopt);
+    EXPECT_EQ(service.stringForKeyCode(KeyCode::Digit1, {}), u"1");
+    EXPECT_EQ(service.stringForKeyCode(KeyCode::Digit1, EventFlag::Shift), u"!");
+    EXPECT_EQ(service.stringForKeyCode(KeyCode::C, EventFlag::Control), u"\x03");
+    EXPECT_EQ(service.stringForKeyCode(KeyCode::F1, {}), std::nullopt);
 }
 
 TEST_F(Keyboard, ClicksTellWhere) {
@@ -110,7 +111,7 @@ TEST(KeyTable, EveryPrintableAsciiCharacterIsOnAKeyThatProducesIt) {
     for (char16_t c = u' '; c <= u'~'; ++c) {
         const auto stroke = SimulatedInputSources::strokeFor(c);
         ASSERT_TRUE(stroke) << static_cast<int>(c);
-        const std::uint64_t flags = stroke->shift ? EventFlag::Shift : 0;
+        const EventFlags flags = stroke->shift ? EventFlags(EventFlag::Shift) : EventFlags();
         EXPECT_EQ(sources.translateKey(stroke->keyCode, flags), std::u16string(1, c));
     }
 }

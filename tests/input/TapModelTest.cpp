@@ -15,8 +15,8 @@ namespace {
 struct Step {
     enum class Kind { Down, Up, Modifiers, Ignore };
     Kind kind;
-    std::uint16_t key = 0;
-    std::int32_t modifiers = 0;
+    KeyCode key = KeyCode::None;
+    KeyModifiers modifiers = {};
     bool swallowed = false;
 };
 
@@ -24,11 +24,11 @@ using Kind = Step::Kind;
 using History = std::vector<Step>;
 
 // What the listeners swallow.
-bool engineSwallows(std::uint16_t key) {
-    return key % 2 == 0;
+bool engineSwallows(KeyCode key) {
+    return numberOf(key) % 2 == 0;
 }
 bool shortcutSwallows(const GeneralHotKey& hotKey) {
-    return hotKey.keyCode == 3;
+    return hotKey.keyCode == KeyCode::F;
 }
 bool hotKeySwallows(const GeneralHotKey& hotKey) {
     return hotKey.modifiers != KeyModifier::Shift;
@@ -38,11 +38,11 @@ class Model {
   public:
     explicit Model(std::vector<GeneralHotKey> hotKeys) : hotKeys_(std::move(hotKeys)) {}
 
-    std::int32_t held() const {
+    KeyModifiers held() const {
         for (auto step = history_.rbegin(); step != history_.rend(); ++step) {
             if (step->kind == Kind::Modifiers) return step->modifiers;
         }
-        return 0;
+        return {};
     }
 
     bool answer(Step step) {
@@ -54,7 +54,8 @@ class Model {
                 step.swallowed = swallowsUp(step.key);
                 break;
             case Kind::Modifiers:
-                step.swallowed = step.modifiers <= held() && !theyServedAPurpose() && firesHotKey(KeyCode::None);
+                step.swallowed =
+                    step.modifiers.bits() <= held().bits() && !theyServedAPurpose() && firesHotKey(KeyCode::None);
                 break;
             case Kind::Ignore:
                 break;
@@ -64,7 +65,7 @@ class Model {
     }
 
   private:
-    bool firesHotKey(std::int32_t key) const {
+    bool firesHotKey(KeyCode key) const {
         const GeneralHotKey pressed{held(), key};
         if (!pressed.isValid()) return false;
         return std::find(hotKeys_.begin(), hotKeys_.end(), pressed) != hotKeys_.end() && hotKeySwallows(pressed);
@@ -76,21 +77,22 @@ class Model {
             const Step& step = history_[i];
             const Model before(hotKeys_, {history_.begin(), history_.begin() + static_cast<std::ptrdiff_t>(i)});
             if (step.kind == Kind::Ignore) return true;
-            if (step.kind == Kind::Down && before.held() != 0) return true;
-            if (step.kind == Kind::Modifiers) return step.modifiers <= before.held() && step.modifiers != 0;
+            if (step.kind == Kind::Down && !before.held().isEmpty()) return true;
+            if (step.kind == Kind::Modifiers)
+                return step.modifiers.bits() <= before.held().bits() && !step.modifiers.isEmpty();
         }
         return false;
     }
 
-    bool isShortcut() const { return (held() & (KeyModifier::Control | KeyModifier::Command)) != 0; }
+    bool isShortcut() const { return held().containsAny(KeyModifier::Control | KeyModifier::Command); }
 
-    bool swallowsDown(std::uint16_t key) const {
+    bool swallowsDown(KeyCode key) const {
         if (firesHotKey(key)) return true;
         return isShortcut() ? shortcutSwallows({held(), key}) : engineSwallows(key);
     }
 
     // The last key that was swallowed, while its release is still to come.
-    bool swallowsUp(std::uint16_t key) const {
+    bool swallowsUp(KeyCode key) const {
         for (auto step = history_.rbegin(); step != history_.rend(); ++step) {
             if (step->kind == Kind::Up && step->swallowed) return false;
             if (step->kind == Kind::Down && step->swallowed) return step->key == key;
@@ -111,15 +113,19 @@ struct Swallowers {
     void hotKeys(ZDHotKeysPressedEventArgs& event) { event.cancel = hotKeySwallows(event.hotKeys.front()); }
 };
 
+KeyModifiers randomModifiers() {
+    return KeyModifiers::fromBits(*rc::gen::inRange(0, 16));
+}
+
 Step randomStep() {
     Step step{*rc::gen::element(Kind::Down, Kind::Down, Kind::Up, Kind::Modifiers, Kind::Modifiers, Kind::Ignore)};
-    step.key = *rc::gen::inRange<std::uint16_t>(1, 5);
-    step.modifiers = *rc::gen::inRange(0, 16);
+    step.key = *rc::gen::element(KeyCode::S, KeyCode::D, KeyCode::F, KeyCode::H);
+    step.modifiers = randomModifiers();
     return step;
 }
 
 GeneralHotKey randomHotKey() {
-    return {*rc::gen::inRange(0, 16), *rc::gen::element<std::int32_t>(1, 2, 3, KeyCode::None, KeyCode::None)};
+    return {randomModifiers(), *rc::gen::element(KeyCode::S, KeyCode::D, KeyCode::F, KeyCode::None, KeyCode::None)};
 }
 
 bool answerOf(InputDesk& desk, const Step& step) {

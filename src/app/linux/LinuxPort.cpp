@@ -7,10 +7,10 @@
 #include <optional>
 #include <utility>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "input/BundleIdentifierResolver.h"
-#include "input/KeyCodes.h"
 #include "ports/x11/keyboard/TerminalApplications.h"
-#include "ports/x11/keyboard/X11KeyCodes.h"
 
 namespace plume {
 
@@ -25,10 +25,10 @@ Result<void> keep(Result<std::unique_ptr<Part>> result, std::unique_ptr<Part>& p
 }
 
 // Keys by which people leave a field or set something off, by themselves or with a modifier.
-bool movesFocus(std::uint16_t keyCode, std::uint64_t flags) {
+bool movesFocus(KeyCode keyCode, EventFlags flags) {
     constexpr std::array Keys = {KeyCode::Tab, KeyCode::Return, KeyCode::KeypadEnter, KeyCode::Escape};
-    constexpr std::uint64_t Shortcuts = X11Flag::Control | X11Flag::Option | X11Flag::Command;
-    return (flags & Shortcuts) != 0 || std::ranges::find(Keys, keyCode) != Keys.end();
+    constexpr EventFlags Shortcuts = EventFlag::Control | EventFlag::Option | EventFlag::Command;
+    return flags.containsAny(Shortcuts) || std::ranges::find(Keys, keyCode) != Keys.end();
 }
 
 }  // namespace
@@ -64,7 +64,7 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
     processManager_ = std::make_unique<X11ProcessManager>(*session_, DesktopFiles::ofEnvironment());
     inputSources_ = std::make_unique<X11InputSources>(*keyboard_);
     systemHotKeys_ =
-        std::make_unique<X11SystemHotKeys>(*session_, [this](std::uint16_t keyCode) -> std::optional<xcb_keycode_t> {
+        std::make_unique<X11SystemHotKeys>(*session_, [this](KeyCode keyCode) -> std::optional<xcb_keycode_t> {
             const xcb_keycode_t keycode = keyboard_->keymap()->keycodeOf(keyCode);
             return keycode != 0 ? std::optional(keycode) : std::nullopt;
         });
@@ -88,7 +88,7 @@ void LinuxPort::connectParts() {
 
 // Programs are asked for their focus when it may have moved.
 void LinuxPort::followFocus() {
-    keyboardTap_->setUserTyped([this](std::uint16_t keyCode, std::uint64_t flags) {
+    keyboardTap_->setUserTyped([this](KeyCode keyCode, EventFlags flags) {
         if (movesFocus(keyCode, flags)) {
             accessibility_.focusMayHaveMoved();
         } else {

@@ -17,7 +17,7 @@ constexpr int MaximumAncestors = 1000;
 
 // Shorter texts are typed whatever key is held.
 constexpr std::size_t HeldKeyMinimumLength = 21;
-constexpr std::uint16_t HeldKey = 0;
+constexpr KeyCode HeldKey = KeyCode::A;
 
 bool isString(const std::optional<std::u16string>& value, std::u16string_view expected) {
     return value && *value == expected;
@@ -46,8 +46,7 @@ void ContextInputResolver::refresh() {
     if (!listenAtAnnotatedSession || !hasSheets) return;
     const auto top = AXUtils::getFocusedTopLevelUIElement(accessibility_);
     if (!top || !isString(top->stringAttribute("AXRole"), u"AXSheet")) return;
-    setting_->flags.set(InputFlag::PostToSessionEventTap);
-    setting_->flags.set(InputFlag::UseClipboard);
+    setting_->flags |= InputFlag::PostToSessionEventTap | InputFlag::UseClipboard;
 }
 
 void ContextInputResolver::prepareSending(const SnippetExpandedContent* content) {
@@ -55,17 +54,17 @@ void ContextInputResolver::prepareSending(const SnippetExpandedContent* content)
     if (has(InputFlag::UseClipboard)) return;
     askFocusedElement();
     if (content && content->isRich()) {
-        setting_->flags.set(InputFlag::UseClipboard);
+        setting_->flags |= InputFlag::UseClipboard;
         return;
     }
     if (preferences.useClipboard) applyPreference();
     if (!content || has(InputFlag::UseClipboard)) return;
     if (mustPaste(content->string())) {
-        setting_->flags.set(InputFlag::UseClipboard);
+        setting_->flags |= InputFlag::UseClipboard;
     } else if (!poster_.canType(content->string())) {
         // A copy: that this text has letters no key produces says nothing about the next one.
         setting_ = std::make_shared<ContextInputSetting>(*setting_);
-        setting_->flags.set(InputFlag::UseClipboard);
+        setting_->flags |= InputFlag::UseClipboard;
     }
 }
 
@@ -77,7 +76,7 @@ void ContextInputResolver::askFocusedElement() {
     // The search field of a help menu.
     const auto parent = focused->elementAttribute("AXParent");
     if (parent && isString(parent->stringAttribute("AXRole"), u"AXMenuItem")) {
-        setting_->flags.set(InputFlag::UseClipboard);
+        setting_->flags |= InputFlag::UseClipboard;
     }
 }
 
@@ -86,7 +85,7 @@ void ContextInputResolver::lookForDocumentEditor(std::shared_ptr<UIElement> elem
         if (isString(element->stringAttribute("AXRole"), u"AXWebArea")) {
             const auto address = element->stringAttribute("AXURL");
             if (address && address->starts_with(DocumentEditorAddress)) {
-                setting_->flags.set(InputFlag::UseClipboard);
+                setting_->flags |= InputFlag::UseClipboard;
                 setting_->afterPastingDelay = DocumentEditorPause;
                 return;
             }
@@ -105,7 +104,11 @@ void ContextInputResolver::applyPreference() {
     } else if (preferences.useClipboardIn != 0) {
         paste = !isListed;
     }
-    setting_->flags.set(InputFlag::UseClipboard, paste);
+    if (paste) {
+        setting_->flags |= InputFlag::UseClipboard;
+    } else {
+        setting_->flags -= InputFlag::UseClipboard;
+    }
 }
 
 bool ContextInputResolver::mustPaste(std::u16string_view text) const {

@@ -13,6 +13,8 @@
 #include <string>
 #include <string_view>
 
+#include "Foundation/Flags.h"
+
 namespace plume {
 
 enum class InputFlag : std::uint16_t {
@@ -34,30 +36,10 @@ enum class InputFlag : std::uint16_t {
     ExcludeParagraphTag = 0x8000,       // and that without paragraph elements
 };
 
-// A set of InputFlag.
-class InputFlags {
-  public:
-    constexpr InputFlags() = default;
-    constexpr InputFlags(InputFlag flag) : bits_(static_cast<std::uint16_t>(flag)) {}
-    constexpr explicit InputFlags(std::uint16_t bits) : bits_(bits) {}
-
-    constexpr bool has(InputFlag flag) const { return (bits_ & static_cast<std::uint16_t>(flag)) != 0; }
-    constexpr void set(InputFlag flag, bool value = true) {
-        const auto bit = static_cast<std::uint16_t>(flag);
-        bits_ = static_cast<std::uint16_t>(value ? bits_ | bit : bits_ & ~bit);
-    }
-    constexpr InputFlags operator|(InputFlags other) const {
-        return InputFlags(static_cast<std::uint16_t>(bits_ | other.bits_));
-    }
-    constexpr std::uint16_t bits() const { return bits_; }
-    constexpr bool operator==(const InputFlags&) const = default;
-
-  private:
-    std::uint16_t bits_ = 0;
-};
+using InputFlags = Flags<InputFlag>;
 
 constexpr InputFlags operator|(InputFlag a, InputFlag b) {
-    return InputFlags(a) | InputFlags(b);
+    return InputFlags(a) | b;
 }
 
 struct ContextInputSetting {
@@ -67,7 +49,7 @@ struct ContextInputSetting {
     double afterPastingDelay = 0;   // seconds
     std::uint64_t blockLength = 0;  // units in a typed chunk; 0 means 20
 
-    bool has(InputFlag flag) const { return flags.has(flag); }
+    bool has(InputFlag flag) const { return flags.contains(flag); }
 
     // Everything but the identifier, which belongs to a resolution.
     std::shared_ptr<ContextInputSetting> copy() const;

@@ -18,8 +18,8 @@ namespace plume {
 
 // The keys that type "V" and "C" in the user's keyboard layout.
 struct CommandKeyCodes {
-    std::uint16_t v = 9;
-    std::uint16_t c = 8;
+    KeyCode v = KeyCode::V;
+    KeyCode c = KeyCode::C;
 };
 
 class KeySender {
@@ -35,7 +35,7 @@ class KeySender {
     // Types the text in chunks, none of the modifiers held.
     void sendPlainText(std::u16string_view text);
     // Down and up, `count` times.
-    void sendKey(std::uint16_t keyCode, std::uint64_t flags = 0, std::uint64_t count = 1);
+    void sendKey(KeyCode keyCode, EventFlags flags = {}, std::uint64_t count = 1);
     // When text is selected, one forward delete comes first: it takes the selection, and the rest what was typed.
     void sendBackspaces(std::uint64_t count);
     void sendLeftArrowKeys(std::uint64_t count);
@@ -56,9 +56,9 @@ class KeySender {
         KeySender& sender_;
     };
 
-    void post(std::uint16_t keyCode, std::uint64_t flags, bool down, std::u16string_view text = {});
-    void press(std::uint16_t keyCode, std::uint64_t flags);
-    void sendAlternativePaste(const ContextInputSetting& setting, std::uint64_t modifier);
+    void post(KeyCode keyCode, EventFlags flags, bool down, std::u16string_view text = {});
+    void press(KeyCode keyCode, EventFlags flags);
+    void sendAlternativePaste(const ContextInputSetting& setting, EventFlag modifier);
 
     EventPoster& poster_;
     const Accessibility& accessibility_;

@@ -104,7 +104,7 @@ void OutputDelivery::perform(const OutputStep& step) {
             return paste(step.fragment);
         case OutputStep::Kind::Key: {
             const auto& key = *std::get<std::shared_ptr<SnippetKeyVariable>>(step.fragment);
-            if (key.keyCode != SnippetKeyVariable::NoKey) sender_.sendKey(key.keyCode, key.modifiers, step.count);
+            if (key.keyCode != KeyCode::None) sender_.sendKey(key.keyCode, key.modifiers, step.count);
             return;
         }
     }

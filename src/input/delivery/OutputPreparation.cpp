@@ -1,6 +1,7 @@
 #include "input/delivery/OutputPreparation.h"
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "input/delivery/OutputBatch.h"
 #include "input/delivery/OutputFragments.h"
 #include "library/Snippet.h"

@@ -13,7 +13,7 @@ namespace plume {
 
 // The last key that was heard, as far as it is still the one being handled.
 struct TriggerKey {
-    std::optional<std::uint16_t> keyCode;
+    std::optional<KeyCode> keyCode;
     std::optional<std::u16string> string;  // what it produced
 };
 

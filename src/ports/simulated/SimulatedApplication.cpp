@@ -3,16 +3,14 @@
 #include <algorithm>
 #include <utility>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/text/RTFD.h"
-#include "input/KeyCodes.h"
 #include "ports/simulated/SimulatedModifiers.h"
 
 namespace plume {
 
 namespace {
-
-constexpr std::uint16_t KeyV = 9;
-constexpr std::uint16_t KeyC = 8;
 
 // Control characters that stand for keys (Escape, arrows) are no text; Return, Enter and Tab are.
 bool isText(char16_t unit) {
@@ -62,22 +60,22 @@ void SimulatedApplication::handle(SimulatedKeyEvent event) {
 }
 
 void SimulatedApplication::followPlumesModifiers(const SimulatedKeyEvent& event) {
-    const std::uint64_t flag = event.keyCode ? modifierFlagOf(*event.keyCode) : 0;
-    plumesModifiers_ = event.down ? plumesModifiers_ | flag : plumesModifiers_ & ~flag;
+    const EventFlags flag = event.keyCode ? modifierFlagOf(*event.keyCode) : EventFlags();
+    plumesModifiers_ = event.down ? plumesModifiers_ | flag : plumesModifiers_ - flag;
 }
 
 void SimulatedApplication::perform(const SimulatedKeyEvent& event) {
     // What is typed without a key is text whatever is held.
     if (!event.keyCode) return field_.insert(event.string);
-    if (modifierFlagOf(*event.keyCode) != 0) return;
-    if (performByKey(*event.keyCode, (event.flags & EventFlag::Shift) != 0)) return;
-    const std::uint64_t commands = EventFlag::Control | EventFlag::Command;
-    const std::uint64_t own = usesControlKey_ ? EventFlag::Control : EventFlag::Command;
-    if ((event.flags & commands) == 0) return insertProduced(event.string);
+    if (!modifierFlagOf(*event.keyCode).isEmpty()) return;
+    if (performByKey(*event.keyCode, event.flags.contains(EventFlag::Shift))) return;
+    const EventFlags commands = EventFlag::Control | EventFlag::Command;
+    const EventFlags own = usesControlKey_ ? EventFlag::Control : EventFlag::Command;
+    if (!event.flags.containsAny(commands)) return insertProduced(event.string);
     if ((event.flags & commands) == own) performCommand(*event.keyCode);
 }
 
-bool SimulatedApplication::performByKey(std::uint16_t keyCode, bool shift) {
+bool SimulatedApplication::performByKey(KeyCode keyCode, bool shift) {
     using Movement = SimulatedTextField::Movement;
     const auto move = [&](Movement movement) {
         field_.move(movement, shift);
@@ -107,9 +105,9 @@ bool SimulatedApplication::performByKey(std::uint16_t keyCode, bool shift) {
     }
 }
 
-void SimulatedApplication::performCommand(std::uint16_t keyCode) {
-    if (keyCode == KeyV) paste();
-    if (keyCode == KeyC) copy();
+void SimulatedApplication::performCommand(KeyCode keyCode) {
+    if (keyCode == KeyCode::V) paste();
+    if (keyCode == KeyCode::C) copy();
 }
 
 void SimulatedApplication::insertProduced(std::u16string_view produced) {

@@ -23,8 +23,8 @@ struct SimulatedKeyEvent {
     double time = 0;  // seconds on the desktop's clock
     Origin origin = Origin::User;
     // The key, or nothing when the event carries `string` without belonging to a key.
-    std::optional<std::uint16_t> keyCode;
-    std::uint64_t flags = 0;  // event flag bits
+    std::optional<KeyCode> keyCode;
+    EventFlags flags;
     bool down = true;
     std::u16string string;  // what it produces
 };
@@ -56,8 +56,8 @@ class SimulatedApplication {
   private:
     void followPlumesModifiers(const SimulatedKeyEvent& event);
     void perform(const SimulatedKeyEvent& event);
-    bool performByKey(std::uint16_t keyCode, bool shift);
-    void performCommand(std::uint16_t keyCode);
+    bool performByKey(KeyCode keyCode, bool shift);
+    void performCommand(KeyCode keyCode);
     void insertProduced(std::u16string_view produced);
     void paste();
     std::optional<std::u16string> pasteboardText() const;
@@ -69,7 +69,7 @@ class SimulatedApplication {
     Pasteboard& pasteboard_;
     SimulatedTextField field_;
     bool usesControlKey_ = false;
-    std::uint64_t plumesModifiers_ = 0;  // of modifier keys that Plume pressed as keys of their own
+    EventFlags plumesModifiers_;  // of modifier keys that Plume pressed as keys of their own
     std::vector<SimulatedKeyEvent> events_;
     std::shared_ptr<SimulatedUIElement> element_ = std::make_shared<SimulatedUIElement>();
     std::shared_ptr<SimulatedUIElement> fieldElement_ = std::make_shared<SimulatedUIElement>();

@@ -10,15 +10,15 @@ namespace plume {
 namespace {
 
 struct ModifierKey {
-    std::int32_t modifier;
-    std::uint16_t keyCode;
+    KeyModifier modifier;
+    KeyCode keyCode;
 };
 
 constexpr auto ModifierKeys = std::to_array<ModifierKey>({
-    {KeyModifier::Shift, 56},
-    {KeyModifier::Control, 59},
-    {KeyModifier::Option, 58},
-    {KeyModifier::Command, 55},
+    {KeyModifier::Shift, KeyCode::Shift},
+    {KeyModifier::Control, KeyCode::Control},
+    {KeyModifier::Option, KeyCode::Option},
+    {KeyModifier::Command, KeyCode::Command},
 });
 
 }  // namespace
@@ -56,27 +56,27 @@ SimulatedApplication* SimulatedDesktop::front() {
     return nullptr;
 }
 
-void SimulatedDesktop::pressAndRelease(std::uint16_t keyCode, std::int32_t modifiers) {
+void SimulatedDesktop::pressAndRelease(KeyCode keyCode, KeyModifiers modifiers) {
     pressCombination(modifiers, keyCode);
 }
 
-void SimulatedDesktop::pressCombination(std::int32_t modifiers, std::optional<std::uint16_t> keyCode) {
+void SimulatedDesktop::pressCombination(KeyModifiers modifiers, std::optional<KeyCode> keyCode) {
     for (const ModifierKey& key : ModifierKeys) {
-        if ((modifiers & key.modifier) != 0) keyboard_.press(key.keyCode);
+        if (modifiers.contains(key.modifier)) keyboard_.press(key.keyCode);
     }
     if (keyCode) {
         keyboard_.press(*keyCode);
         keyboard_.release(*keyCode);
     }
     for (auto key = ModifierKeys.rbegin(); key != ModifierKeys.rend(); ++key) {
-        if ((modifiers & key->modifier) != 0) keyboard_.release(key->keyCode);
+        if (modifiers.contains(key->modifier)) keyboard_.release(key->keyCode);
     }
 }
 
 void SimulatedDesktop::typeCharacter(std::u16string_view character) {
     if (character.size() == 1) {
         if (const auto stroke = SimulatedInputSources::strokeFor(character.front())) {
-            return pressAndRelease(stroke->keyCode, stroke->shift ? KeyModifier::Shift : 0);
+            return pressAndRelease(stroke->keyCode, stroke->shift ? KeyModifiers(KeyModifier::Shift) : KeyModifiers());
         }
     }
     keyboard_.pressCharacter(character);

@@ -54,10 +54,10 @@ class SimulatedDesktop {
     // The program that gets the keys; null when it is Plume itself or none.
     SimulatedApplication* front();
 
-    // The user presses and releases a key while these modifiers are held (KeyModifier bits), which takes no time.
-    void pressAndRelease(std::uint16_t keyCode, std::int32_t modifiers = 0);
+    // The user presses and releases a key while these modifiers are held, which takes no time.
+    void pressAndRelease(KeyCode keyCode, KeyModifiers modifiers = {});
     // The same, also for modifiers alone.
-    void pressCombination(std::int32_t modifiers, std::optional<std::uint16_t> keyCode);
+    void pressCombination(KeyModifiers modifiers, std::optional<KeyCode> keyCode);
     // The user types one character: its key, with Shift where it needs it, or a key of its own.
     void typeCharacter(std::u16string_view character);
     // The user clicks where the pointer is.

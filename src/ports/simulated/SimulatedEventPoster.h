@@ -25,7 +25,7 @@ class SimulatedEventPoster final : public EventPoster {
         deliver_(key);
     }
     bool canType(std::u16string_view text) const override { return !canType_ || canType_(text); }
-    bool isKeyDown(std::uint16_t keyCode) const override { return keyboard_.isDown(keyCode); }
+    bool isKeyDown(KeyCode keyCode) const override { return keyboard_.isDown(keyCode); }
     std::optional<CommandKeystroke> pasteKeystroke() const override { return pasteKeystroke_; }
     std::optional<CommandKeystroke> copyKeystroke() const override { return copyKeystroke_; }
     Point pointerLocation() const override { return pointer_; }

@@ -11,13 +11,12 @@ SimulatedInputService::SimulatedInputService(const ProcessManager& processManage
                                              RunLoop& runLoop)
     : processManager_(processManager), inputSources_(inputSources), runLoop_(runLoop) {}
 
-bool SimulatedInputService::pressKey(std::uint16_t keyCode, std::int32_t modifiers) {
-    const std::uint64_t flags = static_cast<std::uint64_t>(modifiers) << 17;
-    return pressKeyProducing(keyCode, inputSources_.translateKey(keyCode, flags), modifiers);
+bool SimulatedInputService::pressKey(KeyCode keyCode, KeyModifiers modifiers) {
+    return pressKeyProducing(keyCode, inputSources_.translateKey(keyCode, flagsFromModifiers(modifiers)), modifiers);
 }
 
-bool SimulatedInputService::pressKeyProducing(std::uint16_t keyCode, std::optional<std::u16string> text,
-                                              std::int32_t modifiers) {
+bool SimulatedInputService::pressKeyProducing(KeyCode keyCode, std::optional<std::u16string> text,
+                                              KeyModifiers modifiers) {
     keyModifier_ = modifiers;
     followFrontProcess();
 
@@ -27,14 +26,14 @@ bool SimulatedInputService::pressKeyProducing(std::uint16_t keyCode, std::option
     if (event.s && !event.s->empty()) event.c = event.s->front();
     lastKeyString_ = event.s;
 
-    const bool shortcut = (modifiers & (KeyModifier::Control | KeyModifier::Command)) != 0;
-    const bool backspaceOfWord = (modifiers & KeyModifier::Option) != 0 && event.c == u'\b';
+    const bool shortcut = modifiers.containsAny(KeyModifier::Control | KeyModifier::Command);
+    const bool backspaceOfWord = modifiers.contains(KeyModifier::Option) && event.c == u'\b';
     if (shortcut || backspaceOfWord) {
         event.cancel = raiseUnregisteredHotKey(event);
     } else {
         keyDownEvent.raise(event);
     }
-    keyModifier_ = 0;
+    keyModifier_ = {};
     return event.cancel;
 }
 
@@ -46,8 +45,9 @@ std::u16string SimulatedInputService::typeText(std::u16string_view text) {
         i += character.size();
 
         const auto stroke = SimulatedInputSources::strokeFor(character.front());
-        const bool swallowed = stroke ? pressKey(stroke->keyCode, stroke->shift ? KeyModifier::Shift : 0)
-                                      : pressKeyProducing(UnmappedKeyCode, std::u16string(character));
+        const bool swallowed =
+            stroke ? pressKey(stroke->keyCode, stroke->shift ? KeyModifiers(KeyModifier::Shift) : KeyModifiers())
+                   : pressKeyProducing(UnmappedKeyCode, std::u16string(character));
         if (!swallowed) passed += character;
     }
     return passed;
@@ -64,8 +64,7 @@ bool SimulatedInputService::isSameProcess() const {
     return lastProcess_ == processManager_.currentProcess();
 }
 
-std::optional<std::u16string> SimulatedInputService::stringForKeyCode(std::uint16_t keyCode,
-                                                                      std::uint64_t flags) const {
+std::optional<std::u16string> SimulatedInputService::stringForKeyCode(KeyCode keyCode, EventFlags flags) const {
     return inputSources_.translateKey(keyCode, flags);
 }
 

@@ -15,23 +15,23 @@ namespace plume {
 class SimulatedInputService final : public InputService {
   public:
     // The key code of a character that is on no key.
-    static constexpr std::uint16_t UnmappedKeyCode = 0x7F;
+    static constexpr KeyCode UnmappedKeyCode{0x7F};
 
     // Nothing is owned; all of it outlives the service.
     SimulatedInputService(const ProcessManager& processManager, const InputSources& inputSources, RunLoop& runLoop);
 
     // Presses and releases a key while these modifiers are held; whether a listener swallowed it.
-    bool pressKey(std::uint16_t keyCode, std::int32_t modifiers = 0);
+    bool pressKey(KeyCode keyCode, KeyModifiers modifiers = {});
     // A key that produces this text on whatever keyboard it stands on.
-    bool pressKeyProducing(std::uint16_t keyCode, std::optional<std::u16string> text, std::int32_t modifiers = 0);
+    bool pressKeyProducing(KeyCode keyCode, std::optional<std::u16string> text, KeyModifiers modifiers = {});
     // One key per character, with Shift where the character needs it. What was not swallowed.
     std::u16string typeText(std::u16string_view text);
     void click(double x, double y);
 
-    std::int32_t keyModifier() const override { return keyModifier_; }
+    KeyModifiers keyModifier() const override { return keyModifier_; }
     bool isSameProcess() const override;
     ProcessSerialNumber lastProcessReceivedKeyEvent() const override { return lastProcess_; }
-    std::optional<std::u16string> stringForKeyCode(std::uint16_t keyCode, std::uint64_t flags) const override;
+    std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const override;
     const std::optional<std::u16string>& lastKeyString() const override { return lastKeyString_; }
     const std::optional<std::u16string>& contextBundleIdentifier() const override { return contextBundleIdentifier_; }
     std::shared_ptr<const ContextInputSetting> refreshContextInputSetting() override;
@@ -52,7 +52,7 @@ class SimulatedInputService final : public InputService {
     const ProcessManager& processManager_;
     const InputSources& inputSources_;
     RunLoop& runLoop_;
-    std::int32_t keyModifier_ = 0;
+    KeyModifiers keyModifier_;
     bool receivedKey_ = false;
     ProcessSerialNumber lastProcess_;
     std::optional<std::u16string> lastKeyString_;

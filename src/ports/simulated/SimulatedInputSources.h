@@ -12,7 +12,7 @@ class SimulatedInputSources final : public InputSources {
   public:
     // A key, and whether Shift is held with it.
     struct Stroke {
-        std::uint16_t keyCode = 0;
+        KeyCode keyCode = KeyCode::None;
         bool shift = false;
     };
 
@@ -25,7 +25,7 @@ class SimulatedInputSources final : public InputSources {
     static std::optional<Stroke> strokeFor(char16_t character);
 
     const std::optional<std::u16string>& currentInputSourceIdentifier() const override { return identifier_; }
-    std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override;
+    std::optional<std::u16string> translateKey(KeyCode keyCode, EventFlags flags) const override;
     void setChangeListener(std::function<void()> listener) override { listener_ = std::move(listener); }
 
   private:

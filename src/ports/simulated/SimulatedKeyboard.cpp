@@ -14,8 +14,8 @@ SimulatedKeyboard::~SimulatedKeyboard() {
     runLoop_.cancel(holdLimit_);
 }
 
-void SimulatedKeyboard::press(std::uint16_t keyCode) {
-    const bool isModifier = modifierFlagOf(keyCode) != 0;
+void SimulatedKeyboard::press(KeyCode keyCode) {
+    const bool isModifier = !modifierFlagOf(keyCode).isEmpty();
     const bool isNew = down_.insert(keyCode).second;
     if (isModifier) {
         if (isNew) arrive({TapEvent::Type::FlagsChanged, keyCode, flags(), {}, true});
@@ -25,9 +25,9 @@ void SimulatedKeyboard::press(std::uint16_t keyCode) {
     arrive({TapEvent::Type::KeyDown, keyCode, flags(), produced, true});
 }
 
-void SimulatedKeyboard::release(std::uint16_t keyCode) {
+void SimulatedKeyboard::release(KeyCode keyCode) {
     if (down_.erase(keyCode) == 0) return;
-    if (modifierFlagOf(keyCode) != 0) {
+    if (!modifierFlagOf(keyCode).isEmpty()) {
         arrive({TapEvent::Type::FlagsChanged, keyCode, flags(), {}, false});
         return;
     }
@@ -43,9 +43,9 @@ void SimulatedKeyboard::releaseCharacter(std::u16string_view character) {
     arrive({TapEvent::Type::KeyUp, UnmappedKeyCode, flags(), std::u16string(character), false});
 }
 
-std::uint64_t SimulatedKeyboard::flags() const {
-    std::uint64_t held = 0;
-    for (const std::uint16_t keyCode : down_) held |= modifierFlagOf(keyCode);
+EventFlags SimulatedKeyboard::flags() const {
+    EventFlags held;
+    for (const KeyCode keyCode : down_) held |= modifierFlagOf(keyCode);
     return held;
 }
 

@@ -19,15 +19,15 @@ namespace plume {
 class SimulatedKeyboard {
   public:
     // The key code of a character that is on no key.
-    static constexpr std::uint16_t UnmappedKeyCode = 0x7F;
+    static constexpr KeyCode UnmappedKeyCode{0x7F};
     // Held keys follow after this time at the latest, in seconds.
     static constexpr double LongestHold = 2;
 
     // A key on its way to the program in front.
     struct Key {
         TapEvent::Type type = TapEvent::Type::KeyDown;
-        std::uint16_t keyCode = 0;
-        std::uint64_t flags = 0;
+        KeyCode keyCode = KeyCode::None;
+        EventFlags flags;
         std::u16string string;
         bool isDown = true;
     };
@@ -41,15 +41,14 @@ class SimulatedKeyboard {
     SimulatedKeyboard& operator=(const SimulatedKeyboard&) = delete;
 
     // A key that is down already repeats; a modifier key does not.
-    void press(std::uint16_t keyCode);
-    void release(std::uint16_t keyCode);
+    void press(KeyCode keyCode);
+    void release(KeyCode keyCode);
     // A key that stands for a character which the layout has on no key.
     void pressCharacter(std::u16string_view character);
     void releaseCharacter(std::u16string_view character);
 
-    bool isDown(std::uint16_t keyCode) const { return down_.contains(keyCode); }
-    // Event flag bits of the modifiers held.
-    std::uint64_t flags() const;
+    bool isDown(KeyCode keyCode) const { return down_.contains(keyCode); }
+    EventFlags flags() const;
 
     // Whether the port can make the user's keys wait; it cannot at first.
     void setCanHold(bool can) { canHold_ = can; }
@@ -72,8 +71,8 @@ class SimulatedKeyboard {
     SimulatedKeyboardTap& tap_;
     SimulatedSystemHotKeys& hotKeys_;
     const Deliver deliver_;
-    std::set<std::uint16_t> down_;
-    std::set<std::uint16_t> takenBySystem_;  // keys whose release the system keeps as well
+    std::set<KeyCode> down_;
+    std::set<KeyCode> takenBySystem_;  // keys whose release the system keeps as well
     bool canHold_ = false;
     bool holding_ = false;
     bool lettingGo_ = false;

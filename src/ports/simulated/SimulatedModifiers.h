@@ -1,29 +1,28 @@
 // The modifier keys of the simulated keyboard.
 #pragma once
 
-#include <cstdint>
-
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 
 namespace plume {
 
-// The event flag bit of a modifier key, 0 for every other key.
-constexpr std::uint64_t modifierFlagOf(std::uint16_t keyCode) {
+// The event flag of a modifier key, none for every other key.
+constexpr EventFlags modifierFlagOf(KeyCode keyCode) {
     switch (keyCode) {
-        case 54:
-        case 55:
+        case KeyCode::RightCommand:
+        case KeyCode::Command:
             return EventFlag::Command;
-        case 56:
-        case 60:
+        case KeyCode::Shift:
+        case KeyCode::RightShift:
             return EventFlag::Shift;
-        case 58:
-        case 61:
+        case KeyCode::Option:
+        case KeyCode::RightOption:
             return EventFlag::Option;
-        case 59:
-        case 62:
+        case KeyCode::Control:
+        case KeyCode::RightControl:
             return EventFlag::Control;
         default:
-            return 0;
+            return {};
     }
 }
 

@@ -4,7 +4,7 @@
 
 namespace plume {
 
-Result<void> SimulatedSystemHotKeys::registerHotKey(Id id, std::uint16_t keyCode, std::int32_t modifiers,
+Result<void> SimulatedSystemHotKeys::registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers,
                                                     std::function<void()> handler) {
     for (const auto& [otherId, other] : hotKeys_) {
         if (otherId != id && other.keyCode == keyCode && other.modifiers == modifiers) {
@@ -15,7 +15,7 @@ Result<void> SimulatedSystemHotKeys::registerHotKey(Id id, std::uint16_t keyCode
     return {};
 }
 
-bool SimulatedSystemHotKeys::press(std::uint16_t keyCode, std::int32_t modifiers) {
+bool SimulatedSystemHotKeys::press(KeyCode keyCode, KeyModifiers modifiers) {
     for (const auto& [id, hotKey] : hotKeys_) {
         if (hotKey.keyCode != keyCode || hotKey.modifiers != modifiers) continue;
         // The handler may register the hot key anew.

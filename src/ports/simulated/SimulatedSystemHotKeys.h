@@ -9,17 +9,16 @@ namespace plume {
 
 class SimulatedSystemHotKeys final : public SystemHotKeys {
   public:
-    Result<void> registerHotKey(Id id, std::uint16_t keyCode, std::int32_t modifiers,
-                                std::function<void()> handler) override;
+    Result<void> registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers, std::function<void()> handler) override;
     void unregisterHotKey(Id id) override { hotKeys_.erase(id); }
 
     // Runs the handlers of this combination; false when there is none.
-    bool press(std::uint16_t keyCode, std::int32_t modifiers);
+    bool press(KeyCode keyCode, KeyModifiers modifiers);
 
   private:
     struct HotKey {
-        std::uint16_t keyCode;
-        std::int32_t modifiers;
+        KeyCode keyCode;
+        KeyModifiers modifiers;
         std::function<void()> handler;
     };
     std::map<Id, HotKey> hotKeys_;

@@ -94,7 +94,7 @@ TEST_F(ContextInputResolverTest, ChoosesBetweenTypingAndPasting) {
     for (const ChoiceCase& c : cases) {
         activate(c.application);
         resolver.preferences = c.preferences;
-        poster.held = c.holdsKeyA ? std::set<std::uint16_t>{0} : std::set<std::uint16_t>{};
+        poster.held = c.holdsKeyA ? std::set<KeyCode>{KeyCode::A} : std::set<KeyCode>{};
         EXPECT_EQ(pastes(c.content), c.pastes) << c.about;
         EXPECT_EQ(resolver.contextBundleIdentifier(), c.application) << c.about;
     }

@@ -58,9 +58,9 @@ TEST(ContextInputSettings, KnowsApplicationsAndTheirFamilies) {
 TEST(ContextInputSettings, EntriesAreCopiedAndFamiliesAreShared) {
     ContextInputSettings settings;
     bool isKnown = false;
-    settings.resolve(u"com.microsoft.Word", isKnown)->flags.set(UseClipboard);
+    settings.resolve(u"com.microsoft.Word", isKnown)->flags |= UseClipboard;
     EXPECT_FALSE(settings.resolve(u"com.microsoft.Word", isKnown)->has(UseClipboard));
-    settings.resolve(u"com.jetbrains.clion", isKnown)->flags.set(UseClipboard);
+    settings.resolve(u"com.jetbrains.clion", isKnown)->flags |= UseClipboard;
     EXPECT_TRUE(settings.resolve(u"com.jetbrains.pycharm", isKnown)->has(UseClipboard));
 }
 

@@ -5,7 +5,8 @@
 
 #include <set>
 
-#include "input/KeyCodes.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "ports/simulated/SimulatedAccessibility.h"
 #include "tests/input/delivery/RecordingPoster.h"
 
@@ -40,7 +41,7 @@ TEST_F(KeySenderTest, TypesTextInChunksWithoutModifiers) {
 }
 
 TEST_F(KeySenderTest, PressesKeys) {
-    sender.sendKey(36, EventFlag::Shift, 2);
+    sender.sendKey(KeyCode::Return, EventFlag::Shift, 2);
     EXPECT_THAT(poster.take(), ElementsAre("v36/1", "^36/1", "v36/1", "^36/1"));
     sender.sendBackspaces(2);
     EXPECT_THAT(poster.take(), ElementsAre("v51", "^51", "v51", "^51"));
@@ -67,16 +68,16 @@ TEST_F(KeySenderTest, PastesAsTheApplicationWantsIt) {
     struct Case {
         const char* about;
         InputFlags flags;
-        std::set<std::uint16_t> held;
+        std::set<KeyCode> held;
         std::vector<std::string> events;
     };
     const Case cases[] = {
         {"usual", {}, {}, {"v9/8", "^9"}},
         {"control", UseControlKey, {}, {"v9/2", "^9"}},
-        {"V is held", {}, {9}, {"^9", "v9/8", "^9"}},
+        {"V is held", {}, {KeyCode::V}, {"^9", "v9/8", "^9"}},
         {"alternative", AlternativePasting, {}, {"v55", "v9/8", "^9/8", "^55"}},
         {"alternative with control", AlternativePasting | UseControlKey, {}, {"v59", "v9/2", "^9/2", "^59"}},
-        {"no flags", AlternativePasting | DoNotSetModifier, {56}, {"^56", "v55", "v9", "^9", "^55"}},
+        {"no flags", AlternativePasting | DoNotSetModifier, {KeyCode::Shift}, {"^56", "v55", "v9", "^9", "^55"}},
     };
     for (const Case& c : cases) {
         poster.held = c.held;
@@ -84,7 +85,7 @@ TEST_F(KeySenderTest, PastesAsTheApplicationWantsIt) {
         EXPECT_EQ(poster.take(), c.events) << c.about;
     }
     poster.held.clear();
-    poster.own = CommandKeystroke{114, EventFlag::Shift};
+    poster.own = CommandKeystroke{KeyCode::Help, EventFlag::Shift};
     sender.sendPasteCommand(with({}));
     EXPECT_THAT(poster.take(), ElementsAre("v114/1", "^114/1")) << "the program's own keystroke";
 }

@@ -11,7 +11,7 @@ using enum InputFlag;
 using Fragment = PLOutput::Fragment;
 
 Fragment key(std::uint64_t count, double delay = 0) {
-    auto variable = std::make_shared<SnippetKeyVariable>(u"\u21e5", 48);
+    auto variable = std::make_shared<SnippetKeyVariable>(u"\u21e5", KeyCode::Tab);
     variable->count = count;
     variable->delay = delay;
     return variable;
@@ -111,7 +111,7 @@ TEST(OutputBatch, TakesAnOutputApart) {
 }
 
 TEST(OutputBatch, LeavesTheContentsKeysAlone) {
-    const auto variable = std::make_shared<SnippetKeyVariable>(u"\u21e5", 48);
+    const auto variable = std::make_shared<SnippetKeyVariable>(u"\u21e5", KeyCode::Tab);
     variable->count = 30;
     PLOutput output;
     output.fragments = {variable};

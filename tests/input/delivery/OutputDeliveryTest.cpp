@@ -17,7 +17,7 @@ using Times = std::vector<long>;
 constexpr const char* Paste = "v9/8";
 
 void addKey(PLOutput& output, std::size_t location, std::uint64_t count = 1) {
-    auto key = std::make_shared<SnippetKeyVariable>(u"\u21e5", 48);
+    auto key = std::make_shared<SnippetKeyVariable>(u"\u21e5", KeyCode::Tab);
     key->location = location;
     key->count = count;
     output.snippetExpandedContent->variables.push_back(key);
@@ -176,7 +176,7 @@ TEST(OutputDelivery, ActivatesAVirtualMachineAgain) {
 
 TEST(OutputDelivery, BackspacesWaitForTheVirtualMachine) {
     InputDesk desk(u"com.vmware.fusion");
-    desk.keyDown(0);
+    desk.keyDown(KeyCode::A);
     desk.service.sendOutput(InputDesk::output(u"text", 3));
     desk.loop.advance(2);
     EXPECT_EQ(desk.poster.timesOf("v51"), (Times{900, 900, 900}));
@@ -187,15 +187,15 @@ TEST(OutputDelivery, BackspacesWaitForTheVirtualMachine) {
 
 TEST(OutputDelivery, EveryKeyPassesWhileAPasteIsToCome) {
     InputDesk desk(u"org.virtualbox.app.VirtualBoxVM");
-    desk.service.registerHotKey({0, 7});
+    desk.service.registerHotKey({{}, KeyCode::X});
     desk.service.sendOutput(InputDesk::output(u"text"));
     struct Swallower {
         void pressed(ZDHotKeysPressedEventArgs& event) { event.cancel = true; }
     } swallower;
     const Subscription subscription = desk.service.hotKeysPressed.addObserver(&swallower, &Swallower::pressed);
-    EXPECT_FALSE(desk.keyDown(7));
+    EXPECT_FALSE(desk.keyDown(KeyCode::X));
     desk.loop.advance(0.3);
-    EXPECT_TRUE(desk.keyDown(7));
+    EXPECT_TRUE(desk.keyDown(KeyCode::X));
 }
 
 TEST(OutputDelivery, OwnKeysAreNotHeard) {
@@ -215,7 +215,7 @@ class ClipboardDeliveryTest : public ::testing::TestWithParam<bool> {
         desk.pasteboard.tells = GetParam();
         desk.pasteboard.content.copyFromProgram(u"user's");
         desk.poster.onPost = [this](const SynthesisedKey& key) {
-            if (key.keyCode == 9 && key.down) pasted.push_back(desk.pasteboard.take().value_or(u"nothing"));
+            if (key.keyCode == KeyCode::V && key.down) pasted.push_back(desk.pasteboard.take().value_or(u"nothing"));
         };
     }
     void sendTo(const char16_t* application, const char16_t* text) {
@@ -360,8 +360,8 @@ TEST(OutputDelivery, CopiesAList) {
     std::size_t column = 0;
     desk.poster.onPost = [&](const SynthesisedKey& key) {
         if (!key.down) return;
-        if (key.keyCode == 8) desk.pasteboard.content.copyFromProgram(rows[row][column]);
-        if (key.keyCode == KeyCode::Tab) column = key.flags != 0 ? 0 : 1;
+        if (key.keyCode == KeyCode::C) desk.pasteboard.content.copyFromProgram(rows[row][column]);
+        if (key.keyCode == KeyCode::Tab) column = !key.flags.isEmpty() ? 0 : 1;
         if (key.keyCode == KeyCode::Down) row = std::min(row + 1, rows.size() - 1);
     };
     KeySender sender(desk.poster, desk.accessibility);

@@ -45,7 +45,7 @@ RC_GTEST_PROP(OutputFragments, ChunksGiveBackTheText, (const std::vector<std::ui
 }
 
 std::shared_ptr<SnippetKeyVariable> key(std::size_t location, std::uint64_t count) {
-    auto variable = std::make_shared<SnippetKeyVariable>(u"\u21e5", 48);
+    auto variable = std::make_shared<SnippetKeyVariable>(u"\u21e5", KeyCode::Tab);
     variable->location = location;
     variable->count = count;
     return variable;
@@ -68,7 +68,7 @@ TEST(OutputFragments, WhatIsPastedStaysWhole) {
     PLOutput output;
     output.snippetExpandedContent = std::make_shared<SnippetExpandedContent>(std::u16string(45, u'x'));
     ContextInputSetting pasting;
-    pasting.flags.set(InputFlag::UseClipboard);
+    pasting.flags |= InputFlag::UseClipboard;
     refreshFragmentsForOuput(output, pasting);
     EXPECT_EQ(output.fragments.size(), 1U);
 

@@ -2,8 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/Strings.h"
-#include "input/KeyCodes.h"
 #include "library/Snippet.h"
 #include "library/SnippetGroup.h"
 
@@ -74,11 +75,11 @@ std::vector<PreparationCase> cases() {
         {"and that only once", with(World(401), [](World& w) { w.content().suffix = u"!"; }), true, x(401, u"!")},
         {"a delayed key", with(World(), [](World& w) { w.addKey(2, 1, 0.5); }), true, x(5, u" ")},
         {"many presses", with(World(), [](World& w) { w.addKey(2, 30); }), true, x(5, u" ")},
-        {"pasted at once", with(World(401), [](World& w) { w.setting.flags.set(UseClipboard); }), false, x(401)},
+        {"pasted at once", with(World(401), [](World& w) { w.setting.flags |= UseClipboard; }), false, x(401)},
         {"pasted in two pieces",
          with(World(),
               [](World& w) {
-                  w.setting.flags.set(UseClipboard);
+                  w.setting.flags |= UseClipboard;
                   w.addKey(2, 1);
               }),
          true, x(5, u" ")},
@@ -87,7 +88,7 @@ std::vector<PreparationCase> cases() {
         {"with a wait behind",
          with(World(),
               [](World& w) {
-                  w.setting.flags.set(UseClipboard);
+                  w.setting.flags |= UseClipboard;
                   w.setting.afterPastingDelay = 0.05;
               }),
          true, x(5, u" ")},

@@ -25,14 +25,14 @@ class RecordingPoster final : public EventPoster {
     void post(const SynthesisedKey& key, bool pastTap) override {
         EXPECT_GT(open, 0) << "outside of begin and end";
         std::string event = key.down ? "v" : "^";
-        event += key.text.empty() ? std::to_string(key.keyCode) : toUtf8(key.text);
-        if (key.flags != 0) event += "/" + std::to_string(key.flags >> 17);
+        event += key.text.empty() ? std::to_string(numberOf(key.keyCode)) : toUtf8(key.text);
+        if (!key.flags.isEmpty()) event += "/" + std::to_string(modifiersFromFlags(key.flags).bits());
         if (pastTap) event += "!";
         write(std::move(event));
         if (onPost) onPost(key);
     }
     bool canType(std::u16string_view text) const override { return text.find(untypeable) == std::u16string_view::npos; }
-    bool isKeyDown(std::uint16_t keyCode) const override { return held.contains(keyCode); }
+    bool isKeyDown(KeyCode keyCode) const override { return held.contains(keyCode); }
     std::optional<CommandKeystroke> pasteKeystroke() const override { return own; }
     std::optional<CommandKeystroke> copyKeystroke() const override { return own; }
     Point pointerLocation() const override { return {30, 40}; }
@@ -74,7 +74,7 @@ class RecordingPoster final : public EventPoster {
     std::vector<std::string> events;
     std::vector<std::pair<double, std::string>> timeline;
     const RunLoop* clock = nullptr;
-    std::set<std::uint16_t> held;
+    std::set<KeyCode> held;
     char16_t untypeable = u'\uFFFF';
     std::optional<CommandKeystroke> own;
     std::function<void(const SynthesisedKey&)> onPost;

@@ -4,23 +4,20 @@
 
 #include <functional>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "Foundation/text/RTFD.h"
-#include "input/KeyCodes.h"
 
 namespace plume {
 
 namespace {
 
-constexpr std::uint16_t KeyA = 0;
-constexpr std::uint16_t KeyV = 9;
-constexpr std::uint16_t KeyC = 8;
-
 class SimulatedDesktopTest : public testing::Test {
   protected:
-    void press(std::uint16_t keyCode, std::int32_t modifiers = 0, int count = 1) {
+    void press(KeyCode keyCode, KeyModifiers modifiers = {}, int count = 1) {
         for (int i = 0; i < count; ++i) desktop_.pressAndRelease(keyCode, modifiers);
     }
-    void post(std::uint16_t keyCode, std::uint64_t flags = 0) {
+    void post(KeyCode keyCode, EventFlags flags = {}) {
         for (const bool down : {true, false}) desktop_.poster().post({keyCode, flags, down, {}}, false);
     }
 
@@ -52,46 +49,46 @@ class Reacting final : public KeyboardTapListener {
 TEST_F(SimulatedDesktopTest, EditsTextWithTheKeyboard) {
     struct Case {
         std::u16string text;
-        std::uint16_t keyCode;
-        std::int32_t modifiers;
+        KeyCode keyCode;
+        KeyModifiers modifiers;
         int count;
         std::u16string result;
         Range selection;
     };
     const Case cases[] = {
-        {u"ab", KeyCode::Return, 0, 1, u"ab\n", {3, 0}},
-        {u"ab", 76, 0, 1, u"ab\n", {3, 0}},
-        {u"ab", KeyCode::Escape, 0, 1, u"ab", {2, 0}},
-        {u"ab", KeyA, KeyModifier::Control, 1, u"ab", {2, 0}},
-        {u"a\U0001F600", KeyCode::Delete, 0, 1, u"a", {1, 0}},
-        {u"ae\u0301", KeyCode::Delete, 0, 1, u"a", {1, 0}},
-        {u"a\U0001F600", KeyCode::Left, 0, 1, u"a\U0001F600", {1, 0}},
+        {u"ab", KeyCode::Return, {}, 1, u"ab\n", {3, 0}},
+        {u"ab", KeyCode::KeypadEnter, {}, 1, u"ab\n", {3, 0}},
+        {u"ab", KeyCode::Escape, {}, 1, u"ab", {2, 0}},
+        {u"ab", KeyCode::A, KeyModifier::Control, 1, u"ab", {2, 0}},
+        {u"a\U0001F600", KeyCode::Delete, {}, 1, u"a", {1, 0}},
+        {u"ae\u0301", KeyCode::Delete, {}, 1, u"a", {1, 0}},
+        {u"a\U0001F600", KeyCode::Left, {}, 1, u"a\U0001F600", {1, 0}},
         {u"abc", KeyCode::Left, KeyModifier::Shift, 2, u"abc", {1, 2}},
-        {u"ab\ncd", KeyCode::Home, 0, 1, u"ab\ncd", {3, 0}},
-        {u"ab\ncd", KeyCode::Up, 0, 1, u"ab\ncd", {2, 0}},
-        {u"ab\ncd", KeyCode::Up, 0, 2, u"ab\ncd", {0, 0}},
-        {u"ab\ncd", KeyCode::Down, 0, 1, u"ab\ncd", {5, 0}},
-        {u"a\nbcd", KeyCode::Up, 0, 1, u"a\nbcd", {1, 0}},
-        {u"", KeyCode::Delete, 0, 1, u"", {0, 0}},
-        {u"", KeyCode::ForwardDelete, 0, 1, u"", {0, 0}},
+        {u"ab\ncd", KeyCode::Home, {}, 1, u"ab\ncd", {3, 0}},
+        {u"ab\ncd", KeyCode::Up, {}, 1, u"ab\ncd", {2, 0}},
+        {u"ab\ncd", KeyCode::Up, {}, 2, u"ab\ncd", {0, 0}},
+        {u"ab\ncd", KeyCode::Down, {}, 1, u"ab\ncd", {5, 0}},
+        {u"a\nbcd", KeyCode::Up, {}, 1, u"a\nbcd", {1, 0}},
+        {u"", KeyCode::Delete, {}, 1, u"", {0, 0}},
+        {u"", KeyCode::ForwardDelete, {}, 1, u"", {0, 0}},
     };
     for (const Case& c : cases) {
         editor_.setText(c.text);
         press(c.keyCode, c.modifiers, c.count);
-        EXPECT_EQ(editor_.field().text(), c.result) << "key " << c.keyCode;
-        EXPECT_EQ(editor_.field().selection(), c.selection) << "key " << c.keyCode;
+        EXPECT_EQ(editor_.field().text(), c.result) << "key " << numberOf(c.keyCode);
+        EXPECT_EQ(editor_.field().selection(), c.selection) << "key " << numberOf(c.keyCode);
     }
 }
 
 TEST_F(SimulatedDesktopTest, WorksOnTheSelection) {
     editor_.setText(u"one two");
     editor_.select({0, 3});
-    press(KeyC, KeyModifier::Command);
+    press(KeyCode::C, KeyModifier::Command);
     EXPECT_EQ(desktop_.pasteboard().string(), u"one");
     press(KeyCode::ForwardDelete);
     EXPECT_EQ(editor_.field().text(), u" two");
     press(KeyCode::End);
-    press(KeyV, KeyModifier::Command);
+    press(KeyCode::V, KeyModifier::Command);
     EXPECT_EQ(editor_.field().text(), u" twoone");
     press(KeyCode::Left, KeyModifier::Shift, 3);
     desktop_.typeCharacter(u"X");
@@ -103,34 +100,34 @@ TEST_F(SimulatedDesktopTest, WorksOnTheSelection) {
 
 TEST_F(SimulatedDesktopTest, PastesWithTheModifierOfTheApplication) {
     desktop_.pasteboard().copyFromProgram(u"P");
-    press(KeyV, KeyModifier::Control);
+    press(KeyCode::V, KeyModifier::Control);
     EXPECT_EQ(editor_.field().text(), u"");
     editor_.setUsesControlKey(true);
-    press(KeyV, KeyModifier::Control);
-    press(KeyV, KeyModifier::Command);
+    press(KeyCode::V, KeyModifier::Control);
+    press(KeyCode::V, KeyModifier::Command);
     EXPECT_EQ(editor_.field().text(), u"P");
 }
 
 TEST_F(SimulatedDesktopTest, PastesTheTextOfRichContent) {
     const AttributedString rich(u"rich \u00E9");
     desktop_.pasteboard().copyFromProgram({{std::string(PasteboardType::RTF), rtfFromAttributedString(rich)}});
-    press(KeyV, KeyModifier::Command);
+    press(KeyCode::V, KeyModifier::Command);
     EXPECT_EQ(editor_.field().text(), u"rich \u00E9");
 }
 
 TEST_F(SimulatedDesktopTest, TakesAModifierThatPlumePressesAsAKey) {
     desktop_.pasteboard().copyFromProgram(u"P");
-    desktop_.poster().post({55, 0, true, {}}, false);
-    post(KeyV);
-    desktop_.poster().post({55, 0, false, {}}, false);
-    post(KeyV);
+    desktop_.poster().post({KeyCode::Command, {}, true, {}}, false);
+    post(KeyCode::V);
+    desktop_.poster().post({KeyCode::Command, {}, false, {}}, false);
+    post(KeyCode::V);
     EXPECT_EQ(editor_.field().text(), u"Pv");
 }
 
 TEST_F(SimulatedDesktopTest, InsertsAChunkAsItStands) {
-    desktop_.keyboard().press(55);
-    desktop_.poster().post({0, 0, true, u"a\rb\t"}, false);
-    desktop_.poster().post({0, 0, false, u"a\rb\t"}, false);
+    desktop_.keyboard().press(KeyCode::Command);
+    desktop_.poster().post({KeyCode::A, {}, true, u"a\rb\t"}, false);
+    desktop_.poster().post({KeyCode::A, {}, false, u"a\rb\t"}, false);
     EXPECT_EQ(editor_.field().text(), u"a\rb\t");
 }
 
@@ -141,8 +138,8 @@ TEST_F(SimulatedDesktopTest, RecordsWhatTheApplicationReceived) {
     post(KeyCode::Delete);
     const auto& events = editor_.events();
     ASSERT_EQ(events.size(), 8u);
-    EXPECT_EQ(events[0].keyCode, 56);
-    EXPECT_EQ(events[1].keyCode, KeyA);
+    EXPECT_EQ(events[0].keyCode, KeyCode::Shift);
+    EXPECT_EQ(events[1].keyCode, KeyCode::A);
     EXPECT_EQ(events[1].flags, EventFlag::Shift);
     EXPECT_EQ(events[1].time, 1.5);
     EXPECT_EQ(events[4].keyCode, std::nullopt);
@@ -177,7 +174,7 @@ TEST_F(SimulatedDesktopTest, LetsKeysWaitForTheOutputWhereThePortCan) {
     desktop_.typeCharacter(u"b");
     EXPECT_EQ(editor_.field().text(), u"");
     EXPECT_EQ(listener.heard, 1);
-    desktop_.poster().post({0, 0, true, u"1"}, false);
+    desktop_.poster().post({KeyCode::A, {}, true, u"1"}, false);
     desktop_.poster().releaseUserKeys();
     EXPECT_EQ(editor_.field().text(), u"1ab");
     EXPECT_EQ(listener.heard, 2);
@@ -208,12 +205,12 @@ TEST_F(SimulatedDesktopTest, LeavesKeysAloneAfterATimeoutUntilEnabled) {
 
 TEST_F(SimulatedDesktopTest, GivesSystemHotKeysToTheirHandlerAlone) {
     int pressed = 0;
-    ASSERT_TRUE(desktop_.systemHotKeys().registerHotKey(1, KeyA, KeyModifier::Option, [&] { ++pressed; }).ok());
-    EXPECT_FALSE(desktop_.systemHotKeys().registerHotKey(2, KeyA, KeyModifier::Option, [] {}).ok());
-    press(KeyA, KeyModifier::Option);
-    press(KeyA);
+    ASSERT_TRUE(desktop_.systemHotKeys().registerHotKey(1, KeyCode::A, KeyModifier::Option, [&] { ++pressed; }).ok());
+    EXPECT_FALSE(desktop_.systemHotKeys().registerHotKey(2, KeyCode::A, KeyModifier::Option, [] {}).ok());
+    press(KeyCode::A, KeyModifier::Option);
+    press(KeyCode::A);
     desktop_.systemHotKeys().unregisterHotKey(1);
-    press(KeyA, KeyModifier::Option);
+    press(KeyCode::A, KeyModifier::Option);
     EXPECT_EQ(pressed, 1);
     EXPECT_EQ(editor_.field().text(), u"aa");
 }

@@ -19,10 +19,8 @@ bool isModifierSymbol(xkb_keysym_t symbol) {
            (symbol >= XKB_KEY_ISO_Lock && symbol <= XKB_KEY_ISO_Level5_Lock) || symbol == XKB_KEY_Mode_switch;
 }
 
-bool isModifierKeyCode(std::uint16_t keyCode) {
-    constexpr std::uint16_t rightCommand = 54;
-    constexpr std::uint16_t rightControl = 62;
-    return keyCode >= rightCommand && keyCode <= rightControl;
+bool isModifierKeyCode(KeyCode keyCode) {
+    return keyCode >= KeyCode::RightCommand && keyCode <= KeyCode::RightControl;
 }
 
 // As the C library chooses the locale of a program's text.
@@ -79,14 +77,14 @@ void KeyDecoder::undoLocks() {
     if (locks() != locksBefore_) adopt(locksBefore_);
 }
 
-std::uint64_t KeyDecoder::flags() const {
+EventFlags KeyDecoder::flags() const {
     const auto mods = xkb_state_serialize_mods(state_.get(), XKB_STATE_MODS_EFFECTIVE);
-    std::uint64_t flags = 0;
-    if ((mods & XCB_MOD_MASK_LOCK) != 0) flags |= X11Flag::CapsLock;
-    if ((mods & XCB_MOD_MASK_SHIFT) != 0) flags |= X11Flag::Shift;
-    if ((mods & XCB_MOD_MASK_CONTROL) != 0) flags |= X11Flag::Control;
-    if ((mods & XCB_MOD_MASK_1) != 0) flags |= X11Flag::Option;
-    if ((mods & XCB_MOD_MASK_4) != 0) flags |= X11Flag::Command;
+    EventFlags flags;
+    if ((mods & XCB_MOD_MASK_LOCK) != 0) flags |= EventFlag::CapsLock;
+    if ((mods & XCB_MOD_MASK_SHIFT) != 0) flags |= EventFlag::Shift;
+    if ((mods & XCB_MOD_MASK_CONTROL) != 0) flags |= EventFlag::Control;
+    if ((mods & XCB_MOD_MASK_1) != 0) flags |= EventFlag::Option;
+    if ((mods & XCB_MOD_MASK_4) != 0) flags |= EventFlag::Command;
     return flags;
 }
 
@@ -99,12 +97,12 @@ KeyDecoder::Key KeyDecoder::press(xcb_keycode_t keycode) {
     keyCodes_[keycode] = key.keyCode;
     key.modifier = isModifierSymbol(symbol);
     const bool composed = !key.modifier && isComposed(symbol);
-    if (!key.modifier && !composed) text_.assignKey(*state_, keycode, (key.flags & X11Flag::Option) != 0);
+    if (!key.modifier && !composed) text_.assignKey(*state_, keycode, key.flags.contains(EventFlag::Option));
     key.composing = composed && text_.view().empty();
     locksBefore_ = locks();
     xkb_state_update_key(state_.get(), keycode, XKB_KEY_DOWN);
     if (key.modifier) {
-        const std::uint64_t now = flags();
+        const EventFlags now = flags();
         key.silent = now == key.flags && !isModifierKeyCode(key.keyCode);
         key.flags = now;
     }
@@ -132,10 +130,10 @@ KeyDecoder::Key KeyDecoder::release(xcb_keycode_t keycode) {
     key.keyCode = keyCodes_[keycode];
     key.flags = flags();
     key.modifier = isModifierSymbol(symbol);
-    if (!key.modifier) text_.assignKey(*state_, keycode, (key.flags & X11Flag::Option) != 0);
+    if (!key.modifier) text_.assignKey(*state_, keycode, key.flags.contains(EventFlag::Option));
     xkb_state_update_key(state_.get(), keycode, XKB_KEY_UP);
     if (key.modifier) {
-        const std::uint64_t now = flags();
+        const EventFlags now = flags();
         key.silent = now == key.flags && !isModifierKeyCode(key.keyCode);
         key.flags = now;
     }

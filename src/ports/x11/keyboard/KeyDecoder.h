@@ -13,6 +13,8 @@
 #include <memory>
 #include <string_view>
 
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
 #include "ports/x11/keyboard/KeyText.h"
 #include "ports/x11/keyboard/XkbKeyboard.h"
 #include "ports/x11/keyboard/XkbKeymap.h"
@@ -22,11 +24,11 @@ namespace plume {
 class KeyDecoder {
   public:
     struct Key {
-        std::uint16_t keyCode = 0;  // virtual
+        KeyCode keyCode = KeyCode::None;  // virtual
         bool modifier = false;
         // A key that only chooses among the characters of other keys, like AltGr: nothing to tell anybody.
         bool silent = false;
-        std::uint64_t flags = 0;     // for a modifier, with this change
+        EventFlags flags;            // for a modifier, with this change
         std::u16string_view string;  // valid until the next call
         bool composing = false;      // one of a sequence that has produced nothing yet
     };
@@ -43,7 +45,7 @@ class KeyDecoder {
     // The press did not reach any program, so what it locked is not locked.
     void undoLocks();
 
-    std::uint64_t flags() const;
+    EventFlags flags() const;
 
   private:
     struct Unref {
@@ -60,8 +62,8 @@ class KeyDecoder {
     XkbOwned<xkb_state> state_;
     std::unique_ptr<xkb_compose_table, Unref> composeTable_;
     std::unique_ptr<xkb_compose_state, Unref> composeState_;
-    std::array<std::uint16_t, 256> keyCodes_{};  // that a key went down with
-    XkbLocks locksBefore_;                       // the latest press
+    std::array<KeyCode, 256> keyCodes_{};  // that a key went down with
+    XkbLocks locksBefore_;                 // the latest press
     KeyText text_;
 };
 

@@ -11,14 +11,13 @@ namespace plume {
 namespace {
 
 constexpr double LongestHold = 2.0;
-constexpr std::uint64_t ModifierFlags = X11Flag::Shift | X11Flag::Control | X11Flag::Option | X11Flag::Command;
 
 // The left one of the keys that make the lowest of these flags.
-std::uint16_t modifierKeyOf(std::uint64_t flags) {
-    if ((flags & X11Flag::Shift) != 0) return 56;
-    if ((flags & X11Flag::Control) != 0) return 59;
-    if ((flags & X11Flag::Option) != 0) return 58;
-    return 55;
+KeyCode modifierKeyOf(EventFlags flags) {
+    if (flags.contains(EventFlag::Shift)) return KeyCode::Shift;
+    if (flags.contains(EventFlag::Control)) return KeyCode::Control;
+    if (flags.contains(EventFlag::Option)) return KeyCode::Option;
+    return KeyCode::Command;
 }
 
 }  // namespace
@@ -182,7 +181,7 @@ bool TapSession::tellsKey(const KeyDecoder::Key& key) {
 
 void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     const KeycodeSet& down = dependencies_.connection.keysDown();
-    const std::uint64_t flagsBefore = decoder_.flags();
+    const EventFlags flagsBefore = decoder_.flags();
     const KeyDecoder::Key key = decoder_.press(keycode);
     dependencies_.connection.userKeys.set(keycode);
     seen_.set(keycode);
@@ -217,9 +216,9 @@ void TapSession::release(xcb_keycode_t keycode) {
     if (!isUp) inject({keycode, false});
 }
 
-void TapSession::tellMissedModifiers(std::uint64_t flags) {
-    const std::uint64_t changed = (flags ^ dependencies_.toldFlags) & ModifierFlags;
-    if (changed == 0) return;
+void TapSession::tellMissedModifiers(EventFlags flags) {
+    const EventFlags changed = (flags ^ dependencies_.toldFlags) & ModifierFlags;
+    if (changed.isEmpty()) return;
     dependencies_.toldFlags = flags;
     dependencies_.listener.keyboardEvent({TapEvent::Type::FlagsChanged, modifierKeyOf(changed), flags, {}});
 }
@@ -227,7 +226,7 @@ void TapSession::tellMissedModifiers(std::uint64_t flags) {
 bool TapSession::tell(const KeyDecoder::Key& key, TapEvent::Type type) {
     dependencies_.toldFlags = key.flags;
     // Programs type nothing with Alt.
-    const bool command = !key.modifier && (key.flags & X11Flag::Option) != 0;
+    const bool command = !key.modifier && key.flags.contains(EventFlag::Option);
     return dependencies_.listener.keyboardEvent({type, key.keyCode, key.flags, key.string, key.composing, command});
 }
 

@@ -25,7 +25,7 @@
 namespace plume {
 
 // A key that the user pressed, by its virtual key code and with the flags of the modifiers held.
-using UserTyped = std::function<void(std::uint16_t keyCode, std::uint64_t flags)>;
+using UserTyped = std::function<void(KeyCode keyCode, EventFlags flags)>;
 
 class TapSession : public std::enable_shared_from_this<TapSession> {
   public:
@@ -37,7 +37,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         const std::function<bool()>& focusIsPassword;  // may be empty
         const UserTyped& userTyped;                    // may be empty
         std::function<void()> lost;                    // the connection is gone
-        std::uint64_t& toldFlags;                      // the modifiers that the listener takes to be held
+        EventFlags& toldFlags;                         // the modifiers that the listener takes to be held
     };
 
     explicit TapSession(Dependencies dependencies);
@@ -75,7 +75,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void releaseKeysOf(std::uint16_t device);
     bool mayTell();
     bool tellsKey(const KeyDecoder::Key& key);
-    void tellMissedModifiers(std::uint64_t flags);
+    void tellMissedModifiers(EventFlags flags);
     bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
     void inject(Injection injection);
 

@@ -17,8 +17,6 @@ namespace {
 
 // A key code of the poster's own: the key that types this ASCII character without modifiers, a spare one if need be.
 constexpr std::uint16_t LetterKeyCode = 0x4000;
-constexpr std::uint16_t InsertKeyCode = 114;  // where a US Apple keyboard has Help
-constexpr std::uint16_t NoKeyCode = 65535;
 
 // Seconds that one batch may wait for spare key codes, and between two heartbeats.
 constexpr double LongestWait = 2;
@@ -26,12 +24,12 @@ constexpr double BeatPeriod = 0.05;
 
 constexpr std::uint8_t LeftButton = 1;
 
-std::uint8_t realModifiers(std::uint64_t flags) {
+std::uint8_t realModifiers(EventFlags flags) {
     unsigned modifiers = 0;
-    if (flags & X11Flag::Shift) modifiers |= XCB_MOD_MASK_SHIFT;
-    if (flags & X11Flag::Control) modifiers |= XCB_MOD_MASK_CONTROL;
-    if (flags & X11Flag::Option) modifiers |= XCB_MOD_MASK_1;
-    if (flags & X11Flag::Command) modifiers |= XCB_MOD_MASK_4;
+    if (flags.contains(EventFlag::Shift)) modifiers |= XCB_MOD_MASK_SHIFT;
+    if (flags.contains(EventFlag::Control)) modifiers |= XCB_MOD_MASK_CONTROL;
+    if (flags.contains(EventFlag::Option)) modifiers |= XCB_MOD_MASK_1;
+    if (flags.contains(EventFlag::Command)) modifiers |= XCB_MOD_MASK_4;
     return static_cast<std::uint8_t>(modifiers);
 }
 
@@ -66,9 +64,6 @@ bool isKeyOfItsOwn(char32_t character) {
     return character == U'\n' || character == U'\t';
 }
 
-constexpr std::uint16_t ReturnKeyCode = 36;
-constexpr std::uint16_t TabKeyCode = 48;
-
 }  // namespace
 
 X11EventPoster::X11EventPoster(const RunLoop& loop, TapConnection& connection, XkbKeyboard& keyboard,
@@ -102,8 +97,9 @@ void X11EventPoster::post(const SynthesisedKey& key, bool) {
     } else {
         textEnd_ = 0;
         Item item{.modifiers = realModifiers(key.flags), .down = key.down, .isKey = true};
-        if ((key.keyCode & LetterKeyCode) != 0 && key.keyCode < NoKeyCode) {
-            item.character = key.keyCode & 0x7FU;
+        const std::uint16_t number = numberOf(key.keyCode);
+        if ((number & LetterKeyCode) != 0 && key.keyCode != KeyCode::None) {
+            item.character = number & 0x7FU;
         } else {
             item.keycode = keyboard_.keymap()->keycodeOf(key.keyCode);
         }
@@ -185,7 +181,7 @@ std::size_t X11EventPoster::findKeys(std::span<Item> items) {
 bool X11EventPoster::findKey(Item& item) {
     if (item.character == 0) return true;
     if (isKeyOfItsOwn(item.character)) {
-        item.keycode = keymap_->keycodeOf(item.character == U'\t' ? TabKeyCode : ReturnKeyCode);
+        item.keycode = keymap_->keycodeOf(item.character == U'\t' ? KeyCode::Tab : KeyCode::Return);
         return true;
     }
     const auto stroke = keymap_->strokeFor(item.character, group_);
@@ -247,38 +243,38 @@ PasteStyle X11EventPoster::pasteStyle() const {
 std::optional<CommandKeystroke> X11EventPoster::pasteKeystroke() const {
     switch (pasteStyle()) {
         case PasteStyle::ShiftInsert:
-            return CommandKeystroke{InsertKeyCode, X11Flag::Shift};
+            return CommandKeystroke{KeyCode::Help, EventFlag::Shift};
         case PasteStyle::ControlShift:
-            return CommandKeystroke{keyCodeOfLetter(u'v'), X11Flag::Control | X11Flag::Shift};
+            return CommandKeystroke{keyCodeOfLetter(u'v'), EventFlag::Control | EventFlag::Shift};
         case PasteStyle::Control:
             break;
     }
-    return CommandKeystroke{keyCodeOfLetter(u'v'), X11Flag::Control};
+    return CommandKeystroke{keyCodeOfLetter(u'v'), EventFlag::Control};
 }
 
 std::optional<CommandKeystroke> X11EventPoster::copyKeystroke() const {
     switch (pasteStyle()) {
         case PasteStyle::ShiftInsert:
-            return CommandKeystroke{NoKeyCode, 0};  // the usual keystroke would interrupt what runs there
+            return CommandKeystroke{KeyCode::None, {}};  // the usual keystroke would interrupt what runs there
         case PasteStyle::ControlShift:
-            return CommandKeystroke{keyCodeOfLetter(u'c'), X11Flag::Control | X11Flag::Shift};
+            return CommandKeystroke{keyCodeOfLetter(u'c'), EventFlag::Control | EventFlag::Shift};
         case PasteStyle::Control:
             break;
     }
-    return CommandKeystroke{keyCodeOfLetter(u'c'), X11Flag::Control};
+    return CommandKeystroke{keyCodeOfLetter(u'c'), EventFlag::Control};
 }
 
-std::uint16_t X11EventPoster::keyCodeOfLetter(char16_t letter) const {
+KeyCode X11EventPoster::keyCodeOfLetter(char16_t letter) const {
     const XkbKeymap& keymap = *keyboard_.keymap();
     const auto stroke = keymap.strokeFor(letter, keyboard_.group());
     if (stroke && stroke->modifiers == 0) {
-        const std::uint16_t keyCode = virtualKeyAt(stroke->keycode);
+        const KeyCode keyCode = virtualKeyAt(stroke->keycode);
         if (keymap.keycodeOf(keyCode) == stroke->keycode) return keyCode;
     }
-    return static_cast<std::uint16_t>(LetterKeyCode | letter);
+    return KeyCode{static_cast<std::uint16_t>(LetterKeyCode | letter)};
 }
 
-bool X11EventPoster::isKeyDown(std::uint16_t keyCode) const {
+bool X11EventPoster::isKeyDown(KeyCode keyCode) const {
     const xcb_keycode_t keycode = keyboard_.keymap()->keycodeOf(keyCode);
     return keycode != 0 && connection_.userKeys[keycode];
 }

@@ -49,7 +49,7 @@ class X11EventPoster final : public EventPoster {
     void end() override;
     void post(const SynthesisedKey& key, bool pastTap) override;
     bool canType(std::u16string_view text) const override;
-    bool isKeyDown(std::uint16_t keyCode) const override;
+    bool isKeyDown(KeyCode keyCode) const override;
     std::optional<CommandKeystroke> pasteKeystroke() const override;
     std::optional<CommandKeystroke> copyKeystroke() const override;
     Point pointerLocation() const override;
@@ -75,7 +75,7 @@ class X11EventPoster final : public EventPoster {
     void setModifiers(std::uint8_t wanted);
     bool awaitSpare(double deadline) const;
     PasteStyle pasteStyle() const;
-    std::uint16_t keyCodeOfLetter(char16_t letter) const;
+    KeyCode keyCodeOfLetter(char16_t letter) const;
 
     const RunLoop& loop_;
     TapConnection& connection_;

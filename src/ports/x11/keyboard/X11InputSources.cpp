@@ -23,17 +23,17 @@ void X11InputSources::readIdentifier() {
     if (!keyboard_.layoutName().empty()) identifier_ = fromUtf8(keyboard_.layoutName());
 }
 
-std::optional<std::u16string> X11InputSources::translateKey(std::uint16_t keyCode, std::uint64_t flags) const {
+std::optional<std::u16string> X11InputSources::translateKey(KeyCode keyCode, EventFlags flags) const {
     const xcb_keycode_t keycode = keyboard_.keymap()->keycodeOf(keyCode);
     const XkbOwned<xkb_state> state(xkb_state_new(keyboard_.keymap()->get()));
     if (keycode == 0 || !state) return std::nullopt;
     constexpr std::uint32_t numLock = XCB_MOD_MASK_2;
     std::uint32_t held = 0;
-    if ((flags & X11Flag::Shift) != 0) held |= XCB_MOD_MASK_SHIFT;
-    if ((flags & X11Flag::Control) != 0) held |= XCB_MOD_MASK_CONTROL;
+    if (flags.contains(EventFlag::Shift)) held |= XCB_MOD_MASK_SHIFT;
+    if (flags.contains(EventFlag::Control)) held |= XCB_MOD_MASK_CONTROL;
     xkb_state_update_mask(state.get(), held, 0, numLock, 0, 0, keyboard_.group());
     KeyText text;
-    text.assignKey(*state, keycode, (flags & X11Flag::Option) != 0);
+    text.assignKey(*state, keycode, flags.contains(EventFlag::Option));
     if (text.view().empty()) return std::nullopt;
     return std::u16string(text.view());
 }

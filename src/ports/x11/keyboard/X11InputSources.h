@@ -24,7 +24,7 @@ class X11InputSources final : public InputSources {
     const std::optional<std::u16string>& currentInputSourceIdentifier() const override { return identifier_; }
     // Option changes no text on X11: what types third-level characters is no modifier but a level chooser. Keypad keys
     // type digits.
-    std::optional<std::u16string> translateKey(std::uint16_t keyCode, std::uint64_t flags) const override;
+    std::optional<std::u16string> translateKey(KeyCode keyCode, EventFlags flags) const override;
     void setChangeListener(std::function<void()> listener) override { listener_ = std::move(listener); }
 
   private:

@@ -7,24 +7,20 @@
 
 #include <cstdint>
 
+#include "Foundation/KeyCode.h"
+
 namespace plume {
 
-// Event flag bits of the modifiers.
-namespace X11Flag {
-inline constexpr std::uint64_t CapsLock = 0x10000;
-inline constexpr std::uint64_t Shift = 0x20000;
-inline constexpr std::uint64_t Control = 0x40000;
-inline constexpr std::uint64_t Option = 0x80000;
-inline constexpr std::uint64_t Command = 0x100000;
-}  // namespace X11Flag
-
-// Keys that a US Apple keyboard has no code for (media keys and the like) have codes of their own from here on, so that
-// every key has one and none is mistaken for another.
-inline constexpr std::uint16_t FirstForeignKeyCode = 256;
+// Keys that a US Apple keyboard has no code for (media keys and the like) have codes of their own, so that every key
+// has one and none is mistaken for another.
+constexpr KeyCode foreignKeyCode(xcb_keycode_t keycode) {
+    constexpr std::uint16_t first = 256;
+    return KeyCode{static_cast<std::uint16_t>(first + keycode)};
+}
 
 // The virtual key code of the key at this place.
-std::uint16_t virtualKeyAt(xcb_keycode_t keycode);
+KeyCode virtualKeyAt(xcb_keycode_t keycode);
 // The X key code of the place of this key; 0 when there is no such key.
-xcb_keycode_t placeOfVirtualKey(std::uint16_t keyCode);
+xcb_keycode_t placeOfVirtualKey(KeyCode keyCode);
 
 }  // namespace plume

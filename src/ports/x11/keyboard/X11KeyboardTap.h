@@ -55,7 +55,7 @@ class X11KeyboardTap final : public KeyboardTap {
     std::function<bool()> focusIsPassword_;
     UserTyped userTyped_;
     KeyboardTapListener* listener_ = nullptr;
-    std::uint64_t toldFlags_ = 0;          // the modifiers that the listener takes to be held, across sessions
+    EventFlags toldFlags_;                 // the modifiers that the listener takes to be held, across sessions
     std::shared_ptr<TapSession> session_;  // while the keyboards are taken
     Timer nextTry_;
     Subscription keyboardChanged_;

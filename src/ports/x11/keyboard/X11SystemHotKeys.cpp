@@ -17,10 +17,10 @@ constexpr std::uint16_t MatteringModifiers =
 // Shift, Control, Option, Command by their bits.
 constexpr std::uint16_t XModifiers[] = {XCB_MOD_MASK_SHIFT, XCB_MOD_MASK_CONTROL, XCB_MOD_MASK_1, XCB_MOD_MASK_4};
 
-std::uint16_t xModifiersOf(std::int32_t modifiers) {
+std::uint16_t xModifiersOf(KeyModifiers modifiers) {
     std::uint16_t mask = 0;
     for (std::size_t bit = 0; bit < std::size(XModifiers); ++bit) {
-        if ((modifiers >> bit & 1) != 0) mask = static_cast<std::uint16_t>(mask | XModifiers[bit]);
+        if ((modifiers.bits() >> bit & 1) != 0) mask = static_cast<std::uint16_t>(mask | XModifiers[bit]);
     }
     return mask;
 }
@@ -93,11 +93,12 @@ std::vector<std::uint16_t> X11SystemHotKeys::lockVariants() const {
     return variants;
 }
 
-Result<void> X11SystemHotKeys::registerHotKey(Id id, std::uint16_t keyCode, std::int32_t modifiers,
+Result<void> X11SystemHotKeys::registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers,
                                               std::function<void()> handler) {
     unregisterHotKey(id);
     const auto xKeyCode = keyCodeOf_(keyCode);
-    if (!xKeyCode) return Error{"The keyboard has no key with code " + std::to_string(keyCode) + " for the hot key."};
+    if (!xKeyCode)
+        return Error{"The keyboard has no key with code " + std::to_string(numberOf(keyCode)) + " for the hot key."};
     HotKey hotKey{*xKeyCode, xModifiersOf(modifiers), std::move(handler)};
     if (isRegistered(hotKey)) return Error{"Another hot key of Plume's has this combination already."};
     if (!grab(hotKey)) return Error{"Another program has this combination as its hot key already: choose another."};

@@ -14,7 +14,7 @@ namespace plume {
 class X11SystemHotKeys final : public SystemHotKeys {
   public:
     // The X key code of a virtual key code, if the keyboard has that key.
-    using KeyCodeOf = std::function<std::optional<xcb_keycode_t>(std::uint16_t)>;
+    using KeyCodeOf = std::function<std::optional<xcb_keycode_t>(KeyCode)>;
 
     // The session outlives the hot keys.
     X11SystemHotKeys(X11Session& session, KeyCodeOf keyCodeOf);
@@ -22,8 +22,7 @@ class X11SystemHotKeys final : public SystemHotKeys {
     X11SystemHotKeys(const X11SystemHotKeys&) = delete;
     X11SystemHotKeys& operator=(const X11SystemHotKeys&) = delete;
 
-    Result<void> registerHotKey(Id id, std::uint16_t keyCode, std::int32_t modifiers,
-                                std::function<void()> handler) override;
+    Result<void> registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers, std::function<void()> handler) override;
     void unregisterHotKey(Id id) override;
 
   private:

@@ -18,51 +18,51 @@ constexpr unsigned LastKeycode = 255;
 // Keys that are what their symbol says, wherever they are: remapping Caps Lock to Escape makes it an Escape key.
 struct Function {
     xkb_keysym_t symbol;
-    std::uint16_t virtualKey;
+    KeyCode virtualKey;
     bool alias = false;  // another key is the one to press for it
 };
 
 constexpr auto Functions = std::to_array<Function>({
-    {XKB_KEY_Return, 36},
-    {XKB_KEY_Tab, 48},
-    {XKB_KEY_ISO_Left_Tab, 48, true},
-    {XKB_KEY_BackSpace, 51},
-    {XKB_KEY_Escape, 53},
-    {XKB_KEY_KP_Enter, 76},
-    {XKB_KEY_Insert, 114},
-    {XKB_KEY_Home, 115},
-    {XKB_KEY_Prior, 116},
-    {XKB_KEY_Delete, 117},
-    {XKB_KEY_End, 119},
-    {XKB_KEY_Next, 121},
-    {XKB_KEY_Left, 123},
-    {XKB_KEY_Right, 124},
-    {XKB_KEY_Down, 125},
-    {XKB_KEY_Up, 126},
-    {XKB_KEY_KP_Insert, 114, true},
-    {XKB_KEY_KP_Home, 115, true},
-    {XKB_KEY_KP_Prior, 116, true},
-    {XKB_KEY_KP_Delete, 117, true},
-    {XKB_KEY_KP_End, 119, true},
-    {XKB_KEY_KP_Next, 121, true},
-    {XKB_KEY_KP_Left, 123, true},
-    {XKB_KEY_KP_Right, 124, true},
-    {XKB_KEY_KP_Down, 125, true},
-    {XKB_KEY_KP_Up, 126, true},
-    {XKB_KEY_Super_R, 54},
-    {XKB_KEY_Super_L, 55},
-    {XKB_KEY_Hyper_R, 54, true},
-    {XKB_KEY_Hyper_L, 55, true},
-    {XKB_KEY_Shift_L, 56},
-    {XKB_KEY_Shift_R, 60},
-    {XKB_KEY_Caps_Lock, 57},
-    {XKB_KEY_Shift_Lock, 57, true},
-    {XKB_KEY_Alt_L, 58},
-    {XKB_KEY_Alt_R, 61},
-    {XKB_KEY_Meta_L, 58, true},
-    {XKB_KEY_Meta_R, 61, true},
-    {XKB_KEY_Control_L, 59},
-    {XKB_KEY_Control_R, 62},
+    {XKB_KEY_Return, KeyCode::Return},
+    {XKB_KEY_Tab, KeyCode::Tab},
+    {XKB_KEY_ISO_Left_Tab, KeyCode::Tab, true},
+    {XKB_KEY_BackSpace, KeyCode::Delete},
+    {XKB_KEY_Escape, KeyCode::Escape},
+    {XKB_KEY_KP_Enter, KeyCode::KeypadEnter},
+    {XKB_KEY_Insert, KeyCode::Help},
+    {XKB_KEY_Home, KeyCode::Home},
+    {XKB_KEY_Prior, KeyCode::PageUp},
+    {XKB_KEY_Delete, KeyCode::ForwardDelete},
+    {XKB_KEY_End, KeyCode::End},
+    {XKB_KEY_Next, KeyCode::PageDown},
+    {XKB_KEY_Left, KeyCode::Left},
+    {XKB_KEY_Right, KeyCode::Right},
+    {XKB_KEY_Down, KeyCode::Down},
+    {XKB_KEY_Up, KeyCode::Up},
+    {XKB_KEY_KP_Insert, KeyCode::Help, true},
+    {XKB_KEY_KP_Home, KeyCode::Home, true},
+    {XKB_KEY_KP_Prior, KeyCode::PageUp, true},
+    {XKB_KEY_KP_Delete, KeyCode::ForwardDelete, true},
+    {XKB_KEY_KP_End, KeyCode::End, true},
+    {XKB_KEY_KP_Next, KeyCode::PageDown, true},
+    {XKB_KEY_KP_Left, KeyCode::Left, true},
+    {XKB_KEY_KP_Right, KeyCode::Right, true},
+    {XKB_KEY_KP_Down, KeyCode::Down, true},
+    {XKB_KEY_KP_Up, KeyCode::Up, true},
+    {XKB_KEY_Super_R, KeyCode::RightCommand},
+    {XKB_KEY_Super_L, KeyCode::Command},
+    {XKB_KEY_Hyper_R, KeyCode::RightCommand, true},
+    {XKB_KEY_Hyper_L, KeyCode::Command, true},
+    {XKB_KEY_Shift_L, KeyCode::Shift},
+    {XKB_KEY_Shift_R, KeyCode::RightShift},
+    {XKB_KEY_Caps_Lock, KeyCode::CapsLock},
+    {XKB_KEY_Shift_Lock, KeyCode::CapsLock, true},
+    {XKB_KEY_Alt_L, KeyCode::Option},
+    {XKB_KEY_Alt_R, KeyCode::RightOption},
+    {XKB_KEY_Meta_L, KeyCode::Option, true},
+    {XKB_KEY_Meta_R, KeyCode::RightOption, true},
+    {XKB_KEY_Control_L, KeyCode::Control},
+    {XKB_KEY_Control_R, KeyCode::RightControl},
 });
 
 const Function* functionOf(xkb_keysym_t symbol) {
@@ -70,7 +70,7 @@ const Function* functionOf(xkb_keysym_t symbol) {
     return found == Functions.end() ? nullptr : &*found;
 }
 
-bool hasFunction(std::uint16_t virtualKey) {
+bool hasFunction(KeyCode virtualKey) {
     return std::ranges::find(Functions, virtualKey, &Function::virtualKey) != Functions.end();
 }
 
@@ -214,17 +214,17 @@ xcb_keycode_t XkbKeymap::keyOfModifier(std::uint8_t modifier) const {
                                          : xcb_keycode_t{0};
 }
 
-xcb_keycode_t XkbKeymap::keycodeOf(std::uint16_t virtualKey) const {
+xcb_keycode_t XkbKeymap::keycodeOf(KeyCode virtualKey) const {
     if (!hasFunction(virtualKey)) return placeOfVirtualKey(virtualKey);
     const auto found = keyOfFunction_.find(virtualKey);
     return found == keyOfFunction_.end() ? xcb_keycode_t{0} : found->second;
 }
 
-std::uint16_t XkbKeymap::virtualKeyOf(xcb_keycode_t keycode, xkb_keysym_t symbol) {
+KeyCode XkbKeymap::virtualKeyOf(xcb_keycode_t keycode, xkb_keysym_t symbol) {
     if (const Function* const function = functionOf(symbol)) return function->virtualKey;
-    const std::uint16_t atPlace = virtualKeyAt(keycode);
+    const KeyCode atPlace = virtualKeyAt(keycode);
     if (!hasFunction(atPlace)) return atPlace;
-    return static_cast<std::uint16_t>(FirstForeignKeyCode + keycode);
+    return foreignKeyCode(keycode);
 }
 
 }  // namespace plume

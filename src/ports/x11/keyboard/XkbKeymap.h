@@ -14,6 +14,8 @@
 #include <unordered_map>
 #include <vector>
 
+#include "Foundation/KeyCode.h"
+
 namespace plume {
 
 struct XkbUnref {
@@ -46,9 +48,9 @@ class XkbKeymap {
     xcb_keycode_t keyOfModifier(std::uint8_t modifier) const;
     // The key that does what the virtual key of this code does: for keys that print nothing the one that has the
     // symbol wherever the user put it, otherwise the key at its place. 0 when there is none.
-    xcb_keycode_t keycodeOf(std::uint16_t virtualKey) const;
+    xcb_keycode_t keycodeOf(KeyCode virtualKey) const;
     // The other way round, for a key with this symbol now.
-    static std::uint16_t virtualKeyOf(xcb_keycode_t keycode, xkb_keysym_t symbol);
+    static KeyCode virtualKeyOf(xcb_keycode_t keycode, xkb_keysym_t symbol);
 
     // Key codes without any symbol, ascending: free to be given symbols.
     const std::vector<xcb_keycode_t>& spareKeycodes() const { return spares_; }
@@ -67,7 +69,7 @@ class XkbKeymap {
 
     XkbOwned<xkb_keymap> keymap_;
     std::vector<std::unordered_map<char32_t, XkbStroke>> strokes_;  // by group
-    std::unordered_map<std::uint16_t, xcb_keycode_t> keyOfFunction_;
+    std::unordered_map<KeyCode, xcb_keycode_t> keyOfFunction_;
     std::array<std::uint8_t, 256> modifiersOf_{};
     std::array<xcb_keycode_t, 8> keyOfModifier_{};
     std::vector<xcb_keycode_t> spares_;
