@@ -3,7 +3,6 @@
 #include <utility>
 
 #include "Foundation/KeyCode.h"
-#include "Foundation/KeyModifiers.h"
 #include "input/delivery/KeySender.h"
 
 namespace plume {
@@ -19,7 +18,7 @@ AclExport::AclExport(KeySender& sender, const Pasteboard& pasteboard, RunLoop& r
     : sender_(sender), pasteboard_(pasteboard), runLoop_(runLoop), copy_(std::move(copy)) {}
 
 void AclExport::after(void (AclExport::*next)()) {
-    runLoop_.schedule(Pause, [this, next] { (this->*next)(); });
+    next_ = runLoop_.performAfterDelay(Pause, [this, next] { (this->*next)(); });
 }
 
 void AclExport::start() {

@@ -37,6 +37,7 @@ class AclExport {
     const Pasteboard& pasteboard_;
     RunLoop& runLoop_;
     std::function<void()> copy_;
+    Timer next_;
     bool running_ = false;
     std::optional<std::u16string> previous_;
     std::u16string collected_;

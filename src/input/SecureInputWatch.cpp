@@ -25,12 +25,11 @@ void SecureInputWatch::startCheckingSecureInputTimer() {
 
 void SecureInputWatch::check() {
     checkSecureInput();
-    timer_ = mainLoop_.schedule(CheckInterval, [this] { check(); });
+    nextCheck_ = mainLoop_.performAfterDelay(CheckInterval, [this] { check(); });
 }
 
 void SecureInputWatch::stop() {
-    mainLoop_.cancel(timer_);
-    timer_ = 0;
+    nextCheck_.cancel();
 }
 
 void SecureInputWatch::checkSecureInput() {

@@ -45,7 +45,7 @@ class SecureInputWatch {
     std::function<void()> changed_;
     std::atomic<bool> state_ = false;
     std::optional<std::u16string> lastApp_;
-    RunLoop::CallId timer_ = 0;
+    Timer nextCheck_;
 };
 
 }  // namespace plume

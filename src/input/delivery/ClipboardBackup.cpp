@@ -19,7 +19,6 @@ void ClipboardBackup::backup() {
 }
 
 void ClipboardBackup::restore() {
-    pendingRestore_ = 0;
     if (!hasData_) return;
     hasData_ = false;
     std::vector<std::string> types;
@@ -30,13 +29,11 @@ void ClipboardBackup::restore() {
 
 void ClipboardBackup::restoreAfterDelay() {
     if (!hasData_) return;
-    cancelRestore();
-    pendingRestore_ = runLoop_.schedule(RestoreDelay, [this] { restore(); });
+    pendingRestore_ = runLoop_.performAfterDelay(RestoreDelay, [this] { restore(); });
 }
 
 void ClipboardBackup::cancelRestore() {
-    runLoop_.cancel(pendingRestore_);
-    pendingRestore_ = 0;
+    pendingRestore_.cancel();
 }
 
 }  // namespace plume

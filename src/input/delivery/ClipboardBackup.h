@@ -15,7 +15,6 @@ namespace plume {
 class ClipboardBackup {
   public:
     ClipboardBackup(Pasteboard& pasteboard, RunLoop& runLoop) : pasteboard_(pasteboard), runLoop_(runLoop) {}
-    ~ClipboardBackup() { cancelRestore(); }
     ClipboardBackup(const ClipboardBackup&) = delete;
     ClipboardBackup& operator=(const ClipboardBackup&) = delete;
 
@@ -30,7 +29,7 @@ class ClipboardBackup {
     RunLoop& runLoop_;
     bool hasData_ = false;
     std::vector<std::pair<std::string, std::string>> datas_;  // type and bytes, in the clipboard's order
-    RunLoop::CallId pendingRestore_ = 0;
+    Timer pendingRestore_;
 };
 
 }  // namespace plume

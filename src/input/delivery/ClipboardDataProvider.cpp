@@ -11,10 +11,6 @@ namespace plume {
 ClipboardDataProvider::ClipboardDataProvider(Pasteboard& pasteboard, RunLoop& runLoop)
     : pasteboard_(pasteboard), runLoop_(runLoop) {}
 
-ClipboardDataProvider::~ClipboardDataProvider() {
-    cancelRestore();
-}
-
 void ClipboardDataProvider::prepareSetData() {
     // What is remembered would pass for the user's latest content while it is older than that.
     if (types_ && pasteboard_.changeCount() != backupChangeCount_) backup();
@@ -86,7 +82,7 @@ void ClipboardDataProvider::backup() {
 }
 
 void ClipboardDataProvider::restore() {
-    pendingRestore_ = 0;
+    pendingRestore_.cancel();
     if (!types_) return;
     // Somebody has copied something since: that is what the user wants to find there.
     if (pasteboard_.changeCount() != changeCount_) return;
@@ -103,14 +99,13 @@ void ClipboardDataProvider::restore() {
 }
 
 void ClipboardDataProvider::restoreAfterDelay() {
-    cancelRestore();
-    pendingRestore_ = runLoop_.schedule(restoreDelay, [this] { restore(); });
+    restoresWhenTaken_ = false;
+    pendingRestore_ = runLoop_.performAfterDelay(restoreDelay, [this] { restore(); });
 }
 
 bool ClipboardDataProvider::cancelRestore() {
-    const bool wasPending = pendingRestore_ != 0 || restoresWhenTaken_;
-    runLoop_.cancel(pendingRestore_);
-    pendingRestore_ = 0;
+    const bool wasPending = pendingRestore_ || restoresWhenTaken_;
+    pendingRestore_.cancel();
     restoresWhenTaken_ = false;
     return wasPending;
 }

@@ -23,7 +23,6 @@ namespace plume {
 class ClipboardDataProvider final : public PasteboardOwner {
   public:
     ClipboardDataProvider(Pasteboard& pasteboard, RunLoop& runLoop);
-    ~ClipboardDataProvider() override;
     ClipboardDataProvider(const ClipboardDataProvider&) = delete;
     ClipboardDataProvider& operator=(const ClipboardDataProvider&) = delete;
 
@@ -69,7 +68,7 @@ class ClipboardDataProvider final : public PasteboardOwner {
     bool providedData_ = false;           // the expansion was read
     bool restoresWhenTaken_ = false;      // a restore is due as soon as it was
     bool provideBackupData_ = false;
-    RunLoop::CallId pendingRestore_ = 0;
+    Timer pendingRestore_;
 };
 
 // What clipboard placeholders read: the clipboard, or, while an expansion stands there, the user's remembered content.

@@ -81,7 +81,7 @@ void OutputDelivery::continueBatch() {
     performSteps();
     if (awaitsTaking_) return;
     if (!batch_.pause) return finish();
-    dependencies_.tapLoop.schedule(*batch_.pause, [this] { sendBatch(); });
+    nextBatch_ = dependencies_.tapLoop.performAfterDelay(*batch_.pause, [this] { sendBatch(); });
 }
 
 // All in one, so that the port can send it together.
@@ -141,7 +141,7 @@ void OutputDelivery::paste(const PLOutput::Fragment& fragment) {
     if (pastesByActivation(setting)) return pasteByActivation();
     if (!setting.has(InputFlag::DelayPasting)) return sendPasteCommand();
     pasting_ = true;
-    dependencies_.tapLoop.schedule(pasteKeystrokeDelay(setting), [this] { sendPasteCommand(); });
+    keystroke_ = dependencies_.tapLoop.performAfterDelay(pasteKeystrokeDelay(setting), [this] { sendPasteCommand(); });
 }
 
 void OutputDelivery::offer(const PLOutput::Fragment& fragment) {
@@ -170,7 +170,7 @@ void OutputDelivery::sendPasteCommand() {
     hasAskedForPaste_ = true;
     sender_.sendPasteCommand(*current_->setting);
     if (awaitsTaking_ && hasAskedForPaste_) {
-        takingLimit_ = dependencies_.tapLoop.schedule(TakingLimit, [this] { goOnBehindPaste(); });
+        behindPaste_ = dependencies_.tapLoop.performAfterDelay(TakingLimit, [this] { goOnBehindPaste(); });
     }
     completeIfDone();
 }
@@ -179,8 +179,7 @@ void OutputDelivery::sendPasteCommand() {
 void OutputDelivery::wasTaken() {
     if (!awaitsTaking_ || !hasAskedForPaste_) return;
     hasAskedForPaste_ = false;
-    dependencies_.tapLoop.cancel(takingLimit_);
-    dependencies_.tapLoop.schedule(0, [this] { goOnBehindPaste(); });
+    behindPaste_ = dependencies_.tapLoop.performAfterDelay(0, [this] { goOnBehindPaste(); });
 }
 
 void OutputDelivery::goOnBehindPaste() {

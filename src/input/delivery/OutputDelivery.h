@@ -103,7 +103,9 @@ class OutputDelivery {
     int keystrokesToCome_ = 0;       // paste keystrokes, delayed ones and those to virtual machines
     bool awaitsTaking_ = false;      // nothing goes on before the last paste was taken
     bool hasAskedForPaste_ = false;  // its keystroke was sent
-    RunLoop::CallId takingLimit_ = 0;
+    Timer nextBatch_;
+    Timer keystroke_;    // the delayed one
+    Timer behindPaste_;  // when the paste was taken, or is waited for no longer
 };
 
 }  // namespace plume

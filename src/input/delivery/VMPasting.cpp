@@ -21,9 +21,14 @@ VMPasting::VMPasting(EventPoster& poster, ProcessManager& processManager, RunLoo
                      VMHelperController* helper)
     : poster_(poster), processManager_(processManager), tapLoop_(tapLoop), mainLoop_(mainLoop), helper_(helper) {}
 
+void VMPasting::after(double delay, std::function<void()> call) {
+    timers_.push_back(tapLoop_.performAfterDelay(delay, std::move(call)));
+}
+
 void VMPasting::start(Order order) {
+    ++ordersToCome_;
     auto shared = std::make_shared<const Order>(std::move(order));
-    tapLoop_.schedule(ActivationDelay, [this, shared = std::move(shared)] {
+    after(ActivationDelay, [this, shared = std::move(shared)] {
         processManager_.bringToFront(processManager_.currentProcess());
         showVMHelper(shared);
     });
@@ -32,25 +37,31 @@ void VMPasting::start(Order order) {
 void VMPasting::showVMHelper(const std::shared_ptr<const Order>& order) {
     if (order->setting->has(InputFlag::ClickAtVMHelper)) {
         if (helper_) mainLoop_.perform([helper = helper_, at = poster_.pointerLocation()] { helper->show(at); });
-        tapLoop_.schedule(HelperClickDelay, [this] { sendMouseClick(); });
-        tapLoop_.schedule(HelperHideDelay, [this] {
+        after(HelperClickDelay, [this] { sendMouseClick(); });
+        after(HelperHideDelay, [this] {
             if (helper_) mainLoop_.perform([helper = helper_] { helper->hide(); });
         });
     }
-    tapLoop_.schedule(GiveWayDelay, [this, order] { activateAndPasteToVM(*order); });
+    after(GiveWayDelay, [this, order] { activateAndPasteToVM(*order); });
 }
 
 void VMPasting::activateAndPasteToVM(const Order& order) {
     processManager_.bringToFront(order.target);
     if (order.setting->has(InputFlag::ClickAtVM)) {
-        tapLoop_.schedule(MachineClickDelay, [this] { sendMouseClick(); });
+        after(MachineClickDelay, [this] { sendMouseClick(); });
     }
     if (order.setting->has(InputFlag::DeleteAfterActivateVM)) {
-        tapLoop_.schedule(KeystrokeDelay, order.sendBackspaces);
-        tapLoop_.schedule(KeystrokeDelayBehindBackspaces, order.sendPasteCommand);
+        after(KeystrokeDelay, order.sendBackspaces);
+        after(KeystrokeDelayBehindBackspaces, [this, send = order.sendPasteCommand] { sendPasteCommand(send); });
     } else {
-        tapLoop_.schedule(KeystrokeDelay, order.sendPasteCommand);
+        after(KeystrokeDelay, [this, send = order.sendPasteCommand] { sendPasteCommand(send); });
     }
+}
+
+// The last step of an order.
+void VMPasting::sendPasteCommand(const std::function<void()>& send) {
+    if (--ordersToCome_ == 0) timers_.clear();
+    send();
 }
 
 void VMPasting::sendMouseClick() {

@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <memory>
+#include <vector>
 
 #include "input/delivery/ContextInputSetting.h"
 #include "input/delivery/VMHelperController.h"
@@ -31,8 +32,10 @@ class VMPasting {
     void start(Order order);
 
   private:
+    void after(double delay, std::function<void()> call);
     void showVMHelper(const std::shared_ptr<const Order>& order);
     void activateAndPasteToVM(const Order& order);
+    void sendPasteCommand(const std::function<void()>& send);
     void sendMouseClick();
 
     EventPoster& poster_;
@@ -40,6 +43,8 @@ class VMPasting {
     RunLoop& tapLoop_;
     RunLoop& mainLoop_;
     VMHelperController* helper_;
+    int ordersToCome_ = 0;       // a paste may be ordered before the last one is done
+    std::vector<Timer> timers_;  // of the orders to come; some have run
 };
 
 }  // namespace plume
