@@ -38,6 +38,9 @@ class Listener {
 
 class ZDEventTest : public testing::Test {
   protected:
+    void listen(Listener& listener, void (Listener::*selector)(Arguments&)) {
+        subscriptions_.push_back(event_.addObserver(&listener, selector));
+    }
     std::vector<std::string> raise() {
         Arguments arguments;
         event_.raise(arguments);
@@ -45,8 +48,8 @@ class ZDEventTest : public testing::Test {
     }
 
     // Stands for the main thread: keeps the calls until they are run.
-    void raiseLater(const std::shared_ptr<Arguments>& arguments) {
-        event_.raiseOnMainThread(arguments, [this](std::function<void()> call) { queue_.push_back(std::move(call)); });
+    Event::Post later() {
+        return [this](std::function<void()> call) { queue_.push_back(std::move(call)); };
     }
     void runQueue() {
         for (const auto& call : queue_) call();
@@ -60,63 +63,37 @@ class ZDEventTest : public testing::Test {
     std::vector<Subscription> subscriptions_;
 };
 
-TEST_F(ZDEventTest, CallsInTheOrderOfRegistration) {
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::second));
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    EXPECT_THAT(raise(), ElementsAre("b.second", "a.first", "b.first"));
-}
-
-TEST_F(ZDEventTest, RemovesTheFirstOfTwoEqualHandlers) {
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+TEST_F(ZDEventTest, CallsInTheOrderOfRegistrationAndRemovesTheFirstThatWasNamed) {
+    listen(a_, &Listener::first);
+    listen(b_, &Listener::second);
+    listen(b_, &Listener::first);
+    listen(a_, &Listener::first);
+    EXPECT_THAT(raise(), ElementsAre("a.first", "b.second", "b.first", "a.first"));
     event_.removeObserver(&a_, &Listener::first);
-    EXPECT_THAT(raise(), ElementsAre("b.first", "a.first"));
-}
-
-TEST_F(ZDEventTest, RemovesOnlyTheHandlerThatWasNamed) {
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::second));
     event_.removeObserver(&a_, &Listener::second);
-    event_.removeObserver(&b_, &Listener::first);
-    EXPECT_THAT(raise(), ElementsAre("a.first"));
+    EXPECT_THAT(raise(), ElementsAre("b.second", "b.first", "a.first"));
 }
 
-TEST_F(ZDEventTest, AHandlerRemovedWhileTheEventIsRaisedIsNotCalled) {
-    a_.during = [this] { event_.removeObserver(&b_, &Listener::first); };
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::second));
-    EXPECT_THAT(raise(), ElementsAre("a.first", "a.second"));
-}
-
-TEST_F(ZDEventTest, AHandlerMayRemoveItself) {
-    a_.during = [this] { event_.removeObserver(&a_, &Listener::first); };
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    EXPECT_THAT(raise(), ElementsAre("a.first", "b.first"));
-    EXPECT_THAT(raise(), ElementsAre("b.first"));
-}
-
-TEST_F(ZDEventTest, RemovingTwiceWhileRaisedTakesBothOfTwoEqualHandlers) {
+TEST_F(ZDEventTest, HandlersMayRemoveThemselvesAndOthersWhileTheEventIsRaised) {
     a_.during = [this] {
-        event_.removeObserver(&b_, &Listener::first);
-        event_.removeObserver(&b_, &Listener::first);
+        event_.removeObserver(&a_, &Listener::first);
+        for (int i = 0; i < 2; ++i) event_.removeObserver(&b_, &Listener::first);
     };
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    EXPECT_THAT(raise(), ElementsAre("a.first"));
+    listen(b_, &Listener::first);
+    listen(a_, &Listener::first);
+    listen(b_, &Listener::first);
+    listen(a_, &Listener::second);
+    EXPECT_THAT(raise(), ElementsAre("b.first", "a.first", "a.second"));
+    EXPECT_THAT(raise(), ElementsAre("a.second"));
 }
 
 TEST_F(ZDEventTest, AHandlerAddedWhileTheEventIsRaisedIsCalledFromTheNextTimeOn) {
     a_.during = [this] {
         a_.during = nullptr;
-        for (int i = 0; i < 100; ++i) subscriptions_.push_back(event_.addObserver(&b_, &Listener::second));
+        for (int i = 0; i < 100; ++i) listen(b_, &Listener::second);
     };
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
+    listen(a_, &Listener::first);
+    listen(b_, &Listener::first);
     EXPECT_THAT(raise(), ElementsAre("a.first", "b.first"));
     EXPECT_EQ(raise().size(), 102U);
 }
@@ -128,17 +105,17 @@ TEST_F(ZDEventTest, RemovingWhileRaisedWithinAHandlerKeepsThePlacesOfTheOuterRai
         event_.removeObserver(&a_, &Listener::first);
         inner = raise();
     };
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::second));
+    listen(a_, &Listener::first);
+    listen(b_, &Listener::first);
+    listen(b_, &Listener::second);
     EXPECT_THAT(raise(), ElementsAre("a.first", "b.first", "b.second"));
     EXPECT_THAT(inner, ElementsAre("b.first", "b.second"));
 }
 
 TEST_F(ZDEventTest, LaterHandlersAndTheRaiserSeeWhatAHandlerSet) {
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::readsCancel));
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::cancels));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::readsCancel));
+    listen(a_, &Listener::readsCancel);
+    listen(a_, &Listener::cancels);
+    listen(b_, &Listener::readsCancel);
     Arguments arguments;
     event_.raise(arguments);
     EXPECT_TRUE(arguments.cancel);
@@ -151,32 +128,24 @@ TEST_F(ZDEventTest, ASubscriptionThatEndsRemovesItsHandlerAlone) {
     first = std::move(second);
     EXPECT_THAT(raise(), ElementsAre("b.first"));
     a_.during = [&first] { first.end(); };
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
+    listen(a_, &Listener::first);
     EXPECT_THAT(raise(), ElementsAre("b.first", "a.first"));
     EXPECT_THAT(raise(), ElementsAre("a.first"));
     subscriptions_.clear();
     EXPECT_FALSE(event_.isObserved());
 }
 
-TEST_F(ZDEventTest, OnTheMainThreadEveryHandlerGetsACallOfItsOwn) {
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
+TEST_F(ZDEventTest, OnTheMainThreadEveryHandlerGetsACallOfItsOwnUnlessRemovedBefore) {
+    listen(b_, &Listener::second);
+    listen(a_, &Listener::first);
+    listen(b_, &Listener::first);
     const auto arguments = std::make_shared<Arguments>();
-    raiseLater(arguments);
-    EXPECT_EQ(queue_.size(), 2U);
+    event_.raiseOnMainThread(arguments, later());
+    EXPECT_EQ(queue_.size(), 3U);
     EXPECT_THAT(arguments->calls, IsEmpty());
-    runQueue();
-    EXPECT_THAT(arguments->calls, ElementsAre("a.first", "b.first"));
-}
-
-TEST_F(ZDEventTest, AHandlerRemovedBeforeItsCallArrivesIsNotCalled) {
-    subscriptions_.push_back(event_.addObserver(&a_, &Listener::first));
-    subscriptions_.push_back(event_.addObserver(&b_, &Listener::first));
-    const auto arguments = std::make_shared<Arguments>();
-    raiseLater(arguments);
     event_.removeObserver(&a_, &Listener::first);
     runQueue();
-    EXPECT_THAT(arguments->calls, ElementsAre("b.first"));
+    EXPECT_THAT(arguments->calls, ElementsAre("b.second", "b.first"));
 }
 
 TEST_F(ZDEventTest, QueuedCallsKeepTheArgumentAliveAndOutliveTheEvent) {
@@ -185,7 +154,7 @@ TEST_F(ZDEventTest, QueuedCallsKeepTheArgumentAliveAndOutliveTheEvent) {
     {
         Event event;
         subscriptions_.push_back(event.addObserver(&a_, &Listener::first));
-        event.raiseOnMainThread(arguments, [this](std::function<void()> call) { queue_.push_back(std::move(call)); });
+        event.raiseOnMainThread(arguments, later());
     }
     arguments.reset();
     EXPECT_FALSE(watched.expired());

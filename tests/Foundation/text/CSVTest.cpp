@@ -39,8 +39,9 @@ std::string shown(const std::optional<Rows>& rows) {
     return text;
 }
 
-std::optional<Rows> parsed(std::u16string text, std::u16string separator = u",") {
-    return CSVParser(std::move(text), std::move(separator), std::nullopt, false, ImportNames).arrayOfParsedRows();
+std::string parsed(std::u16string text, std::u16string separator = u",", bool hasHeader = false) {
+    return shown(
+        CSVParser(std::move(text), std::move(separator), std::nullopt, hasHeader, ImportNames).arrayOfParsedRows());
 }
 
 struct Reading {
@@ -51,17 +52,13 @@ struct Reading {
 TEST(CSVParser, ReadsTheDialect) {
     const Reading cases[] = {
         {u"a,b\nc,d", "Name=a;Value=b|Name=c;Value=d"},
-        {u"a,b\nc,d\n", "Name=a;Value=b|Name=c;Value=d"},
         {u"a", "Name=a"},
         {u"a\r\nb\r\n\r\n\nc", "Name=a|Name=b|Name=c"},
         {u"a\u2028b\u2029c\u0085d\vf\fg", "Name=a|Name=b|Name=c|Name=d|Name=f|Name=g"},
         {u"", "nothing"},
         {u"\na,b", "nothing"},
-        {u"\r\n", "nothing"},
-        {u"a,b,c,d", "FIELD_4=d;Label=c;Name=a;Value=b"},
         {u"a,,c", "Label=c;Name=a;Value="},
         {u",", "Name=;Value="},
-        {u"a,\nb", "Name=a;Value=|Name=b"},
         {u" a , b ", "Name= a ;Value= b "},
         {u"\"a,b\nc\"\"d\",e", "Name=a,b\nc\"d;Value=e"},
         {u"\"\",\"\"\"\"", "Name=;Value=\""},
@@ -71,10 +68,9 @@ TEST(CSVParser, ReadsTheDialect) {
         {u"a,\"x\"y,b\nc", "Name=a;Value=x"},
         {u"a,\"x\"\"y,b\nc", "Name=a"},
         {u"\"x", "nothing"},
-        {u"a\n\"x", "Name=a"},
         {u"a\n\"x\ny\nz", "Name=a"},
     };
-    for (const Reading& c : cases) EXPECT_EQ(shown(parsed(c.text)), c.expected) << toUtf8(c.text);
+    for (const Reading& c : cases) EXPECT_EQ(parsed(c.text), c.expected) << toUtf8(c.text);
 }
 
 TEST(CSVParser, ReadsWithLongSeparators) {
@@ -86,7 +82,7 @@ TEST(CSVParser, ReadsWithLongSeparators) {
         {u":", "Name=:"},
         {u"\"a::b\"::c", "Name=a::b;Value=c"},
     };
-    for (const Reading& c : cases) EXPECT_EQ(shown(parsed(c.text, u"::")), c.expected) << toUtf8(c.text);
+    for (const Reading& c : cases) EXPECT_EQ(parsed(c.text, u"::"), c.expected) << toUtf8(c.text);
 }
 
 TEST(CSVParser, ReadsTheNamesFromAHeader) {
@@ -99,42 +95,34 @@ TEST(CSVParser, ReadsTheNamesFromAHeader) {
         {u"x,y\n", "nothing"},
         {u"\nx,y\na,b", "nothing"},
         {u"x,\"y\na,b", "nothing"},
-        {u"", "nothing"},
     };
-    for (const Reading& c : cases) {
-        CSVParser parser(c.text, u",", std::nullopt, true, ImportNames);
-        EXPECT_EQ(shown(parser.arrayOfParsedRows()), c.expected) << toUtf8(c.text);
-    }
+    for (const Reading& c : cases) EXPECT_EQ(parsed(c.text, u",", true), c.expected) << toUtf8(c.text);
 }
 
-TEST(CSVParser, TakesItsLineSeparatorsFromTheCaller) {
-    CSVParser parser(u"a\nb;c\rd", u",", CharacterSet::withCharacters(u";\r"), false, ImportNames);
-    EXPECT_EQ(shown(parser.arrayOfParsedRows()), "Name=a\nb|Name=c|Name=d");
-}
-
-TEST(CSVParser, MakesUpNamesForFurtherColumns) {
-    CSVParser parser(u"a,b,c\nd,e", u",", std::nullopt, false, {u"Name"});
-    EXPECT_EQ(shown(parser.arrayOfParsedRows()), "FIELD_2=b;FIELD_3=c;Name=a|FIELD_2=e;Name=d");
-    EXPECT_THAT(parser.fieldNames(), ElementsAre(u"Name", u"FIELD_2", u"FIELD_3"));
+TEST(CSVParser, TakesLineSeparatorsAndNamesFromTheCaller) {
+    CSVParser parser(u"a\nb;c\rd,e", u",", CharacterSet::withCharacters(u";\r"), false, {u"Name"});
+    EXPECT_EQ(shown(parser.arrayOfParsedRows()), "Name=a\nb|Name=c|FIELD_2=e;Name=d");
+    EXPECT_THAT(parser.fieldNames(), ElementsAre(u"Name", u"FIELD_2"));
 }
 
 TEST(CSVParser, RefusesSeparatorsThatCannotSeparate) {
-    const auto make = [](std::u16string separator, std::optional<CharacterSet> lines) {
-        CSVParser(u"a", std::move(separator), std::move(lines), false, {});
+    const auto complaint = [](std::u16string separator,
+                              std::optional<CharacterSet> lines = std::nullopt) -> std::string {
+        try {
+            CSVParser(u"a", std::move(separator), std::move(lines), false, {});
+            return "";
+        } catch (const std::invalid_argument& error) {
+            return error.what();
+        }
     };
     for (const char16_t* separator : {u"", u"\"", u",\"", u"\n", u",\u2028"}) {
-        EXPECT_THROW(make(separator, std::nullopt), std::invalid_argument) << toUtf8(separator);
+        EXPECT_EQ(complaint(separator),
+                  "CSV separator string must not be empty and must not contain the double quote character or newline "
+                  "characters.");
     }
-    EXPECT_THROW(make(u";", CharacterSet::withCharacters(u";")), std::invalid_argument);
-    EXPECT_NO_THROW(make(u"\t", std::nullopt));
-    EXPECT_NO_THROW(make(u"\n", CharacterSet::withCharacters(u";")));
-    try {
-        make(u"", std::nullopt);
-    } catch (const std::invalid_argument& error) {
-        EXPECT_STREQ(error.what(),
-                     "CSV separator string must not be empty and must not contain the double quote character or "
-                     "newline characters.");
-    }
+    EXPECT_NE(complaint(u";", CharacterSet::withCharacters(u";")), "");
+    EXPECT_EQ(complaint(u"\t"), "");
+    EXPECT_EQ(complaint(u"\n", CharacterSet::withCharacters(u";")), "");
 }
 
 TEST(CSVParser, HandsRowsOverOneByOne) {
@@ -164,11 +152,11 @@ TEST(CSVParser, ReadsLargeTexts) {
 
 TEST(CSVParser, ARecordWithTooManyFieldsIsTheLast) {
     constexpr std::size_t Limit = CSVParser::MaxFieldsPerRecord;
-    const auto rows = parsed(std::u16string(Limit - 1, u',') + u"\na\n" + std::u16string(Limit, u',') + u"\nb");
-    ASSERT_TRUE(rows);
-    ASSERT_EQ(rows->size(), 3U);
-    EXPECT_EQ(rows->front().size(), Limit);
-    EXPECT_EQ(rows->back().size(), Limit);
+    std::vector<std::size_t> fields;
+    CSVParser parser(std::u16string(Limit - 1, u',') + u"\na\n" + std::u16string(Limit, u',') + u"\nb", u",",
+                     std::nullopt, false, ImportNames);
+    parser.parseRowsForReceiver([&](const CSVParser::Row& row) { fields.push_back(row.size()); });
+    EXPECT_THAT(fields, ElementsAre(Limit, 1U, Limit));
 }
 
 std::string written(const std::vector<std::vector<CsvWriter::Field>>& lines, char16_t delimiter = u',') {
@@ -200,11 +188,8 @@ TEST(CsvWriter, QuotesOnlyWhatNeedsIt) {
     EXPECT_EQ(written({{u"a,b", u"c;d"}}, u';'), "a,b;\"c;d\"\n");
 }
 
-TEST(CsvWriter, WritesLines) {
+TEST(CsvWriter, WritesLinesAndCommentsAndFinishesAStartedLineBefore) {
     EXPECT_EQ(written({{u"a", std::nullopt, u"b"}, {}, {std::nullopt}, {u"c"}}), "a,,b\n\n\nc\n");
-}
-
-TEST(CsvWriter, FinishesAStartedLineBeforeTheNext) {
     std::ostringstream stream;
     CsvWriter writer(stream, CsvEncoding::Utf8, u',');
     writer.writeField(u"a");
@@ -227,19 +212,8 @@ TEST(CsvWriter, WritesTheByteOrderMarkOfUtf16Once) {
                                         10));
 }
 
-class CsvFile : public testing::Test {
-  protected:
-    CsvFile() : folder(std::filesystem::path(testing::TempDir()) / "plume-csv-test") {
-        std::filesystem::remove_all(folder);
-        std::filesystem::create_directory(folder);
-    }
-    ~CsvFile() override { std::filesystem::remove_all(folder); }
-
-    std::filesystem::path folder;
-};
-
-TEST_F(CsvFile, ReplacesWhatWasThere) {
-    const auto path = folder / "export.csv";
+TEST(CsvWriter, ReplacesTheFileThatWasThere) {
+    const auto path = std::filesystem::path(testing::TempDir()) / "plume-csv-test.csv";
     std::ofstream(path) << "a much longer text than the new one";
     auto writer = CsvWriter::makeForWritingToCSVFile(path);
     ASSERT_TRUE(writer);
@@ -249,15 +223,13 @@ TEST_F(CsvFile, ReplacesWhatWasThere) {
     std::ostringstream text;
     text << std::ifstream(path).rdbuf();
     EXPECT_EQ(text.str(), "ä,b\n");
+    std::filesystem::remove(path);
 }
 
-TEST_F(CsvFile, ReportsAFileThatCannotBeOpened) {
-    const auto writer = CsvWriter::makeForWritingToCSVFile(folder / "missing" / "export.csv");
-    ASSERT_FALSE(writer);
-    EXPECT_THAT(writer.error().message, StartsWith("The file " + (folder / "missing" / "export.csv").string()));
-}
-
-TEST(CsvWriter, ReportsATextThatWasNotWritten) {
+TEST(CsvWriter, ReportsWhatCannotBeWritten) {
+    const auto unopened = CsvWriter::makeForWritingToCSVFile("/plume-missing/export.csv");
+    ASSERT_FALSE(unopened);
+    EXPECT_THAT(unopened.error().message, StartsWith("The file /plume-missing/export.csv"));
     std::ostringstream stream;
     CsvWriter writer(stream, CsvEncoding::Utf8, u',');
     stream.setstate(std::ios::badbit);

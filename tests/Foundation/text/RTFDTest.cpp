@@ -90,9 +90,6 @@ std::string container(const std::vector<std::pair<std::string, std::string>>& en
     return bytes;
 }
 
-constexpr std::string_view TextWithPicture =
-    "{\\rtf1\\ansi a{{\\NeXTGraphic my pic.png \\width640 \\height480 \\appleattachmentpadding0\n}\\'ac}b}";
-
 TEST(RTFD, WritesTheContainerByteForByte) {
     const std::string rtf = "{\\rtf1\\ansi\\ansicpg1252\\uc0\na}";
     const std::string attributes = number(16) + number(0) + number(0644) + number(0) + number(0);
@@ -102,38 +99,24 @@ TEST(RTFD, WritesTheContainerByteForByte) {
 
 TEST(RTFD, LargeFilesStartOnAPage) {
     const std::string contents(4096, '\x07');
-    AttributedString text(u"a");
-    text.append(
+    const std::string bytes = rtfdFromAttributedString(
         attributed(u"\uFFFC", [&](TextAttributes& attributes) { attributes.attachment = attachment(u"x", contents); }));
-    const std::string bytes = rtfdFromAttributedString(text);
     EXPECT_EQ(bytes.find(contents) % 4096, 0u);
-    EXPECT_EQ(attributedStringFromRTFD(bytes).value(), text);
 }
 
-TEST(RTFD, ReadsAttachmentsWhereverTheTextShowsThem) {
-    const std::string bytes =
-        container({{"my pic.png", file("PNG")}, {"unused", file("x")}, {"TXT.rtf", file(TextWithPicture)}});
-    const AttributedString text = attributedStringFromRTFD(bytes).value();
-    EXPECT_EQ(text.string(), u"a\uFFFCb");
-    EXPECT_EQ(*attributesAt(text, 1).attachment, (TextAttachment{u"my pic.png", "PNG", {}}));
-    EXPECT_FALSE(attributesAt(text, 2).attachment);
-}
-
-TEST(RTFD, FoldersAmongTheFilesAreLeftOut) {
+TEST(RTFD, ReadsAttachmentsWhereTheTextShowsThemAndNoFolders) {
+    const std::string text = file("{\\rtf1 a{{\\NeXTGraphic my pic.png \\width640 \\height480 \n}\\'ac}b}");
+    const AttributedString read =
+        attributedStringFromRTFD(container({{"my pic.png", file("PNG")}, {"unused", file("x")}, {"TXT.rtf", text}}))
+            .value();
+    EXPECT_EQ(read.string(), u"a\uFFFCb");
+    EXPECT_EQ(*attributesAt(read, 1).attachment, (TextAttachment{u"my pic.png", "PNG", {}}));
+    EXPECT_FALSE(attributesAt(read, 2).attachment);
+    EXPECT_EQ(attributedStringFromRTF(rtfFromAttributedString(read)).value().string(), u"ab");
     const std::string folder = container({{"x", file("y")}}).substr(8);
-    const std::string bytes = container({{"my pic.png", folder}, {"TXT.rtf", file(TextWithPicture)}});
-    EXPECT_EQ(attributedStringFromRTFD(bytes).value().string(), u"ab");
-}
-
-TEST(RTFD, PlainRTFIsReadToo) {
+    const std::string withFolder = container({{"my pic.png", folder}, {"TXT.rtf", text}});
+    EXPECT_EQ(attributedStringFromRTFD(withFolder).value().string(), u"ab");
     EXPECT_EQ(attributedStringFromRTFD("{\\rtf1 a}").value().string(), u"a");
-}
-
-TEST(RTFD, AttachmentsAreLeftOutOfPlainRTF) {
-    AttributedString text(u"a");
-    text.append(
-        attributed(u"\uFFFC", [](TextAttributes& attributes) { attributes.attachment = attachment(u"x", "y"); }));
-    EXPECT_EQ(attributedStringFromRTF(rtfFromAttributedString(text)).value().string(), u"a");
 }
 
 TEST(RTFD, DamageIsToldWithItsPlace) {
@@ -144,15 +127,14 @@ TEST(RTFD, DamageIsToldWithItsPlace) {
         EXPECT_THAT(cut.error().message, HasSubstr("damaged at byte ")) << length;
     }
     const std::string head = "rtfd" + number(0);
-    const std::vector<std::string> damaged = {
-        head + number(7) + number(0),
-        head + number(3) + number(0xFFFFFFFF),
-        head + number(3) + number(1) + number(0xFFFFFFF0) + std::string(16, 'x'),
-        container({{"TXT.rtf", number(1) + number(100) + "{\\rtf1"}}),
-        container({{"TXT.rtf", number(1) + number(0x80000000) + number(4) + number(0xFFFFFFFF) + "{\\rtf1"}}),
-        container({{"TXT.rtf", number(2) + "abcd"}}),
-    };
-    for (const std::string& bytes : damaged) {
+    for (const std::string& bytes : {
+             head + number(7) + number(0),
+             head + number(3) + number(0xFFFFFFFF),
+             head + number(3) + number(1) + number(0xFFFFFFF0) + std::string(16, 'x'),
+             container({{"TXT.rtf", number(1) + number(100) + "{\\rtf1"}}),
+             container({{"TXT.rtf", number(1) + number(0x80000000) + number(4) + number(0xFFFFFFFF) + "{\\rtf1"}}),
+             container({{"TXT.rtf", number(2) + "abcd"}}),
+         }) {
         const auto text = attributedStringFromRTFD(bytes);
         ASSERT_FALSE(text) << bytes;
         EXPECT_THAT(text.error().message, HasSubstr("damaged at byte "));

@@ -1,4 +1,5 @@
 // Text with any attributes comes back from RTF and RTFD as it went in.
+#include <algorithm>
 #include <memory>
 #include <optional>
 #include <string>
@@ -13,110 +14,78 @@
 namespace plume {
 namespace {
 
-template <typename Value>
-rc::Gen<std::optional<Value>> maybe(rc::Gen<Value> gen) {
-    return rc::gen::oneOf(rc::gen::just(std::optional<Value>()),
-                          rc::gen::map(gen, [](Value value) { return std::optional<Value>(std::move(value)); }));
+bool flipped() {
+    return *rc::gen::arbitrary<bool>();
 }
 
-rc::Gen<std::u16string> arbitraryText() {
+std::u16string arbitraryText() {
     const auto unit = rc::gen::oneOf(
         rc::gen::inRange<int>(0, 0x80), rc::gen::inRange<int>(0x80, 0x10000),
         rc::gen::elementOf(std::vector<int>{' ', '\\', '{', '}', '\t', 'a', '-', '7', '"', ';', '\r', 0x2028, 0xFFFC}));
     const auto inParagraph =
         rc::gen::map(unit, [](int value) { return value == '\n' ? u'a' : static_cast<char16_t>(value); });
-    return rc::gen::nonEmpty(rc::gen::container<std::u16string>(inParagraph));
+    return *rc::gen::nonEmpty(rc::gen::container<std::u16string>(inParagraph));
 }
 
-rc::Gen<double> multiplesOf(double step, int from, int to) {
-    return rc::gen::map(rc::gen::inRange(from, to), [step](int count) { return count / step; });
-}
-
-rc::Gen<ColorAttribute> colorOf(const rc::Gen<double>& component, const rc::Gen<double>& alpha) {
-    return rc::gen::apply(
-        [](double red, double green, double blue, double a) {
-            return ColorAttribute{red, green, blue, a};
-        },
-        component, component, component, alpha);
+// Of `parts` to a unit.
+rc::Gen<double> fractions(double parts, int from, int to) {
+    return rc::gen::map(rc::gen::inRange(from, to), [parts](int count) { return count / parts; });
 }
 
 // Colours of bytes, and finer ones with transparency.
-rc::Gen<ColorAttribute> arbitraryColor() {
-    const auto fine = multiplesOf(100'000, 0, 100'001);
-    return rc::gen::oneOf(colorOf(multiplesOf(255, 0, 256), rc::gen::just(1.0)), colorOf(fine, fine));
+ColorAttribute arbitraryColor() {
+    const bool isFine = flipped();
+    const auto part = isFine ? fractions(100'000, 0, 100'001) : fractions(255, 0, 256);
+    return {*part, *part, *part, isFine ? *part : 1};
 }
 
-rc::Gen<FontAttribute> arbitraryFont() {
-    const auto family = rc::gen::elementOf(
-        std::vector<std::u16string>{u"Helvetica", u"Gill Sans", u"\u30D2\u30E9\u30AE\u30CE", u"7{}\\", u"-"});
-    return rc::gen::apply(
-        [](std::u16string name, double size, bool bold, bool italic) {
-            return FontAttribute{name, size, bold, italic};
-        },
-        family, multiplesOf(2, 1, 200), rc::gen::arbitrary<bool>(), rc::gen::arbitrary<bool>());
+FontAttribute arbitraryFont() {
+    const auto family =
+        *rc::gen::element<std::u16string>(u"Helvetica", u"Gill Sans", u"\u30D2\u30E9\u30AE\u30CE", u"7{}\\", u"-");
+    return {family, *fractions(2, 1, 200), flipped(), flipped()};
 }
 
 // Attachments of one name stand for different files.
-rc::Gen<std::shared_ptr<const TextAttachment>> arbitraryAttachment() {
-    return rc::gen::elementOf(std::vector<std::shared_ptr<const TextAttachment>>{
+std::shared_ptr<const TextAttachment> arbitraryAttachment() {
+    return *rc::gen::elementOf(std::vector<std::shared_ptr<const TextAttachment>>{
         nullptr, attachment(u"a b.png", "one"), attachment(u"a b.png", std::string(5000, '\x80')),
         attachment(u"\u00E9\U0001F600{}\\.txt", ""), attachment(u"TXT.rtf", "{\\rtf1 not the text}")});
 }
 
-rc::Gen<TextAttributes> arbitraryCharacterAttributes() {
-    const auto link = rc::gen::map(arbitraryText(), [](std::u16string text) { return u"x" + text; });
-    const auto lineStyle = rc::gen::element<std::int64_t>(0, 0, 1, 9);
-    return rc::gen::apply(
-        [](auto font, auto foreground, auto background, auto underline, auto strike, auto super, auto baseline,
-           auto aLink, auto toolTip, auto file) {
-            TextAttributes attributes;
-            attributes.font = font;
-            attributes.foregroundColor = foreground;
-            attributes.backgroundColor = background;
-            attributes.underlineStyle = underline;
-            attributes.strikethroughStyle = strike;
-            attributes.superscript = super;
-            if (baseline != 0) attributes.baselineOffset = baseline;
-            attributes.link = aLink;
-            if (aLink) attributes.toolTip = toolTip;
-            attributes.attachment = file;
-            return attributes;
-        },
-        maybe(arbitraryFont()), maybe(arbitraryColor()), maybe(arbitraryColor()), lineStyle, lineStyle,
-        rc::gen::inRange<std::int64_t>(-1, 2), multiplesOf(2, -20, 20), maybe(link), maybe(arbitraryText()),
-        arbitraryAttachment());
+TextAttributes arbitraryCharacterAttributes() {
+    TextAttributes attributes;
+    if (flipped()) attributes.font = arbitraryFont();
+    if (flipped()) attributes.foregroundColor = arbitraryColor();
+    if (flipped()) attributes.backgroundColor = arbitraryColor();
+    attributes.underlineStyle = *rc::gen::element<std::int64_t>(0, 0, 1, 9);
+    attributes.strikethroughStyle = *rc::gen::element<std::int64_t>(0, 0, 1, 9);
+    attributes.superscript = *rc::gen::inRange<std::int64_t>(-1, 2);
+    if (const double offset = *fractions(2, -20, 20); offset != 0) attributes.baselineOffset = offset;
+    if (flipped()) attributes.link = u"x" + arbitraryText();
+    if (attributes.link && flipped()) attributes.toolTip = arbitraryText();
+    attributes.attachment = arbitraryAttachment();
+    return attributes;
 }
 
-rc::Gen<std::optional<ParagraphStyle>> arbitraryParagraphStyle() {
-    const auto list = rc::gen::apply(
-        [](std::u16string marker, std::int64_t start) {
-            return TextList{marker, start};
-        },
-        rc::gen::elementOf(
-            std::vector<std::u16string>{u"{disc}", u"({lower-alpha})", u"{decimal}.", u"\u2013", u"\\{x;"}),
-        rc::gen::inRange<std::int64_t>(-3, 100));
-    const auto distances = rc::gen::container<std::vector<double>>(6, multiplesOf(20, -4000, 4000));
-    return rc::gen::apply(
-        [](int alignment, std::vector<double> distance, double multiple, std::vector<double> tabStops,
-           std::vector<TextList> lists) -> std::optional<ParagraphStyle> {
-            ParagraphStyle style;
-            style.alignment = static_cast<TextAlignment>(alignment);
-            style.firstLineHeadIndent = distance[0];
-            style.headIndent = distance[1];
-            style.tailIndent = distance[2] > 0 ? 0 : distance[2];
-            style.lineSpacing = distance[3];
-            style.paragraphSpacing = distance[4];
-            style.paragraphSpacingBefore = distance[5];
-            style.lineHeightMultiple = multiple;
-            if (tabStops.size() > 64) tabStops.resize(64);
-            style.tabStops = std::move(tabStops);
-            if (lists.size() > 9) lists.resize(9);
-            style.textLists = std::move(lists);
-            return style == ParagraphStyle{} ? std::nullopt : std::optional(style);
-        },
-        rc::gen::inRange(0, 5), distances, multiplesOf(240, 0, 1000),
-        rc::gen::container<std::vector<double>>(multiplesOf(20, 0, 10000)),
-        rc::gen::container<std::vector<TextList>>(list));
+std::optional<ParagraphStyle> arbitraryParagraphStyle() {
+    const auto distance = fractions(20, -4000, 4000);
+    ParagraphStyle style;
+    style.alignment = static_cast<TextAlignment>(*rc::gen::inRange(0, 5));
+    style.firstLineHeadIndent = *distance;
+    style.headIndent = *distance;
+    style.tailIndent = std::min(*distance, 0.0);
+    style.lineSpacing = *distance;
+    style.paragraphSpacing = *distance;
+    style.paragraphSpacingBefore = *distance;
+    style.lineHeightMultiple = *fractions(240, 0, 1000);
+    style.tabStops = *rc::gen::container<std::vector<double>>(fractions(20, 0, 10000));
+    if (style.tabStops.size() > 64) style.tabStops.resize(64);
+    for (int i = *rc::gen::inRange(0, 10); i > 0; --i) {
+        const auto marker =
+            *rc::gen::element<std::u16string>(u"{disc}", u"({lower-alpha})", u"{decimal}.", u"\u2013", u"\\{x;");
+        style.textLists.push_back({marker, *rc::gen::inRange<std::int64_t>(-3, 100)});
+    }
+    return style == ParagraphStyle{} ? std::nullopt : std::optional(style);
 }
 
 // Paragraphs of a few runs each, all in the style of their paragraph. An attachment stands on its character only.
@@ -124,12 +93,12 @@ AttributedString arbitraryDocument(bool withAttachments) {
     AttributedString text;
     const int paragraphs = *rc::gen::inRange(0, 4);
     for (int i = 0; i < paragraphs; ++i) {
-        const auto style = *maybe(arbitraryParagraphStyle());
+        const auto style = flipped() ? arbitraryParagraphStyle() : std::nullopt;
         const int runs = *rc::gen::inRange(1, 4);
         for (int j = 0; j < runs; ++j) {
-            TextAttributes attributes = *arbitraryCharacterAttributes();
-            attributes.paragraphStyle = style.value_or(std::nullopt);
-            std::u16string piece = *arbitraryText();
+            TextAttributes attributes = arbitraryCharacterAttributes();
+            attributes.paragraphStyle = style;
+            std::u16string piece = arbitraryText();
             if (!withAttachments) attributes.attachment = nullptr;
             if (attributes.attachment) piece.assign(1, u'\uFFFC');
             if (j == runs - 1 && !attributes.attachment) piece += u"\n";
