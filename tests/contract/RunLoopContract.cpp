@@ -43,6 +43,24 @@ TEST_P(RunLoopContract, ForgetsCancelledCalls) {
     EXPECT_EQ(order, "k");
 }
 
+TEST_P(RunLoopContract, TimersThatGoOrAreGivenAnotherCallForgetTheirs) {
+    std::string order;
+    const auto call = [&](char name) { return [&order, name] { order += name; }; };
+    Timer empty = loop_.performAfterDelay(0, call('m'));
+    Timer moved = std::move(empty);
+    EXPECT_FALSE(empty);  // NOLINT(bugprone-use-after-move): what is promised
+    EXPECT_TRUE(moved);
+    Timer given = loop_.performAfterDelay(0, call('x'));
+    given = loop_.performAfterDelay(0, call('g'));
+    Timer cancelled = loop_.performAfterDelay(0, call('x'));
+    cancelled.cancel();
+    cancelled.cancel();
+    { const Timer gone = loop_.performAfterDelay(0, call('x')); }
+    bench_->run(0.01);
+    EXPECT_EQ(order, "mg");
+    moved.cancel();
+}
+
 TEST_P(RunLoopContract, LetsACallCancelOneThatIsDueWithIt) {
     std::string order;
     RunLoop::CallId second = 0;

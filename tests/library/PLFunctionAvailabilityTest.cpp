@@ -7,52 +7,32 @@
 namespace plume {
 namespace {
 
-struct Case {
-    std::int64_t option;
-    bool listed;
-    bool unlisted;
-    bool none;
-};
-
-TEST(PLFunctionAvailability, AdmitsApplicationsByItsOption) {
-    const Case cases[] = {
-        {0, true, true, true},    {1, false, true, true},    {2, true, false, false},
-        {3, false, false, false}, {-1, false, false, false},
+// What a list of "a" and "b" admits: "b", "B" and nothing (0); and whether a missing list admits "b" (!).
+TEST(PLFunctionAvailability, AdmitsByItsOption) {
+    using List = std::optional<std::vector<std::u16string>>;
+    const auto admitted = [](auto admits) {
+        const List list = {{u"a", u"b"}};
+        std::string names = admits(list, u"b") ? "b" : "";
+        if (admits(list, u"B")) names += "B";
+        if (admits(list, std::nullopt)) names += "0";
+        return names + (admits(std::nullopt, u"b") ? "!" : "");
     };
-    for (const Case& c : cases) {
-        PLFunctionAvailability record;
-        record.availability = c.option;
-        record.applications = {u"org.editor", u"org.mail"};
-        EXPECT_EQ(record.admitsApplication(u"org.mail"), c.listed) << c.option;
-        EXPECT_EQ(record.admitsApplication(u"org.Mail"), c.unlisted) << c.option;
-        EXPECT_EQ(record.admitsApplication(std::nullopt), c.none) << c.option;
+    const struct {
+        std::int64_t option;
+        const char* applications;
+        const char* inputSources;
+    } cases[] = {{0, "bB0!", "bB0!"}, {1, "B0!", "B0!"}, {2, "b", "b"}, {3, "", "b"}, {-1, "", "b"}};
+    for (const auto& c : cases) {
+        using Identifier = std::optional<std::u16string>;
+        const auto application = [&](const List& list, const Identifier& identifier) {
+            return PLFunctionAvailability{c.option, list, 0, {}}.admitsApplication(identifier);
+        };
+        const auto inputSource = [&](const List& list, const Identifier& identifier) {
+            return PLFunctionAvailability{0, {}, c.option, list}.admitsInputSource(identifier);
+        };
+        EXPECT_EQ(admitted(application), c.applications) << c.option;
+        EXPECT_EQ(admitted(inputSource), c.inputSources) << c.option;
     }
-}
-
-TEST(PLFunctionAvailability, AdmitsInputSourcesByItsOption) {
-    const Case cases[] = {
-        {0, true, true, true},
-        {1, false, true, true},
-        {2, true, false, false},
-        {7, true, false, false},
-    };
-    for (const Case& c : cases) {
-        PLFunctionAvailability record;
-        record.inputMethodsOption = c.option;
-        record.inputMethods = {u"us", u"de(neo)"};
-        EXPECT_EQ(record.admitsInputSource(u"de(neo)"), c.listed) << c.option;
-        EXPECT_EQ(record.admitsInputSource(u"de"), c.unlisted) << c.option;
-        EXPECT_EQ(record.admitsInputSource(std::nullopt), c.none) << c.option;
-    }
-}
-
-TEST(PLFunctionAvailability, AMissingListIsEmpty) {
-    PLFunctionAvailability except{1, std::nullopt, 1, std::nullopt};
-    EXPECT_TRUE(except.admitsApplication(u"org.mail"));
-    EXPECT_TRUE(except.admitsInputSource(u"us"));
-    PLFunctionAvailability only{2, std::nullopt, 2, std::nullopt};
-    EXPECT_FALSE(only.admitsApplication(u"org.mail"));
-    EXPECT_FALSE(only.admitsInputSource(u"us"));
 }
 
 }  // namespace

@@ -22,10 +22,8 @@ TEST(Snippet, StartsWithItsDatesNowAndNothingElse) {
     EXPECT_EQ(empty.dateModified(), date.now());
     EXPECT_EQ(empty.lastTimeUsed(), date.now());
     EXPECT_EQ(empty.abbreviation(), std::nullopt);
-    EXPECT_EQ(empty.abbreviationHash(), EmptySuffixHash);
     EXPECT_EQ(empty.plainTextContent(), std::nullopt);
     EXPECT_EQ(empty.contentData(), std::nullopt);
-    EXPECT_FALSE(empty.hasContent());
     EXPECT_TRUE(empty.isSimpleSnippet());
     EXPECT_NE(empty.uuid(), Snippet().uuid());
 }
@@ -36,8 +34,7 @@ struct Change {
     bool modifies;
 };
 
-// The snippet is rich text from "plain bold".
-TEST(Snippet, RemembersWhenItWasModified) {
+TEST(Snippet, RemembersWhenItWasModifiedAndUsed) {
     const Change changes[] = {
         {"abbreviation", [](Snippet& s) { s.setAbbreviation(u"other"); }, true},
         {"same abbreviation", [](Snippet& s) { s.setAbbreviation(s.abbreviation()); }, true},
@@ -56,22 +53,13 @@ TEST(Snippet, RemembersWhenItWasModified) {
     for (const Change& change : changes) {
         StoppedDate date;
         const Date created = date.now();
-        Snippet snippet;
-        snippet.setContentType(ContentType::RichText);
-        snippet.setRichTextContent(test::richText());
+        const auto snippet = test::fullSnippet();
         date.pass(60s);
-        change.make(snippet);
-        EXPECT_EQ(snippet.dateModified(), change.modifies ? date.now() : created) << change.name;
-        EXPECT_EQ(snippet.dateCreated(), created) << change.name;
+        change.make(*snippet);
+        EXPECT_EQ(snippet->dateModified(), change.modifies ? date.now() : created) << change.name;
+        EXPECT_EQ(snippet->lastTimeUsed(), std::string(change.name) == "use" ? date.now() : created) << change.name;
+        EXPECT_EQ(snippet->dateCreated(), created) << change.name;
     }
-}
-
-TEST(Snippet, RemembersWhenItWasUsed) {
-    StoppedDate date;
-    Snippet snippet;
-    date.pass(60s);
-    snippet.updateLastTimeUsed();
-    EXPECT_EQ(snippet.lastTimeUsed(), date.now());
 }
 
 TEST(Snippet, HashFollowsTheAbbreviation) {
@@ -86,71 +74,52 @@ TEST(Snippet, HashFollowsTheAbbreviation) {
 TEST(Snippet, FormattingGoesWhenItBecomesPlainTextOnly) {
     Snippet snippet;
     snippet.setContentType(ContentType::RichText);
+    snippet.setContentType(ContentType::PlainText);
+    EXPECT_FALSE(snippet.hasContent());
+    snippet.setContentType(ContentType::RichText);
     snippet.setRichTextContent(test::richText());
     snippet.setContentType(ContentType::ShellScript);
     EXPECT_EQ(snippet.richTextContent(), test::richText());
     snippet.setContentType(ContentType::PlainText);
     EXPECT_EQ(snippet.richTextContent(), AttributedString(u"plain bold"));
-    snippet.setContentType(ContentType::RichText);
-    EXPECT_EQ(snippet.richTextContent(), AttributedString(u"plain bold"));
-}
-
-TEST(Snippet, BecomingPlainTextWithoutContentLeavesItWithout) {
-    Snippet snippet;
-    snippet.setContentType(ContentType::RichText);
-    snippet.setContentType(ContentType::PlainText);
-    EXPECT_FALSE(snippet.hasContent());
 }
 
 TEST(Snippet, AnEmptyContentIsAContent) {
     Snippet snippet;
     snippet.setPlainTextContent(u"");
-    EXPECT_TRUE(snippet.hasContent());
     EXPECT_EQ(snippet.plainTextContent(), u"");
     EXPECT_NE(snippet.contentData(), std::nullopt);
-    snippet.setPlainTextContent(std::nullopt);
-    EXPECT_FALSE(snippet.hasContent());
-}
-
-TEST(Snippet, ContentLengthCountsUnits) {
-    Snippet snippet;
     EXPECT_EQ(snippet.contentLength(), 0U);
     snippet.setPlainTextContent(u"a\U0001F600");
     EXPECT_EQ(snippet.contentLength(), 3U);
+    snippet.setPlainTextContent(std::nullopt);
+    EXPECT_FALSE(snippet.hasContent());
+    EXPECT_EQ(snippet.contentLength(), 0U);
 }
 
-TEST(Snippet, PrefixStandsBeforeANonEmptyAbbreviation) {
-    struct Case {
+TEST(Snippet, ThePrefixOfALivingGroupStandsBeforeANonEmptyAbbreviation) {
+    const struct {
         Snippet::Text prefix;
         Snippet::Text abbreviation;
         Snippet::Text expected;
-    };
-    const Case cases[] = {
+    } cases[] = {
         {u";", u"ad", u";ad"},
         {u"", u"ad", u"ad"},
         {std::nullopt, u"ad", u"ad"},
         {u";", u"", u""},
         {u";", std::nullopt, std::nullopt},
     };
-    for (const Case& c : cases) {
-        const auto group = SnippetGroup::make();
-        group->setAbbreviationPrefix(c.prefix);
+    for (const auto& c : cases) {
         Snippet snippet(c.abbreviation, u"x");
+        {
+            const auto group = SnippetGroup::make();
+            group->setAbbreviationPrefix(c.prefix);
+            snippet.setParentGroup(group);
+            EXPECT_EQ(snippet.abbreviationWithPrefix(), c.expected);
+        }
+        EXPECT_EQ(snippet.parentGroup(), nullptr);
         EXPECT_EQ(snippet.abbreviationWithPrefix(), c.abbreviation);
-        snippet.setParentGroup(group);
-        EXPECT_EQ(snippet.abbreviationWithPrefix(), c.expected);
     }
-}
-
-TEST(Snippet, DoesNotKeepItsGroupAlive) {
-    Snippet snippet(u"ad", u"x");
-    {
-        const auto group = SnippetGroup::make();
-        group->setAbbreviationPrefix(u";");
-        snippet.setParentGroup(group);
-    }
-    EXPECT_EQ(snippet.parentGroup(), nullptr);
-    EXPECT_EQ(snippet.abbreviationWithPrefix(), u"ad");
 }
 
 TEST(Snippet, SortsByLabelOrElseContent) {
@@ -200,26 +169,15 @@ TEST(Snippet, KnowsScriptsAndPlaceholders) {
 TEST(Snippet, DuplicateSharesEverythingButIdentityDatesAndList) {
     StoppedDate date;
     const auto group = SnippetGroup::make();
-    const auto original = test::snippet(u"sig");
+    const auto original = test::fullSnippet();
     group->addItem(original);
-    original->setLabel(u"label");
-    original->setNote(u"note");
-    original->setContentType(ContentType::RichText);
-    original->setRichTextContent(test::richText());
-    original->setCaseSensitivity(static_cast<CaseSensitivity>(9));
     date.pass(60s);
     const auto copy = original->copySnippet();
+    EXPECT_EQ(test::fieldsOf(*copy), test::fieldsOf(*original));
     EXPECT_NE(copy->uuid(), original->uuid());
     EXPECT_EQ(copy->dateCreated(), date.now());
     EXPECT_EQ(copy->dateModified(), date.now());
     EXPECT_EQ(copy->lastTimeUsed(), date.now());
-    EXPECT_EQ(copy->abbreviation(), u"sig");
-    EXPECT_EQ(copy->abbreviationHash(), original->abbreviationHash());
-    EXPECT_EQ(copy->label(), u"label");
-    EXPECT_EQ(copy->note(), u"note");
-    EXPECT_EQ(copy->contentType(), ContentType::RichText);
-    EXPECT_EQ(copy->richTextContent(), test::richText());
-    EXPECT_EQ(copy->caseSensitivity(), static_cast<CaseSensitivity>(9));
     EXPECT_EQ(copy->parentGroup(), group);
     EXPECT_EQ(group->items().size(), 1U);
 }

@@ -8,7 +8,6 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <type_traits>
 #include <utility>
 #include <variant>
 #include <vector>
@@ -17,87 +16,51 @@
 
 namespace plume::test {
 
-class MemoryArchive;
+struct MemoryArchive;
 
 // Objects are kept as what they are, whichever operation wrote them, as a real archive does.
-using MemoryValue = std::variant<std::int64_t, bool, std::u16string, Date, CharacterSet, std::vector<std::u16string>,
-                                 ArchivedData, AttributedString, std::vector<MemoryArchive>>;
+using MemoryValue =
+    std::variant<std::monostate, std::int64_t, bool, std::u16string, Date, CharacterSet, std::vector<std::u16string>,
+                 ArchivedData, AttributedString, std::vector<MemoryArchive>>;
 
 // The values of one record.
-class MemoryArchive {
-  public:
-    struct Entry;
+struct MemoryArchive {
+    std::string className = {};
+    std::vector<std::pair<std::string, MemoryValue>> entries = {};  // in the order of writing
 
-    explicit MemoryArchive(std::string className = "");
-
-    const std::string& className() const { return className_; }
-    const MemoryValue* find(std::string_view key) const;
-    // Replaces the value, or appends one under a new key.
-    MemoryArchive& set(std::string_view key, MemoryValue value);
-    MemoryArchive& remove(std::string_view key);
-
-    // The keys in the order of writing, each with its kind: "Name:string".
-    std::vector<std::string> keysAndKinds() const;
-
-    bool operator==(const MemoryArchive& other) const;
-
-  private:
-    std::string className_;
-    std::vector<Entry> entries_;
-};
-
-struct MemoryArchive::Entry {
-    std::string key;
-    MemoryValue value;
-
-    bool operator==(const Entry&) const = default;
-};
-
-inline MemoryArchive::MemoryArchive(std::string className) : className_(std::move(className)) {}
-
-inline bool MemoryArchive::operator==(const MemoryArchive& other) const {
-    return className_ == other.className_ && entries_ == other.entries_;
-}
-
-inline const MemoryValue* MemoryArchive::find(std::string_view key) const {
-    const auto found = std::find_if(entries_.begin(), entries_.end(), [&](const Entry& e) { return e.key == key; });
-    return found == entries_.end() ? nullptr : &found->value;
-}
-
-inline MemoryArchive& MemoryArchive::set(std::string_view key, MemoryValue value) {
-    const auto found = std::find_if(entries_.begin(), entries_.end(), [&](const Entry& e) { return e.key == key; });
-    if (found == entries_.end()) {
-        entries_.push_back({std::string(key), std::move(value)});
-    } else {
-        found->value = std::move(value);
+    // Nothing when there is no such key.
+    MemoryValue valueOf(std::string_view key) const {
+        const auto found = std::find_if(entries.begin(), entries.end(), [&](const auto& e) { return e.first == key; });
+        return found == entries.end() ? MemoryValue() : found->second;
     }
-    return *this;
-}
+    // Under a new key; nothing is left out.
+    MemoryArchive& add(std::string_view key, MemoryValue value) {
+        if (value.index() != 0) entries.emplace_back(key, std::move(value));
+        return *this;
+    }
+    // The keys, each with its kind: "Name:string ShowInMenuBar:bool ".
+    std::string layout() const {
+        static constexpr const char* Kinds[] = {"",        "integer", "bool",       "string", "date", "characterSet",
+                                                "strings", "data",    "attributed", "objects"};
+        std::string keys;
+        for (const auto& [key, value] : entries) keys += key + ":" + Kinds[value.index()] + " ";
+        return keys;
+    }
 
-inline MemoryArchive& MemoryArchive::remove(std::string_view key) {
-    std::erase_if(entries_, [&](const Entry& e) { return e.key == key; });
-    return *this;
-}
-
-inline std::vector<std::string> MemoryArchive::keysAndKinds() const {
-    static constexpr const char* Kinds[] = {"integer", "bool", "string",     "date",   "characterSet",
-                                            "strings", "data", "attributed", "objects"};
-    std::vector<std::string> result;
-    for (const Entry& entry : entries_) result.push_back(entry.key + ":" + Kinds[entry.value.index()]);
-    return result;
-}
+    bool operator==(const MemoryArchive&) const = default;
+};
 
 class MemoryEncoder final : public KeyedEncoder {
   public:
     static MemoryArchive encode(const KeyedCodable& record) {
-        MemoryArchive archive{std::string(record.archiveClassName())};
-        MemoryEncoder encoder(archive);
+        MemoryEncoder encoder;
+        encoder.archive_.className = record.archiveClassName();
         record.encodeWithCoder(encoder);
-        return archive;
+        return encoder.archive_;
     }
 
-    void encodeInteger(std::string_view key, std::int64_t value) override { archive_.set(key, value); }
-    void encodeBool(std::string_view key, bool value) override { archive_.set(key, value); }
+    void encodeInteger(std::string_view key, std::int64_t value) override { archive_.add(key, value); }
+    void encodeBool(std::string_view key, bool value) override { archive_.add(key, value); }
     void encodeString(std::string_view key, const std::optional<std::u16string>& value) override { put(key, value); }
     void encodeDate(std::string_view key, const std::optional<Date>& value) override { put(key, value); }
     void encodeCharacterSet(std::string_view key, const std::optional<CharacterSet>& value) override {
@@ -107,37 +70,28 @@ class MemoryEncoder final : public KeyedEncoder {
         put(key, value);
     }
     void encodeContent(std::string_view key, const ArchivedContent& value) override {
-        std::visit(
-            [&](const auto& content) {
-                if constexpr (!std::is_same_v<std::decay_t<decltype(content)>, std::monostate>) {
-                    archive_.set(key, content);
-                }
-            },
-            value);
+        std::visit([&](const auto& content) { archive_.add(key, content); }, value);
     }
     void encodeObjects(std::string_view key, const std::vector<const KeyedCodable*>& values) override {
         std::vector<MemoryArchive> objects;
         for (const KeyedCodable* value : values) objects.push_back(encode(*value));
-        archive_.set(key, std::move(objects));
+        archive_.add(key, std::move(objects));
     }
 
   private:
-    explicit MemoryEncoder(MemoryArchive& archive) : archive_(archive) {}
-
     template <typename Value>
     void put(std::string_view key, const std::optional<Value>& value) {
-        if (value) archive_.set(key, *value);
+        if (value) archive_.add(key, *value);
     }
 
-    MemoryArchive& archive_;
+    MemoryArchive archive_;
 };
 
 class MemoryDecoder final : public KeyedDecoder {
   public:
-    // The archive must outlive the decoder.
-    explicit MemoryDecoder(const MemoryArchive& archive) : archive_(archive) {}
+    explicit MemoryDecoder(MemoryArchive archive) : archive_(std::move(archive)) {}
 
-    bool containsValueForKey(std::string_view key) const override { return archive_.find(key) != nullptr; }
+    bool containsValueForKey(std::string_view key) const override { return archive_.valueOf(key).index() != 0; }
     std::int64_t decodeInteger(std::string_view key) const override { return get<std::int64_t>(key).value_or(0); }
     bool decodeBool(std::string_view key) const override { return get<bool>(key).value_or(false); }
     std::optional<std::u16string> decodeString(std::string_view key) const override { return get<std::u16string>(key); }
@@ -167,12 +121,11 @@ class MemoryDecoder final : public KeyedDecoder {
   private:
     template <typename Value>
     std::optional<Value> get(std::string_view key) const {
-        const MemoryValue* value = archive_.find(key);
-        if (!value || !std::holds_alternative<Value>(*value)) return std::nullopt;
-        return std::get<Value>(*value);
+        const MemoryValue value = archive_.valueOf(key);
+        return std::holds_alternative<Value>(value) ? std::optional(std::get<Value>(value)) : std::nullopt;
     }
 
-    const MemoryArchive& archive_;
+    MemoryArchive archive_;
 };
 
 }  // namespace plume::test
