@@ -12,7 +12,6 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 
 struct Arguments {
-    bool cancel = false;
     std::vector<std::string> calls;
 };
 
@@ -27,8 +26,6 @@ class Listener {
         if (during) during();
     }
     void second(Arguments& arguments) { arguments.calls.push_back(name_ + ".second"); }
-    void cancels(Arguments& arguments) { arguments.cancel = true; }
-    void readsCancel(Arguments& arguments) { arguments.calls.push_back(arguments.cancel ? "cancelled" : "open"); }
 
     std::function<void()> during;
 
@@ -110,16 +107,6 @@ TEST_F(ZDEventTest, RemovingWhileRaisedWithinAHandlerKeepsThePlacesOfTheOuterRai
     listen(b_, &Listener::second);
     EXPECT_THAT(raise(), ElementsAre("a.first", "b.first", "b.second"));
     EXPECT_THAT(inner, ElementsAre("b.first", "b.second"));
-}
-
-TEST_F(ZDEventTest, LaterHandlersAndTheRaiserSeeWhatAHandlerSet) {
-    listen(a_, &Listener::readsCancel);
-    listen(a_, &Listener::cancels);
-    listen(b_, &Listener::readsCancel);
-    Arguments arguments;
-    event_.raise(arguments);
-    EXPECT_TRUE(arguments.cancel);
-    EXPECT_THAT(arguments.calls, ElementsAre("open", "cancelled"));
 }
 
 TEST_F(ZDEventTest, ASubscriptionThatEndsRemovesItsHandlerAlone) {

@@ -5,17 +5,18 @@
 
 #include <algorithm>
 #include <array>
+#include <functional>
 #include <thread>
 #include <utility>
 #include <vector>
+
+#include "tests/Foundation/text/RTFTestSupport.h"
 
 namespace plume {
 namespace {
 
 SharedAttributes underlined(std::int64_t style) {
-    TextAttributes attributes;
-    attributes.underlineStyle = style;
-    return std::make_shared<const TextAttributes>(attributes);
+    return attributed(u"a", [&](TextAttributes& a) { a.underlineStyle = style; }).attributesAt(0);
 }
 
 const SharedAttributes Bold = underlined(1);
@@ -23,57 +24,37 @@ const SharedAttributes Thin = underlined(2);
 
 // ---- Attributes ----
 
-using Change = void (*)(TextAttributes&);
-
-TEST(TextAttributesTest, EveryAttributeCountsInAComparison) {
-    const Change changes[] = {
-        [](TextAttributes& a) {
-            a.font = FontAttribute{u"Mono", 12, false, true};
-        },
-        [](TextAttributes& a) {
-            a.foregroundColor = ColorAttribute{1, 0, 0, 1};
-        },
-        [](TextAttributes& a) { a.backgroundColor = ColorAttribute{}; },
+// Texts that differ in one attribute each.
+std::vector<AttributedString> differentLooks() {
+    const auto file = [](const char* contents) {
+        return [contents](TextAttributes& a) { a.attachment = attachment(u"a.png", contents); };
+    };
+    const std::function<void(TextAttributes&)> changes[] = {
+        [](TextAttributes&) {},
+        [](TextAttributes& a) { a.font.emplace().italic = true; },
+        [](TextAttributes& a) { a.foregroundColor.emplace().red = 1; },
+        [](TextAttributes& a) { a.backgroundColor.emplace(); },
         [](TextAttributes& a) { a.underlineStyle = 1; },
         [](TextAttributes& a) { a.strikethroughStyle = 1; },
         [](TextAttributes& a) { a.superscript = -1; },
         [](TextAttributes& a) { a.baselineOffset = 0; },
         [](TextAttributes& a) { a.link = u"x:"; },
         [](TextAttributes& a) { a.toolTip = u""; },
-        [](TextAttributes& a) { a.paragraphStyle = ParagraphStyle{}; },
-        [](TextAttributes& a) { a.attachment = std::make_shared<const TextAttachment>(); },
+        [](TextAttributes& a) { a.paragraphStyle.emplace(); },
+        file(""),
+        file("bytes"),
     };
-    for (const Change change : changes) {
-        TextAttributes changed;
-        change(changed);
-        TextAttributes likewise;
-        change(likewise);
-        EXPECT_FALSE(changed == TextAttributes{}) << &change - &changes[0];
-        EXPECT_TRUE(changed == likewise) << &change - &changes[0];
+    std::vector<AttributedString> looks;
+    for (const auto& change : changes) looks.push_back(attributed(u"a", change));
+    return looks;
+}
+
+TEST(TextAttributesTest, EveryAttributeCountsByWhatItHolds) {
+    const auto looks = differentLooks();
+    const auto again = differentLooks();
+    for (std::size_t i = 0; i < looks.size(); ++i) {
+        for (std::size_t j = 0; j < looks.size(); ++j) EXPECT_EQ(looks[i] == again[j], i == j) << i << " and " << j;
     }
-}
-
-TEST(TextAttributesTest, CompareByWhatTheyHold) {
-    const auto withFile = [](const char* contents) {
-        TextAttributes attributes;
-        attributes.attachment = std::make_shared<const TextAttachment>(TextAttachment{u"a.png", contents, u""});
-        return std::make_shared<const TextAttributes>(attributes);
-    };
-    EXPECT_TRUE(sameAttributes(withFile("bytes"), withFile("bytes")));
-    EXPECT_FALSE(sameAttributes(withFile("bytes"), withFile("other")));
-    EXPECT_FALSE(sameAttributes(withFile("bytes"), nullptr));
-    EXPECT_FALSE(sameAttributes(Thin, withFile("")));
-    EXPECT_TRUE(sameAttributes(nullptr, std::make_shared<const TextAttributes>()));
-}
-
-// ---- Edits ----
-
-TEST(AttributedStringTest, UpperCasingKeepsAttributesWithTheirText) {
-    AttributedString text(u"stra\u00DF", Bold);
-    text.append(u"e\U00010428", Thin);
-    AttributedString expected(u"STRASS", Bold);
-    expected.append(u"E\U00010400", Thin);
-    EXPECT_EQ(text.upperCaseAttributedString(), expected);
 }
 
 TEST(AttributedStringTest, CopiesMayBeChangedOnDifferentThreads) {

@@ -39,14 +39,11 @@ std::string shown(const std::optional<Rows>& rows) {
     return text;
 }
 
-std::string parsed(std::u16string text, std::u16string separator = u",", bool hasHeader = false) {
-    return shown(
-        CSVParser(std::move(text), std::move(separator), std::nullopt, hasHeader, ImportNames).arrayOfParsedRows());
-}
-
 struct Reading {
     const char16_t* text;
     const char* expected;
+    const char16_t* separator = u",";
+    bool hasHeader = false;
 };
 
 TEST(CSVParser, ReadsTheDialect) {
@@ -69,34 +66,25 @@ TEST(CSVParser, ReadsTheDialect) {
         {u"a,\"x\"\"y,b\nc", "Name=a"},
         {u"\"x", "nothing"},
         {u"a\n\"x\ny\nz", "Name=a"},
+        // Long separators.
+        {u"a:b::c:", "Name=a:b;Value=c:", u"::"},
+        {u"a:::b", "Name=a;Value=:b", u"::"},
+        {u"::", "Name=;Value=", u"::"},
+        {u":", "Name=:", u"::"},
+        {u"\"a::b\"::c", "Name=a::b;Value=c", u"::"},
+        // Names from a header.
+        {u"x,y\r\n\r\na,b,c", "FIELD_3=c;x=a;y=b", u",", true},
+        {u"\"x,\",y\na,b", "x,=a;y=b", u",", true},
+        {u"x,x\na,b", "x=b", u",", true},
+        {u"x,y", "nothing", u",", true},
+        {u"x,y\n", "nothing", u",", true},
+        {u"\nx,y\na,b", "nothing", u",", true},
+        {u"x,\"y\na,b", "nothing", u",", true},
     };
-    for (const Reading& c : cases) EXPECT_EQ(parsed(c.text), c.expected) << toUtf8(c.text);
-}
-
-TEST(CSVParser, ReadsWithLongSeparators) {
-    const Reading cases[] = {
-        {u"a::b", "Name=a;Value=b"},
-        {u"a:b::c:", "Name=a:b;Value=c:"},
-        {u"a:::b", "Name=a;Value=:b"},
-        {u"::", "Name=;Value="},
-        {u":", "Name=:"},
-        {u"\"a::b\"::c", "Name=a::b;Value=c"},
-    };
-    for (const Reading& c : cases) EXPECT_EQ(parsed(c.text, u"::"), c.expected) << toUtf8(c.text);
-}
-
-TEST(CSVParser, ReadsTheNamesFromAHeader) {
-    const Reading cases[] = {
-        {u"x,y\na,b", "x=a;y=b"},
-        {u"x,y\r\n\r\na,b,c", "FIELD_3=c;x=a;y=b"},
-        {u"\"x,\",y\na,b", "x,=a;y=b"},
-        {u"x,x\na,b", "x=b"},
-        {u"x,y", "nothing"},
-        {u"x,y\n", "nothing"},
-        {u"\nx,y\na,b", "nothing"},
-        {u"x,\"y\na,b", "nothing"},
-    };
-    for (const Reading& c : cases) EXPECT_EQ(parsed(c.text, u",", true), c.expected) << toUtf8(c.text);
+    for (const Reading& c : cases) {
+        CSVParser parser(c.text, c.separator, std::nullopt, c.hasHeader, ImportNames);
+        EXPECT_EQ(shown(parser.arrayOfParsedRows()), c.expected) << toUtf8(c.text);
+    }
 }
 
 TEST(CSVParser, TakesLineSeparatorsAndNamesFromTheCaller) {
@@ -167,24 +155,16 @@ std::string written(const std::vector<std::vector<CsvWriter::Field>>& lines, cha
 }
 
 TEST(CsvWriter, QuotesOnlyWhatNeedsIt) {
-    struct Case {
-        const char16_t* field;
-        const char* expected;
-    };
-    const Case cases[] = {
-        {u"plain", "plain"},
+    const std::pair<const char16_t*, std::string> cases[] = {
+        {u" plain\tb;c'd ", " plain\tb;c'd "},
         {u"", ""},
-        {u"   ", "   "},
-        {u"a\tb;c'd", "a\tb;c'd"},
         {u"a,b", "\"a,b\""},
-        {u"a\rb", "\"a\rb\""},
-        {u"a\nb", "\"a\nb\""},
+        {u"a\rb\n", "\"a\rb\n\""},
         {u"a\u2028b", "\"a\u2028b\""},
-        {u"\"", "\"\"\"\""},
         {u"say \"hi\"", "\"say \"\"hi\"\"\""},
         {u"ü\U0001F600", "ü\U0001F600"},
     };
-    for (const Case& c : cases) EXPECT_EQ(written({{c.field}}), std::string(c.expected) + "\n") << toUtf8(c.field);
+    for (const auto& [field, expected] : cases) EXPECT_EQ(written({{field}}), expected + "\n") << toUtf8(field);
     EXPECT_EQ(written({{u"a,b", u"c;d"}}, u';'), "a,b;\"c;d\"\n");
 }
 

@@ -2,14 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/Foundation/text/RTFTestSupport.h"
+
 namespace plume {
 namespace {
-
-SharedAttributes look(const std::function<void(TextAttributes&)>& set) {
-    TextAttributes attributes;
-    set(attributes);
-    return std::make_shared<const TextAttributes>(attributes);
-}
 
 struct ExportCase {
     const char* about;
@@ -25,31 +21,9 @@ AttributedString joined(std::initializer_list<AttributedString> pieces) {
 }
 
 TEST(HTMLExport, WritesWhatTheTextLooksLike) {
-    const auto bold = look([](TextAttributes& a) { a.font = FontAttribute{u"", 0, true, true}; });
-    const auto font = look([](TextAttributes& a) { a.font = FontAttribute{u"Times'; x:y", 10.5, false, false}; });
-    const auto red = look([](TextAttributes& a) {
-        a.foregroundColor = ColorAttribute{1, 0, 0.5, 1};
-        a.underlineStyle = 1;
-    });
-    const auto link = look([](TextAttributes& a) {
-        a.link = u"https://example.org/?a=\"b\"&c";
-        a.underlineStyle = 1;
-    });
-    const auto centred = look([](TextAttributes& a) {
-        a.paragraphStyle = ParagraphStyle{};
-        a.paragraphStyle->alignment = TextAlignment::Center;
-    });
-    const auto item = look([](TextAttributes& a) {
-        a.paragraphStyle = ParagraphStyle{};
-        a.paragraphStyle->textLists = {{u"{disc}", 1}};
-    });
-    const auto numbered = look([](TextAttributes& a) {
-        a.paragraphStyle = ParagraphStyle{};
-        a.paragraphStyle->textLists = {{u"{disc}", 1}, {u"{decimal}.", 1}};
-    });
-    const auto image = look([](TextAttributes& a) {
-        a.attachment = std::make_shared<TextAttachment>(TextAttachment{u"i.png", "\x89PNG", u""});
-    });
+    const auto list = [](const char16_t* text, std::vector<TextList> lists) {
+        return attributed(text, [&](TextAttributes& a) { a.paragraphStyle.emplace().textLists = lists; });
+    };
     const ExportCase cases[] = {
         {"empty", AttributedString(), ""},
         {"plain", AttributedString(u"a & <b>"), "<p>a &amp; &lt;b&gt;</p>"},
@@ -60,17 +34,39 @@ TEST(HTMLExport, WritesWhatTheTextLooksLike) {
         {"no paragraphs, break at the end", AttributedString(u"a\n\nb\n"), "a<br><br>b<br>", false},
         {"spaces", AttributedString(u" a  b "), "<p>&nbsp;a &nbsp;b </p>"},
         {"tab", AttributedString(u"a\tb"), "<p>a<span style=\"white-space:pre\">\t</span>b</p>"},
-        {"bold", joined({AttributedString(u"a"), AttributedString(u"b", bold)}), "<p>a<b><i>b</i></b></p>"},
-        {"font", AttributedString(u"a", font),
+        {"bold",
+         joined({AttributedString(u"a"), attributed(u"b",
+                                                    [](auto& a) {
+                                                        a.font = FontAttribute{u"", 0, true, true};
+                                                    })}),
+         "<p>a<b><i>b</i></b></p>"},
+        {"font",
+         attributed(u"a",
+                    [](auto& a) {
+                        a.font = FontAttribute{u"Times'; x:y", 10.5, false, false};
+                    }),
          "<p><span style=\"font-family:'Times x:y';font-size:10.5pt;\">a</span></p>"},
-        {"colour", AttributedString(u"a", red), "<p><span style=\"color:#ff0080;\"><u>a</u></span></p>"},
-        {"link", AttributedString(u"a", link), "<p><a href=\"https://example.org/?a=&quot;b&quot;&amp;c\">a</a></p>"},
-        {"centred", AttributedString(u"a", centred), "<p style=\"text-align:center;\">a</p>"},
+        {"colour",
+         attributed(u"a",
+                    [](auto& a) {
+                        a.foregroundColor = ColorAttribute{1, 0, 0.5, 1};
+                    }),
+         "<p><span style=\"color:#ff0080;\">a</span></p>"},
+        {"underline", attributed(u"a", [](auto& a) { a.underlineStyle = 1; }), "<p><u>a</u></p>"},
+        {"link",
+         attributed(u"a",
+                    [](auto& a) {
+                        a.link = u"https://example.org/?a=\"b\"&c";
+                        a.underlineStyle = 1;
+                    }),
+         "<p><a href=\"https://example.org/?a=&quot;b&quot;&amp;c\">a</a></p>"},
+        {"centred", attributed(u"a", [](auto& a) { a.paragraphStyle.emplace().alignment = TextAlignment::Center; }),
+         "<p style=\"text-align:center;\">a</p>"},
         {"list",
-         joined({AttributedString(u"x\n"), AttributedString(u"\t\u2022\ta\n", item),
-                 AttributedString(u"\t1.\tb\n", numbered), AttributedString(u"y")}),
+         joined({AttributedString(u"x\n"), list(u"\t\u2022\ta\n", {{u"{disc}", 1}}),
+                 list(u"\t1.\tb\n", {{u"{disc}", 1}, {u"{decimal}.", 1}}), AttributedString(u"y")}),
          "<p>x</p><ul><li>a</li><ol><li>b</li></ol></ul><p>y</p>"},
-        {"image", AttributedString(u"\xfffc", image),
+        {"image", attributed(u"\xfffc", [](auto& a) { a.attachment = attachment(u"i.png", "\x89PNG"); }),
          "<p><img src=\"data:image/png;base64,iVBORw==\" alt=\"i.png\"></p>"},
     };
     for (const ExportCase& c : cases) {
