@@ -354,7 +354,7 @@ std::string typesAndBytes(int descriptor) {
     return all;
 }
 
-TEST(ClipboardLegacyTest, HoldsWhatWasReadOfTheNewestContent) {
+TEST(SharedClipboardCopyTest, HoldsWhatWasReadOfTheNewestContent) {
     SharedClipboardCopy copy;
     EXPECT_EQ(typesAndBytes(copy.descriptor()), "");
     copy.add("UTF8_STRING", 300, 8, "one");
@@ -372,7 +372,7 @@ TEST(ClipboardLegacyTest, HoldsWhatWasReadOfTheNewestContent) {
 }
 
 // The writer was killed, or something else is in its place.
-TEST(ClipboardLegacyTest, GivesOnlyWholeEntries) {
+TEST(SharedClipboardCopyTest, GivesOnlyWholeEntries) {
     SharedClipboardCopy copy;
     copy.add("first", 300, 8, "one");
     const off_t afterFirst = lseek(copy.descriptor(), 0, SEEK_END);

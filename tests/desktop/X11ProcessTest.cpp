@@ -287,6 +287,19 @@ TEST_F(BareServerTest, TheFocusTellsTheProgramInFront) {
     processes.reset();
 }
 
+TEST_F(BareServerTest, AnObserverHearsEventsUntilItsSubscriptionEnds) {
+    SessionThread thread(server_.display());
+    int heard = 0;
+    thread.run([&] {
+        X11Session& session = thread.session();
+        Subscription observer = session.addObserver(XCB_PROPERTY_NOTIFY, [&](const auto&) { ++heard; });
+        session.serverTime();  // which changes a property
+        observer.end();
+        session.serverTime();
+    });
+    EXPECT_EQ(heard, 1);
+}
+
 TEST_F(BareServerTest, AServerThatHasGoneIsTold) {
     PrivateDirectory directory;
     auto server = std::make_unique<XServer>(directory, XServer::Options{}, privateEnvironment(directory));

@@ -75,7 +75,7 @@ class X11Session {
     void flush();
     // Reads and handles all that has arrived. Never waits. Not from inside a handler.
     void drain();
-    // Waits until the condition holds, collecting, at most so long; false when it still does not. The heartbeat beats
+    // Waits until the condition holds, collecting, at most so long; false when it still does not. Calls `heartbeat`
     // meanwhile.
     bool waitUntil(const std::function<bool()>& condition, double seconds);
 

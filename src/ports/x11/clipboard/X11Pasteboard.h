@@ -2,7 +2,7 @@
 //
 // Belongs to the tap thread. Reading what another program offers waits for that program, 0.3 s for a first answer and
 // one second in all; a program that has not answered is not asked again until the clipboard changes. The session's
-// heartbeat beats meanwhile, and the tap's keys wait unread.
+// heartbeat is called meanwhile, and the tap's keys wait unread.
 //
 // What another program offers is told under the program's own names, and under a name of PasteboardType in front of the
 // first one that holds it. Content that is given back under all these names offers exactly what it offered before.

@@ -2,8 +2,8 @@
 //
 // Keys that are down on the XTEST keyboard are released; the modifiers among them that the user still holds are pressed
 // again at the end. A shift or a Caps Lock that is locked is unlocked and locked again; a latched modifier is spent.
-// The group in force stays, and so does Num Lock, which only the keypad's keys mind. Tap thread; waits for the server
-// once.
+// The group in force stays, and so does Num Lock, which only changes the keypad. Tap thread; waits for the
+// server once.
 #pragma once
 
 #include <xcb/xcb.h>
