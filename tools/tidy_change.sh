@@ -1,15 +1,44 @@
 #!/usr/bin/env bash
-# Runs clang-tidy on the source files of the change: all that differ from the newest commit older than PLUME_TIDY_SINCE
-# (default "4 hours ago"), or every file when there is none.
+# Runs clang-tidy on the .cpp files of the change, and through them on the headers that they include.
+#   tools/tidy_change.sh [BRANCH]
+# The change is what came since HEAD left BRANCH (origin/main when none is named). When that is HEAD itself, it is what came
+# since the newest commit older than PLUME_TIDY_SINCE ("4 hours ago"), and every file when there is no such commit.
+# A large change would take too long: of more than PLUME_TIDY_FILES (40) files, those that changed most are checked.
+# PLUME_TIDY_BUILD (build/default) is a build folder with compile commands.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-base=$(git rev-list -1 --before="${PLUME_TIDY_SINCE:-4 hours ago}" HEAD 2>/dev/null || true)
-if [ -n "$base" ]; then
-    mapfile -t files < <(git diff --name-only --diff-filter=d "$base" HEAD -- 'src/*.cpp')
-else
-    mapfile -t files < <(git ls-files 'src/*.cpp')
-fi
-[ ${#files[@]} -gt 0 ] || { echo "no source file changed"; exit 0; }
-printf '%s\n' "${files[@]}" | xargs -P "$(nproc)" -n 4 clang-tidy --quiet -p ${PLUME_TIDY_BUILD:-build/default} \
-    --extra-arg=-Wno-unknown-warning-option --warnings-as-errors='*' 2>/dev/null
-echo "${#files[@]} files are clean"
+most=${PLUME_TIDY_FILES:-40}
+build=${PLUME_TIDY_BUILD:-build/default}
+sources=('src/*.cpp' 'testing/*.cpp' 'tests/*.cpp' 'bench/*.cpp')
+[ -f "$build/compile_commands.json" ] || { echo "$build is no build folder: build there first" >&2; exit 2; }
+
+# The commit that the change starts from, or nothing when all is new.
+base_commit() {
+    local base
+    if [ $# -gt 0 ]; then
+        git merge-base "$1" HEAD
+        return
+    fi
+    base=$(git merge-base origin/main HEAD 2>/dev/null || true)
+    if [ -z "$base" ] || [ "$base" = "$(git rev-parse HEAD)" ]; then
+        base=$(git rev-list -1 --before="${PLUME_TIDY_SINCE:-4 hours ago}" HEAD)
+    fi
+    echo "$base"
+}
+
+# The changed files, those with the most changed lines first. A file that only moved has none and comes last.
+changed_files() {
+    local since=${1:-$(git hash-object -t tree /dev/null)}
+    git diff --numstat --find-renames --diff-filter=d "$since" HEAD -- "${sources[@]}" |
+        awk -F'\t' '{ print $1 + $2 "\t" $3 }' | sort -k1,1nr -k2 | cut -f2 |
+        sed -E 's/\{.* => (.*)\}/\1/; s/.* => //; s,//,/,'
+}
+
+base=$(base_commit "$@")
+changed=$(changed_files "$base")
+[ -n "$changed" ] || { echo "no source file changed"; exit 0; }
+mapfile -t files <<<"$changed"
+checked=("${files[@]:0:most}")
+printf '%s\n' "${checked[@]}" | xargs -P "$(nproc)" -n 1 clang-tidy --quiet -p "$build" \
+    --extra-arg=-Wno-unknown-warning-option --warnings-as-errors='*' 2> >(grep -v ' generated\.$' >&2)
+echo "${#checked[@]} of the ${#files[@]} files that changed are clean; $((${#files[@]} - ${#checked[@]})) were left out"
