@@ -39,8 +39,8 @@ struct CharacterSet::Storage {
     }
 
     static std::shared_ptr<const Storage> empty() {
-        static const auto Empty = std::make_shared<const Storage>(icu::UnicodeSet());
-        return Empty;
+        static const auto empty = std::make_shared<const Storage>(icu::UnicodeSet());
+        return empty;
     }
 
     icu::UnicodeSet set;
@@ -73,44 +73,44 @@ CharacterSet CharacterSet::withRange(char32_t first, char32_t last) {
 }
 
 const CharacterSet& CharacterSet::letters() {
-    static const CharacterSet Set = Storage::make(Storage::ofCategories(U_GC_L_MASK | U_GC_M_MASK));
-    return Set;
+    static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_L_MASK | U_GC_M_MASK));
+    return set;
 }
 
 const CharacterSet& CharacterSet::lowercaseLetters() {
-    static const CharacterSet Set = Storage::make(Storage::ofCategories(U_GC_LL_MASK));
-    return Set;
+    static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_LL_MASK));
+    return set;
 }
 
 const CharacterSet& CharacterSet::uppercaseLetters() {
-    static const CharacterSet Set = Storage::make(Storage::ofCategories(U_GC_LU_MASK | U_GC_LT_MASK));
-    return Set;
+    static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_LU_MASK | U_GC_LT_MASK));
+    return set;
 }
 
 const CharacterSet& CharacterSet::alphanumerics() {
-    static const CharacterSet Set = Storage::make(Storage::ofCategories(U_GC_L_MASK | U_GC_M_MASK | U_GC_N_MASK));
-    return Set;
+    static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_L_MASK | U_GC_M_MASK | U_GC_N_MASK));
+    return set;
 }
 
 const CharacterSet& CharacterSet::decimalDigits() {
-    static const CharacterSet Set = Storage::make(Storage::ofCategories(U_GC_ND_MASK));
-    return Set;
+    static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_ND_MASK));
+    return set;
 }
 
 const CharacterSet& CharacterSet::whitespaces() {
-    static const CharacterSet Set = Storage::make(Storage::ofCategories(U_GC_ZS_MASK).add(u'\t'));
-    return Set;
+    static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_ZS_MASK).add(u'\t'));
+    return set;
 }
 
 const CharacterSet& CharacterSet::newlines() {
-    static const CharacterSet Set =
+    static const CharacterSet set =
         Storage::make(icu::UnicodeSet(0x0A, 0x0D).add(UChar32{0x85}).add(UChar32{0x2028}).add(UChar32{0x2029}));
-    return Set;
+    return set;
 }
 
 const CharacterSet& CharacterSet::whitespacesAndNewlines() {
-    static const CharacterSet Set = whitespaces().united(newlines());
-    return Set;
+    static const CharacterSet set = whitespaces().united(newlines());
+    return set;
 }
 
 bool CharacterSet::contains(char32_t codePoint) const {

@@ -221,8 +221,8 @@ std::u16string uppercased(std::u16string_view text) {
 }
 
 char32_t foldedCodePoint(char32_t c) {
-    static const std::array<char16_t, FoldTableSize> Table = makeFoldTable();
-    return c < FoldTableSize ? Table[c] : foldedByUnicodeData(c);
+    static const std::array<char16_t, FoldTableSize> table = makeFoldTable();
+    return c < FoldTableSize ? table[c] : foldedByUnicodeData(c);
 }
 
 std::u16string folded(std::u16string_view text) {

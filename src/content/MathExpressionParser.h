@@ -16,12 +16,12 @@
 
 namespace plume {
 
-// Thrown for an expression that cannot be read. `name` is "Error in expression", what() "error = parse error" or
+// Thrown for an expression that cannot be read. `Name` is "Error in expression", what() "error = parse error" or
 // "error = parser stack overflow".
 class MathExpressionError : public std::runtime_error {
   public:
     explicit MathExpressionError(const char* problem);
-    static constexpr const char* name = "Error in expression";
+    static constexpr const char* Name = "Error in expression";
 };
 
 class MathExpressionParser {

@@ -72,8 +72,8 @@ SRKeyCodeTransformer::SRKeyCodeTransformer(const InputSources& inputSources, Key
 }
 
 std::optional<std::u16string> SRKeyCodeTransformer::transformedValue(KeyCode keyCode) const {
-    constexpr std::uint16_t last = 0x7FFF;
-    if (numberOf(keyCode) > last) return std::nullopt;
+    constexpr std::uint16_t Last = 0x7FFF;
+    if (numberOf(keyCode) > Last) return std::nullopt;
     if (keyCode == KeyCode::Space) return texts_.space;
     const auto* const special = std::find_if(std::begin(SpecialKeys), std::end(SpecialKeys),
                                              [&](const SpecialKey& key) { return key.keyCode == keyCode; });

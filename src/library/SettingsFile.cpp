@@ -38,8 +38,8 @@ Defaults::Value selectorModifier(const JsonNode& node) {
 }
 
 Defaults::Value seconds(const JsonNode& node) {
-    constexpr double day = 24 * 60 * 60;
-    return node.number(0, day);
+    constexpr double Day = 24 * 60 * 60;
+    return node.number(0, Day);
 }
 
 Defaults::Value string(const JsonNode& node) {
@@ -52,10 +52,10 @@ Defaults::Value strings(const JsonNode& node) {
 
 // The modifiers in the upper half, the key code in the lower.
 Defaults::Value hotKey(const JsonNode& node) {
-    constexpr std::int64_t allModifiers = 15;
-    constexpr std::int64_t noKey = 65535;
+    constexpr std::int64_t AllModifiers = 15;
+    constexpr std::int64_t NoKey = 65535;
     const std::int64_t packed = node.integer(0);
-    if ((packed >> 32) > allModifiers || (packed & 0xFFFFFFFF) > noKey) {
+    if ((packed >> 32) > AllModifiers || (packed & 0xFFFFFFFF) > NoKey) {
         node.fail("expected a packed hot key: 4294967296 times the modifiers (0 to 15) plus the key code (0 to 65535)");
     }
     return packed;

@@ -59,11 +59,11 @@ struct LocalTime {
 };
 
 std::optional<LocalTime> localTimeIn(const std::string& text) {
-    constexpr std::string_view pattern = "dddd-dd-ddTdd:dd:dd";
-    if (text.size() != pattern.size()) return std::nullopt;
+    constexpr std::string_view Pattern = "dddd-dd-ddTdd:dd:dd";
+    if (text.size() != Pattern.size()) return std::nullopt;
     for (std::size_t i = 0; i < text.size(); ++i) {
         const bool digit = text[i] >= '0' && text[i] <= '9';
-        if (pattern[i] == 'd' ? !digit : text[i] != pattern[i]) return std::nullopt;
+        if (Pattern[i] == 'd' ? !digit : text[i] != Pattern[i]) return std::nullopt;
     }
     const auto number = [&](std::size_t at, std::size_t length) { return std::stoi(text.substr(at, length)); };
     return LocalTime{number(0, 4), number(5, 2), number(8, 2), number(11, 2), number(14, 2), number(17, 2)};
@@ -81,8 +81,8 @@ std::shared_ptr<const ContextInputSetting> readApplicationSetting(const JsonNode
     object.whenSet("afterPastingDelay",
                    [&](const JsonNode& n) { setting->afterPastingDelay = n.number(0, LongestDelay); });
     object.whenSet("blockLength", [&](const JsonNode& n) {
-        constexpr std::int64_t longest = 1'000'000;
-        setting->blockLength = static_cast<std::uint64_t>(n.integer(0, longest));
+        constexpr std::int64_t Longest = 1'000'000;
+        setting->blockLength = static_cast<std::uint64_t>(n.integer(0, Longest));
     });
     return setting;
 }

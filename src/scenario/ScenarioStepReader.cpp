@@ -44,8 +44,8 @@ KeyStep readKeyStep(const JsonNode& node) {
         for (const JsonNode& element : n.elements()) step.modifiers |= modifier(element);
     });
     object.whenSet("count", [&](const JsonNode& n) {
-        constexpr std::int64_t most = 100'000;
-        step.count = n.integer(0, most);
+        constexpr std::int64_t Most = 100'000;
+        step.count = n.integer(0, Most);
     });
     return step;
 }

@@ -47,8 +47,8 @@ void checkWriting(const Rows& rows, const std::vector<std::u16string>& names) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     if (size == 0) return 0;
-    static const std::u16string Separators[] = {u",", u";", u"\t", u"::"};
-    const std::u16string separator = Separators[data[0] % 4];
+    static const std::u16string separators[] = {u",", u";", u"\t", u"::"};
+    const std::u16string separator = separators[data[0] % 4];
     const std::u16string text = plume::fromUtf8({reinterpret_cast<const char*>(data) + 1, size - 1});
     std::vector<std::u16string> names;
     read(text, separator, true, names);

@@ -94,8 +94,8 @@ AttributedString& AttributedString::operator=(const AttributedString& other) {
 }
 
 const AttributedString::Storage& AttributedString::storage() const {
-    static const Storage Empty;
-    return storage_ ? *storage_ : Empty;
+    static const Storage empty;
+    return storage_ ? *storage_ : empty;
 }
 
 AttributedString::Storage& AttributedString::mutableStorage() {

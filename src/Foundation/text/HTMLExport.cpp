@@ -244,8 +244,8 @@ class Exporter {
     }
 
     void writeRun(std::u16string_view text, const SharedAttributes& shared) {
-        static const TextAttributes Plain;
-        const TextAttributes& look = shared ? *shared : Plain;
+        static const TextAttributes plain;
+        const TextAttributes& look = shared ? *shared : plain;
         std::vector<std::string_view> open;
         const auto start = [&](std::string_view tag, std::string_view attributes = {}) {
             markup_.start(tag, attributes);

@@ -91,9 +91,9 @@ void RTFCodePages::appendText(int codePage, std::string_view bytes, std::u16stri
     // Some pages have a control character of their own for what they cannot convert.
     std::replace(text.begin() + static_cast<std::ptrdiff_t>(start), text.end(), u'\u001A', u'\uFFFD');
     if (codePage == SymbolCodePage) {
-        constexpr char16_t latinMeaning = u'\u00B7';
-        static_assert(static_cast<unsigned char>(SymbolBullet) == latinMeaning);
-        std::replace(text.begin() + static_cast<std::ptrdiff_t>(start), text.end(), latinMeaning, u'\u2022');
+        constexpr char16_t LatinMeaning = u'\u00B7';
+        static_assert(static_cast<unsigned char>(SymbolBullet) == LatinMeaning);
+        std::replace(text.begin() + static_cast<std::ptrdiff_t>(start), text.end(), LatinMeaning, u'\u2022');
     }
 }
 

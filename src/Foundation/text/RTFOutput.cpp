@@ -42,10 +42,10 @@ void RTFOutput::append(const RTFOutput& other) {
 }
 
 void RTFOutput::byte(unsigned char byte) {
-    constexpr std::string_view digits = "0123456789abcdef";
+    constexpr std::string_view Digits = "0123456789abcdef";
     bytes_.append("\\'");
-    bytes_.push_back(digits[byte >> 4]);
-    bytes_.push_back(digits[byte & 0xF]);
+    bytes_.push_back(Digits[byte >> 4]);
+    bytes_.push_back(Digits[byte & 0xF]);
     needsDelimiter_ = false;
 }
 

@@ -126,7 +126,7 @@ void writeLevelText(RTFOutput& output, const LevelText& level, unsigned char dep
 }
 
 void writeLevel(RTFOutput& output, const TextList& list, unsigned char depth) {
-    constexpr std::int64_t largest = std::numeric_limits<int>::max();
+    constexpr std::int64_t Largest = std::numeric_limits<int>::max();
     const LevelText level = levelTextOf(list.markerFormat);
     output.openGroup();
     output.control("listlevel");
@@ -135,7 +135,7 @@ void writeLevel(RTFOutput& output, const TextList& list, unsigned char depth) {
     output.control("leveljc", 0);
     output.control("leveljcn", 0);
     output.control("levelfollow", 0);
-    output.control("levelstartat", static_cast<int>(std::clamp(list.startingItemNumber, -largest, largest)));
+    output.control("levelstartat", static_cast<int>(std::clamp(list.startingItemNumber, -Largest, Largest)));
     output.openGroup();
     output.ignorableControl("levelmarker");
     output.text(list.markerFormat);
@@ -312,9 +312,9 @@ int RTFTableWriter::colorIndex(const ColorAttribute& color) {
 
 int RTFTableWriter::listNumber(const std::vector<TextList>& levels) {
     if (levels.empty()) return 0;
-    constexpr std::size_t deepest = RTFDeepestListLevel + 1;
+    constexpr std::size_t Deepest = RTFDeepestListLevel + 1;
     const std::vector<TextList> written(levels.begin(),
-                                        levels.begin() + static_cast<std::ptrdiff_t>(std::min(levels.size(), deepest)));
+                                        levels.begin() + static_cast<std::ptrdiff_t>(std::min(levels.size(), Deepest)));
     if (listNumbers_.size() >= RTFMaximumLists && !listNumbers_.contains(written)) return 0;
     return listNumbers_.emplace(written, static_cast<int>(listNumbers_.size()) + 1).first->second;
 }

@@ -10,8 +10,8 @@ bool sameAttachment(const TextAttributes& a, const TextAttributes& b) {
 }
 
 const TextAttributes& orNone(const SharedAttributes& attributes) {
-    static const TextAttributes None;
-    return attributes ? *attributes : None;
+    static const TextAttributes none;
+    return attributes ? *attributes : none;
 }
 
 }  // namespace

@@ -20,8 +20,8 @@ constexpr const char16_t* Label = u"Label";
 
 // Every sequence of bytes is a text in these; nothing only when ICU lacks the encoding.
 std::optional<std::u16string> decoded(std::string_view bytes, const char* encoding) {
-    constexpr std::size_t most = std::numeric_limits<std::int32_t>::max() / 2;
-    if (bytes.size() > most) return std::nullopt;
+    constexpr std::size_t Most = std::numeric_limits<std::int32_t>::max() / 2;
+    if (bytes.size() > Most) return std::nullopt;
     UErrorCode status = U_ZERO_ERROR;
     UConverter* const converter = ucnv_open(encoding, &status);
     if (U_FAILURE(status)) return std::nullopt;
@@ -35,9 +35,9 @@ std::optional<std::u16string> decoded(std::string_view bytes, const char* encodi
 }
 
 std::optional<std::u16string> textOf(std::string_view bytes) {
-    constexpr std::string_view utf8Mark = "\xEF\xBB\xBF";
+    constexpr std::string_view Utf8Mark = "\xEF\xBB\xBF";
     if (bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF")) return decoded(bytes, "UTF-16");
-    if (bytes.starts_with(utf8Mark)) bytes.remove_prefix(utf8Mark.size());
+    if (bytes.starts_with(Utf8Mark)) bytes.remove_prefix(Utf8Mark.size());
     if (auto text = fromStrictUtf8(bytes)) return text;
     return decoded(bytes, "macintosh");
 }

@@ -150,8 +150,8 @@ class Examination {
 
     void examineAccessibility() {
         const AtspiAccessibility accessibility;
-        constexpr int tries = 75;
-        for (int i = 0; i < tries && accessibility.status() == AccessibilityStatus::Starting; ++i) {
+        constexpr int Tries = 75;
+        for (int i = 0; i < Tries && accessibility.status() == AccessibilityStatus::Starting; ++i) {
             std::this_thread::sleep_for(std::chrono::milliseconds(20));
         }
         const AccessibilityStatus status = accessibility.status();
@@ -187,8 +187,8 @@ class Examination {
         const std::set<std::string> running = runningPrograms();
         bool any = false;
         for (const Conflict& conflict : Conflicts) {
-            constexpr std::size_t keptLength = 15;
-            if (!running.contains(std::string(conflict.program).substr(0, keptLength))) continue;
+            constexpr std::size_t KeptLength = 15;
+            if (!running.contains(std::string(conflict.program).substr(0, KeptLength))) continue;
             any = true;
             warn("other programs", std::string(conflict.program) + " is running and " + conflict.what +
                                        "; when keys get lost or come twice, end one of the two.");

@@ -26,8 +26,8 @@ Result<std::string> readWholeFile(const std::filesystem::path& path) {
     std::ifstream file(path, std::ios::binary);
     if (!file) return cannotRead(path, errno != 0 ? std::strerror(errno) : "it cannot be opened");
     std::string bytes;
-    constexpr std::size_t pieceLength = std::size_t{64} * 1024;
-    std::string piece(pieceLength, '\0');
+    constexpr std::size_t PieceLength = std::size_t{64} * 1024;
+    std::string piece(PieceLength, '\0');
     while (file.read(piece.data(), static_cast<std::streamsize>(piece.size())), file.gcount() > 0) {
         bytes.append(piece, 0, static_cast<std::size_t>(file.gcount()));
         if (bytes.size() > LargestFile) return cannotRead(path, "it is larger than 256 MiB");

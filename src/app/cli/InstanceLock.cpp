@@ -25,8 +25,8 @@ std::string environment(const char* name) {
 bool isPrivate(const std::string& folder) {
     struct stat status {};
     if (lstat(folder.c_str(), &status) != 0) return false;
-    constexpr mode_t others = 077;
-    return S_ISDIR(status.st_mode) && status.st_uid == getuid() && (status.st_mode & others) == 0;
+    constexpr mode_t Others = 077;
+    return S_ISDIR(status.st_mode) && status.st_uid == getuid() && (status.st_mode & Others) == 0;
 }
 
 Result<std::string> folder() {

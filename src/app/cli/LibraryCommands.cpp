@@ -40,10 +40,10 @@ std::string whenItExpands(const SnippetGroup& group) {
 
 // The first line, as much of it as suits a list.
 std::u16string beginning(const std::u16string& content) {
-    constexpr std::size_t most = 60;
+    constexpr std::size_t Most = 60;
     const std::u16string_view line = trimmed(std::u16string_view(content).substr(0, content.find(u'\n')));
-    if (line.size() <= most && line.size() == trimmed(content).size()) return std::u16string(line);
-    std::size_t length = std::min(line.size(), most);
+    if (line.size() <= Most && line.size() == trimmed(content).size()) return std::u16string(line);
+    std::size_t length = std::min(line.size(), Most);
     const bool cutsPair = length < line.size() && (line[length] & 0xFC00) == 0xDC00;
     if (cutsPair) --length;
     return std::u16string(trimmed(line.substr(0, length))) + u" …";

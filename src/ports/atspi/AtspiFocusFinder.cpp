@@ -26,9 +26,9 @@ AtspiFocusFinder::Found AtspiFocusFinder::find(pid_t process) {
 }
 
 const std::string& AtspiFocusFinder::toolkitOf(const std::string& program) {
-    static const std::string None;
+    static const std::string none;
     const auto found = std::ranges::find(programs_, program, [](const Program& each) { return each.root.program; });
-    if (found == programs_.end()) return None;
+    if (found == programs_.end()) return none;
     if (!found->toldToolkit) {
         const BusAnswer answer = bus_.property(found->root, "org.a11y.atspi.Application", "ToolkitName");
         found->toldToolkit = static_cast<bool>(answer);

@@ -14,8 +14,8 @@ void append(DBusMessageIter& iterator, const BusValue& value) {
                 const char* text = held.c_str();
                 dbus_message_iter_append_basic(&iterator, DBUS_TYPE_STRING, static_cast<const void*>(&text));
             } else {
-                constexpr int type = std::is_signed_v<Held> ? DBUS_TYPE_INT32 : DBUS_TYPE_UINT32;
-                dbus_message_iter_append_basic(&iterator, type, &held);
+                constexpr int Type = std::is_signed_v<Held> ? DBUS_TYPE_INT32 : DBUS_TYPE_UINT32;
+                dbus_message_iter_append_basic(&iterator, Type, &held);
             }
         },
         value);
