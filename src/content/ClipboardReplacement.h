@@ -6,7 +6,7 @@
 
 #include "Foundation/text/AttributedString.h"
 #include "content/ContentEnvironment.h"
-#include "content/SnippetVariable.h"
+#include "content/SnippetClipboardVariable.h"
 
 namespace plume {
 

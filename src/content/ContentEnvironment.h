@@ -3,6 +3,7 @@
 
 #include <functional>
 #include <string>
+#include <string_view>
 
 #include "Foundation/Date.h"
 #include "platform/Pasteboard.h"
@@ -20,6 +21,13 @@ struct ContentEnvironment {
     const PasteboardReader* pasteboard = nullptr;
     // Tells the user that something in a snippet cannot work, in one sentence. Never null.
     std::function<void(const std::string&)> report = [](const std::string&) {};
+
+    // Reports the sentence unless it was reported lately, so that the user does not read it at every expansion: the
+    // last few dozen are remembered, for the whole process. From any thread.
+    void reportOnce(const std::string& sentence) const;
 };
+
+// A piece of a snippet as it may stand in such a sentence: in quotes, and not too long.
+std::string quotedForReport(std::u16string_view text);
 
 }  // namespace plume

@@ -41,7 +41,7 @@ std::optional<AttributedString> readRichText(const PasteboardReader& pasteboard)
 }  // namespace
 
 ExpansionContext::ExpansionContext(const ContentEnvironment& anEnvironment, const std::shared_ptr<Snippet>& aSnippet,
-                                   const SnippetParser::Groups& groups)
+                                   const Groups& groups)
     : environment_(anEnvironment), snippet_(aSnippet), groups_(groups) {}
 
 bool ExpansionContext::giveUp() {
@@ -76,7 +76,7 @@ void ExpansionContext::settleTimeZone() {
 std::shared_ptr<Snippet> ExpansionContext::nestedSnippet(const SnippetAbbreviationVariable& variable) {
     const auto [entry, isNew] = found_.try_emplace(lookupKey(variable));
     if (isNew) {
-        entry->second = SnippetParser::findSnippetBySnippetAbbreviationVariable(variable, *snippet_, groups_);
+        entry->second = findSnippetBySnippetAbbreviationVariable(variable, *snippet_, groups_);
         if (entry->second == snippet_) entry->second = nullptr;
     }
     return entry->second;

@@ -7,19 +7,29 @@
 #include <optional>
 #include <string>
 #include <unordered_map>
+#include <vector>
 
 #include "Foundation/text/AttributedString.h"
 #include "content/ContentEnvironment.h"
-#include "content/SnippetParser.h"
-#include "content/SnippetVariable.h"
+#include "content/SnippetAbbreviationVariable.h"
+#include "library/SnippetGroup.h"
 
 namespace plume {
 
 // Lives on the stack of one parse; refers to its arguments.
 class ExpansionContext {
   public:
+    using Groups = std::vector<std::shared_ptr<SnippetGroup>>;
+
+    // One expansion gives up beyond these.
+    static constexpr std::size_t MaximumReplacements = 100'000;
+    static constexpr std::size_t MaximumLength = std::size_t{16} * 1024 * 1024;  // UTF-16 units
+    // Find-and-replace with patterns may take this long in one expansion; what comes later leaves the clipboard's text
+    // as it is. The keyboard waits meanwhile.
+    static constexpr std::chrono::milliseconds MaximumPatternTime{200};
+
     ExpansionContext(const ContentEnvironment& anEnvironment, const std::shared_ptr<Snippet>& aSnippet,
-                     const SnippetParser::Groups& groups);
+                     const Groups& groups);
 
     const ContentEnvironment& environment() const { return environment_; }
     // The snippet that is expanded, whatever snippets are nested in it.
@@ -55,10 +65,10 @@ class ExpansionContext {
 
     const ContentEnvironment& environment_;
     const std::shared_ptr<Snippet>& snippet_;
-    const SnippetParser::Groups& groups_;
-    std::size_t replacementsLeft_ = SnippetParser::MaximumReplacements;
-    std::size_t unitsLeft_ = SnippetParser::MaximumLength;
-    std::chrono::nanoseconds patternTimeLeft_ = SnippetParser::MaximumPatternTime;
+    const Groups& groups_;
+    std::size_t replacementsLeft_ = MaximumReplacements;
+    std::size_t unitsLeft_ = MaximumLength;
+    std::chrono::nanoseconds patternTimeLeft_ = MaximumPatternTime;
     std::size_t scriptDepth_ = 0;
     bool exhausted_ = false;
     bool timeZoneSettled_ = false;

@@ -1,10 +1,10 @@
-// Putting the values of the fill-in form into the content.
+#include "content/FieldMerging.h"
+
 #include <algorithm>
 #include <utility>
 #include <vector>
 
 #include "content/ContentRewriter.h"
-#include "content/SnippetParser.h"
 
 namespace plume {
 
@@ -77,7 +77,7 @@ void moveVariables(const SnippetExpandedContent& content, bool fieldsAscend) {
 
 }  // namespace
 
-void SnippetParser::mergeFields(SnippetExpandedContent& content) {
+void mergeFields(SnippetExpandedContent& content) {
     const Fields fields = content.fields();
     emptyUnusedFields(fields);
     insertValues(content, fields);

@@ -1,13 +1,13 @@
-// The older placeholder syntax, "%date:short%", rewritten into today's.
+#include "content/OldSyntax.h"
+
 #include <array>
 #include <string>
 #include <string_view>
 #include <utility>
 
-#include "content/AttributedStringRewriter.h"
-#include "content/SnippetParser.h"
-#include "content/SnippetVariableUtils.h"
-#include "library/Snippet.h"
+#include "content/ContentRewriter.h"
+#include "content/PlaceholderBody.h"
+#include "content/SnippetKeyVariable.h"
 
 namespace plume {
 
@@ -62,7 +62,7 @@ std::u16string bodyForKey(View name) {
 std::u16string bodyForParameter(View keyword, View parameter) {
     if (keyword == u"key:") return bodyForKey(parameter);
     std::u16string body(keyword == u"fill:" ? View(u"field:") : keyword);
-    return body + SnippetVariableUtils::escapeParam(parameter);
+    return body + escapeParam(parameter);
 }
 
 // The placeholder that the text, which starts with the marker, starts with.
@@ -78,7 +78,7 @@ OldPlaceholder readPlaceholder(View text) {
 
 }  // namespace
 
-void SnippetParser::convertOldSnippet(Snippet& snippet) {
+void convertOldSnippet(Snippet& snippet) {
     if (!snippet.hasContent()) return;
     const AttributedString source = *snippet.richTextContent();
     const View text = source.string();
@@ -90,8 +90,7 @@ void SnippetParser::convertOldSnippet(Snippet& snippet) {
             continue;
         }
         rewriter.copyTo(at);
-        rewriter.append(SnippetVariableUtils::OpeningMarker + old.body + SnippetVariableUtils::ClosingMarker,
-                        rewriter.attributes());
+        rewriter.append(OpeningMarker + old.body + ClosingMarker, rewriter.attributes());
         at += old.length;
         rewriter.skipTo(at);
     }

@@ -3,8 +3,6 @@
 #include <utility>
 #include <variant>
 
-#include "content/KeySequence.h"
-
 namespace plume {
 
 namespace {
@@ -12,15 +10,11 @@ namespace {
 // `piece` makes the fragment of a range of the content.
 template <class Piece>
 std::vector<PLOutput::Fragment> cut(const SnippetExpandedContent& content, Piece piece) {
-    const std::size_t length = content.string().size();
-    const auto keys = content.keys();
     std::vector<PLOutput::Fragment> fragments;
-    if (keys.empty()) {
-        fragments.push_back(piece(Range{0, length}));
-        return fragments;
-    }
-    for (DeliveryStep& step : deliverySteps(keys, length)) {
-        if (step.text.length > 0) fragments.push_back(piece(step.text));
+    std::vector<DeliveryStep> steps = content.deliverySteps();
+    for (DeliveryStep& step : steps) {
+        // A content without keys is one piece, even when it is empty.
+        if (step.text.length > 0 || steps.size() == 1) fragments.push_back(piece(step.text));
         if (step.key) fragments.emplace_back(std::move(step.key));
     }
     return fragments;

@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "Foundation/ZDEvent.h"
-#include "content/SnippetVariable.h"
+#include "content/SnippetAbbreviationVariable.h"
 
 namespace plume {
 

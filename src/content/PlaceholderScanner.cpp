@@ -5,41 +5,13 @@
 #include <utility>
 #include <vector>
 
+#include "content/PlaceholderKinds.h"
 #include "content/ScannedText.h"
 #include "content/SnippetDateTimeVariable.h"
-#include "content/SnippetVariableUtils.h"
-#include "library/Snippet.h"
 
 namespace plume {
 
 namespace {
-
-struct Arrow {
-    char16_t character;
-    KeyCode keyCode;
-};
-constexpr Arrow Arrows[] = {
-    {u'\u25C0', KeyCode::Left}, {u'\u25B2', KeyCode::Up}, {u'\u25B6', KeyCode::Right}, {u'\u25BC', KeyCode::Down}};
-
-// An arrow is located by its place in the table, at the very start of the content, wherever it was written.
-std::shared_ptr<SnippetVariable> arrowKey(char16_t character) {
-    for (std::size_t index = 0; index < std::size(Arrows); ++index) {
-        if (Arrows[index].character != character) continue;
-        auto key = std::make_shared<SnippetKeyVariable>(std::u16string(1, character), Arrows[index].keyCode);
-        key->location = index;
-        return key;
-    }
-    return nullptr;
-}
-
-// The placeholders that are one sign alone; null for any other body.
-std::shared_ptr<SnippetVariable> variableForSign(std::u16string_view body, std::size_t location) {
-    if (body.size() != 1) return nullptr;
-    if (body.front() != u'|') return arrowKey(body.front());
-    auto caret = std::make_shared<SnippetContentCaret>();
-    caret->location = location;
-    return caret;
-}
 
 template <class Text>
 class PlaceholderScanner {
@@ -59,9 +31,8 @@ class PlaceholderScanner {
     // False at the end of the text.
     bool expandNextPlaceholder() {
         const std::u16string_view rest = text_.rest();
-        const std::size_t opening = rest.find(SnippetVariableUtils::OpeningMarker);
-        const std::size_t closing =
-            opening == std::u16string_view::npos ? opening : rest.find(SnippetVariableUtils::ClosingMarker, opening);
+        const std::size_t opening = rest.find(OpeningMarker);
+        const std::size_t closing = opening == std::u16string_view::npos ? opening : rest.find(ClosingMarker, opening);
         if (closing == std::u16string_view::npos) {  // also: no opening marker further on can ever be closed
             text_.keep(rest.size());
             return false;
@@ -75,12 +46,12 @@ class PlaceholderScanner {
     void expandPlaceholder(std::u16string_view body) {
         const std::size_t length = body.size() + 2;
         attributes_ = text_.attributes();
-        std::shared_ptr<SnippetVariable> variable = SnippetVariableUtils::parseVariable(body);
+        std::shared_ptr<SnippetVariable> variable = parseVariable(body);
         if (variable) {
             variable->location = text_.location();
             variable->attributes = attributes_;
         } else {
-            variable = variableForSign(body, text_.location());
+            variable = parseSign(body, text_.location());
         }
         if (!variable) {
             text_.keep(length);
@@ -91,6 +62,7 @@ class PlaceholderScanner {
         replaceBy(std::move(variable));
     }
 
+    // A kind that has no branch here is not text: it is recorded for the form and for the delivery.
     void replaceBy(std::shared_ptr<SnippetVariable> variable) {
         if (auto nested = std::dynamic_pointer_cast<SnippetAbbreviationVariable>(variable)) {
             replaceByNested(std::move(nested));

@@ -3,7 +3,6 @@
 #include <algorithm>
 
 #include "content/ClipboardReplacement.h"
-#include "library/Snippet.h"
 
 namespace plume {
 

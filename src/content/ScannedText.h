@@ -10,8 +10,9 @@
 
 #include "Foundation/text/AttributedString.h"
 #include "content/ExpansionContext.h"
+#include "content/SnippetClipboardVariable.h"
 #include "content/SnippetExpandedContent.h"
-#include "content/SnippetVariable.h"
+#include "library/Snippet.h"
 
 namespace plume {
 

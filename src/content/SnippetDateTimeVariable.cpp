@@ -3,8 +3,6 @@
 #include <algorithm>
 
 #include "content/DateFormatters.h"
-#include "content/ReportOnce.h"
-#include "content/VariableBody.h"
 
 namespace plume {
 namespace {
@@ -52,9 +50,8 @@ std::u16string text(const SnippetDateTimeVariable& variable, DateTextKind kind, 
     const auto formatted =
         formattedDate(variable.date(environment), kind, *variable.format, variable.locale, environment);
     if (formatted) return *formatted;
-    reportOnce(environment,
-               "A date or time is left out: the pattern " + quotedForReport(*variable.format) +
-                   " of its placeholder has letters without a meaning (text belongs between apostrophes).");
+    environment.reportOnce("A date or time is left out: the pattern " + quotedForReport(*variable.format) +
+                           " of its placeholder has letters without a meaning (text belongs between apostrophes).");
     return {};
 }
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "content/KeySequence.h"
+#include "content/ExpansionContext.h"
 
 namespace plume {
 
@@ -68,7 +68,8 @@ bool SnippetExpandedContent::hasCaretLocationOrKeys() const {
 }
 
 bool SnippetExpandedContent::hasCaretLocationOrArrowKeys() const {
-    return hasCaret() || hasVariable<SnippetKeyVariable>(*this, isArrowKey);
+    return hasCaret() ||
+           hasVariable<SnippetKeyVariable>(*this, [](const SnippetKeyVariable& key) { return key.isArrow(); });
 }
 
 bool SnippetExpandedContent::hasCaretOrFields() const {
@@ -83,7 +84,7 @@ std::int64_t SnippetExpandedContent::caretLocation() const {
     const SnippetContentCaret* caret = lastCaret(*this);
     std::int64_t location = caret != nullptr ? static_cast<std::int64_t>(caret->location) : -1;
     for (const auto& key : keys()) {
-        if (isReturnOrTab(*key)) ++location;
+        if (key->isReturnOrTab()) ++location;
     }
     return location;
 }
@@ -95,7 +96,7 @@ std::int64_t SnippetExpandedContent::caretDistanceFromEnding() const {
             return static_cast<std::int64_t>(string().size() + typed - caret->location);
         }
         const auto* key = dynamic_cast<const SnippetKeyVariable*>(variable->get());
-        if (key != nullptr && movesCaret(*key)) typed += key->count;
+        if (key != nullptr && key->movesCaret()) typed += key->count;
     }
     return 0;
 }
@@ -105,12 +106,28 @@ std::int64_t SnippetExpandedContent::caretDistanceFromEndingIgnoreKeys() const {
     return caret != nullptr ? static_cast<std::int64_t>(string().size() - caret->location) : 0;
 }
 
+std::vector<DeliveryStep> SnippetExpandedContent::deliverySteps() const {
+    const std::size_t textLength = string().size();
+    std::vector<DeliveryStep> steps;
+    std::size_t left = std::max(ExpansionContext::MaximumLength, textLength);
+    std::size_t position = 0;
+    const auto addUpTo = [&](std::size_t end, std::shared_ptr<SnippetKeyVariable> key) {
+        const std::size_t length = std::min(end > position ? end - position : 0, left);
+        steps.push_back({{position, length}, std::move(key)});
+        left -= length;
+        position = end;
+    };
+    for (const auto& key : keys()) addUpTo(std::min(key->location, textLength), key);
+    addUpTo(textLength, nullptr);
+    return steps;
+}
+
 std::u16string SnippetExpandedContent::copyString() const {
     const std::u16string& text = string();
     std::u16string result;
-    for (const DeliveryStep& step : deliverySteps(keys(), text.size())) {
+    for (const DeliveryStep& step : deliverySteps()) {
         result.append(text, step.text.location, step.text.length);
-        if (step.key && isReturnOrTab(*step.key)) result.push_back(u' ');
+        if (step.key && step.key->isReturnOrTab()) result.push_back(u' ');
     }
     return result;
 }

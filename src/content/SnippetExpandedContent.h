@@ -7,13 +7,21 @@
 #include <variant>
 #include <vector>
 
+#include "Foundation/Strings.h"
 #include "Foundation/text/AttributedString.h"
-#include "content/SnippetVariable.h"
+#include "content/SnippetAbbreviationVariable.h"
+#include "content/SnippetFieldVariable.h"
+#include "content/SnippetKeyVariable.h"
 
 namespace plume {
 
 class PLScript;
-class Snippet;
+
+// A stretch of the text, which may be empty, and the key behind it; null behind the last one.
+struct DeliveryStep {
+    Range text;
+    std::shared_ptr<SnippetKeyVariable> key;
+};
 
 // Made by the parser, filled by the form and the scripts, delivered by the input service; one thread at a time has it.
 class SnippetExpandedContent {
@@ -52,6 +60,10 @@ class SnippetExpandedContent {
     std::int64_t caretDistanceFromEnding() const;
     std::int64_t caretDistanceFromEndingIgnoreKeys() const;
 
+    // In which order text and keys are delivered. A key located before its predecessor brings the text back to its
+    // place, so that what follows is delivered again. That has an end: beyond ExpansionContext::MaximumLength units in
+    // all, keys come without text.
+    std::vector<DeliveryStep> deliverySteps() const;
     // The text for placing on a clipboard: Return and Tab keys become spaces, other keys nothing.
     std::u16string copyString() const;
     // Appends the suffix, unstyled; variables keep their places.

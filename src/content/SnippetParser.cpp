@@ -4,7 +4,6 @@
 
 #include "content/ExpansionContext.h"
 #include "content/PlaceholderScanner.h"
-#include "library/SnippetUtils.h"
 
 namespace plume {
 
@@ -61,20 +60,6 @@ SnippetParser::Expansion SnippetParser::parse(const std::shared_ptr<Snippet>& sn
                                               const AttributedString& richTextContent, const Groups& groups) {
     return expandWithin(environment_, snippet, groups, richTextContent.length(),
                         [&](ExpansionContext& context) { return expandRichText(context, richTextContent); });
-}
-
-std::shared_ptr<Snippet> SnippetParser::findSnippetBySnippetAbbreviationVariable(
-    const SnippetAbbreviationVariable& variable, const Snippet& snippet, const Groups& groups) {
-    const std::optional<std::u16string>& abbreviation = variable.abbreviation;
-    std::shared_ptr<Snippet> found;
-    if (variable.uuid) {
-        found = SnippetUtils::findSnippetByUUID(*variable.uuid, groups);
-    } else if (abbreviation) {
-        found = SnippetUtils::findSnippetByAbbreviation(*abbreviation, groups, true);
-    }
-    if (found || !abbreviation) return found;
-    if (const auto ownGroup = snippet.parentGroup()) found = ownGroup->findSnippetWithAbbreviation(*abbreviation);
-    return found ? found : SnippetUtils::findSnippetByAbbreviation(*abbreviation, groups);
 }
 
 }  // namespace plume

@@ -2,6 +2,8 @@
 #include <algorithm>
 #include <utility>
 
+#include "content/FieldMerging.h"
+#include "content/NestedScripts.h"
 #include "engine/SendingPipeline.h"
 #include "engine/SlowActivation.h"
 
@@ -54,8 +56,8 @@ void SendingPipeline::fieldsEditorAction(FieldsEditor& editor) {
 }
 
 void SendingPipeline::fieldsEditorDidClose(EngineState& engine, const Expansion& content) {
-    SnippetParser::mergeFields(*content);
-    SnippetParser::processScripts(*content);
+    mergeFields(*content);
+    processScripts(*content);
     if (content->scripts.empty()) {
         engine.setUndoInfo(std::nullopt);
         sendContent(engine, content->originalSnippet, content, SnippetTrigger::Digit, nullptr);
@@ -70,7 +72,7 @@ void SendingPipeline::executeScripts(EngineState& engine, const Expansion& conte
     performInBackground(
         [&runner = dependencies_.scriptRunner, content] {
             for (const auto& script : content->scripts) script->execute(runner);
-            SnippetParser::mergeScriptResults(*content);
+            mergeScriptResults(*content);
         },
         [this, &engine, content] {
             engine.setUndoInfo(std::nullopt);

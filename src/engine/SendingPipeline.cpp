@@ -3,6 +3,7 @@
 
 #include <utility>
 
+#include "content/NestedScripts.h"
 #include "content/SnippetContentCase.h"
 
 namespace plume {
@@ -94,7 +95,7 @@ bool SendingPipeline::sendSnippet(EngineState& engine, const std::shared_ptr<Sni
     if (!content->fields().empty()) {
         sendByForm(delivery);
     } else {
-        SnippetParser::processScripts(*content);
+        processScripts(*content);
         if (content->scripts.empty()) {
             sendAtOnce(delivery);
         } else {

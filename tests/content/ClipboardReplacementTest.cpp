@@ -1,4 +1,5 @@
 #include "content/ClipboardReplacement.h"
+#include "content/ExpansionContext.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
@@ -6,22 +7,19 @@
 #include <chrono>
 
 #include "Foundation/Strings.h"
-#include "tests/content/ContentWorld.h"
+#include "tests/content/world/ContentWorld.h"
 
 namespace plume {
 namespace {
 
-class Reports {
-  public:
-    Reports() {
-        environment_.report = [this](const std::string& sentence) { sentences_.push_back(sentence); };
+// Collects what is reported.
+struct Reports {
+    ContentEnvironment environment() {
+        ContentEnvironment result;
+        result.report = [this](const std::string& sentence) { sentences.push_back(sentence); };
+        return result;
     }
-    const ContentEnvironment& environment() const { return environment_; }
-    const std::vector<std::string>& sentences() const { return sentences_; }
-
-  private:
-    ContentEnvironment environment_;
-    std::vector<std::string> sentences_;
+    std::vector<std::string> sentences;
 };
 
 SnippetClipboardVariable variable(const std::u16string& find, const std::u16string& replacement, int flags) {
@@ -33,7 +31,7 @@ SnippetClipboardVariable variable(const std::u16string& find, const std::u16stri
 template <class Content>
 Content process(const SnippetClipboardVariable& variable, const Content& content,
                 const ContentEnvironment& environment) {
-    std::chrono::nanoseconds timeLeft = SnippetParser::MaximumPatternTime;
+    std::chrono::nanoseconds timeLeft = ExpansionContext::MaximumPatternTime;
     return processClipboardVariable(variable, content, environment, timeLeft);
 }
 
@@ -48,18 +46,16 @@ SharedAttributes size(double points) {
     return std::make_shared<const TextAttributes>(attributes);
 }
 
-struct FlagsCase {
-    int flags;
-    const char16_t* result;
-};
-
 TEST(ClipboardReplacement, FollowsEveryCombinationOfFlags) {
-    const FlagsCase cases[] = {
+    const struct {
+        int flags;
+        const char16_t* result;
+    } cases[] = {
         {0, u"# #x y# y#x ax"},   {2, u"# #x ya. yA.x ax"},   {4, u"# A.x ya. yA.x ax"},  {6, u"# A.x y# yA.x ax"},
         {8, u"# A.x y# yA.x ax"}, {10, u"# A.x ya. yA.x ax"}, {12, u"# A.x ya. yA.x ax"}, {14, u"# A.x y# yA.x ax"},
         {1, u"# #x y# y#x #"},    {3, u"# #x y# y#x #"},      {5, u"# #x y# y#x #"},      {7, u"# #x y# y#x #"},
         {9, u"# A.x y# yA.x #"},  {11, u"# A.x y# yA.x #"},   {13, u"# A.x y# yA.x #"},   {15, u"# A.x y# yA.x #"}};
-    for (const FlagsCase& c : cases) {
+    for (const auto& c : cases) {
         EXPECT_EQ(toUtf8(replaced(u"a.", u"#", c.flags, u"a. A.x ya. yA.x ax")), toUtf8(c.result)) << c.flags;
     }
 }
@@ -77,8 +73,6 @@ TEST(ClipboardReplacement, ReplacesPlainText) {
     const ReplacementCase cases[] = {
         {"nothing to find", u"", u"x", 1, u"a", u"a"},
         {"empty content", u"a", u"x", 0, u"", u""},
-        {"anywhere", u"a", u"b", 0, u"a ab ba", u"b bb bb"},
-        {"whole words", u"a", u"b", 4, u"a ab ba", u"b ab ba"},
         {"whole words side by side", u"a", u"b", 4, u"a,a a", u"b,b b"},
         {"whole words in other scripts", u"été", u"x", 4, u"été étés l'été (été)", u"x étés l'x (x)"},
         {"underscores and digits belong to words", u"a", u"b", 4, u"a_ a1 _a a", u"a_ a1 _a b"},
@@ -86,10 +80,7 @@ TEST(ClipboardReplacement, ReplacesPlainText) {
         {"find text that ends in a backslash", u"a\\", u"x", 2, u"a\\ a", u"x a"},
         {"find text full of syntax", u"[(*\\Q", u"x", 6, u"[(*\\Q", u"x"},
         {"literal replacement stays literal", u"a", u"$0\\", 0, u"a", u"$0\\"},
-        {"removal", u" ", u"", 0, u"a b c", u"abc"},
-        {"groups", u"(\\w+)@(\\w+)", u"$2 at $1", 1, u"me@home", u"home at me"},
         {"named group", u"(?<user>\\w+)@", u"${user}!", 1, u"me@home", u"me!home"},
-        {"whole match", u"a", u"[$0]", 4, u"a ba", u"[a] ba"},
         {"group that took no part", u"(a)|b", u"<$1>", 1, u"ab", u"<a><>"},
         {"digit after the last group", u"(a)", u"$12", 1, u"a", u"a2"},
         {"escaped dollar", u"a", u"\\$1", 1, u"a", u"$1"},
@@ -107,12 +98,6 @@ TEST(ClipboardReplacement, ReplacesPlainText) {
     }
 }
 
-TEST(ClipboardReplacement, DefaultsToRemovingWithoutAReplacement) {
-    SnippetClipboardVariable removal;
-    removal.find = u"a";
-    EXPECT_EQ(process(removal, std::u16string(u"banana"), ContentEnvironment()), u"bnn");
-}
-
 TEST(ClipboardReplacement, LeavesTheContentAndReportsOnceWhatCannotWork) {
     const ReplacementCase cases[] = {{"unbalanced", u"(one", u"x", 1, u"(one", u""},
                                      {"no such group", u"two", u"$9", 1, u"two", u""},
@@ -128,49 +113,36 @@ TEST(ClipboardReplacement, LeavesTheContentAndReportsOnceWhatCannotWork) {
             const AttributedString rich(c.content, size(9));
             EXPECT_EQ(process(pattern, rich, reports.environment()), rich) << c.what;
         }
-        EXPECT_EQ(reports.sentences().size(), 1U) << c.what;
+        EXPECT_EQ(reports.sentences.size(), 1U) << c.what;
     }
 }
 
 TEST(ClipboardReplacement, GivesUpOnPatternsThatExplode) {
     const std::u16string explosive = std::u16string(5'000, u'a') + u"b";
-    const std::u16string deep = std::u16string(3'000'000, u'a');
-    const struct {
-        std::u16string find;
-        const std::u16string& content;
-    } cases[] = {{u"(a+)+$", explosive}, {u"(a|aa)+$", explosive}, {u"(?:a|b)*c", deep}};
-    for (const auto& c : cases) {
+    const std::pair<std::u16string, std::u16string> cases[] = {
+        {u"(a+)+$", explosive}, {u"(a|aa)+$", explosive}, {u"(?:a|b)*c", std::u16string(3'000'000, u'a')}};
+    for (const auto& [find, content] : cases) {
         Reports reports;
+        std::chrono::nanoseconds timeLeft = std::chrono::hours(1);
         const auto start = std::chrono::steady_clock::now();
-        EXPECT_EQ(process(variable(c.find, u"x", 1), c.content, reports.environment()), c.content);
-        EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2)) << toUtf8(c.find);
-        EXPECT_EQ(reports.sentences().size(), 1U) << toUtf8(c.find);
+        EXPECT_EQ(processClipboardVariable(variable(find, u"x", 1), content, reports.environment(), timeLeft), content);
+        EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2)) << toUtf8(find);
+        EXPECT_LT(timeLeft, std::chrono::hours(1)) << toUtf8(find);
+        EXPECT_EQ(reports.sentences.size(), 1U) << toUtf8(find);
     }
 }
 
-TEST(ClipboardReplacement, TakesTimeOffForPatternsAlone) {
-    const std::u16string content = std::u16string(5'000, u'a') + u"b";
-    const ContentEnvironment environment;
-    std::chrono::nanoseconds timeLeft = std::chrono::hours(1);
-    processClipboardVariable(variable(u"a", u"x", 8), content, environment, timeLeft);
-    EXPECT_EQ(timeLeft, std::chrono::hours(1));
-    processClipboardVariable(variable(u"(a+)+$", u"x", 1), content, environment, timeLeft);
-    EXPECT_LT(timeLeft, std::chrono::hours(1) - std::chrono::milliseconds(50));
-}
-
-TEST(ClipboardReplacement, SearchesForNoPatternWhenTheTimeIsUp) {
+TEST(ClipboardReplacement, SearchesForNoPatternWhenTheTimeIsUpButAlwaysForText) {
     Reports reports;
     std::chrono::nanoseconds timeLeft{0};
-    const auto processed = [&](const SnippetClipboardVariable& variable) {
-        const AttributedString rich =
-            processClipboardVariable(variable, AttributedString(u"up"), reports.environment(), timeLeft);
-        EXPECT_EQ(processClipboardVariable(variable, rich.string(), reports.environment(), timeLeft), rich.string());
-        return toUtf8(rich.string());
-    };
-    EXPECT_EQ(processed(variable(u"u", u"x", 0)), "xp");
-    EXPECT_EQ(processed(variable(u"u", u"x", 1)), "up");
-    EXPECT_EQ(processed(variable(u"u", u"x", 2)), "up");
-    EXPECT_EQ(reports.sentences().size(), 1U);
+    for (const auto& [flags, expected] : {std::pair(0, u"xp"), std::pair(1, u"up"), std::pair(2, u"up")}) {
+        const auto asked = variable(u"u", u"x", flags);
+        EXPECT_EQ(processClipboardVariable(asked, u"up", reports.environment(), timeLeft), expected);
+        const AttributedString rich(u"up");
+        EXPECT_EQ(processClipboardVariable(asked, rich, reports.environment(), timeLeft).string(), expected);
+    }
+    EXPECT_EQ(timeLeft, std::chrono::nanoseconds(0)) << "text takes no time off";
+    EXPECT_EQ(reports.sentences.size(), 1U);
 }
 
 TEST(ClipboardReplacement, HoldsAnExpansionUpNoLongerForManyPatternsThatExplode) {
@@ -184,9 +156,8 @@ TEST(ClipboardReplacement, HoldsAnExpansionUpNoLongerForManyPatternsThatExplode)
     }
     for (const ContentType type : {ContentType::PlainText, ContentType::RichText}) {
         const auto start = std::chrono::steady_clock::now();
-        const auto expansion = world.expand(content, type);
+        EXPECT_EQ(toUtf8(world.expand(content, type)->string()), unchanged);
         EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(2));
-        EXPECT_EQ(toUtf8(expansion->string()), unchanged);
     }
     EXPECT_GE(world.reports.size(), 30U);
 }
@@ -212,10 +183,10 @@ TEST(ClipboardReplacement, RefusesResultsThatGrowWithoutMeasure) {
     Reports reports;
     EXPECT_EQ(process(variable(u".*grow|.+", copies, 1), content, reports.environment()), content);
     EXPECT_EQ(process(variable(u"a", std::u16string(10'000, u'x'), 0), content, reports.environment()), content);
-    EXPECT_EQ(reports.sentences().size(), 2U);
+    EXPECT_EQ(reports.sentences.size(), 2U);
 }
 
-TEST(ClipboardReplacement, GivesTheReplacementTheLookOfWhatItReplaces) {
+TEST(ClipboardReplacement, GivesTheReplacementTheLookOfWhatStoodThere) {
     AttributedString content(u"one ", size(1));
     content.append(u"two", size(2));
     content.append(u" three", size(3));
@@ -223,21 +194,16 @@ TEST(ClipboardReplacement, GivesTheReplacementTheLookOfWhatItReplaces) {
     expected.append(u"zwei drei", size(2));
     EXPECT_EQ(process(variable(u"two three", u"zwei drei", 0), content, ContentEnvironment()), expected);
     EXPECT_EQ(process(variable(u"(two) three", u"zwei drei", 1), content, ContentEnvironment()), expected);
-}
 
-TEST(ClipboardReplacement, GivesTextAtAnEmptyMatchTheLookOfWhatStandsBefore) {
-    AttributedString content(u"ab", size(1));
-    content.append(u"cd", size(2));
-    AttributedString expected(u"ab|", size(1));
-    expected.append(u"cd", size(2));
-    EXPECT_EQ(process(variable(u"(?=c)", u"|", 1), content, ContentEnvironment()), expected);
-}
+    AttributedString marked(u"one |", size(1));  // at an empty match: of what stands before
+    marked.append(u"two", size(2));
+    marked.append(u" three", size(3));
+    EXPECT_EQ(process(variable(u"(?=two)", u"|", 1), content, ContentEnvironment()), marked);
 
-TEST(ClipboardReplacement, PutsNoFileBehindTextThatReplacesOne) {
     TextAttributes file;
     file.attachment = std::make_shared<const TextAttachment>(TextAttachment{u"a.png", "bytes", u""});
-    const AttributedString content(u"\uFFFC", std::make_shared<const TextAttributes>(file));
-    EXPECT_EQ(process(variable(u"\uFFFC", u"x", 0), content, ContentEnvironment()), AttributedString(u"x"));
+    const AttributedString attached(u"\uFFFC", std::make_shared<const TextAttributes>(file));
+    EXPECT_EQ(process(variable(u"\uFFFC", u"x", 0), attached, ContentEnvironment()), AttributedString(u"x"));
 }
 
 TEST(ClipboardReplacement, RewritesRichTextOfManyRuns) {

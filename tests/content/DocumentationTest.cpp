@@ -10,8 +10,10 @@
 #include <stdexcept>
 
 #include "Foundation/Strings.h"
+#include "content/NestedScripts.h"
+#include "content/OldSyntax.h"
 #include "library/Snippet.h"
-#include "tests/content/ContentWorld.h"
+#include "tests/content/world/ContentWorld.h"
 
 namespace plume {
 namespace {
@@ -114,9 +116,9 @@ std::string shown(const SnippetVariable& variable) {
 
 // The content with a sign for everything in it that is no text.
 std::string shown(SnippetExpandedContent& content) {
-    SnippetParser::processScripts(content);
+    processScripts(content);
     for (const auto& script : content.scripts) script->result = u"⟨script " + script->script + u"⟩";
-    SnippetParser::mergeScriptResults(content);
+    mergeScriptResults(content);
 
     struct Sign {
         std::size_t location;
@@ -146,7 +148,7 @@ std::string expanded(const Line& example, ContentType type, const std::vector<Li
 std::string converted(const Line& example) {
     ContentWorld world;
     const auto snippet = world.snippet(example.left);
-    SnippetParser::convertOldSnippet(*snippet);
+    convertOldSnippet(*snippet);
     return toUtf8(*snippet->plainTextContent());
 }
 

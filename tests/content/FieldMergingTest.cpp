@@ -1,12 +1,12 @@
-// Putting the values of the fill-in form into the content.
-#include <gmock/gmock.h>
+#include "content/FieldMerging.h"
+
+#include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
 #include <memory>
 
 #include "Foundation/Strings.h"
-#include "content/SnippetParser.h"
-#include "tests/content/ContentWorld.h"
+#include "tests/content/world/ContentWorld.h"
 
 namespace plume {
 namespace {
@@ -33,28 +33,6 @@ std::shared_ptr<SnippetAbbreviationVariable> addScript(SnippetExpandedContent& c
     return script;
 }
 
-TEST(FieldMerging, InsertsValuesAndMovesWhatFollows) {
-    SnippetExpandedContent content(u"ab");
-    addField(content, 0, u"123");
-    const auto key = addVariable<SnippetKeyVariable>(content, 1);
-    addField(content, 1, u"4567");
-    const auto caret = addVariable<SnippetContentCaret>(content, 2);
-    SnippetParser::mergeFields(content);
-    EXPECT_EQ(content.string(), u"123a4567b");
-    EXPECT_EQ(key->location, 4u);
-    EXPECT_EQ(caret->location, 9u);
-    EXPECT_EQ(content.variables.size(), 4u);
-}
-
-TEST(FieldMerging, FieldsAtOnePlaceKeepTheirOrder) {
-    SnippetExpandedContent content(u"<>");
-    addField(content, 1, u"a");
-    addField(content, 1, u"b");
-    addField(content, 1, u"c");
-    SnippetParser::mergeFields(content);
-    EXPECT_EQ(content.string(), u"<abc>");
-}
-
 TEST(FieldMerging, UnusedFieldsBecomeEmpty) {
     SnippetExpandedContent content(u"<>");
     const auto missing = addField(content, 1, std::nullopt);
@@ -64,27 +42,28 @@ TEST(FieldMerging, UnusedFieldsBecomeEmpty) {
     ticked->isOptional = true;
     ticked->isSelected = true;
     const auto caret = addVariable<SnippetContentCaret>(content, 2);
-    SnippetParser::mergeFields(content);
-    EXPECT_EQ(content.string(), u"<y>");
+    addField(content, 7, u"!");  // past the end
+    mergeFields(content);
+    EXPECT_EQ(content.string(), u"<y>!");
     EXPECT_EQ(missing->value, u"");
     EXPECT_EQ(unticked->value, u"");
     EXPECT_EQ(caret->location, 3u);
 }
 
 TEST(FieldMerging, RichContentTakesRichValuesAndFieldAttributes) {
-    SnippetExpandedContent content(rich("a*b*c"));
-    addField(content, 1, u"x")->attributes = rich("_i_").attributesAt(0);
-    addField(content, 2, u"yz")->richTextValue = rich("*y*_z_");
-    addField(content, 3, u"w");
-    SnippetParser::mergeFields(content);
-    EXPECT_EQ(notation(content), "a_x_*by*_z_cw");
-}
-
-TEST(FieldMerging, PlainContentTakesNoRichValues) {
-    SnippetExpandedContent content(u"<>");
-    addField(content, 1, u"x")->richTextValue = rich("*rich*");
-    SnippetParser::mergeFields(content);
-    EXPECT_EQ(notation(content), "<x>");
+    for (const bool isRich : {false, true}) {
+        SnippetExpandedContent content;
+        if (isRich) {
+            content.setContent(rich("a*b*c"));
+        } else {
+            content.setContent(u"abc");
+        }
+        addField(content, 1, u"x")->attributes = rich("_i_").attributesAt(0);
+        addField(content, 2, u"yz")->richTextValue = rich("*y*_z_");
+        addField(content, 3, u"w");
+        mergeFields(content);
+        EXPECT_EQ(notation(content), isRich ? "a_x_*by*_z_cw" : "axbyzcw");
+    }
 }
 
 TEST(FieldMerging, UntickedRichValuesStayAndMoveWhatFollows) {
@@ -93,7 +72,7 @@ TEST(FieldMerging, UntickedRichValuesStayAndMoveWhatFollows) {
     field->isOptional = true;
     field->richTextValue = rich("*Jo*");
     const auto caret = addVariable<SnippetContentCaret>(content, 2);
-    SnippetParser::mergeFields(content);
+    mergeFields(content);
     EXPECT_EQ(notation(content), "<*Jo*>");
     EXPECT_EQ(field->value, u"");
     EXPECT_EQ(caret->location, 4u);
@@ -108,7 +87,7 @@ TEST(FieldMerging, FieldsInAScriptLengthenIt) {
     addField(content, 6, u"6");   // where the inner script ends: behind it
     addField(content, 8, u"78");  // behind the outer one
     const auto last = addScript(content, 8, 1);
-    SnippetParser::mergeFields(content);
+    mergeFields(content);
     EXPECT_EQ(content.string(), u"a[12b(345c)6d]78e");
     const auto textOf = [&](const SnippetAbbreviationVariable& script) {
         return toUtf8(content.string().substr(script.location, script.scriptLength));
@@ -118,70 +97,36 @@ TEST(FieldMerging, FieldsInAScriptLengthenIt) {
     EXPECT_EQ(textOf(*last), "e");
 }
 
-TEST(FieldMerging, LocationsPastTheEndMeanTheEnd) {
-    SnippetExpandedContent content(u"ab");
-    addField(content, 7, u"c");
-    SnippetParser::mergeFields(content);
-    EXPECT_EQ(content.string(), u"abc");
-}
-
-// Fields in any order, next to each other or not, among carets and scripts: what comes out is what inserting one value
-// after the other, from the last field to the first, gives.
+// Fields in any order, next to each other or not, among carets: what comes out is what inserting one value after the
+// other, from the last field to the first, gives.
 RC_GTEST_PROP(FieldMerging, IsTheSameAsInsertingOneByOne, ()) {
     const auto plain = *rc::gen::container<std::u16string>(rc::gen::inRange<char16_t>(u'a', u'z'));
-    const bool isRich = *rc::gen::arbitrary<bool>();
-    SnippetExpandedContent content;
-    if (isRich) {
-        content.setContent(AttributedString(plain, rich("*b*").attributesAt(0)));
-    } else {
-        content.setContent(plain);
-    }
-    const auto size = static_cast<int>(plain.size());
+    SnippetExpandedContent content(plain);
+    if (*rc::gen::arbitrary<bool>()) content.setContent(AttributedString(plain, rich("*b*").attributesAt(0)));
+    std::vector<std::size_t> carets;  // where each is to stand in the end
+    std::size_t shift = 0;
     for (int count = *rc::gen::inRange(0, 8); count > 0; --count) {
-        const auto location = static_cast<std::size_t>(*rc::gen::inRange(0, size + 1));
+        const auto location = *rc::gen::inRange<std::size_t>(0, plain.size() + 1);
         if (*rc::gen::arbitrary<bool>()) {
-            addField(content, location, std::u16string(*rc::gen::inRange<std::size_t>(0, 4), u'0'));
+            const auto length = *rc::gen::inRange<std::size_t>(0, 4);
+            addField(content, location, std::u16string(length, static_cast<char16_t>(u'0' + count)));
+            shift += length;
         } else {
             addVariable<SnippetContentCaret>(content, location);
+            carets.push_back(location + shift);
         }
     }
-
     std::u16string expected = plain;
-    std::vector<std::size_t> locations;
-    std::size_t shift = 0;
-    for (const auto& variable : content.variables) {
-        const auto field = std::dynamic_pointer_cast<SnippetFieldVariable>(variable);
-        if (field) {
-            shift += field->value->size();
-        } else {
-            locations.push_back(variable->location + shift);
-        }
-    }
     const auto fields = content.fields();
     for (auto field = fields.rbegin(); field != fields.rend(); ++field) {
         expected.insert((*field)->location, *(*field)->value);
     }
-
-    SnippetParser::mergeFields(content);
+    mergeFields(content);
     RC_ASSERT(content.string() == expected);
     std::size_t next = 0;
     for (const auto& variable : content.variables) {
-        if (std::dynamic_pointer_cast<SnippetContentCaret>(variable))
-            RC_ASSERT(variable->location == locations[next++]);
+        if (std::dynamic_pointer_cast<SnippetContentCaret>(variable)) RC_ASSERT(variable->location == carets[next++]);
     }
-}
-
-TEST(FieldMerging, MergesWhatTheParserMade) {
-    ContentWorld world;
-    world.add("sh", "echo 【field:what】;", ContentType::ShellScript);
-    const auto content = world.expand("Dear 【field:name】,【snippet:sh】【|】");
-    content->fields()[0]->value = u"Jo";
-    content->fields()[1]->value = u"hello";
-    SnippetParser::mergeFields(*content);
-    EXPECT_EQ(notation(*content), "Dear Jo,echo hello;");
-    EXPECT_EQ(content->abbreviations()[0]->location, 8u);
-    EXPECT_EQ(content->abbreviations()[0]->scriptLength, 11u);
-    EXPECT_EQ(content->caretLocation(), 19);
 }
 
 }  // namespace

@@ -41,58 +41,27 @@ std::shared_ptr<PLScript> makeScript(std::u16string text, std::size_t location =
     return script;
 }
 
-TEST(PLScript, RunsItsTextAndKeepsTheResult) {
-    FakeRunner runner(inAngles);
-    PLScript script;
-    script.script = u"date";
-    script.isAppleScript = true;
-    script.execute(runner);
-    EXPECT_EQ(script.result, u"<date>");
-    EXPECT_THAT(runner.appleScripts, ElementsAre(u"date"));
-}
-
-TEST(PLScript, InsertsNestedResultsBeforeTheOuterScriptRuns) {
-    FakeRunner runner(inAngles);
-    auto outer = makeScript(u"echo  and ;");
-    outer->nestedScripts = {makeScript(u"one", 5), makeScript(u"two", 10)};
-    outer->execute(runner);
-    EXPECT_THAT(runner.ran, ElementsAre(u"one", u"two", u"echo <one> and <two>;"));
-    EXPECT_EQ(outer->result, u"<echo <one> and <two>;>");
-}
-
-TEST(PLScript, RunsEachLevelFromTheInsideOut) {
+TEST(PLScript, RunsFromTheInsideOut) {
     FakeRunner runner(inAngles);
     auto outer = makeScript(u"a");
     auto middle = makeScript(u"b", 1);
+    middle->isAppleScript = true;
     middle->nestedScripts = {makeScript(u"c", 0)};
     outer->nestedScripts = {middle, makeScript(u"d", 1)};
     outer->execute(runner);
     EXPECT_THAT(runner.ran, ElementsAre(u"c", u"<c>b", u"d", u"a<<c>b><d>"));
+    EXPECT_THAT(runner.appleScripts, ElementsAre(u"<c>b"));
+    EXPECT_EQ(outer->result, u"<a<<c>b><d>>");
 }
 
-TEST(PLScript, KeepsTheOrderOfResultsAtOnePlace) {
+TEST(PLScript, PutsInWhatResultsThereAreWhereverTheyBelong) {
     auto outer = makeScript(u"()");
-    outer->nestedScripts = {makeScript(u"", 1), makeScript(u"", 1)};
+    outer->nestedScripts = {makeScript(u"", 1), makeScript(u"", 1), makeScript(u"", 1), makeScript(u"", 99)};
     outer->nestedScripts[0]->result = u"first";
-    outer->nestedScripts[1]->result = u"second";
+    outer->nestedScripts[2]->result = u"second";
+    outer->nestedScripts[3]->result = u"end";
     outer->mergerNestedScriptResults();
-    EXPECT_EQ(outer->script, u"(firstsecond)");
-}
-
-TEST(PLScript, InsertsNothingForANestedScriptWithoutResult) {
-    FakeRunner runner([](std::u16string_view script) { return script == u"silent" ? std::nullopt : inAngles(script); });
-    auto outer = makeScript(u"ab");
-    outer->nestedScripts = {makeScript(u"silent", 1)};
-    outer->execute(runner);
-    EXPECT_EQ(outer->result, u"<ab>");
-}
-
-TEST(PLScript, BringsLocationsPastTheEndBackToTheEnd) {
-    FakeRunner runner(inAngles);
-    auto outer = makeScript(u"ab");
-    outer->nestedScripts = {makeScript(u"x", 99)};
-    outer->execute(runner);
-    EXPECT_EQ(runner.ran.back(), u"ab<x>");
+    EXPECT_EQ(outer->script, u"(firstsecond)end");
 }
 
 TEST(PLScript, AppendsTheSuffixToAnOutputThatIsNotEmpty) {

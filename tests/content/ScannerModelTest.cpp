@@ -3,8 +3,8 @@
 #include <rapidcheck/gtest.h>
 
 #include "Foundation/Strings.h"
-#include "tests/content/ContentWorld.h"
-#include "tests/content/InPlaceModel.h"
+#include "tests/content/world/ContentWorld.h"
+#include "tests/content/world/InPlaceModel.h"
 
 namespace plume {
 namespace {

@@ -4,7 +4,7 @@
 
 #include "Foundation/Strings.h"
 #include "library/SnippetUtils.h"
-#include "tests/content/ContentWorld.h"
+#include "tests/content/world/ContentWorld.h"
 
 namespace plume {
 namespace {

@@ -7,7 +7,7 @@
 
 #include "Foundation/Strings.h"
 #include "content/PLOutput.h"
-#include "tests/content/ContentWorld.h"
+#include "tests/content/world/ContentWorld.h"
 
 namespace plume {
 namespace {

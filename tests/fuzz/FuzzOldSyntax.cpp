@@ -4,7 +4,7 @@
 #include <string>
 
 #include "Foundation/Strings.h"
-#include "content/SnippetParser.h"
+#include "content/OldSyntax.h"
 
 namespace {
 
@@ -12,7 +12,7 @@ plume::AttributedString converted(const plume::AttributedString& content) {
     plume::Snippet snippet;
     snippet.setContentType(plume::ContentType::RichText);
     snippet.setRichTextContent(content);
-    plume::SnippetParser::convertOldSnippet(snippet);
+    plume::convertOldSnippet(snippet);
     return *snippet.richTextContent();
 }
 

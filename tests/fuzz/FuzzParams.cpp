@@ -4,14 +4,12 @@
 #include <string>
 
 #include "Foundation/Strings.h"
-#include "content/SnippetVariableUtils.h"
+#include "content/PlaceholderKinds.h"
 
 namespace {
 
-using plume::SnippetVariableUtils;
-
 std::u16string writtenBack(const std::u16string& body) {
-    const auto variable = SnippetVariableUtils::parseVariable(body);
+    const auto variable = plume::parseVariable(body);
     return variable ? variable->toString() : std::u16string();
 }
 
@@ -19,7 +17,7 @@ std::u16string writtenBack(const std::u16string& body) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const std::u16string text = plume::fromUtf8({reinterpret_cast<const char*>(data), size});
-    const auto params = SnippetVariableUtils::parseParams(u"field:" + SnippetVariableUtils::escapeParam(text));
+    const auto params = plume::parseParams(u"field:" + plume::escapeParam(text));
     if (params.size() != 1 || params.begin()->second != text) std::abort();
 
     // The first two may differ: what a kind does not keep (a pop-up menu its default index) goes on the way.

@@ -6,9 +6,11 @@
 #include <string_view>
 
 #include "Foundation/Strings.h"
+#include "content/FieldMerging.h"
+#include "content/NestedScripts.h"
 #include "content/PLOutput.h"
-#include "tests/content/ContentWorld.h"
-#include "tests/content/InPlaceModel.h"
+#include "tests/content/world/ContentWorld.h"
+#include "tests/content/world/InPlaceModel.h"
 
 namespace {
 
@@ -28,10 +30,10 @@ void deliver(plume::SnippetExpandedContent& content) {
     for (const auto& field : content.fields()) {
         if (!field->value) field->value = field->name;
     }
-    plume::SnippetParser::mergeFields(content);
-    plume::SnippetParser::processScripts(content);
+    plume::mergeFields(content);
+    plume::processScripts(content);
     for (const auto& script : content.scripts) script->result = script->script;
-    plume::SnippetParser::mergeScriptResults(content);
+    plume::mergeScriptResults(content);
     content.suffix = u".";
     content.applySuffix();
     plume::PLOutput output;

@@ -8,7 +8,7 @@
 
 #include "Foundation/Strings.h"
 #include "app/cli/CommandLine.h"
-#include "content/PLScript.h"
+#include "content/NestedScripts.h"
 #include "content/SnippetParser.h"
 #include "content/scripts/ShellScriptRunner.h"
 #include "library/SnippetUtils.h"
@@ -103,9 +103,9 @@ std::shared_ptr<Snippet> findSnippet(const ChosenLibrary& library, const std::u1
 }
 
 std::u16string runScripts(const Snippet& snippet, SnippetExpandedContent& content, ScriptRunner& runner) {
-    SnippetParser::processScripts(content);
+    processScripts(content);
     for (const auto& script : content.scripts) script->execute(runner);
-    SnippetParser::mergeScriptResults(content);
+    mergeScriptResults(content);
     if (!snippet.isScript()) return content.copyString();
     PLScript script;
     script.script = content.string();

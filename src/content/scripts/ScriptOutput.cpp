@@ -19,6 +19,13 @@ void readAll(ProcessStream& stream, std::string& bytes) {
 
 }  // namespace
 
+ScriptOutput ScriptOutput::notStarted(const Error& reason) {
+    ScriptOutput nothing;
+    nothing.end = ScriptEnd::NotStarted;
+    nothing.problem = reason.message;
+    return nothing;
+}
+
 void ScriptOutput::read(ProcessStream& outputStream, ProcessStream& errorStream) {
     outputStream.read(output);
     errorStream.read(error);

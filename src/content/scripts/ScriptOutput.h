@@ -8,6 +8,7 @@
 #include <optional>
 #include <string>
 
+#include "Foundation/Result.h"
 #include "platform/ProcessLauncher.h"
 
 namespace plume {
@@ -25,6 +26,8 @@ struct ScriptOutput {
     std::string error;
     ScriptEnd end = ScriptEnd::Finished;
     std::string problem;  // why it was not started
+
+    static ScriptOutput notStarted(const Error& reason);
 
     // Takes what has arrived by now.
     void read(ProcessStream& outputStream, ProcessStream& errorStream);

@@ -66,16 +66,12 @@ Result<ScriptProcess> newTaskForScript(std::string_view script, bool isAppleScri
 }
 
 ScriptOutput runScriptProcess(const ScriptProcess& script, ProcessLauncher& launcher, const ScriptWatch& watch) {
-    ScriptOutput written;
     const auto started = launcher.start(script.request);
-    if (!started) {
-        written.end = ScriptEnd::NotStarted;
-        written.problem = started.error().message;
-        return written;
-    }
+    if (!started) return ScriptOutput::notStarted(started.error());
+    ScriptOutput written;
     RunningProcess& process = *started.value();
     const std::array<ProcessStream*, 2> streams{&process.output(), &process.error()};
-    // Whether it has ended is asked before the streams are emptied, so that its last words are among what is read.
+    // Whether it has ended is asked before the streams are read, so that what it wrote last is read, too.
     while (!process.exitStatus()) {
         written.read(process.output(), process.error());
         if (const auto verdict = watch.verdict(written)) {

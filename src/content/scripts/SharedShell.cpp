@@ -35,13 +35,6 @@ std::string without(std::string_view text, std::string_view pattern) {
     return result.append(text.substr(position));
 }
 
-ScriptOutput notStarted(const Error& error) {
-    ScriptOutput result;
-    result.end = ScriptEnd::NotStarted;
-    result.problem = error.message;
-    return result;
-}
-
 }  // namespace
 
 SharedShell::~SharedShell() {
@@ -54,11 +47,11 @@ SharedShell::~SharedShell() {
 
 ScriptOutput SharedShell::run(std::string_view script, const ScriptWatch& watch) {
     auto prepared = prepare(script);
-    if (!prepared) return notStarted(prepared.error());
+    if (!prepared) return ScriptOutput::notStarted(prepared.error());
     const Task& task = prepared.value();
-    if (const auto handed = hand(task, watch); !handed) return notStarted(handed.error());
+    if (const auto sent = sendToShell(task, watch); !sent) return ScriptOutput::notStarted(sent.error());
     ScriptOutput written = follow(task, watch);
-    // The shell names the file in its messages; to the user the script is what was typed.
+    // The shell's messages name the file, which the user has never seen.
     written.error = without(written.error, task.file->path() + ": ");
     return written;
 }
@@ -83,7 +76,7 @@ Result<SharedShell::Task> SharedShell::prepare(std::string_view script) {
 // aliases. Everything is on one line, which the shell has read to its end before it runs any of it: what a script does
 // keeps the end marker from being written only when it ends or stops the shell, or, where the shell is bash, makes such
 // a function read-only. A script that no marker ends runs into its time limit, and the next one has a new shell.
-Result<void> SharedShell::hand(const Task& task, const ScriptWatch& watch) {
+Result<void> SharedShell::sendToShell(const Task& task, const ScriptWatch& watch) {
     const std::string command = "\\unset -f command; \\command ";
     const std::string line = command + ". " + quoted(task.file->path()) + " </dev/null >" +
                              quoted(task.output->path()) + " 2>" + quoted(task.error->path()) + "; " + command +
@@ -116,7 +109,7 @@ ScriptOutput SharedShell::follow(const Task& task, const ScriptWatch& watch) {
         if (hasExited || hasFinished) {
             written.readRest(*task.output, *task.error);
             if (!hasFinished) {
-                // It wrote these on its way out, when the script's streams were its own no longer.
+                // It wrote these while it exited, when the script's streams were its own no longer.
                 shellsOwn.readRest(shell_->output(), shell_->error());
                 written.output += shellsOwn.output;
                 written.error += shellsOwn.error;

@@ -30,7 +30,7 @@ class SharedShell {
     ScriptOutput run(std::string_view script, const ScriptWatch& watch);
 
   private:
-    // One script on its way through the shell.
+    // One script, with what the shell needs to run it.
     struct Task {
         std::unique_ptr<TemporaryFile> file;
         std::unique_ptr<NamedStream> output;
@@ -39,7 +39,7 @@ class SharedShell {
     };
 
     Result<Task> prepare(std::string_view script);
-    Result<void> hand(const Task& task, const ScriptWatch& watch);
+    Result<void> sendToShell(const Task& task, const ScriptWatch& watch);
     Result<void> startShell();
     ScriptOutput follow(const Task& task, const ScriptWatch& watch);
 

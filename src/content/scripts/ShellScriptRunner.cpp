@@ -68,11 +68,8 @@ ScriptOutput ShellScriptRunner::runInSharedShell(std::string_view script) {
 ScriptOutput ShellScriptRunner::runInOwnProcess(std::string_view script, bool isAppleScript) {
     if (stopped_) return stoppedBeforeStart();
     const auto prepared = newTaskForScript(script, isAppleScript, launcher_);
-    if (prepared) return runScriptProcess(prepared.value(), launcher_, ScriptWatch(limits_, stopped_));
-    ScriptOutput nothing;
-    nothing.end = ScriptEnd::NotStarted;
-    nothing.problem = prepared.error().message;
-    return nothing;
+    if (!prepared) return ScriptOutput::notStarted(prepared.error());
+    return runScriptProcess(prepared.value(), launcher_, ScriptWatch(limits_, stopped_));
 }
 
 bool ShellScriptRunner::canRunAppleScript() {

@@ -1,10 +1,11 @@
-#include "tests/content/InPlaceModel.h"
+#include "tests/content/world/InPlaceModel.h"
 
 #include <utility>
 
 #include "content/ClipboardReplacement.h"
+#include "content/PlaceholderKinds.h"
+#include "content/SnippetAbbreviationVariable.h"
 #include "content/SnippetDateTimeVariable.h"
-#include "content/SnippetVariableUtils.h"
 #include "library/Snippet.h"
 
 namespace plume {
@@ -71,7 +72,7 @@ std::size_t InPlaceModel::replace(InPlaceExpansion& expansion, const Range& rang
     const std::u16string body = expansion.text.substr(range.location + 1, range.length - 2);
     const std::u16string arrows = u"\u25C0\u25B2\u25B6\u25BC";
     const KeyCode arrowCodes[] = {KeyCode::Left, KeyCode::Up, KeyCode::Right, KeyCode::Down};
-    const auto variable = SnippetVariableUtils::parseVariable(body);
+    const auto variable = parseVariable(body);
     const bool isArrow = body.size() == 1 && arrows.find(body) != std::u16string::npos;
     if (!variable && body != u"|" && !isArrow) return range.end();
     --left_;
@@ -106,7 +107,7 @@ std::size_t InPlaceModel::replace(InPlaceExpansion& expansion, const Range& rang
 
 std::size_t InPlaceModel::replaceByNested(InPlaceExpansion& expansion, const Range& range,
                                           const std::shared_ptr<SnippetAbbreviationVariable>& variable) {
-    const auto nested = SnippetParser::findSnippetBySnippetAbbreviationVariable(*variable, *snippet_, groups_);
+    const auto nested = findSnippetBySnippetAbbreviationVariable(*variable, *snippet_, groups_);
     if (!nested || nested == snippet_) return putIn(expansion, range, u"");
     const auto content = nested->plainTextContent();
     if (variable->isOptional && nested->isSimpleSnippet()) {

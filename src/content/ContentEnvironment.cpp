@@ -1,4 +1,4 @@
-#include "content/ReportOnce.h"
+#include "content/ContentEnvironment.h"
 
 #include <algorithm>
 #include <deque>
@@ -24,8 +24,8 @@ bool isNew(const std::string& sentence) {
 
 }  // namespace
 
-void reportOnce(const ContentEnvironment& environment, const std::string& sentence) {
-    if (isNew(sentence)) environment.report(sentence);
+void ContentEnvironment::reportOnce(const std::string& sentence) const {
+    if (isNew(sentence)) report(sentence);
 }
 
 std::string quotedForReport(std::u16string_view text) {

@@ -1,11 +1,11 @@
-// Cutting nested scripts out of a content, and putting their output in.
+#include "content/NestedScripts.h"
+
 #include <algorithm>
 #include <unordered_map>
 #include <utility>
 #include <vector>
 
 #include "content/ContentRewriter.h"
-#include "content/SnippetParser.h"
 
 namespace plume {
 
@@ -125,7 +125,7 @@ std::size_t scriptsBeforeVariable(const SnippetExpandedContent& content, std::si
 
 }  // namespace
 
-void SnippetParser::processScripts(SnippetExpandedContent& content) {
+void processScripts(SnippetExpandedContent& content) {
     std::vector<Variable> variables = content.abbreviations();
     if (variables.empty()) return;
     std::stable_sort(variables.begin(), variables.end(), isLocatedBefore);
@@ -146,9 +146,9 @@ void SnippetParser::processScripts(SnippetExpandedContent& content) {
     for (const auto& variable : content.variables) variable->location = locationAfterCuts(variable->location, cuts);
 }
 
-std::shared_ptr<PLScript> SnippetParser::newScriptWithAbbreviationVariable(const Variable& variable,
-                                                                           std::u16string_view snippetContent,
-                                                                           std::vector<Variable>& variables) {
+std::shared_ptr<PLScript> newScriptWithAbbreviationVariable(const Variable& variable,
+                                                            std::u16string_view snippetContent,
+                                                            std::vector<Variable>& variables) {
     const Variable outer = variable;  // which may be an element of the list that changes here
     const Range range = rangeOfScript(*outer, snippetContent.size());
     const auto isApart = [&](const Variable& other) {
@@ -166,7 +166,7 @@ std::shared_ptr<PLScript> SnippetParser::newScriptWithAbbreviationVariable(const
     return cutter.finish().front().script;
 }
 
-void SnippetParser::mergeScriptResults(SnippetExpandedContent& content) {
+void mergeScriptResults(SnippetExpandedContent& content) {
     ContentRewriter rewriter(content.content);
     std::vector<std::size_t> inserted = {0};  // by the scripts before each
     for (const auto& script : content.scripts) {

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "content/ContentEnvironment.h"
+#include "content/ExpansionContext.h"
 #include "content/SnippetParser.h"
 
 namespace plume {
@@ -41,7 +42,7 @@ class InPlaceModel {
     std::shared_ptr<Snippet> snippet_;
     const SnippetParser::Groups& groups_;
     std::size_t left_;
-    std::chrono::nanoseconds patternTimeLeft_ = SnippetParser::MaximumPatternTime;
+    std::chrono::nanoseconds patternTimeLeft_ = ExpansionContext::MaximumPatternTime;
 };
 
 }  // namespace plume

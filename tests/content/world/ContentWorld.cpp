@@ -1,4 +1,4 @@
-#include "tests/content/ContentWorld.h"
+#include "tests/content/world/ContentWorld.h"
 
 #include <chrono>
 
