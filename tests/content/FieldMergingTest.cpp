@@ -26,13 +26,6 @@ std::shared_ptr<SnippetFieldVariable> addField(SnippetExpandedContent& content, 
     return field;
 }
 
-std::shared_ptr<SnippetAbbreviationVariable> addScript(SnippetExpandedContent& content, std::size_t location,
-                                                       std::size_t length) {
-    auto script = addVariable<SnippetAbbreviationVariable>(content, location);
-    script->scriptLength = length;
-    return script;
-}
-
 TEST(FieldMerging, UnusedFieldsBecomeEmpty) {
     SnippetExpandedContent content(u"<>");
     const auto missing = addField(content, 1, std::nullopt);
@@ -52,49 +45,40 @@ TEST(FieldMerging, UnusedFieldsBecomeEmpty) {
 
 TEST(FieldMerging, RichContentTakesRichValuesAndFieldAttributes) {
     for (const bool isRich : {false, true}) {
-        SnippetExpandedContent content;
-        if (isRich) {
-            content.setContent(rich("a*b*c"));
-        } else {
-            content.setContent(u"abc");
-        }
+        SnippetExpandedContent content(u"abc");
+        if (isRich) content.setContent(rich("a*b*c"));
         addField(content, 1, u"x")->attributes = rich("_i_").attributesAt(0);
         addField(content, 2, u"yz")->richTextValue = rich("*y*_z_");
-        addField(content, 3, u"w");
+        const auto unticked = addField(content, 3, u"Jo");
+        unticked->isOptional = true;
+        unticked->richTextValue = rich("*Jo*");
+        const auto caret = addVariable<SnippetContentCaret>(content, 3);
         mergeFields(content);
-        EXPECT_EQ(notation(content), isRich ? "a_x_*by*_z_cw" : "axbyzcw");
+        EXPECT_EQ(notation(content), isRich ? "a_x_*by*_z_c*Jo*" : "axbyzc") << "an unticked rich value stays";
+        EXPECT_EQ(unticked->value, u"");
+        EXPECT_EQ(caret->location, content.string().size());
     }
-}
-
-TEST(FieldMerging, UntickedRichValuesStayAndMoveWhatFollows) {
-    SnippetExpandedContent content(rich("<>"));
-    const auto field = addField(content, 1, u"Jo");
-    field->isOptional = true;
-    field->richTextValue = rich("*Jo*");
-    const auto caret = addVariable<SnippetContentCaret>(content, 2);
-    mergeFields(content);
-    EXPECT_EQ(notation(content), "<*Jo*>");
-    EXPECT_EQ(field->value, u"");
-    EXPECT_EQ(caret->location, 4u);
 }
 
 TEST(FieldMerging, FieldsInAScriptLengthenIt) {
     SnippetExpandedContent content(u"a[b(c)d]e");
-    const auto outer = addScript(content, 1, 7);
+    const auto addScript = [&](std::size_t location, std::size_t length) {
+        addVariable<SnippetAbbreviationVariable>(content, location)->scriptLength = length;
+    };
+    addScript(1, 7);
     addField(content, 2, u"12");
-    const auto inner = addScript(content, 3, 3);
+    addScript(3, 3);
     addField(content, 4, u"345");
     addField(content, 6, u"6");   // where the inner script ends: behind it
     addField(content, 8, u"78");  // behind the outer one
-    const auto last = addScript(content, 8, 1);
+    addScript(8, 1);
     mergeFields(content);
     EXPECT_EQ(content.string(), u"a[12b(345c)6d]78e");
-    const auto textOf = [&](const SnippetAbbreviationVariable& script) {
-        return toUtf8(content.string().substr(script.location, script.scriptLength));
-    };
-    EXPECT_EQ(textOf(*outer), "[12b(345c)6d]");
-    EXPECT_EQ(textOf(*inner), "(345c)");
-    EXPECT_EQ(textOf(*last), "e");
+    std::vector<std::u16string> scripts;
+    for (const auto& script : content.abbreviations()) {
+        scripts.push_back(content.string().substr(script->location, script->scriptLength));
+    }
+    EXPECT_EQ(scripts, (std::vector<std::u16string>{u"[12b(345c)6d]", u"(345c)", u"e"}));
 }
 
 // Fields in any order, next to each other or not, among carets: what comes out is what inserting one value after the

@@ -106,16 +106,5 @@ TEST(NestedSnippets, InclusionWithoutEndIsRefusedAndReported) {
     EXPECT_THAT(world.reports, SizeIs(7));
 }
 
-TEST(NestedSnippets, AFiniteDoublingIsExpanded) {
-    ContentWorld world;
-    world.add("d0", "x");
-    for (int level = 1; level <= 13; ++level) {
-        const std::string below = "【snippet:d" + std::to_string(level - 1) + "】";
-        world.add("d" + std::to_string(level), below + below);
-    }
-    EXPECT_EQ(notation(*world.expand("【snippet:d13】")), std::string(8192, 'x'));
-    EXPECT_EQ(notation(*world.expand("*【snippet:d13】*", ContentType::RichText)), "*" + std::string(8192, 'x') + "*");
-}
-
 }  // namespace
 }  // namespace plume

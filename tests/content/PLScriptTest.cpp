@@ -65,19 +65,15 @@ TEST(PLScript, PutsInWhatResultsThereAreWhereverTheyBelong) {
 }
 
 TEST(PLScript, AppendsTheSuffixToAnOutputThatIsNotEmpty) {
-    struct Case {
-        std::optional<std::u16string> output, suffix, expected;
-    };
-    const Case cases[] = {
-        {u"out", u".", u"out."}, {u"out", std::nullopt, u"out"},     {u"out", u"", u"out"},
-        {u"", u".", u""},        {std::nullopt, u".", std::nullopt},
-    };
-    for (const Case& c : cases) {
-        FakeRunner runner([&](std::u16string_view) { return c.output; });
+    using Text = PLScript::Text;
+    const Text cases[][3] = {
+        {u"out", u".", u"out."}, {u"out", std::nullopt, u"out"}, {u"", u".", u""}, {std::nullopt, u".", std::nullopt}};
+    for (const auto& [output, suffix, expected] : cases) {
+        FakeRunner runner([&result = output](std::u16string_view) { return result; });
         PLScript script;
-        script.suffix = c.suffix;
+        script.suffix = suffix;
         script.execute(runner);
-        EXPECT_EQ(script.result, c.expected);
+        EXPECT_EQ(script.result, expected);
     }
 }
 

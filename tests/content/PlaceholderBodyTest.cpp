@@ -38,14 +38,5 @@ RC_GTEST_PROP(PlaceholderBody, EscapedParametersAreReadBackAsTheyWere, ()) {
     RC_ASSERT(params == (VariableParams{{u"first", first}, {u"second", second}}));
 }
 
-TEST(PlaceholderBody, QuotesOnlyWhatNeedsIt) {
-    EXPECT_EQ(escapeParam(u"short"), u"short");
-    EXPECT_EQ(escapeParam(u""), u"");
-    EXPECT_EQ(escapeParam(u"a\nb"), u"a\nb");
-    EXPECT_EQ(escapeParam(u"a b"), u"\"a b\"");
-    EXPECT_EQ(escapeParam(u"HH:mm"), u"\"HH:mm\"");
-    EXPECT_EQ(escapeParam(u"5\""), u"\"5\"\"\"");
-}
-
 }  // namespace
 }  // namespace plume

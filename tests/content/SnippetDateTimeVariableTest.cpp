@@ -47,8 +47,6 @@ TEST(SnippetDateTimeVariable, WritesStylesAndPatternsOfItsLocale) {
         {u"date:full locale:ja_JP", "2026年1月31日土曜日"},
         {u"date:long locale:ar_EG", "٣١ يناير ٢٠٢٦"},
         {u"date:yyyy-MM-dd locale:ar_EG", "٢٠٢٦-٠١-٣١"},
-        {u"date:\"'Day' D 'of' yyyy\"", "Day 31 of 2026"},
-        {u"date:\"HH:mm:ss\"", "10:05:09"},
         {u"date:full locale:", "Saturday, January 31, 2026"},
         {u"date:", ""},
         {u"date:yyyy locale:\"no such: thing\"", "2026"},
@@ -96,7 +94,6 @@ TEST(SnippetDateTimeVariable, MayBeUsedFromSeveralThreads) {
 
 TEST(SnippetDateVariable, CountsAsTheCalendarAndTheClocksOfThePlaceDo) {
     const Date leapDay = sys_days(2024y / 2 / 29) + 23h;
-    const Date spring = sys_days(2026y / 3 / 28) + 11h;
     const struct {
         const char* timeZone;
         std::u16string offsets;
@@ -104,23 +101,18 @@ TEST(SnippetDateVariable, CountsAsTheCalendarAndTheClocksOfThePlaceDo) {
         Date result;
     } cases[] = {
         {"UTC", u"", Now, Now},
-        {"UTC", u"day:0", Now, Now},
         {"UTC", u"day:-31", Now, sys_days(2025y / 12 / 31)},
         {"UTC", u"month:1", Now, sys_days(2026y / 3 / 3)},
-        {"UTC", u"month:14", Now, sys_days(2027y / 3 / 31)},
-        {"UTC", u"month:-2", Now, sys_days(2025y / 12 / 1)},
         {"UTC", u"month:1 day:-3", Now, sys_days(2026y / 2 / 28)},
         {"UTC", u"day:1 weekday:4", Now, sys_days(2026y / 2 / 1)},
         {"UTC", u"year:-326", Now, sys_days(1700y / 1 / 31)},
         {"UTC", u"year:1", leapDay, sys_days(2025y / 3 / 1)},
         {"UTC", u"year:-1 month:12", leapDay, sys_days(2024y / 2 / 29)},
-        {"UTC", u"day:366", leapDay, sys_days(2025y / 3 / 1)},
         // Weekdays past Saturday count from Sunday again.
         {"UTC", u"valueType:1 weekday:7", Now, sys_days(2026y / 2 / 1)},
         {"UTC", u"valueType:2 weekday:-1", Now, sys_days(2026y / 1 / 24)},
-        // Before, over and back over a change of clocks.
-        {"Europe/Berlin", u"day:1", spring, sys_days(2026y / 3 / 28) + 23h},
-        {"Europe/Berlin", u"day:2", spring, sys_days(2026y / 3 / 29) + 22h},
+        // Over a change of clocks and back over one.
+        {"Europe/Berlin", u"day:2", sys_days(2026y / 3 / 28) + 11h, sys_days(2026y / 3 / 29) + 22h},
         {"Europe/Berlin", u"day:-1", sys_days(2026y / 10 / 26) + 11h, sys_days(2026y / 10 / 24) + 22h},
         {"America/New_York", u"valueType:1 weekday:1", sys_days(2026y / 10 / 31) + 16h, sys_days(2026y / 11 / 2) + 5h},
         {"America/New_York", u"month:6", sys_days(2026y / 1 / 15) + 16h, sys_days(2026y / 7 / 15) + 4h},

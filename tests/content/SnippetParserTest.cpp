@@ -78,9 +78,8 @@ TEST(SnippetParser, TakesTheRichestReadableFormOfTheClipboardIntoRichText) {
 
     const auto content = world.expand("_<【clipboard】>_", Rich);
     const auto& text = std::get<AttributedString>(content->content);
-    EXPECT_TRUE(text.attributesAt(1)->font->bold);
-    EXPECT_FALSE(text.attributesAt(4)->font->bold);
-    EXPECT_TRUE(text.attributesAt(5)->font->italic);
+    EXPECT_EQ(notation(text.substring({0, 1})) + notation(text.substring({5, 1})), "_<__>_");
+    EXPECT_EQ(notation(text.substring({1, 4})), "*rt*fd");
 
     const auto optional = world.expand("【clipboard find:d replacement:x optional:1】", Rich);
     ASSERT_THAT(optional->fields(), SizeIs(1));
