@@ -3,7 +3,7 @@
 #   tools/tidy_change.sh [BRANCH]
 # The change is what came since HEAD left BRANCH (origin/main when none is named). When that is HEAD itself, it is what came
 # since the newest commit older than PLUME_TIDY_SINCE ("4 hours ago"), and every file when there is no such commit.
-# A large change would take too long: of more than PLUME_TIDY_FILES (40) files, those that changed most are checked.
+# A large change would take too long: of more than PLUME_TIDY_FILES (40) files, those with the most new lines are checked.
 # PLUME_TIDY_BUILD (build/default) is a build folder with compile commands.
 set -euo pipefail
 cd "$(dirname "$0")/.."
@@ -26,11 +26,11 @@ base_commit() {
     echo "$base"
 }
 
-# The changed files, those with the most changed lines first. A file that only moved has none and comes last.
+# The changed files, those with the most new lines first. A file that only moved has none and comes last.
 changed_files() {
     local since=${1:-$(git hash-object -t tree /dev/null)}
     git diff --numstat --find-renames --diff-filter=d "$since" HEAD -- "${sources[@]}" |
-        awk -F'\t' '{ print $1 + $2 "\t" $3 }' | sort -k1,1nr -k2 | cut -f2 |
+        cut -f1,3 | sort -k1,1nr -k2 | cut -f2 |
         sed -E 's/\{.* => (.*)\}/\1/; s/.* => //; s,//,/,'
 }
 
