@@ -59,10 +59,10 @@ void HardwareKeyboards::grabNew() {
 
 bool HardwareKeyboards::grab(std::uint16_t device) {
     auto* const connection = connection_.connection().get();
-    constexpr std::uint32_t events = XCB_INPUT_XI_EVENT_MASK_KEY_PRESS | XCB_INPUT_XI_EVENT_MASK_KEY_RELEASE;
+    constexpr std::uint32_t Events = XCB_INPUT_XI_EVENT_MASK_KEY_PRESS | XCB_INPUT_XI_EVENT_MASK_KEY_RELEASE;
     const auto cookie = xcb_input_xi_grab_device(
         connection, connection_.connection().root(), XCB_CURRENT_TIME, XCB_NONE, device, XCB_INPUT_GRAB_MODE_22_ASYNC,
-        XCB_INPUT_GRAB_MODE_22_ASYNC, XCB_INPUT_GRAB_OWNER_NO_OWNER, 1, &events);
+        XCB_INPUT_GRAB_MODE_22_ASYNC, XCB_INPUT_GRAB_OWNER_NO_OWNER, 1, &Events);
     const XcbOwned<xcb_input_xi_grab_device_reply_t> reply(xcb_input_xi_grab_device_reply(connection, cookie, nullptr));
     if (!reply || reply->status != XCB_GRAB_STATUS_SUCCESS) return false;
     grabbed_.push_back(device);

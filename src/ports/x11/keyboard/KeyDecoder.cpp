@@ -51,10 +51,10 @@ void KeyDecoder::setKeymap(std::shared_ptr<const XkbKeymap> keymap, const Keycod
 
 void KeyDecoder::loadCompose() {
     if (composeState_ || !context_) return;
-    constexpr auto flags = XKB_COMPOSE_COMPILE_NO_FLAGS;
-    composeTable_.reset(xkb_compose_table_new_from_locale(context_.get(), textLocale(), flags));
+    constexpr auto Flags = XKB_COMPOSE_COMPILE_NO_FLAGS;
+    composeTable_.reset(xkb_compose_table_new_from_locale(context_.get(), textLocale(), Flags));
     // Without a locale of its own a program composes nothing; everybody else composes much the same.
-    if (!composeTable_) composeTable_.reset(xkb_compose_table_new_from_locale(context_.get(), "en_US.UTF-8", flags));
+    if (!composeTable_) composeTable_.reset(xkb_compose_table_new_from_locale(context_.get(), "en_US.UTF-8", Flags));
     if (composeTable_) composeState_.reset(xkb_compose_state_new(composeTable_.get(), XKB_COMPOSE_STATE_NO_FLAGS));
 }
 

@@ -147,16 +147,16 @@ void TapSession::askForGrabs() {
 }
 
 void TapSession::handleHierarchy(const xcb_input_hierarchy_event_t& event) {
-    constexpr std::uint32_t came = XCB_INPUT_HIERARCHY_MASK_SLAVE_ADDED | XCB_INPUT_HIERARCHY_MASK_DEVICE_ENABLED |
+    constexpr std::uint32_t Came = XCB_INPUT_HIERARCHY_MASK_SLAVE_ADDED | XCB_INPUT_HIERARCHY_MASK_DEVICE_ENABLED |
                                    XCB_INPUT_HIERARCHY_MASK_SLAVE_ATTACHED;
-    constexpr std::uint32_t went = XCB_INPUT_HIERARCHY_MASK_SLAVE_REMOVED | XCB_INPUT_HIERARCHY_MASK_DEVICE_DISABLED;
+    constexpr std::uint32_t Went = XCB_INPUT_HIERARCHY_MASK_SLAVE_REMOVED | XCB_INPUT_HIERARCHY_MASK_DEVICE_DISABLED;
     const auto* const infos = xcb_input_hierarchy_infos(&event);
     for (int i = 0; i < xcb_input_hierarchy_infos_length(&event); ++i) {
-        if ((infos[i].flags & went) == 0) continue;
+        if ((infos[i].flags & Went) == 0) continue;
         keyboards_.forget(infos[i].deviceid);
         releaseKeysOf(infos[i].deviceid);
     }
-    if ((event.flags & came) != 0) keyboards_.grabNew();
+    if ((event.flags & Came) != 0) keyboards_.grabNew();
 }
 
 void TapSession::releaseKeysOf(std::uint16_t device) {

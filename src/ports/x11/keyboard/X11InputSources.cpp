@@ -27,11 +27,11 @@ std::optional<std::u16string> X11InputSources::translateKey(KeyCode keyCode, Eve
     const xcb_keycode_t keycode = keyboard_.keymap()->keycodeOf(keyCode);
     const XkbOwned<xkb_state> state(xkb_state_new(keyboard_.keymap()->get()));
     if (keycode == 0 || !state) return std::nullopt;
-    constexpr std::uint32_t numLock = XCB_MOD_MASK_2;
+    constexpr std::uint32_t NumLock = XCB_MOD_MASK_2;
     std::uint32_t held = 0;
     if (flags.contains(EventFlag::Shift)) held |= XCB_MOD_MASK_SHIFT;
     if (flags.contains(EventFlag::Control)) held |= XCB_MOD_MASK_CONTROL;
-    xkb_state_update_mask(state.get(), held, 0, numLock, 0, 0, keyboard_.group());
+    xkb_state_update_mask(state.get(), held, 0, NumLock, 0, 0, keyboard_.group());
     KeyText text;
     text.assignKey(*state, keycode, flags.contains(EventFlag::Option));
     if (text.view().empty()) return std::nullopt;

@@ -14,8 +14,8 @@ namespace plume {
 // Keys that a US Apple keyboard has no code for (media keys and the like) have codes of their own, so that every key
 // has one and none is mistaken for another.
 constexpr KeyCode foreignKeyCode(xcb_keycode_t keycode) {
-    constexpr std::uint16_t first = 256;
-    return KeyCode{static_cast<std::uint16_t>(first + keycode)};
+    constexpr std::uint16_t First = 256;
+    return KeyCode{static_cast<std::uint16_t>(First + keycode)};
 }
 
 // The virtual key code of the key at this place.

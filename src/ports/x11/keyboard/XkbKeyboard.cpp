@@ -46,9 +46,9 @@ Result<std::unique_ptr<XkbKeyboard>> XkbKeyboard::open(XcbConnection& connection
 }
 
 bool XkbKeyboard::begin() {
-    constexpr auto flags = XKB_X11_SETUP_XKB_EXTENSION_NO_FLAGS;
+    constexpr auto Flags = XKB_X11_SETUP_XKB_EXTENSION_NO_FLAGS;
     if (xkb_x11_setup_xkb_extension(connection_.get(), XKB_X11_MIN_MAJOR_XKB_VERSION, XKB_X11_MIN_MINOR_XKB_VERSION,
-                                    flags, nullptr, nullptr, &firstEvent_, nullptr) == 0) {
+                                    Flags, nullptr, nullptr, &firstEvent_, nullptr) == 0) {
         return false;
     }
     device_ = xkb_x11_get_core_keyboard_device_id(connection_.get());
@@ -63,7 +63,7 @@ bool XkbKeyboard::begin() {
 }
 
 void XkbKeyboard::selectEvents() const {
-    constexpr std::uint16_t events =
+    constexpr std::uint16_t Events =
         XCB_XKB_EVENT_TYPE_NEW_KEYBOARD_NOTIFY | XCB_XKB_EVENT_TYPE_MAP_NOTIFY | XCB_XKB_EVENT_TYPE_STATE_NOTIFY;
     xcb_xkb_select_events_details_t details{};
     details.affectNewKeyboard =
@@ -71,7 +71,7 @@ void XkbKeyboard::selectEvents() const {
     details.newKeyboardDetails = details.affectNewKeyboard;
     details.affectState = WatchedStateParts;
     details.stateDetails = WatchedStateParts;
-    xcb_xkb_select_events_aux(connection_.get(), static_cast<std::uint16_t>(device_), events, 0, 0, WatchedMapParts,
+    xcb_xkb_select_events_aux(connection_.get(), static_cast<std::uint16_t>(device_), Events, 0, 0, WatchedMapParts,
                               WatchedMapParts, &details);
 }
 
@@ -103,18 +103,18 @@ void XkbKeyboard::readState() {
 }
 
 void XkbKeyboard::readLayoutName() {
-    constexpr std::uint32_t longest = 1024;  // in words
+    constexpr std::uint32_t Longest = 1024;  // in words
     const auto cookie = xcb_get_property(connection_.get(), 0, connection_.root(), connection_.atom(RulesProperty),
-                                         XCB_ATOM_STRING, 0, longest);
+                                         XCB_ATOM_STRING, 0, Longest);
     const XcbOwned<xcb_get_property_reply_t> reply(xcb_get_property_reply(connection_.get(), cookie, nullptr));
     std::string_view names;
     if (reply) {
         names = {static_cast<const char*>(xcb_get_property_value(reply.get())),
                  static_cast<std::size_t>(xcb_get_property_value_length(reply.get()))};
     }
-    constexpr std::size_t layouts = 2;  // after the rules and the model
-    layoutName_ = piece(piece(names, '\0', layouts), ',', group_);
-    const auto variant = piece(piece(names, '\0', layouts + 1), ',', group_);
+    constexpr std::size_t Layouts = 2;  // after the rules and the model
+    layoutName_ = piece(piece(names, '\0', Layouts), ',', group_);
+    const auto variant = piece(piece(names, '\0', Layouts + 1), ',', group_);
     if (!layoutName_.empty() && !variant.empty()) layoutName_ += '(' + std::string(variant) + ')';
     if (!layoutName_.empty()) return;
     const char* const name = xkb_keymap_layout_get_name(keymap_->get(), group_);
