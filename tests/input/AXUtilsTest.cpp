@@ -39,30 +39,24 @@ void expectNothing(const Accessibility& screen) {
     EXPECT_EQ(AXUtils::getFocusedUIElementBound(screen), Rectangle{});
 }
 
-TEST_F(Queries, FindNothingWithoutAnApplication) {
-    screen.setFrontApplicationElement(nullptr);
-    EXPECT_EQ(AXUtils::getFocusedUIElement(screen), nullptr);
-    expectNothing(screen);
-}
-
-TEST_F(Queries, FindNothingWithoutAFocusedElement) {
-    application->removeAttribute("AXFocusedUIElement");
-    EXPECT_EQ(AXUtils::getFocusedUIElement(screen), nullptr);
-    expectNothing(screen);
-}
-
-TEST_F(Queries, FindNothingInAnElementThatTellsNothing) {
+TEST_F(Queries, FindNothingWhereNobodyTells) {
     EXPECT_EQ(AXUtils::getFocusedUIElement(screen), focused);
     expectNothing(screen);
-}
 
-TEST_F(Queries, FindNothingInValuesOfOtherTypes) {
+    // Values of other types than they should have.
     focused->setAttribute("AXSelectedTextRange", u"0,5");
     focused->setAttribute("AXValue", Size{1, 2});
     focused->setAttribute("AXTopLevelUIElement", u"window");
     focused->setAttribute("AXPosition", Size{1, 2});
     focused->setAttribute("AXSize", Point{1, 2});
     application->setAttribute("AXMenuBar", u"menus");
+    expectNothing(screen);
+
+    application->removeAttribute("AXFocusedUIElement");
+    EXPECT_EQ(AXUtils::getFocusedUIElement(screen), nullptr);
+    expectNothing(screen);
+    screen.setFrontApplicationElement(nullptr);
+    EXPECT_EQ(AXUtils::getFocusedUIElement(screen), nullptr);
     expectNothing(screen);
 }
 
@@ -113,6 +107,8 @@ struct CaretCase {
 };
 
 TEST_F(Queries, ReadWhatStandsBeforeTheCaret) {
+    select(0, 0);
+    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(screen, 3), u"") << "at the start no text is needed";
     focused->setText(u"0123456789");
     const CaretCase cases[] = {{3, 10, u"012"}, {3, 2, u"12"},         {3, 3, u"012"},        {0, 3, u""},
                                {10, 1, u"9"},   {11, 3, std::nullopt}, {-1, 3, std::nullopt}, {5, -1, u""}};
@@ -121,11 +117,6 @@ TEST_F(Queries, ReadWhatStandsBeforeTheCaret) {
         EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(screen, one.maxLength), one.answer)
             << one.location << " " << one.maxLength;
     }
-}
-
-TEST_F(Queries, NeedNoTextAtTheStart) {
-    select(0, 0);
-    EXPECT_EQ(AXUtils::getTextBeforeCaretWithMaxLength(screen, 3), u"");
 }
 
 TEST_F(Queries, TurnRectanglesOver) {

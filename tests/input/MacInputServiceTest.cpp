@@ -3,8 +3,6 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "library/Snippet.h"
-#include "library/SnippetGroup.h"
 #include "tests/engine/AllocationCounter.h"
 #include "tests/input/InputDesk.h"
 
@@ -81,31 +79,16 @@ struct MacInputServiceTest : ::testing::Test {
 
 TEST_F(MacInputServiceTest, ReadsWhatAKeyTypes) {
     desk.keyDown(KeyCode::C, u"c");
+    EXPECT_EQ(desk.service.lastKeyString(), u"c");
+    desk.hold(KeyModifier::Shift);
+    EXPECT_EQ(desk.service.lastKeyString(), std::nullopt) << "forgotten at the next event";
+    desk.hold({});
     desk.keyDown(KeyCode::C, u"ch");
     desk.keyDown(KeyCode::C);
     desk.heldFlags = EventFlag::Shift | EventFlag::CapsLock;
     desk.keyDown(KeyCode::C);
     desk.keyDown(KeyCode::Section);
     EXPECT_THAT(heard(), ElementsAre("key 8 c", "key 8 ch", "key 8 c", "key 8 C", "key 10 -"));
-}
-
-TEST_F(MacInputServiceTest, ForgetsTheLastKeyAtTheNextEvent) {
-    desk.keyDown(KeyCode::C, u"c");
-    EXPECT_EQ(desk.service.lastKeyString(), u"c");
-    desk.hold(KeyModifier::Shift);
-    EXPECT_EQ(desk.service.lastKeyString(), std::nullopt);
-}
-
-TEST_F(MacInputServiceTest, ASwallowedKeyIsSwallowedWithItsRelease) {
-    EXPECT_FALSE(desk.keyDown(KeyCode::C, u"c"));
-    EXPECT_FALSE(desk.keyUp(KeyCode::C));
-    EXPECT_THAT(heard(), ElementsAre("key 8 c", "up 8"));
-    listener.swallows = true;
-    EXPECT_TRUE(desk.keyDown(KeyCode::C, u"c"));
-    EXPECT_FALSE(desk.keyUp(KeyCode::V)) << "another key";
-    EXPECT_TRUE(desk.keyUp(KeyCode::C));
-    EXPECT_FALSE(desk.keyUp(KeyCode::C)) << "once";
-    EXPECT_THAT(heard(), ElementsAre("key 8 c", "up 9", "up 8"));
 }
 
 TEST_F(MacInputServiceTest, ShortcutsAreNoText) {
@@ -162,27 +145,6 @@ TEST_F(MacInputServiceTest, HotKeysComeBeforeTheEngine) {
     desk.service.unregisterHotKey({KeyModifier::Control, KeyCode::K});
     desk.keyDown(KeyCode::K, u"k");
     EXPECT_THAT(heard(), ElementsAre("shortcut 40/2"));
-}
-
-TEST_F(MacInputServiceTest, ModifiersAloneAreAHotKey) {
-    constexpr KeyModifiers Both = KeyModifier::Control | KeyModifier::Option;
-    desk.service.registerHotKey({Both, KeyCode::None});
-    desk.hold(KeyModifier::Control);
-    desk.hold(Both);
-    desk.hold(KeyModifier::Option);
-    desk.hold({});
-    EXPECT_THAT(heard(), ElementsAre("hot 65535/6"));
-
-    desk.hold(Both);
-    desk.keyDown(KeyCode::K, u"k");
-    heard();
-    desk.hold({});
-    EXPECT_THAT(heard(), IsEmpty()) << "they were held for the key";
-
-    desk.hold(Both);
-    desk.service.ignoreNextHotKey();
-    desk.hold({});
-    EXPECT_THAT(heard(), IsEmpty());
 }
 
 TEST_F(MacInputServiceTest, NoticesAnotherProgramBeforeItsFirstKey) {
@@ -327,23 +289,6 @@ TEST_F(MacInputServiceTest, CopiesAsTheApplicationInFrontWantsIt) {
     desk.service.sendCopyCommand();
     EXPECT_THAT(desk.poster.take(), ElementsAre("v8/2", "^8"));
     EXPECT_EQ(desk.service.contextBundleIdentifier(), u"wine");
-}
-
-TEST_F(MacInputServiceTest, TheTriggerKeyIsTypedAgainBehindLongOutput) {
-    desk.keyDown(KeyCode::Return, u"\r");
-    auto group = SnippetGroup::make();
-    group->setExpandTrigger(ExpandTrigger::DelimiterKept);
-    auto snippet = std::make_shared<Snippet>();
-    group->addItem(snippet);
-    const auto output = InputDesk::output(u"text", 20);
-    output->cancelTrigger = false;
-    output->backspaceCount = 25;
-    output->trigger = SnippetTrigger::Typed;
-    output->snippetExpandedContent->originalSnippet = snippet;
-    desk.service.sendOutput(output);
-    EXPECT_TRUE(output->cancelTrigger);
-    desk.loop.advance(1);
-    EXPECT_THAT(desk.poster.timesOf("vtext\r"), ElementsAre(40));
 }
 
 TEST(MacInputService, APlainKeyAllocatesNothing) {

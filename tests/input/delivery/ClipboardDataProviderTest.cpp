@@ -13,7 +13,6 @@ namespace plume {
 namespace {
 
 using ::testing::ElementsAre;
-using ::testing::IsEmpty;
 
 const std::string String(PasteboardType::String);
 const std::string RTF(PasteboardType::RTF);
@@ -55,28 +54,6 @@ TEST_F(ClipboardDataProviderTest, GivesTheClipboardBackOnceTheTargetHasRead) {
     EXPECT_EQ(pasteboard.data(String), "user's");
     EXPECT_EQ(pasteboard.data("odd"), "");
     EXPECT_FALSE(loop.nextDue());
-}
-
-TEST_F(ClipboardDataProviderTest, TwoExpansionsInARowKeepTheUsersContent) {
-    pasteboard.copyFromProgram(u"user's");
-    expand(u"one");
-    paste();
-    provider.restoreAfterDelay();
-    expand(u"two");
-    EXPECT_EQ(userPasteboard.string(), u"user's");
-    EXPECT_EQ(paste(), u"two");
-    provider.restoreAfterDelay();
-    loop.advance(1);
-    EXPECT_EQ(paste(), u"user's");
-    EXPECT_EQ(userPasteboard.string(), u"user's");
-}
-
-TEST_F(ClipboardDataProviderTest, AnEmptyClipboardIsEmptyAgain) {
-    expand(u"expansion");
-    paste();
-    provider.restoreAfterDelay();
-    loop.advance(1);
-    EXPECT_THAT(pasteboard.types(), IsEmpty());
 }
 
 TEST_F(ClipboardDataProviderTest, WhatTheUserCopiedSinceStays) {

@@ -41,60 +41,25 @@ class ContextInputResolverTest : public ::testing::Test {
     ContextInputResolver resolver{processes, identifiers, accessibility, poster};
 };
 
-struct ChoiceCase {
-    const char* about;
-    const char16_t* application;
-    SnippetExpandedContent::Content content;
-    bool pastes;
-    DeliveryPreferences preferences = {};
-    bool holdsKeyA = false;
-};
-
-DeliveryPreferences clipboard(std::int64_t in, std::vector<std::u16string> listed) {
-    DeliveryPreferences preferences;
-    preferences.useClipboard = true;
-    preferences.useClipboardIn = in;
-    preferences.useClipboardApplications = std::move(listed);
-    return preferences;
-}
-
-DeliveryPreferences longText(std::int8_t length) {
-    DeliveryPreferences preferences;
-    preferences.useClipboardForLongText = true;
-    preferences.longTextLength = length;
-    return preferences;
-}
-
-std::u16string x(std::size_t length) {
-    return std::u16string(length, u'x');
-}
-
 TEST_F(ContextInputResolverTest, ChoosesBetweenTypingAndPasting) {
-    const ChoiceCase cases[] = {
-        {"plain text", u"editor", u"text", false},
-        {"rich text", u"editor", AttributedString(u"text"), true},
-        {"an application of the table", u"net.ichi2.anki", u"text", true},
-        {"the user pastes everywhere", u"editor", u"text", true, clipboard(0, {})},
-        {"except here", u"editor", u"text", false, clipboard(1, {u"editor"})},
-        {"except elsewhere", u"editor", u"text", true, clipboard(1, {u"other"})},
-        {"only here", u"editor", u"text", true, clipboard(2, {u"editor"})},
-        {"only elsewhere", u"editor", u"text", false, clipboard(2, {u"other"})},
-        {"lines where they are pasted", u"com.microsoft.Word", u"a\nb", true},
-        {"other texts there", u"com.microsoft.Word", u"a\rb", false},
+    struct Case {
+        const char* about;
+        const char16_t* application;
+        std::u16string content;
+        bool pastes;
+    };
+    const Case cases[] = {
+        {"no line feed where lines are pasted", u"com.microsoft.Word", u"a\rb", false},
         {"lines elsewhere", u"editor", u"a\nb", false},
-        {"100 units are not long", u"editor", x(100), false, longText(100)},
-        {"101 are", u"editor", x(101), true, longText(100)},
-        {"nothing is long below 0", u"editor", x(1000), false, longText(-56)},
-        {"the user types all long text", u"editor", x(1000), false},
-        {"the key is held", u"editor", x(21), true, {}, true},
-        {"for a shorter text", u"editor", x(20), false, {}, true},
+        {"long text that the user has typed", u"editor", std::u16string(1000, u'x'), false},
+        {"a key is held, but the text is short", u"editor", std::u16string(20, u'x'), false},
         {"no key produces it", u"editor", u"a\u4E00", true},
     };
     poster.untypeable = u'\u4E00';
-    for (const ChoiceCase& c : cases) {
+    for (const Case& c : cases) {
         activate(c.application);
-        resolver.preferences = c.preferences;
-        poster.held = c.holdsKeyA ? std::set<KeyCode>{KeyCode::A} : std::set<KeyCode>{};
+        poster.held.clear();
+        if (c.content.size() == 20) poster.held = {KeyCode::A};
         EXPECT_EQ(pastes(c.content), c.pastes) << c.about;
         EXPECT_EQ(resolver.contextBundleIdentifier(), c.application) << c.about;
     }
@@ -111,10 +76,11 @@ TEST_F(ContextInputResolverTest, TheNewLineRuleStaysInAFamilyAndWhatNoKeyProduce
 
 TEST_F(ContextInputResolverTest, ErasingAloneFollowsThePreference) {
     activate(u"editor");
-    resolver.preferences = longText(0);
+    resolver.preferences.useClipboardForLongText = true;
+    resolver.preferences.longTextLength = 0;
     resolver.prepareSending(nullptr);
     EXPECT_FALSE(resolver.setting()->has(UseClipboard));
-    resolver.preferences = clipboard(0, {});
+    resolver.preferences.useClipboard = true;
     resolver.prepareSending(nullptr);
     EXPECT_TRUE(resolver.setting()->has(UseClipboard));
 }
@@ -126,7 +92,9 @@ TEST_F(ContextInputResolverTest, PastesIntoTheSearchFieldOfAHelpMenu) {
     focus({element("AXSubrole", u"AXSearchField"), element("AXRole", u"AXMenuItem")});
     EXPECT_TRUE(pastes(u"text"));
     // The user's own list replaces what was found out.
-    resolver.preferences = clipboard(1, {u"editor"});
+    resolver.preferences.useClipboard = true;
+    resolver.preferences.useClipboardIn = 1;
+    resolver.preferences.useClipboardApplications = {u"editor"};
     EXPECT_FALSE(pastes(u"text"));
 }
 

@@ -2,11 +2,14 @@
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
 
+#include <numeric>
 #include <set>
 
 #include "Foundation/KeyCode.h"
 #include "Foundation/KeyModifiers.h"
+#include "input/delivery/OutputFragments.h"
 #include "ports/simulated/SimulatedAccessibility.h"
 #include "tests/input/delivery/RecordingPoster.h"
 
@@ -14,7 +17,6 @@ namespace plume {
 namespace {
 
 using ::testing::ElementsAre;
-using ::testing::IsEmpty;
 
 class KeySenderTest : public ::testing::Test {
   protected:
@@ -30,8 +32,8 @@ class KeySenderTest : public ::testing::Test {
 };
 
 TEST_F(KeySenderTest, TypesTextInChunksWithoutModifiers) {
-    sender.sendPlainText(u"\nabc");
-    EXPECT_THAT(poster.take(), ElementsAre("v\n", "^\n", "vabc", "^abc"));
+    sender.sendPlainText(u"\n\tabc");
+    EXPECT_THAT(poster.take(), ElementsAre("v\n", "^\n", "v\t", "^\t", "vabc", "^abc"));
     auto setting = std::make_shared<ContextInputSetting>(with(InputFlag::PostToSessionEventTap));
     setting->blockLength = 2;
     sender.setContextInputSetting(setting);
@@ -40,27 +42,13 @@ TEST_F(KeySenderTest, TypesTextInChunksWithoutModifiers) {
     EXPECT_FALSE(sender.isSending());
 }
 
-TEST_F(KeySenderTest, PressesKeys) {
-    sender.sendKey(KeyCode::Return, EventFlag::Shift, 2);
-    EXPECT_THAT(poster.take(), ElementsAre("v36/1", "^36/1", "v36/1", "^36/1"));
-    sender.sendBackspaces(2);
-    EXPECT_THAT(poster.take(), ElementsAre("v51", "^51", "v51", "^51"));
-    sender.sendBackspaces(0);
-    EXPECT_THAT(poster.take(), IsEmpty());
-    sender.sendShiftTab();
-    EXPECT_THAT(poster.take(), ElementsAre("v48/1", "^48/1"));
-    sender.sendLeftArrowKeys(1);
-    EXPECT_THAT(poster.take(), ElementsAre("v123", "^123"));
-}
-
-TEST_F(KeySenderTest, ErasesASelectionBeforeWhatWasTyped) {
-    const auto application = std::make_shared<SimulatedUIElement>();
-    const auto field = std::make_shared<SimulatedUIElement>();
-    application->setAttribute("AXFocusedUIElement", std::shared_ptr<UIElement>(field));
-    field->setAttribute("AXSelectedTextRange", TextRange{4, 3});
-    accessibility.setFrontApplicationElement(application);
-    sender.sendBackspaces(1);
-    EXPECT_THAT(poster.take(), ElementsAre("v117", "^117", "v51", "^51"));
+RC_GTEST_PROP(KeySenderChunks, GiveBackTheText, (const std::vector<std::uint8_t>& picks)) {
+    std::u16string text;
+    for (const auto pick : picks) text += u"abc \t\n\u2029x"[pick % 8];
+    ContextInputSetting setting;
+    setting.blockLength = *rc::gen::inRange<std::uint64_t>(0, 7);
+    const auto chunks = fragmentsForPlainText(text, setting);
+    RC_ASSERT(std::accumulate(chunks.begin(), chunks.end(), std::u16string()) == text);
 }
 
 TEST_F(KeySenderTest, PastesAsTheApplicationWantsIt) {
@@ -88,13 +76,6 @@ TEST_F(KeySenderTest, PastesAsTheApplicationWantsIt) {
     poster.own = CommandKeystroke{KeyCode::Help, EventFlag::Shift};
     sender.sendPasteCommand(with({}));
     EXPECT_THAT(poster.take(), ElementsAre("v114/1", "^114/1")) << "the program's own keystroke";
-}
-
-TEST_F(KeySenderTest, CopiesWithCommandOrControl) {
-    sender.sendCopyCommand(false);
-    EXPECT_THAT(poster.take(), ElementsAre("v8/8", "^8"));
-    sender.sendCopyCommand(true);
-    EXPECT_THAT(poster.take(), ElementsAre("v8/2", "^8"));
 }
 
 }  // namespace

@@ -23,10 +23,9 @@ struct World {
     PLOutput output;
     ContextInputSetting setting;
     TriggerKey key = SpaceKey;
-    bool mustWait = false;
 
-    explicit World(std::size_t length = 5, ExpandTrigger trigger = ExpandTrigger::DelimiterKept) {
-        group->setExpandTrigger(trigger);
+    explicit World(std::size_t length = 5) {
+        group->setExpandTrigger(ExpandTrigger::DelimiterKept);
         group->addItem(snippet);
         output.trigger = SnippetTrigger::Typed;
         output.snippetExpandedContent = std::make_shared<SnippetExpandedContent>(std::u16string(length, u'x'));
@@ -34,12 +33,9 @@ struct World {
     }
 
     SnippetExpandedContent& content() { return *output.snippetExpandedContent; }
-    void makeRich() { content().content = AttributedString(u"rich"); }
-    void addKey(std::size_t location, std::uint64_t count, double delay = 0) {
+    void addKey(std::uint64_t count) {
         auto variable = std::make_shared<SnippetKeyVariable>(u"\u2192", KeyCode::Right);
-        variable->location = location;
         variable->count = count;
-        variable->delay = delay;
         content().variables.push_back(variable);
     }
 };
@@ -62,29 +58,14 @@ std::u16string x(std::size_t length, std::u16string_view suffix = {}) {
 
 std::vector<PreparationCase> cases() {
     return {
-        {"the delimiter is let through behind short output", World(), false, x(5)},
         {"20 events", with(World(10), [](World& w) { w.output.backspaceCount = 19; }), false, x(10)},
         {"21 events", with(World(10), [](World& w) { w.output.backspaceCount = 20; }), true, x(10, u" ")},
-        {"long text", World(401), true, x(401, u" ")},
-        {"Return is typed as it was", with(World(401), [](World& w) { w.key = ReturnKey; }), true, x(401, u"\r")},
-        {"a group that swallows it", World(401, ExpandTrigger::DelimiterSwallowed), true, x(401)},
         {"not typed", with(World(401), [](World& w) { w.output.trigger = SnippetTrigger::Suggestion; }), true, x(401)},
         {"swallowed already, and typed again", with(World(), [](World& w) { w.output.cancelTrigger = true; }), true,
          x(5, u" ")},
         {"a suffix of its own", with(World(), [](World& w) { w.content().suffix = u"!"; }), false, x(5, u"!")},
         {"and that only once", with(World(401), [](World& w) { w.content().suffix = u"!"; }), true, x(401, u"!")},
-        {"a delayed key", with(World(), [](World& w) { w.addKey(2, 1, 0.5); }), true, x(5, u" ")},
-        {"many presses", with(World(), [](World& w) { w.addKey(2, 30); }), true, x(5, u" ")},
-        {"pasted at once", with(World(401), [](World& w) { w.setting.flags |= UseClipboard; }), false, x(401)},
-        {"pasted in two pieces",
-         with(World(),
-              [](World& w) {
-                  w.setting.flags |= UseClipboard;
-                  w.addKey(2, 1);
-              }),
-         true, x(5, u" ")},
-        {"pasted late", with(World(), [](World& w) { w.setting.flags = UseClipboard | DelayPasting; }), true,
-         x(5, u" ")},
+        {"many presses", with(World(), [](World& w) { w.addKey(30); }), true, x(5, u" ")},
         {"with a wait behind",
          with(World(),
               [](World& w) {
@@ -95,20 +76,11 @@ std::vector<PreparationCase> cases() {
         {"by way of activation", with(World(), [](World& w) { w.setting.flags = UseClipboard | Reactivate; }), true,
          x(5, u" ")},
         {"delays that only pastes have", with(World(), [](World& w) { w.setting.flags = DelayPasting; }), false, x(5)},
-        {"others come first", with(World(), [](World& w) { w.mustWait = true; }), true, x(5, u" ")},
         {"the key is gone", with(World(401), [](World& w) { w.key = NoLongerKnown; }), true, x(401)},
-        {"rich", with(World(), [](World& w) { w.makeRich(); }), false, u"rich"},
-        {"rich, with an unstyled delimiter",
+        {"no styled delimiter behind rich text, but Return has no look",
          with(World(),
               [](World& w) {
-                  w.makeRich();
-                  w.group->setResetFormatting(true);
-              }),
-         true, u"rich "},
-        {"which Return needs not be",
-         with(World(),
-              [](World& w) {
-                  w.makeRich();
+                  w.content().content = AttributedString(u"rich");
                   w.group->setResetFormatting(true);
                   w.key = ReturnKey;
               }),
@@ -120,7 +92,7 @@ std::vector<PreparationCase> cases() {
 TEST(OutputPreparation, DecidesAboutTheTriggerKey) {
     for (PreparationCase& c : cases()) {
         World& world = c.world;
-        prepareOutput(world.output, world.setting, world.key, world.mustWait);
+        prepareOutput(world.output, world.setting, world.key, false);
         EXPECT_EQ(world.output.cancelTrigger, c.cancelTrigger) << c.about;
         EXPECT_EQ(toUtf8(world.content().string()), toUtf8(c.text)) << c.about;
         std::u16string sent;
