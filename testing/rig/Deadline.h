@@ -31,7 +31,7 @@ class Deadline {
 
 // Waits for a condition that nothing tells about; false when it still does not hold after the bound.
 template <typename Condition>
-bool waitUntil(Condition holds, Milliseconds bound) {
+bool waitUntil(Condition holds, Milliseconds bound = Milliseconds(10'000)) {
     const Deadline deadline(bound);
     while (!holds()) {
         if (deadline.passed()) return false;

@@ -3,16 +3,16 @@
 #include <functional>
 #include <memory>
 #include <string>
-#include <thread>
+#include <string_view>
+#include <utility>
 
 #include "platform/KeyboardTap.h"
-#include "ports/posix/PollRunLoop.h"
-#include "ports/x11/X11Session.h"
 #include "ports/x11/keyboard/TapConnection.h"
 #include "ports/x11/keyboard/X11EventPoster.h"
 #include "ports/x11/keyboard/X11KeyboardTap.h"
 #include "ports/x11/keyboard/XkbKeyboard.h"
 #include "ports/x11/watchdog/Watchdog.h"
+#include "testing/rig/SessionThread.h"
 
 namespace plume::rig {
 
@@ -35,33 +35,35 @@ class KeyboardPort final : private KeyboardTapListener {
     KeyboardPort(const KeyboardPort&) = delete;
     KeyboardPort& operator=(const KeyboardPort&) = delete;
 
-    // Calls on the tap thread and waits for the end of the call.
-    void run(const std::function<void()>& call);
+    // Calls on the tap thread, waits, and gives what the call gives.
+    template <typename Call>
+    auto run(Call call) {
+        return thread_.run(std::move(call));
+    }
 
     // Types a text as one batch.
     void type(std::u16string_view text);
 
     // For use on the tap thread.
-    PollRunLoop& loop() { return loop_; }
+    PollRunLoop& loop() { return thread_.loop(); }
     X11EventPoster& poster() { return *poster_; }
     TapConnection& connection() { return *connection_; }
     Watchdog& watchdog() { return *watchdog_; }
 
   private:
+    void putTogether(const std::string& display);
     bool keyboardEvent(const TapEvent& event) override { return options_.decide && options_.decide(event); }
     void tapDisabledByTimeout() override;
     void tapDisabledByUserInput() override {}
 
     Options options_;
-    PollRunLoop loop_;
+    SessionThread thread_;
     std::unique_ptr<Watchdog> watchdog_;
-    std::unique_ptr<X11Session> session_;
     std::unique_ptr<XkbKeyboard> keyboard_;
     std::unique_ptr<TapConnection> connection_;
     std::unique_ptr<X11KeyboardTap> tap_;
     std::unique_ptr<X11EventPoster> poster_;
     Timer enabling_;
-    std::thread thread_;
 };
 
 }  // namespace plume::rig

@@ -156,18 +156,6 @@ void TargetProgram::forgetReports() {
     const std::scoped_lock lock(mutex_);
     changes_.clear();
     pastes_ = 0;
-    focusChanges_ = {};
-}
-
-TargetProgram::FocusChanges TargetProgram::focusChanges() {
-    const std::scoped_lock lock(mutex_);
-    return focusChanges_;
-}
-
-TargetProgram::FocusChanges TargetProgram::awaitFocusChanges(const FocusChanges& expected, Milliseconds bound) {
-    std::unique_lock lock(mutex_);
-    told_.wait_for(lock, bound, [&] { return focusChanges_ == expected || ended_; });
-    return focusChanges_;
 }
 
 std::string TargetProgram::ask(const std::string& request) {
@@ -212,8 +200,6 @@ void TargetProgram::takeLine(const std::string& line) {
         const std::chrono::nanoseconds time(told.at("time").get<std::int64_t>());
         changes_.push_back(
             {MonotonicTime(time), told.at("position"), told.at("removed"), told.at("inserted"), told.at("length")});
-    } else if (event == "focus") {
-        ++(told.at("in").get<bool>() ? focusChanges_.in : focusChanges_.out);
     } else if (event == "pasted") {
         ++pastes_;
     } else if (event == "answer") {

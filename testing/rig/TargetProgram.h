@@ -32,8 +32,8 @@ struct TextChange {
     int length = 0;        // of the whole text afterwards
 };
 
-// A program of the desktop with one text in it, to type into. It tells of every change, of focus and of pastes, and
-// gives and takes its whole text. A thread of its own reads what it tells, so it never waits for a test that is busy
+// A program of the desktop with one text in it, to type into. It tells of every change and of pastes, and gives and
+// takes its whole text. A thread of its own reads what it tells, so it never waits for a test that is busy
 // typing.
 class TargetProgram {
   public:
@@ -73,20 +73,8 @@ class TargetProgram {
     // Waits for the end of the next paste; false when there is none within the bound.
     bool awaitPaste(Milliseconds bound);
 
-    // Forgets what was told so far: changes, pastes and focus.
+    // Forgets what was told so far: changes and pastes.
     void forgetReports();
-
-    // How often the text itself got and lost the focus, by the toolkit's own account.
-    struct FocusChanges {
-        int in = 0;
-        int out = 0;
-        friend bool operator==(const FocusChanges&, const FocusChanges&) = default;
-    };
-    FocusChanges focusChanges();
-
-    // Waits until that is how often and returns it; what it is instead when it still is not after the bound. Qt tells
-    // of a lost focus 0.4 seconds late, and not at all when the focus is back by then.
-    FocusChanges awaitFocusChanges(const FocusChanges& expected, Milliseconds bound = Milliseconds(5'000));
 
   private:
     std::string ask(const std::string& request);
@@ -107,7 +95,6 @@ class TargetProgram {
     std::deque<TextChange> changes_;
     std::deque<std::string> answers_;
     int pastes_ = 0;
-    FocusChanges focusChanges_;
     std::thread reader_;
 };
 

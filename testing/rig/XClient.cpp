@@ -92,6 +92,22 @@ std::vector<xcb_window_t> XClient::managedWindows() {
     return windows;
 }
 
+std::vector<int> XClient::keysDown() {
+    const auto reply = own(xcb_query_keymap_reply(connection_, xcb_query_keymap(connection_), nullptr));
+    if (!reply) throw RigError("the X server does not tell which keys are down");
+    std::vector<int> down;
+    for (int key = 0; key < 256; ++key) {
+        if ((reply->keys[key / 8] >> (key % 8) & 1) != 0) down.push_back(key);
+    }
+    return down;
+}
+
+std::uint16_t XClient::modifiers() {
+    const auto reply = own(xcb_query_pointer_reply(connection_, xcb_query_pointer(connection_, root()), nullptr));
+    if (!reply) throw RigError("the X server does not tell which modifiers are down");
+    return reply->mask & 0xFF;
+}
+
 XClient::Place XClient::placeOf(xcb_window_t window) {
     const auto geometry = own(xcb_get_geometry_reply(connection_, xcb_get_geometry(connection_, window), nullptr));
     const auto cookie = xcb_translate_coordinates(connection_, window, root(), 0, 0);

@@ -48,6 +48,10 @@ class XClient {
     // The top-level windows that the window manager manages, oldest first.
     std::vector<xcb_window_t> managedWindows();
 
+    // The keys that are down for programs, by their keycodes, and the modifiers, locked ones included.
+    std::vector<int> keysDown();
+    std::uint16_t modifiers();
+
     // Where a window is on the screen, in pixels, without its frame.
     struct Place {
         int x = 0;

@@ -11,15 +11,6 @@
 
 namespace plume::rig {
 
-inline bool await(const std::function<bool()>& condition) {
-    const Deadline deadline(Milliseconds(10'000));
-    while (!condition()) {
-        if (deadline.passed()) return false;
-        deadline.waitReadable(-1, Milliseconds(5));
-    }
-    return true;
-}
-
 // One desktop for all. The tests say who is in front and that somebody types, as the keyboard's port does.
 class AccessibilityDesktop : public testing::Test {
   protected:
@@ -28,7 +19,7 @@ class AccessibilityDesktop : public testing::Test {
         rig_ = std::make_unique<DesktopRig>();
         rig_->session().join();
         accessibility_ = std::make_unique<AtspiAccessibility>();
-        ASSERT_TRUE(await([] { return accessibility_->status() != AccessibilityStatus::Starting; }));
+        ASSERT_TRUE(waitUntil([] { return accessibility_->status() != AccessibilityStatus::Starting; }));
     }
 
     static std::unique_ptr<TargetProgram> startFocused(TargetKind kind) {
@@ -45,7 +36,7 @@ class AccessibilityDesktop : public testing::Test {
 
     // With somebody who types all the while.
     static bool awaitTyping(const std::function<bool()>& condition) {
-        return await([&] {
+        return waitUntil([&] {
             accessibility_->userTypes();
             return condition();
         });

@@ -8,10 +8,10 @@
 #include <cstddef>
 
 #include "input/AXUtils.h"
-#include "ports/atspi/AccessibilityBus.h"
+#include "ports/atspi/AtspiSession.h"
+#include "testing/rig/BusMonitor.h"
+#include "testing/rig/ListedProgram.h"
 #include "tests/desktop/AccessibilityDesktop.h"
-#include "tests/desktop/BusMonitor.h"
-#include "tests/desktop/ListedProgram.h"
 
 namespace plume::rig {
 
@@ -72,7 +72,7 @@ class AccessibilityFocusTest : public AccessibilityDesktop {
 
 TEST_F(AccessibilityFocusTest, AProgramDoesNotWaitForTheBusWithEveryKey) {
     const auto target = startFocused(TargetKind::GtkTextView);
-    EXPECT_TRUE(await([] { return AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3).has_value(); }));
+    EXPECT_TRUE(waitUntil([] { return AXUtils::getTextBeforeCaretWithMaxLength(*accessibility_, 3).has_value(); }));
     BusClient client(address());
     EXPECT_EQ(client.registeredEvents(), 0);
 
@@ -88,7 +88,7 @@ TEST_F(AccessibilityFocusTest, AProgramDoesNotWaitForTheBusWithEveryKey) {
 
     // With somebody who listens it does, or this test sees nothing.
     ASSERT_TRUE(client.call(Registry, "RegisterEvent", {"object:state-changed:focused"}));
-    EXPECT_TRUE(await([&] {
+    EXPECT_TRUE(waitUntil([&] {
         rig_->keyboard().type("k");
         return told.count() > 0;
     }));
@@ -99,7 +99,7 @@ TEST_F(AccessibilityFocusTest, TypingAsksFewQuestions) {
     awaitEndOfLooks();
     BusMonitor states(address(), {"GetState"});
     const auto begin = steady_clock::now();
-    ASSERT_TRUE(await([&] {
+    ASSERT_TRUE(waitUntil([&] {
         for (int i = 0; i < 1'000; ++i) accessibility_->userTypes();
         return states.count() >= 3;
     }));
@@ -111,7 +111,7 @@ TEST_F(AccessibilityFocusTest, AProgramThatTellsNothingIsAskedEverMoreRarely) {
     const auto terminal = rig_->startTarget(TargetKind::Xterm);
     BusMonitor lists(address(), {"GetChildren"});
     accessibility_->setFrontProcess(terminal->pid());
-    ASSERT_TRUE(await([&] { return lists.count() > 0; }));
+    ASSERT_TRUE(waitUntil([&] { return lists.count() > 0; }));
     EXPECT_TRUE(awaitTyping([&] { return lists.count() >= 12; }));  // the first looks, and more with the keys
     EXPECT_EQ(accessibility_->frontApplicationElement(), nullptr);  // the text behind it does not stand for it
     EXPECT_EQ(accessibility_->focusedProcess(), 0);
@@ -130,7 +130,7 @@ TEST_F(AccessibilityFocusTest, APasswordFieldIsNoticedByTypingAlone) {
     for (int i = 0; i < 4 && quickest > std::chrono::milliseconds(500); ++i) {
         awaitEndOfLooks();
         target->showPassword(true);
-        ASSERT_TRUE(await([&] { return rig_->client().focusedWindow() != target->window(); }));
+        ASSERT_TRUE(waitUntil([&] { return rig_->client().focusedWindow() != target->window(); }));
         const auto begin = steady_clock::now();
         ASSERT_TRUE(awaitTyping([] { return accessibility_->focusIsPassword(); }));
         quickest = std::min(quickest, steady_clock::now() - begin);
@@ -182,14 +182,14 @@ TEST_F(AccessibilityFocusTest, ADeepProgramIsListenedToWhileItIsInFront) {
     EXPECT_EQ(accessibility_->focusedProcess(), 0);  // out of reach
 
     program.focus(ListedProgram::Field::Password);
-    EXPECT_TRUE(await([] { return accessibility_->focusIsPassword(); }));
+    EXPECT_TRUE(waitUntil([] { return accessibility_->focusIsPassword(); }));
     EXPECT_EQ(accessibility_->focusedProcess(), getpid());
     program.focus(ListedProgram::Field::Text);
-    EXPECT_TRUE(await([] { return !accessibility_->focusIsPassword(); }));
+    EXPECT_TRUE(waitUntil([] { return !accessibility_->focusIsPassword(); }));
     EXPECT_EQ(accessibility_->focusedProcess(), getpid());
 
     comesToFront(*target);
-    EXPECT_TRUE(await([&] { return client.registeredEvents() == 0; }));
+    EXPECT_TRUE(waitUntil([&] { return client.registeredEvents() == 0; }));
 }
 
 // ---- A bus that goes ----
@@ -202,7 +202,7 @@ TEST_F(AccessibilityFocusTest, ABusThatGoesIsTold) {
     AtspiAccessibility accessibility;
     accessibility.setFrontProcess(target->pid());
     target->showPassword(true);
-    EXPECT_TRUE(await([&] {
+    EXPECT_TRUE(waitUntil([&] {
         accessibility.userTypes();
         return accessibility.focusIsPassword();
     }));
@@ -213,7 +213,7 @@ TEST_F(AccessibilityFocusTest, ABusThatGoesIsTold) {
                          .uint32();
     ASSERT_TRUE(bus);
     ASSERT_EQ(kill(static_cast<pid_t>(*bus), SIGKILL), 0);
-    EXPECT_TRUE(await([&] {
+    EXPECT_TRUE(waitUntil([&] {
         accessibility.userTypes();
         return accessibility.status() == AccessibilityStatus::Failed;
     }));

@@ -30,7 +30,8 @@ class Crash : public Robustness {
         while (!usable && !deadline.passed()) {
             rig_->keyboard().press(key);
             rig_->keyboard().sync();
-            usable = waitUntil([&] { return isKeyDown(key); }, Milliseconds(20));
+            usable =
+                waitUntil([&] { return std::ranges::count(rig_->client().keysDown(), key) > 0; }, Milliseconds(20));
             rig_->keyboard().release(key);
             rig_->keyboard().sync();
         }

@@ -15,7 +15,7 @@
 #include "ports/x11/clipboard/X11Pasteboard.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/SelectionClients.h"
-#include "tests/desktop/SessionThread.h"
+#include "testing/rig/SessionThread.h"
 
 namespace plume::rig {
 

@@ -2,11 +2,10 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <fstream>
 #include <string>
 
 #include "testing/rig/Deadline.h"
-#include "testing/rig/DesktopRig.h"
+#include "testing/rig/PlumeProgram.h"
 
 namespace plume::rig {
 
@@ -38,28 +37,16 @@ class Program : public testing::Test {
     static void SetUpTestSuite() { rig_ = std::make_unique<DesktopRig>(); }
     static void TearDownTestSuite() { rig_.reset(); }
 
-    void SetUp() override {
-        library_ = rig_->directory() / "library.json";
-        std::ofstream(library_) << Library;
-        settings_ = rig_->directory() / "settings.json";
-        std::ofstream(settings_) << R"({ "PlayFeedbackSound": false })";
-        plume_ = start();
-        ASSERT_TRUE(awaitLog(*plume_, "Plume is ready")) << plume_->logTail();
-    }
+    void SetUp() override { start(Library); }
 
-    std::unique_ptr<ChildProcess> start() {
-        return rig_->session().start(
-            {plumeProgram(), "run", "--library", library_.string(), "--settings", settings_.string()}, "plume");
+    void start(const std::string& library) {
+        plume_.reset();
+        plume_ = std::make_unique<PlumeProgram>(*rig_, library, R"({ "PlayFeedbackSound": false })");
     }
-
-    static bool awaitLog(const ChildProcess& program, const std::string& text) {
-        return waitUntil([&] { return program.logTail().find(text) != std::string::npos; }, Bound);
-    }
+    std::string log() { return plume_->process().logTail(); }
 
     static inline std::unique_ptr<DesktopRig> rig_;
-    std::filesystem::path library_;
-    std::filesystem::path settings_;
-    std::unique_ptr<ChildProcess> plume_;
+    std::unique_ptr<PlumeProgram> plume_;
 };
 
 class ProgramInTarget : public Program, public testing::WithParamInterface<TargetKind> {};
@@ -70,23 +57,16 @@ TEST_P(ProgramInTarget, ExpandsWhatIsTyped) {
         target->clear();
         rig_->keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
         rig_->keyboard().type(typed);
-        EXPECT_EQ(target->awaitText(expected), expected) << plume_->logTail();
+        EXPECT_EQ(target->awaitText(expected), expected) << log();
     };
     typeAndExpect("x ;sig", "x Kind regards, Jo");
     typeAndExpect("btw, Btw BTW ", "by the way, By the way BY THE WAY ");
     typeAndExpect("x ;uni.", "x naïve Ünïcödé — 日本語 【】 😀.");
     typeAndExpect("x ;tagbold", "x <b>bold</b>");
     typeAndExpect("x ;cut", "x 1234567890123456789😀x");
+    typeAndExpect("x ;run", "x out42");
+    typeAndExpect("x ;in", "x [out42]");
     typeAndExpect("no abbreviation at all", "no abbreviation at all");
-}
-
-TEST_P(ProgramInTarget, RunsScripts) {
-    const auto target = rig_->startTarget(GetParam());
-    rig_->keyboard().type("x ;run");
-    EXPECT_EQ(target->awaitText("x out42"), "x out42") << plume_->logTail();
-    target->clear();
-    rig_->keyboard().type("x ;in");
-    EXPECT_EQ(target->awaitText("x [out42]"), "x [out42]") << plume_->logTail();
 }
 
 // A snippet that leaves a mark elsewhere tells whether Plume listened: what a password field holds is nobody's
@@ -102,12 +82,12 @@ TEST_P(ProgramInPasswordField, DoesNotListen) {
         rig_->keyboard().type(";mark");
         return waitUntil([&] { return std::filesystem::exists(marks); }, Milliseconds(400));
     };
-    EXPECT_TRUE(waitUntil(listens, Bound)) << plume_->logTail();
+    EXPECT_TRUE(waitUntil(listens, Bound)) << log();
     target->showPassword(true);
     EXPECT_TRUE(waitUntil([&] { return !listens(); }, Bound));
     EXPECT_FALSE(listens());
     target->showPassword(false);
-    EXPECT_TRUE(waitUntil(listens, Bound)) << plume_->logTail();
+    EXPECT_TRUE(waitUntil(listens, Bound)) << log();
 }
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,
@@ -120,7 +100,7 @@ TEST_F(Program, SaysThatASnippetNeedsAForm) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     rig_->keyboard().type("x ;ask");
     EXPECT_EQ(target->awaitText("x "), "x ");
-    EXPECT_TRUE(awaitLog(*plume_, "form")) << plume_->logTail();
+    EXPECT_TRUE(waitUntil([&] { return log().find("form") != std::string::npos; })) << log();
 }
 
 TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {
@@ -129,36 +109,32 @@ TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {
         target->clear();
         rig_->keyboard().type(";sig");
         EXPECT_EQ(target->awaitText("Kind regards, Jo"), "Kind regards, Jo");
-        ASSERT_EQ(kill(plume_->pid(), signal), 0);
-        EXPECT_EQ(plume_->waitForExit(Bound), 0) << plume_->logTail();
+        ASSERT_EQ(kill(plume_->process().pid(), signal), 0);
+        EXPECT_EQ(plume_->process().waitForExit(Bound), 0) << log();
         target->clear();
         rig_->keyboard().type(";sig");
         EXPECT_EQ(target->awaitText(";sig"), ";sig");
-        plume_ = start();
-        ASSERT_TRUE(awaitLog(*plume_, "Plume is ready")) << plume_->logTail();
+        start(Library);
     }
 }
 
 TEST_F(Program, EndsInTheMiddleOfAScript) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    std::ofstream(library_) << R"([{"expandTrigger": 0, "items": [
+    start(R"([{"expandTrigger": 0, "items": [
         {"abbreviation": "slow", "contentType": 3, "content": "echo $$ >)" +
-                                   (rig_->directory() / "pid").string() + R"(; sleep 30"}]}])";
-    plume_.reset();
-    plume_ = start();
-    ASSERT_TRUE(awaitLog(*plume_, "Plume is ready")) << plume_->logTail();
+          (rig_->directory() / "pid").string() + R"(; sleep 30"}]}])");
     rig_->keyboard().type("slow");
     ASSERT_TRUE(waitUntil([&] { return std::filesystem::exists(rig_->directory() / "pid"); }, Bound));
-    ASSERT_EQ(kill(plume_->pid(), SIGTERM), 0);
-    EXPECT_EQ(plume_->waitForExit(Bound), 0) << plume_->logTail();
+    ASSERT_EQ(kill(plume_->process().pid(), SIGTERM), 0);
+    EXPECT_EQ(plume_->process().waitForExit(Bound), 0) << log();
 }
 
 TEST_F(Program, RunsOncePerDisplay) {
-    const auto second = start();
+    const auto second = rig_->session().start({plumeProgram(), "run"}, "plume");
     EXPECT_EQ(second->waitForExit(Bound), 1);
     EXPECT_NE(second->logTail().find("already running"), std::string::npos) << second->logTail();
-    EXPECT_NE(second->logTail().find(std::to_string(plume_->pid())), std::string::npos) << second->logTail();
-    EXPECT_TRUE(plume_->isRunning());
+    EXPECT_NE(second->logTail().find(std::to_string(plume_->process().pid())), std::string::npos) << second->logTail();
+    EXPECT_TRUE(plume_->process().isRunning());
 }
 
 TEST_F(Program, DoctorFindsAllThatIsNeededHere) {

@@ -6,14 +6,12 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <iterator>
 #include <memory>
 #include <string>
 
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/PlumeProgram.h"
-#include "testing/rig/XcbReply.h"
 
 namespace plume::rig {
 
@@ -81,23 +79,7 @@ class Robustness : public testing::Test {
     }
 
     // No key and no modifier is down for programs.
-    static bool isKeyboardAtRest() {
-        auto* const connection = rig_->client().connection();
-        const auto askedKeys = xcb_query_keymap(connection);
-        const auto askedState = xcb_query_pointer(connection, rig_->client().root());
-        const auto keys = own(xcb_query_keymap_reply(connection, askedKeys, nullptr));
-        const auto state = own(xcb_query_pointer_reply(connection, askedState, nullptr));
-        const auto isZero = [](std::uint8_t bits) { return bits == 0; };
-        return keys && state && std::all_of(std::begin(keys->keys), std::end(keys->keys), isZero) &&
-               (state->mask & 0xFF) == 0;
-    }
-
-    static bool isKeyDown(int keycode) {
-        auto* const connection = rig_->client().connection();
-        const auto keys = own(xcb_query_keymap_reply(connection, xcb_query_keymap(connection), nullptr));
-        const auto code = static_cast<unsigned>(keycode);
-        return keys && (keys->keys[code / 8] >> (code % 8) & 1) != 0;
-    }
+    static bool isKeyboardAtRest() { return rig_->client().keysDown().empty() && rig_->client().modifiers() == 0; }
 
     static std::string log() { return plume_->process().logTail(); }
 

@@ -112,7 +112,7 @@ class X11Desk final : public ContractDesk {
         PollRunLoop& loop = desktop_.port->tapLoop();
         const Deadline deadline(Bound);
         do {
-            loop.schedule(Step, [&loop] { loop.stop(); });
+            const Timer look = loop.performAfterDelay(Step, [&loop] { loop.stop(); });
             loop.run();
             if (condition()) return true;
         } while (!deadline.passed());
@@ -130,7 +130,7 @@ class X11Desk final : public ContractDesk {
     }
     void click(Button button, Point place) override {
         const ClickPad pad(desktop_.rig.client());
-        desktop_.rig.click(static_cast<int>(place.x), static_cast<int>(place.y), button == Button::Left ? 1 : 3);
+        desktop_.rig.click(static_cast<int>(place.x), static_cast<int>(place.y), static_cast<int>(button) + 1);
     }
     void activate(Program program) override { target(program).activate(); }
     std::u16string text(Program program) override { return fromUtf8(target(program).text()); }

@@ -5,7 +5,6 @@
 #include <algorithm>
 #include <chrono>
 #include <future>
-#include <iostream>
 
 #include "Foundation/Strings.h"
 #include "ports/x11/clipboard/SharedClipboardCopy.h"
@@ -78,8 +77,6 @@ TEST_F(X11PasteboardTest, GivesTwentyMegabytesInPiecesToSeveralProgramsAtOnce) {
         const auto value = program.request("CLIPBOARD", "image/png");
         return value && value->bytes == bytes && program.pieces() > 1;
     };
-    const auto time = timeOf([&] { EXPECT_TRUE(read()); });
-    std::cout << "20 MB given in " << time.count() << " ms\n";
     std::vector<std::future<bool>> readers;
     for (int i = 0; i < 3; ++i) readers.push_back(std::async(std::launch::async, read));
     for (auto& reader : readers) EXPECT_TRUE(reader.get());
@@ -127,18 +124,6 @@ TEST_F(X11PasteboardTest, ClipboardManagersAreToldToForgetExpansionsAlone) {
     EXPECT_THAT(manager.targets("CLIPBOARD"), Not(Contains("x-kde-passwordManagerHint")));
 }
 
-TEST_F(X11PasteboardTest, OwnContentIsReadWithoutTheServer) {
-    NotingOwner owner(NotingOwner::Contents{{String, "promised"}});
-    declare({String}, &owner);
-    EXPECT_EQ(string(), u"promised");
-    EXPECT_EQ(data(String), "promised");
-    EXPECT_EQ(data(HTML), std::nullopt);
-    declare({}, nullptr);
-    EXPECT_THAT(types(), IsEmpty());
-    EXPECT_EQ(string(), std::nullopt);
-    EXPECT_EQ(rig_->client().selectionOwner("CLIPBOARD"), 0U);
-}
-
 // ---- Who has taken it ----
 
 TEST_F(X11PasteboardTest, OnlyWhatTheProgramInFrontHasReadWasTaken) {
@@ -168,35 +153,6 @@ TEST_F(X11PasteboardTest, LongContentWasTakenWithItsLastPiece) {
     EXPECT_THAT(owner.taken(), IsEmpty());
     EXPECT_EQ(front.request("CLIPBOARD", "UTF8_STRING")->bytes, text);
     EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
-}
-
-// ---- Changes ----
-
-TEST_F(X11PasteboardTest, CountsItsOwnAndOtherProgramsChangesOnce) {
-    const std::int64_t first = declare({String}, nullptr);
-    EXPECT_EQ(changeCount(), first);
-    const std::int64_t second = declare({String}, nullptr);
-    EXPECT_EQ(second, first + 1);
-    EXPECT_EQ(changeCount(), second);
-    SelectionRequestor(display()).readAll("CLIPBOARD");
-    EXPECT_EQ(changeCount(), second) << "reading changes nothing";
-    auto other = copyElsewhere({{"UTF8_STRING", utf8("theirs")}});
-    EXPECT_EQ(changeCount(), second + 1);
-    EXPECT_EQ(string(), u"theirs");
-    const std::int64_t third = declare({}, nullptr);
-    EXPECT_EQ(changeCount(), third);
-    EXPECT_EQ(third, second + 2);
-}
-
-TEST_F(X11PasteboardTest, LosesItsContentToWhoeverCopies) {
-    write(u"ours");
-    EXPECT_EQ(string(), u"ours");
-    auto other = copyElsewhere({{"UTF8_STRING", utf8("theirs")}});
-    EXPECT_FALSE(thread_->run([&] { return pasteboard_->isOffering(); }));
-    EXPECT_EQ(string(), u"theirs");
-    other.reset();
-    awaitNoOwner();
-    EXPECT_EQ(string(), std::nullopt);
 }
 
 // ---- Reading ----
@@ -237,10 +193,7 @@ TEST_F(X11PasteboardTest, KeepsEveryNameAndSkipsWhatOnlySteersTheExchange) {
 TEST_F(X11PasteboardTest, ReadsTwentyMegabytesInPieces) {
     const std::string bytes = unevenBytes(TwentyMegabytes);
     const auto owner = copyElsewhere({{"image/png", {"image/png", 8, bytes}}});
-    std::optional<std::string> read;
-    const auto time = timeOf([&] { read = data("image/png"); });
-    std::cout << "20 MB read in " << time.count() << " ms\n";
-    EXPECT_TRUE(read == bytes);
+    EXPECT_TRUE(data("image/png") == bytes);
 }
 
 TEST_F(X11PasteboardTest, AnOwnerThatNeverAnswersIsAskedOnce) {

@@ -8,8 +8,6 @@
 #include <condition_variable>
 #include <csignal>
 #include <fstream>
-#include <future>
-#include <iostream>
 #include <mutex>
 
 #include "ports/x11/keyboard/X11SecureInput.h"
@@ -17,7 +15,7 @@
 #include "ports/x11/windows/DesktopFiles.h"
 #include "ports/x11/windows/X11ProcessManager.h"
 #include "testing/rig/DesktopRig.h"
-#include "tests/desktop/SessionThread.h"
+#include "testing/rig/SessionThread.h"
 
 namespace plume::rig {
 
@@ -137,7 +135,7 @@ class X11ProcessTest : public testing::Test {
     std::unique_ptr<X11ProcessManager> processes_;
 };
 
-TEST_F(X11ProcessTest, NamesTheProgramInFrontAndBringsOthersThere) {
+TEST_F(X11ProcessTest, NamesTheProgramInFrontAndForgetsItWhenItEnds) {
     struct Case {
         TargetKind kind;
         std::u16string identifier;
@@ -158,42 +156,21 @@ TEST_F(X11ProcessTest, NamesTheProgramInFrontAndBringsOthersThere) {
         EXPECT_EQ(found->localizedName, one.name);
         EXPECT_TRUE(found->executableURL);
     }
-    for (std::size_t i = 0; i < targets.size(); ++i) {
-        thread_->run([&] { processes_->bringToFront(numbers[i]); });
-        EXPECT_EQ(awaitFront(*targets[i]), numbers[i]);
-        rig_->client().await("the focus", Milliseconds(10'000), [&] {
-            return rig_->client().isInside(rig_->client().focusedWindow(), targets[i]->window());
-        });
-    }
     const auto ended = numbers.front();
     targets.erase(targets.begin());
     rig_->client().await("its end", Milliseconds(10'000), [&] { return !application(ended); });
 }
 
-TEST_F(X11ProcessTest, AnswersAreKnownUntilSomethingChanges) {
+TEST_F(X11ProcessTest, TypingMakesNobodyLookAgain) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     const auto process = awaitFront(*target);
-    const auto [lookUps, each] = thread_->run([&] {
-        const int before = processes_->lookUps();
-        constexpr int count = 1000;
-        const auto start = steady_clock::now();
-        for (int i = 0; i < count; ++i) {
-            EXPECT_EQ(processes_->frontProcess(), process);
-            EXPECT_TRUE(processes_->runningApplication(process));
-        }
-        const auto time = std::chrono::duration<double, std::micro>(steady_clock::now() - start);
-        return std::pair(processes_->lookUps() - before, time.count() / count);
-    });
-    std::cout << "identity, known: " << each << " us\n";
-    EXPECT_EQ(lookUps, 0);
-    EXPECT_LT(each, 100);
+    const auto lookUps = [this] { return thread_->run([this] { return processes_->lookUps(); }); };
+    const int before = lookUps();
     rig_->keyboard().type("typing changes nothing");
     EXPECT_EQ(target->awaitText("typing changes nothing"), "typing changes nothing");
     EXPECT_EQ(front(), process);
-    EXPECT_EQ(thread_->run([&] { return processes_->lookUps(); }), thread_->run([&] {
-        processes_->frontProcess();
-        return processes_->lookUps();
-    }));
+    EXPECT_TRUE(application(process));
+    EXPECT_EQ(lookUps(), before);
 }
 
 TEST_F(X11ProcessTest, AHungProgramInFrontIsNotWaitedFor) {
@@ -215,7 +192,6 @@ TEST_F(X11ProcessTest, AHungProgramInFrontIsNotWaitedFor) {
     ASSERT_FALSE(times.empty());
     const auto middle = times.begin() + static_cast<std::ptrdiff_t>(times.size() / 2);
     std::ranges::nth_element(times, middle);
-    std::cout << "identity after a change of the program in front, median: " << *middle << " us\n";
     EXPECT_LE(*middle, 100'000);
 }
 
@@ -300,36 +276,14 @@ TEST_F(BareServerTest, AnObserverHearsEventsUntilItsSubscriptionEnds) {
     EXPECT_EQ(heard, 1);
 }
 
-TEST_F(BareServerTest, AServerThatHasGoneIsTold) {
-    PrivateDirectory directory;
-    auto server = std::make_unique<XServer>(directory, XServer::Options{}, privateEnvironment(directory));
-    SessionThread thread(server->display());
-    std::promise<void> gone;
-    thread.run([&] { thread.session().serverGone = [&] { gone.set_value(); }; });
-    server.reset();
-    EXPECT_EQ(gone.get_future().wait_for(std::chrono::seconds(10)), std::future_status::ready);
-    EXPECT_EQ(thread.run([&] { return thread.session().serverTime(); }), 0U);
-}
-
 // ---- Secure input ----
 
-TEST_F(BareServerTest, AHeldKeyboardAndAPasswordFieldAreSecure) {
+TEST_F(BareServerTest, APasswordFieldIsSecure) {
     bool isPassword = false;
     const auto secure = std::move(X11SecureInput::open(server_.display(), [&] { return isPassword; })).value();
     EXPECT_FALSE(secure->isSecureEventInputEnabled());
     isPassword = true;
     EXPECT_TRUE(secure->isSecureEventInputEnabled());
-    isPassword = false;
-    auto* const connection = client_.connection();
-    const std::unique_ptr<xcb_grab_keyboard_reply_t, XcbFree> held(xcb_grab_keyboard_reply(
-        connection,
-        xcb_grab_keyboard(connection, 0, client_.root(), XCB_CURRENT_TIME, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC),
-        nullptr));
-    ASSERT_EQ(held->status, XCB_GRAB_STATUS_SUCCESS);
-    EXPECT_TRUE(secure->isSecureEventInputEnabled());
-    xcb_ungrab_keyboard(connection, XCB_CURRENT_TIME);
-    client_.focusedWindow();
-    EXPECT_FALSE(secure->isSecureEventInputEnabled());
 }
 
 TEST(X11SecureInput, NamesTheDisplayThatCannotBeOpened) {
@@ -342,6 +296,8 @@ TEST(X11SecureInput, NamesTheDisplayThatCannotBeOpened) {
 
 class X11HotKeyTest : public X11ProcessTest {
   protected:
+    static constexpr KeyModifiers ControlShift = KeyModifier::Control | KeyModifier::Shift;
+
     std::unique_ptr<X11SystemHotKeys> make(SessionThread& thread) {
         return thread.run([&] {
             return std::make_unique<X11SystemHotKeys>(
@@ -358,15 +314,9 @@ class X11HotKeyTest : public X11ProcessTest {
             changed_.notify_all();
         };
     }
-    std::string awaitHeard(const std::string& expected) {
+    std::string awaitHeard(std::size_t count) {
         std::unique_lock lock(mutex_);
-        changed_.wait_for(lock, std::chrono::seconds(10), [&] { return heard_ == expected; });
-        return heard_;
-    }
-
-    std::string awaitHeardAtLeast(const std::string& expected) {
-        std::unique_lock lock(mutex_);
-        changed_.wait_for(lock, std::chrono::seconds(10), [&] { return heard_.size() >= expected.size(); });
+        changed_.wait_for(lock, std::chrono::seconds(10), [&] { return heard_.size() >= count; });
         return heard_;
     }
 
@@ -375,37 +325,22 @@ class X11HotKeyTest : public X11ProcessTest {
     std::string heard_;
 };
 
-TEST_F(X11HotKeyTest, ExactlyTheRegisteredCombinationIsHeard) {
+TEST_F(X11HotKeyTest, CapsLockDoesNotMatterAndAHeldKeyCountsOnce) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     auto hotKeys = make(*thread_);
-    const auto result = thread_->run([&] {
-        return std::pair(
-            hotKeys->registerHotKey(1, KeyCode{'h'}, KeyModifier::Control | KeyModifier::Option, counting('h')).ok(),
-            hotKeys->registerHotKey(2, KeyCode{'j'}, KeyModifier::Control | KeyModifier::Shift, counting('j')).ok());
-    });
-    EXPECT_TRUE(result.first && result.second);
-    TestKeyboard& keyboard = rig_->keyboard();
-    keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
-    EXPECT_EQ(awaitHeard("h"), "h");
-    keyboard.tap(Key::CapsLock);
-    keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
-    EXPECT_EQ(awaitHeard("hh"), "hh");
-    keyboard.tap(Key::CapsLock);
-    keyboard.chord({Key::LeftControl, Key::LeftAlt, Key::LeftShift}, U'h');
-    keyboard.chord({Key::LeftAlt, Key::LeftShift}, U'h');
-    keyboard.chord({Key::LeftControl, Key::LeftShift}, U'j');
-    EXPECT_EQ(awaitHeard("hhj"), "hhj");
-    thread_->run([&] { hotKeys->unregisterHotKey(1); });
-    keyboard.chord({Key::LeftControl, Key::LeftAlt}, U'h');
-    keyboard.chord({Key::LeftControl, Key::LeftShift}, U'j');
-    EXPECT_EQ(awaitHeard("hhjj"), "hhjj");
+    ASSERT_TRUE(
+        thread_->run([&] { return hotKeys->registerHotKey(1, KeyCode{'h'}, ControlShift, counting('h')).ok(); }));
     Subscription presses = thread_->run(
         [&] { return thread_->session().addHandler(XCB_KEY_PRESS, [&](const auto&) { counting('.')(); }); });
+    TestKeyboard& keyboard = rig_->keyboard();
+    keyboard.tap(Key::CapsLock);
+    keyboard.chord({Key::LeftControl, Key::LeftShift}, U'h');
+    EXPECT_EQ(awaitHeard(2), "h.");
+    keyboard.tap(Key::CapsLock);
     keyboard.press(Key::LeftControl);
     keyboard.press(Key::LeftShift);
-    keyboard.press(keyboard.keycodeOf(U'j'));
-    const std::string repeated = awaitHeardAtLeast("hhjjj...").substr(0, 8);
-    EXPECT_EQ(repeated, "hhjjj...") << "a held key repeats, a hot key does not";
+    keyboard.press(keyboard.keycodeOf(U'h'));
+    EXPECT_EQ(awaitHeard(6).substr(0, 6), "h.h...") << "a held key repeats, a hot key does not";
     keyboard.releaseAll();
     thread_->run([&] {
         presses.end();
@@ -419,8 +354,7 @@ TEST_F(X11HotKeyTest, ACombinationThatIsTakenIsRefused) {
     auto ours = make(*thread_);
     const auto take = [&](SessionThread& thread, X11SystemHotKeys& hotKeys, SystemHotKeys::Id id, KeyCode key) {
         return thread.run([&] {
-            const auto result =
-                hotKeys.registerHotKey(id, key, KeyModifier::Control | KeyModifier::Option, counting('x'));
+            const auto result = hotKeys.registerHotKey(id, key, ControlShift, counting('x'));
             return result.ok() ? std::string() : result.error().message;
         });
     };

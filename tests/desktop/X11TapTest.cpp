@@ -19,18 +19,21 @@
 
 #include "Foundation/Strings.h"
 #include "ports/x11/keyboard/InputDevices.h"
+#include "ports/x11/keyboard/TapConnection.h"
+#include "ports/x11/keyboard/X11InputSources.h"
+#include "ports/x11/keyboard/X11KeyboardTap.h"
 #include "ports/x11/keyboard/XcbXkb.h"
+#include "ports/x11/keyboard/XkbKeyboard.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/FocusCounter.h"
+#include "testing/rig/SessionThread.h"
 #include "testing/rig/XcbReply.h"
-#include "tests/desktop/TapThread.h"
 
 namespace plume::rig {
 
 namespace {
 
-using Parts = TapThread::Parts;
 using Type = TapEvent::Type;
 
 constexpr Milliseconds Bound{10'000};
@@ -61,10 +64,7 @@ class Listener final : public KeyboardTapListener {
             {event.type, event.keyCode, event.flags, std::u16string(event.string), event.composing, event.command});
         return decide && decide(event);
     }
-    void tapDisabledByTimeout() override {
-        ++timeouts;
-        if (tapToEnable) tapToEnable->enable();
-    }
+    void tapDisabledByTimeout() override { ++timeouts; }
     void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody did that"; }
     void keysWithheld() override { ++withheld; }
 
@@ -72,7 +72,29 @@ class Listener final : public KeyboardTapListener {
     std::function<bool(const TapEvent&)> decide;
     int timeouts = 0;
     int withheld = 0;
-    KeyboardTap* tapToEnable = nullptr;
+};
+
+// Plume's ears on a rig's display. All of it is used inside run().
+class TapThread : public SessionThread {
+  public:
+    explicit TapThread(const std::string& display) : SessionThread(display) {
+        run([&] {
+            keyboard = valueOrThrow(XkbKeyboard::open(session().connection()));
+            keyboard->listenTo(session());
+            inputSources = std::make_unique<X11InputSources>(*keyboard);
+            connection = valueOrThrow(TapConnection::open(display, *keyboard));
+            tap = std::make_unique<X11KeyboardTap>(loop(), *connection, *keyboard);
+        });
+    }
+    ~TapThread() {
+        run([this] { tap->remove(); });
+        end();
+    }
+
+    std::unique_ptr<XkbKeyboard> keyboard;
+    std::unique_ptr<X11InputSources> inputSources;
+    std::unique_ptr<TapConnection> connection;
+    std::unique_ptr<X11KeyboardTap> tap;
 };
 
 class X11TapTest : public testing::Test {
@@ -92,21 +114,21 @@ class X11TapTest : public testing::Test {
     }
 
     void createTap() {
-        const auto created = tap_->call([this](Parts& parts) { return parts.tap->create(listener_, false); });
+        const auto created = tap_->run([this] { return tap_->tap->create(listener_, false); });
         ASSERT_TRUE(created.ok()) << created.error().message;
     }
     void removeTap() {
-        tap_->call([](Parts& parts) { parts.tap->remove(); });
+        tap_->run([this] { tap_->tap->remove(); });
     }
     void setDecision(std::function<bool(const TapEvent&)> decide) {
-        tap_->call([&](Parts& /*parts*/) { listener_.decide = std::move(decide); });
+        tap_->run([&] { listener_.decide = std::move(decide); });
     }
     std::vector<Heard> heard() {
-        return tap_->call([this](Parts& /*parts*/) { return listener_.heard; });
+        return tap_->run([this] { return listener_.heard; });
     }
     std::vector<Heard> takeHeard(std::size_t count) {
         await("keys are heard", [&] { return heard().size() >= count; });
-        return tap_->call([this](Parts& /*parts*/) { return std::exchange(listener_.heard, {}); });
+        return tap_->run([this] { return std::exchange(listener_.heard, {}); });
     }
     static void await(const std::string& what, const std::function<bool()>& condition) {
         rig_->client().await(what, Bound, condition);
@@ -120,11 +142,11 @@ class X11TapTest : public testing::Test {
         ASSERT_EQ(program->waitForExit(Bound), 0) << program->logTail();
     }
     std::string identifier() {
-        const auto name = tap_->call([](Parts& parts) { return parts.inputSources->currentInputSourceIdentifier(); });
+        const auto name = tap_->run([this] { return tap_->inputSources->currentInputSourceIdentifier(); });
         return name ? toUtf8(*name) : "";
     }
     std::optional<std::u16string> translate(KeyCode keyCode, EventFlags flags) {
-        return tap_->call([=](Parts& parts) { return parts.inputSources->translateKey(keyCode, flags); });
+        return tap_->run([=, this] { return tap_->inputSources->translateKey(keyCode, flags); });
     }
 
     static void tapKey(int keycode) {
@@ -134,15 +156,7 @@ class X11TapTest : public testing::Test {
     }
 
     // On the main keyboard, as programs see it.
-    static std::vector<int> keysDown() {
-        auto* const connection = rig_->client().connection();
-        const auto reply = own(xcb_query_keymap_reply(connection, xcb_query_keymap(connection), nullptr));
-        std::vector<int> down;
-        for (int key = 0; reply && key < 256; ++key) {
-            if (((reply->keys[key / 8] >> (key % 8)) & 1) != 0) down.push_back(key);
-        }
-        return down;
-    }
+    static std::vector<int> keysDown() { return rig_->client().keysDown(); }
 
     static inline std::unique_ptr<DesktopRig> rig_;
     Listener listener_;  // outlives the tap
@@ -295,9 +309,8 @@ TEST_F(X11TapTest, FollowsTheGroup) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     createTap();
     setLayout({"-layout", "us,de", "-option", "grp:menu_toggle"});
-    await("both layouts are there", [&] {
-        return tap_->call([](Parts& parts) { return xkb_keymap_num_layouts(parts.keyboard->keymap()->get()) == 2; });
-    });
+    await("both layouts are there",
+          [&] { return tap_->run([this] { return xkb_keymap_num_layouts(tap_->keyboard->keymap()->get()) == 2; }); });
     EXPECT_EQ(identifier(), "us");
     tapKey(135);  // switches
     tapKey(29);
@@ -319,37 +332,43 @@ TEST_F(X11TapTest, FollowsTheGroup) {
     EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Y, {}, u"y"}));
 }
 
-TEST_F(X11TapTest, ComposesDeadKeys) {
+TEST_F(X11TapTest, Composes) {
+    struct Case {
+        std::vector<std::string> layout;
+        std::vector<int> keycodes;
+        std::vector<Heard> downs;
+        std::string text;
+    };
+    const Case cases[] = {
+        {{"de"},  // dead acute, e, e
+         {21, 26, 26},
+         {{Type::KeyDown, KeyCode::Equal, {}, u"", true},
+          {Type::KeyDown, KeyCode::E, {}, u"\u00E9"},
+          {Type::KeyDown, KeyCode::E, {}, u"e"}},
+         "ée"},
+        {{"us", "-option", "compose:ralt"},  // Compose, which Apple keyboards do not have, comma, c, c
+         {108, 59, 54, 54},
+         {{Type::KeyDown, KeyCode{364}, {}, u"", true},
+          {Type::KeyDown, KeyCode::Comma, {}, u"", true},
+          {Type::KeyDown, KeyCode::C, {}, u"\u00E7"},
+          {Type::KeyDown, KeyCode::C, {}, u"c"}},
+         "çc"}};
     const auto target = rig_->startTarget(TargetKind::Xterm);
     createTap();
-    setLayout({"de"});
-    await("the layout is de", [&] { return identifier() == "de"; });
-    tapKey(21);  // dead acute
-    tapKey(26);  // e
-    tapKey(26);
-    const auto all = takeHeard(6);
-    EXPECT_EQ(all.at(0), (Heard{Type::KeyDown, KeyCode::Equal, {}, u"", true}));
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::E, {}, u"\u00E9"}));
-    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, KeyCode::E, {}, u"e"}));
-    EXPECT_EQ(target->awaitText("ée"), "ée");
-}
-
-TEST_F(X11TapTest, ComposesSequences) {
-    const auto target = rig_->startTarget(TargetKind::Xterm);
-    createTap();
-    setLayout({"us", "-option", "compose:ralt"});
-    await("the key composes",
-          [&] { return tap_->call([](Parts& parts) { return parts.keyboard->keymap()->hasComposingKeys(); }); });
-    tapKey(108);  // Compose
-    tapKey(59);   // comma
-    tapKey(54);   // c
-    tapKey(54);
-    const auto all = takeHeard(8);
-    EXPECT_TRUE(all.at(0).composing);
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::Comma, {}, u"", true}));
-    EXPECT_EQ(all.at(4), (Heard{Type::KeyDown, KeyCode::C, {}, u"\u00E7"}));
-    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, KeyCode::C, {}, u"c"}));
-    EXPECT_EQ(target->awaitText("çc"), "çc");
+    for (const Case& each : cases) {
+        setLayout(each.layout);
+        await("the layout composes", [&] {
+            return identifier() == each.layout.front() &&
+                   tap_->run([this] { return tap_->keyboard->keymap()->hasComposingKeys(); });
+        });
+        for (const int keycode : each.keycodes) tapKey(keycode);
+        auto all = takeHeard(2 * each.keycodes.size());
+        std::erase_if(all, [](const Heard& heard) { return heard.type == Type::KeyUp; });
+        EXPECT_EQ(all, each.downs);
+        EXPECT_EQ(target->awaitText(each.text), each.text);
+        target->clear();
+        setLayout({"us", "-option", ""});
+    }
 }
 
 TEST_F(X11TapTest, HeldKeysRepeat) {
@@ -382,30 +401,11 @@ TEST_F(X11TapTest, AKeyWhoseRepeatIsSwallowedStopsRepeating) {
     EXPECT_EQ(target->awaitText(text + "b"), text + "b");
 }
 
-TEST_F(X11TapTest, HeldBackKeysFollowInOrder) {
-    const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    createTap();
-    setDecision([this](const TapEvent& event) {
-        if (event.type == Type::KeyDown && event.string == u"x") tap_->parts().tap->hold();
-        return false;
-    });
-    rig_->keyboard().type("axyz");
-    takeHeard(3);
-    tap_->call([](Parts& parts) {
-        for (const bool down : {true, false}) parts.connection->sendKey(24, down);  // q
-        parts.connection->connection().sync();                                      // reads ahead
-    });
-    EXPECT_EQ(target->awaitText("aq"), "aq");
-    EXPECT_EQ(heard(), std::vector<Heard>{}) << "the keys behind it wait";
-    tap_->call([](Parts& parts) { parts.tap->release(); });
-    EXPECT_EQ(target->awaitText("aqxyz"), "aqxyz");
-}
-
 TEST_F(X11TapTest, HeldBackKeysWaitTwoSecondsAtMost) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     createTap();
     setDecision([this](const TapEvent& event) {
-        if (event.type == Type::KeyDown && event.string == u"x") tap_->parts().tap->hold();
+        if (event.type == Type::KeyDown && event.string == u"x") tap_->tap->hold();
         return false;
     });
     const auto start = std::chrono::steady_clock::now();
@@ -452,7 +452,7 @@ TEST_F(X11TapTest, PassesKeysUnheardWhileSomebodyHoldsTheKeyboard) {
         };
         tapKey(39);  // the first key may still go by an answer of before
         awaitEvents(2);
-        tap_->call([this](Parts& /*parts*/) { listener_.heard.clear(); });
+        tap_->run([this] { listener_.heard.clear(); });
         tapKey(38);
         awaitEvents(4);
         EXPECT_EQ(heard(), std::vector<Heard>{});
@@ -466,13 +466,13 @@ TEST_F(X11TapTest, PassesKeysUnheardWhileSomebodyHoldsTheKeyboard) {
 TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     std::atomic<bool> password = true;
-    tap_->call([&](Parts& parts) { parts.tap->setFocusIsPassword([&] { return password.load(); }); });
+    tap_->run([&] { tap_->tap->setFocusIsPassword([&] { return password.load(); }); });
     createTap();
     rig_->keyboard().type("Se");
     rig_->keyboard().press(Key::LeftShift);
     EXPECT_EQ(target->awaitText("Se"), "Se");
     EXPECT_EQ(heard(), std::vector<Heard>{});
-    EXPECT_EQ(tap_->call([this](Parts& /*parts*/) { return listener_.withheld; }), 1) << "of all of them";
+    EXPECT_EQ(tap_->run([this] { return listener_.withheld; }), 1) << "of all of them";
     await("shift is down", [] { return keysDown() == std::vector<int>{50}; });
     password = false;
     tapKey(38);
@@ -484,47 +484,31 @@ TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, KeyCode::A, EventFlag::Shift, u"A"}));
 }
 
-TEST_F(X11TapTest, MakesUpForModifiersThatCameUpWhileItWasLost) {
+TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEndedAndMakesUpForWhatItMissed) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
     createTap();
+    std::vector<xcb_window_t> windows;
+    tap_->run([&] {
+        windows.push_back(tap_->connection->window());
+        tap_->connection->setReopenedListener([&](xcb_window_t window) { windows.push_back(window); });
+    });
     rig_->keyboard().press(Key::LeftControl);
     EXPECT_EQ(takeHeard(1).front(), (Heard{Type::FlagsChanged, KeyCode::Control, EventFlag::Control, u""}));
-    const auto window = tap_->call([](Parts& parts) { return parts.connection->window(); });
-    xcb_kill_client(rig_->client().connection(), window);
+    await("Control is down", [] { return keysDown() == std::vector<int>{37}; });
+    xcb_kill_client(rig_->client().connection(), windows.front());
     rig_->client().focusedWindow();
-    await("the tap is told", [&] { return tap_->call([this](Parts& /*parts*/) { return listener_.timeouts == 1; }); });
+    await("the tap is told", [&] { return tap_->run([this] { return listener_.timeouts == 1; }); });
     rig_->keyboard().releaseAll();
-    await("the key is up", [] { return keysDown().empty(); });
-    tap_->call([](Parts& parts) { parts.tap->enable(); });
+    await("all keys are up", [] { return keysDown().empty(); });
+    tap_->run([this] { tap_->tap->enable(); });
     tapKey(38);
     const auto all = takeHeard(3);
     EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, KeyCode::Control, {}, u""}));
     EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, KeyCode::A, {}, u"a"}));
-}
-
-TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEnded) {
-    const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    createTap();
-    std::vector<xcb_window_t> windows;
-    tap_->call([&](Parts& parts) {
-        listener_.tapToEnable = parts.tap.get();
-        windows.push_back(parts.connection->window());
-        parts.connection->setReopenedListener([&](xcb_window_t window) { windows.push_back(window); });
-    });
-    rig_->keyboard().press(38);
-    await("a is down", [] { return keysDown() == std::vector<int>{38}; });
-    xcb_kill_client(rig_->client().connection(), windows.front());
-    rig_->client().focusedWindow();
-    await("the tap is told", [&] { return tap_->call([this](Parts& /*parts*/) { return listener_.timeouts == 1; }); });
-    rig_->keyboard().releaseAll();
-    await("all keys are up", [] { return keysDown().empty(); });
-    const std::string text = target->text();
-    takeHeard(1);
-    rig_->keyboard().type("b");
-    EXPECT_EQ(target->awaitText(text + "b"), text + "b");
-    EXPECT_THAT(takeHeard(2), testing::Contains(Heard{Type::KeyDown, KeyCode::B, {}, u"b"}));
-    tap_->call([&](Parts& parts) {
+    EXPECT_EQ(target->awaitText("a"), "a");
+    tap_->run([&] {
         EXPECT_EQ(windows.size(), 2U);
-        EXPECT_EQ(windows.back(), parts.connection->window());
+        EXPECT_EQ(windows.back(), tap_->connection->window());
         EXPECT_EQ(listener_.timeouts, 1);
     });
 }
@@ -532,19 +516,18 @@ TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEnded) {
 TEST_F(X11TapTest, SaysThatAnotherProgramHasTheKeyboard) {
     TapThread other(rig_->server().display());
     Listener listener;
-    EXPECT_TRUE(other.call([&](Parts& parts) { return parts.tap->create(listener, false); }).ok());
-    const auto refused = tap_->call([this](Parts& parts) { return parts.tap->create(listener_, false); });
+    EXPECT_TRUE(other.run([&] { return other.tap->create(listener, false); }).ok());
+    const auto refused = tap_->run([this] { return tap_->tap->create(listener_, false); });
     ASSERT_FALSE(refused.ok());
     EXPECT_THAT(refused.error().message, testing::HasSubstr("\"test keyboard\""));
     EXPECT_THAT(refused.error().message, testing::HasSubstr("held by another program"));
-    EXPECT_FALSE(tap_->call([](Parts& parts) { return parts.tap->exists(); }));
-    other.call([](Parts& parts) { parts.tap->remove(); });
+    EXPECT_FALSE(tap_->run([this] { return tap_->tap->exists(); }));
+    other.run([&] { other.tap->remove(); });
     createTap();
-    EXPECT_TRUE(tap_->call([](Parts& parts) { return parts.tap->check().ok(); }));
+    EXPECT_TRUE(tap_->run([this] { return tap_->tap->check().ok(); }));
 }
 
-TEST_F(X11TapTest, ChecksWithoutCreating) {
-    EXPECT_TRUE(tap_->call([](Parts& parts) { return parts.tap->check().ok() && !parts.tap->exists(); }));
+TEST(X11TapDisplayTest, NamesTheDisplayThatCannotBeOpened) {
     const auto nowhere = TapConnection::check(":99999");
     ASSERT_FALSE(nowhere.ok());
     EXPECT_THAT(nowhere.error().message, testing::HasSubstr(":99999"));
@@ -591,13 +574,13 @@ TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThat
     const auto target = rig.startTarget(TargetKind::GtkTextView);
     Listener listener;
     TapThread tap(rig.server().display());
-    ASSERT_TRUE(tap.call([&](Parts& parts) { return parts.tap->create(listener, false); }).ok());
+    ASSERT_TRUE(tap.run([&] { return tap.tap->create(listener, false); }).ok());
     second.set(true);
     rig.client().await("the keyboard is taken", Bound, [&] { return second.isTaken(); });
     InputTestSocket keys(rig.server().secondKeyboardSocket());
     for (const bool down : {true, false}) keys.sendKey(56, down);
     EXPECT_EQ(target->awaitText("b"), "b");
-    const auto heard = tap.call([&](Parts& /*parts*/) { return listener.heard; });
+    const auto heard = tap.run([&] { return listener.heard; });
     EXPECT_THAT(heard, testing::ElementsAre(Heard{Type::KeyDown, KeyCode::B, {}, u"b"},
                                             Heard{Type::KeyUp, KeyCode::B, {}, u"b"}));
 
@@ -617,9 +600,9 @@ TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
         }
     } changes;
     Subscription counting;
-    const auto spare = tap_->call([&](Parts& parts) {
-        counting = parts.keyboard->changedEvent.addObserver(&changes, &KeymapChanges::changed);
-        return parts.keyboard->keymap()->spareKeycodes().back();
+    const auto spare = tap_->run([&] {
+        counting = tap_->keyboard->changedEvent.addObserver(&changes, &KeymapChanges::changed);
+        return tap_->keyboard->keymap()->spareKeycodes().back();
     });
     const auto write = [&](xcb_keycode_t keycode, std::vector<xcb_keysym_t> symbols) {
         xcb_change_keyboard_mapping(rig_->client().connection(), 1, keycode, static_cast<std::uint8_t>(symbols.size()),
@@ -627,35 +610,17 @@ TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
         rig_->client().focusedWindow();
     };
     layoutChanged_ = true;  // to be undone
-    tap_->call([&](Parts& parts) { parts.keyboard->willWrite(spare, std::array{own}); });
+    tap_->run([&] { tap_->keyboard->willWrite(spare, std::array{own}); });
     write(spare, {own, own});
     write(38, {XKB_KEY_q, XKB_KEY_Q});  // the user's change
     await("the layout has changed", [&] { return translate(KeyCode::A, {}) == u"q"; });
-    tap_->call([&](Parts& parts) {
+    tap_->run([&] {
         counting.end();
         EXPECT_EQ(changes.count, 1);
-        EXPECT_FALSE(parts.keyboard->keymap()->strokeFor(U'\u6E00', 0).has_value());
-        EXPECT_THAT(parts.keyboard->keymap()->spareKeycodes(), testing::Contains(spare));
-        EXPECT_EQ(parts.keyboard->keymap()->strokeFor(U'Q', 0)->keycode, 24) << "Q first of all where it was";
+        EXPECT_FALSE(tap_->keyboard->keymap()->strokeFor(U'\u6E00', 0).has_value());
+        EXPECT_THAT(tap_->keyboard->keymap()->spareKeycodes(), testing::Contains(spare));
+        EXPECT_EQ(tap_->keyboard->keymap()->strokeFor(U'Q', 0)->keycode, 24) << "Q first of all where it was";
     });
-}
-
-TEST_F(X11TapTest, HearsClicks) {
-    std::vector<Point> clicks;
-    const auto created = tap_->call(
-        [&](Parts& parts) { return parts.mouse->create([&](Point location) { clicks.push_back(location); }); });
-    ASSERT_TRUE(created.ok());
-    constexpr int wheel = 4;
-    std::vector<Point> expected;
-    for (const int button : {1, wheel, 2, 3}) {
-        rig_->click(200 + button, 300, button);
-        if (button != wheel) expected.push_back({200.0 + button, 300});
-        await("it is heard",
-              [&] { return tap_->call([&](Parts& /*parts*/) { return clicks.size() >= expected.size(); }); });
-    }
-    tap_->call([](Parts& parts) { parts.mouse->remove(); });
-    rig_->click(1, 1);
-    EXPECT_EQ(tap_->call([&](Parts& /*parts*/) { return clicks; }), expected);
 }
 
 }  // namespace

@@ -4,50 +4,12 @@
 #include <utility>
 
 #include "ports/atspi/AtspiElement.h"
-#include "ports/atspi/AtspiSession.h"
 
 namespace plume {
 
 namespace {
 
 constexpr std::chrono::milliseconds LongestGoodbye{50};
-
-// The program in front, of which something is known to have the focus. Nothing needs to be asked to make one.
-class AtspiApplicationElement final : public UIElement {
-  public:
-    using Element = std::shared_ptr<UIElement>;
-
-    explicit AtspiApplicationElement(std::shared_ptr<AtspiSession> session) : session_(std::move(session)) {}
-
-    Element elementAttribute(std::string_view name) const override {
-        if (name != "AXFocusedUIElement") return nullptr;
-        auto focused = session_->askForFocus();
-        if (!focused || !*focused) return nullptr;
-        return std::make_shared<AtspiElement>(session_, std::move(*focused));
-    }
-    std::optional<std::u16string> stringAttribute(std::string_view name) const override {
-        return name == "AXRole" ? std::optional<std::u16string>(u"AXApplication") : std::nullopt;
-    }
-
-    // It has no text and no place.
-    std::vector<Element> elementsAttribute(std::string_view) const override { return {}; }
-    std::optional<TextRange> rangeAttribute(std::string_view) const override { return std::nullopt; }
-    std::optional<TextMarkerRange> markerRangeAttribute(std::string_view) const override { return std::nullopt; }
-    std::optional<Point> pointAttribute(std::string_view) const override { return std::nullopt; }
-    std::optional<Size> sizeAttribute(std::string_view) const override { return std::nullopt; }
-    std::optional<std::u16string> stringForRange(std::string_view, TextRange) const override { return std::nullopt; }
-    std::optional<std::u16string> stringForMarkerRange(std::string_view, TextMarkerRange) const override {
-        return std::nullopt;
-    }
-    std::optional<AttributedString> attributedStringForRange(std::string_view, TextRange) const override {
-        return std::nullopt;
-    }
-    std::optional<std::string> dataForRange(std::string_view, TextRange) const override { return std::nullopt; }
-    std::optional<Rectangle> rectangleForRange(std::string_view, TextRange) const override { return std::nullopt; }
-
-  private:
-    std::shared_ptr<AtspiSession> session_;
-};
 
 }  // namespace
 

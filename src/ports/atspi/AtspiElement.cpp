@@ -4,7 +4,6 @@
 #include <utility>
 
 #include "Foundation/Strings.h"
-#include "ports/atspi/AtspiRoles.h"
 
 namespace plume {
 
@@ -40,6 +39,17 @@ std::optional<std::u16string> stringOf(AtspiBus& bus, const AtspiPart& part, con
 }
 
 }  // namespace
+
+AtspiApplicationElement::Element AtspiApplicationElement::elementAttribute(std::string_view name) const {
+    if (name != "AXFocusedUIElement") return nullptr;
+    auto focused = session_->askForFocus();
+    if (!focused || !*focused) return nullptr;
+    return std::make_shared<AtspiElement>(session_, std::move(*focused));
+}
+
+std::optional<std::u16string> AtspiApplicationElement::stringAttribute(std::string_view name) const {
+    return name == "AXRole" ? std::optional<std::u16string>(u"AXApplication") : std::nullopt;
+}
 
 AtspiElement::AtspiElement(std::shared_ptr<AtspiSession> session, AtspiPart part)
     : session_(std::move(session)), part_(std::move(part)) {}
@@ -85,10 +95,6 @@ std::optional<TextRange> AtspiElement::rangeAttribute(std::string_view name) con
     return selection->first;
 }
 
-std::optional<TextMarkerRange> AtspiElement::markerRangeAttribute(std::string_view) const {
-    return std::nullopt;
-}
-
 std::optional<Rectangle> AtspiElement::place() const {
     return session_->ask<Rectangle>([part = part_](AtspiBus& bus) { return screenBounds(bus, part); });
 }
@@ -110,18 +116,6 @@ std::optional<std::u16string> AtspiElement::stringForRange(std::string_view name
     return session_->ask<std::u16string>([part = part_, anchor = anchor_, range](AtspiBus& bus) {
         return AtspiTextReader(bus, part, anchor).string(range);
     });
-}
-
-std::optional<std::u16string> AtspiElement::stringForMarkerRange(std::string_view, TextMarkerRange) const {
-    return std::nullopt;
-}
-
-std::optional<AttributedString> AtspiElement::attributedStringForRange(std::string_view, TextRange) const {
-    return std::nullopt;
-}
-
-std::optional<std::string> AtspiElement::dataForRange(std::string_view, TextRange) const {
-    return std::nullopt;
 }
 
 std::optional<Rectangle> AtspiElement::rectangleForRange(std::string_view name, TextRange range) const {

@@ -1,5 +1,5 @@
-// One part of a program's user interface, as the rest of Plume asks it: every attribute is a question to the
-// accessibility thread and answers in time or not at all.
+// The program in front and the parts of its user interface, as the rest of Plume asks them: every attribute is a
+// question to the accessibility thread and answers in time or not at all.
 #pragma once
 
 #include "platform/Accessibility.h"
@@ -8,24 +8,53 @@
 
 namespace plume {
 
-// Attributes without a counterpart answer nothing: text markers, attributed text, RTF.
-class AtspiElement final : public UIElement {
+// Answers nothing. AT-SPI has no counterpart of text markers, attributed text and RTF.
+class SilentElement : public UIElement {
   public:
     using Element = std::shared_ptr<UIElement>;
 
+    Element elementAttribute(std::string_view) const override { return nullptr; }
+    std::vector<Element> elementsAttribute(std::string_view) const override { return {}; }
+    std::optional<std::u16string> stringAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<TextRange> rangeAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<TextMarkerRange> markerRangeAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<Point> pointAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<Size> sizeAttribute(std::string_view) const override { return std::nullopt; }
+    std::optional<std::u16string> stringForRange(std::string_view, TextRange) const override { return std::nullopt; }
+    std::optional<std::u16string> stringForMarkerRange(std::string_view, TextMarkerRange) const override {
+        return std::nullopt;
+    }
+    std::optional<AttributedString> attributedStringForRange(std::string_view, TextRange) const override {
+        return std::nullopt;
+    }
+    std::optional<std::string> dataForRange(std::string_view, TextRange) const override { return std::nullopt; }
+    std::optional<Rectangle> rectangleForRange(std::string_view, TextRange) const override { return std::nullopt; }
+};
+
+// The program in front, of which something is known to have the focus: has neither text nor place. Nothing needs to be
+// asked to make one.
+class AtspiApplicationElement final : public SilentElement {
+  public:
+    explicit AtspiApplicationElement(std::shared_ptr<AtspiSession> session) : session_(std::move(session)) {}
+
+    Element elementAttribute(std::string_view name) const override;
+    std::optional<std::u16string> stringAttribute(std::string_view name) const override;
+
+  private:
+    std::shared_ptr<AtspiSession> session_;
+};
+
+class AtspiElement final : public SilentElement {
+  public:
     AtspiElement(std::shared_ptr<AtspiSession> session, AtspiPart part);
 
     Element elementAttribute(std::string_view name) const override;
     std::vector<Element> elementsAttribute(std::string_view name) const override;
     std::optional<std::u16string> stringAttribute(std::string_view name) const override;
     std::optional<TextRange> rangeAttribute(std::string_view name) const override;
-    std::optional<TextMarkerRange> markerRangeAttribute(std::string_view name) const override;
     std::optional<Point> pointAttribute(std::string_view name) const override;
     std::optional<Size> sizeAttribute(std::string_view name) const override;
     std::optional<std::u16string> stringForRange(std::string_view name, TextRange range) const override;
-    std::optional<std::u16string> stringForMarkerRange(std::string_view name, TextMarkerRange range) const override;
-    std::optional<AttributedString> attributedStringForRange(std::string_view name, TextRange range) const override;
-    std::optional<std::string> dataForRange(std::string_view name, TextRange range) const override;
     std::optional<Rectangle> rectangleForRange(std::string_view name, TextRange range) const override;
     bool selectsNothing() const override;
 

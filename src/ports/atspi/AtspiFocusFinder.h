@@ -1,12 +1,16 @@
-// Finds the part that has the focus by walking through the active window. Belongs to the accessibility thread.
+// The two ways to the part that has the focus: walking through the active window, and hearing from a program whose
+// parts are too many to walk through, which browsers have. Both belong to the accessibility thread.
 #pragma once
 
 #include <sys/types.h>
 
+#include <functional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "ports/atspi/AtspiParts.h"
+#include "ports/posix/PollRunLoop.h"
 
 namespace plume {
 
@@ -41,6 +45,33 @@ class AtspiFocusFinder {
     AtspiBus& bus_;
     std::vector<Program> programs_;
     int connection_ = 0;  // the one on which they were found
+};
+
+// Hears from one program which part gets the focus. A connection of its own, because who listens is taken for a screen
+// reader by every program (see AtspiBus.h) until that connection is closed.
+class AtspiFocusListener {
+  public:
+    using Heard = std::function<void(const AtspiPart& part)>;
+
+    AtspiFocusListener(PollRunLoop& loop, Heard heard) : loop_(loop), heard_(std::move(heard)) {}
+    ~AtspiFocusListener() { stop(); }
+    AtspiFocusListener(const AtspiFocusListener&) = delete;
+    AtspiFocusListener& operator=(const AtspiFocusListener&) = delete;
+
+    // To that program instead of another one. `address` is the bus's.
+    void listenTo(const std::string& program, const std::string& address);
+    void stop();
+
+  private:
+    bool begin(const std::string& program, const std::string& address);
+    void takeMessages();
+    void take(DBusMessage* message) const;
+
+    PollRunLoop& loop_;
+    const Heard heard_;
+    AtspiBus bus_;
+    Subscription source_;
+    std::string program_;  // listened to; empty when none is
 };
 
 }  // namespace plume

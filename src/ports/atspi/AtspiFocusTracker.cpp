@@ -68,13 +68,12 @@ AtspiPart AtspiFocusTracker::focusedNow() {
 
 void AtspiFocusTracker::lookSeveralTimes() {
     misses_ = 0;
-    loop_.cancel(nextOfSeries_);
     lookAfter(0);
 }
 
 void AtspiFocusTracker::lookAfter(std::size_t step) {
-    nextOfSeries_ = loop_.schedule(TimesBetweenLooks.at(step), [this, step] {
-        nextOfSeries_ = 0;
+    nextOfSeries_ = loop_.performAfterDelay(TimesBetweenLooks.at(step), [this, step] {
+        nextOfSeries_.cancel();
         if (step + 1 < TimesBetweenLooks.size()) lookAfter(step + 1);
         look();
     });
@@ -101,7 +100,7 @@ void AtspiFocusTracker::search(const AtspiFocus::Front& front) {
     } else {
         focus_.forget(front);
         setPause(PausesAfterNothing.at(std::min(misses_, PausesAfterNothing.size() - 1)));
-        if (nextOfSeries_ == 0) ++misses_;
+        if (!nextOfSeries_) ++misses_;
     }
     listenWhereItHelps(front, found);
 }

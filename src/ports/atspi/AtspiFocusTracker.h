@@ -1,5 +1,5 @@
-// Knows what has the focus by asking for it: when somebody says that it may have moved, and while somebody types. With
-// nothing going on it does nothing, and sets no timer.
+// Which program is in front and which part of it has the focus: found by asking, on the accessibility thread, and read
+// by all without waiting.
 #pragma once
 
 #include <sys/types.h>
@@ -7,16 +7,69 @@
 #include <atomic>
 #include <chrono>
 #include <cstddef>
+#include <cstdint>
 #include <functional>
+#include <mutex>
 #include <string>
+#include <utility>
 
-#include "ports/atspi/AtspiFocus.h"
 #include "ports/atspi/AtspiFocusFinder.h"
-#include "ports/atspi/AtspiFocusListener.h"
-#include "ports/posix/PollRunLoop.h"
 
 namespace plume {
 
+// What is known of the focus.
+class AtspiFocus {
+  public:
+    // A program for as long as it is in front: what was found for an earlier one no longer holds.
+    struct Front {
+        pid_t process = 0;  // 0: not known
+        std::uint64_t turn = 0;
+    };
+
+    Front front() const {
+        const std::scoped_lock lock(mutex_);
+        return front_;
+    }
+    AtspiPart part() const {
+        const std::scoped_lock lock(mutex_);
+        return part_;
+    }
+    bool isKnown() const { return isKnown_; }
+    bool isPassword() const { return isPassword_; }
+    pid_t process() const { return process_; }
+
+    // Whether that is another one. Its focus is not known at first.
+    bool setFront(pid_t process) {
+        const std::scoped_lock lock(mutex_);
+        if (front_.process == process) return false;
+        front_ = {process, front_.turn + 1};
+        change({}, false, 0);
+        return true;
+    }
+    void set(const Front& front, AtspiPart part, bool isPassword, pid_t process) {
+        const std::scoped_lock lock(mutex_);
+        if (front.turn == front_.turn) change(std::move(part), isPassword, process);
+    }
+    void forget(const Front& front) { set(front, {}, false, 0); }
+
+  private:
+    void change(AtspiPart part, bool isPassword, pid_t process) {
+        isKnown_ = static_cast<bool>(part);
+        isPassword_ = isPassword;
+        process_ = process;
+        part_ = std::move(part);
+    }
+
+    mutable std::mutex mutex_;  // held to copy two strings, never longer
+    Front front_;
+    AtspiPart part_;
+    std::atomic<bool> isKnown_ = false;
+    std::atomic<bool> isPassword_ = false;
+    std::atomic<pid_t> process_ = 0;
+};
+
+// Asks what has the focus when somebody says that it may have moved, and while somebody types. With nothing going on it
+// does nothing, and sets no timer.
 class AtspiFocusTracker {
   public:
     // `address` makes sure that the bus is connected, and tells where it is: nothing when it cannot be.
@@ -56,8 +109,8 @@ class AtspiFocusTracker {
     AtspiFocus focus_;
     int connection_ = 0;  // the one on which it was found
     Clock::time_point lookedAt_{};
-    std::size_t misses_ = 0;            // looks in a row that found nothing, without those of a series
-    RunLoop::CallId nextOfSeries_ = 0;  // of looks after a move; 0 after the last one
+    std::size_t misses_ = 0;  // looks in a row that found nothing, without those of a series
+    Timer nextOfSeries_;      // of looks after a move; none after the last one
     // From when on a key makes for a look.
     std::atomic<Clock::rep> nextLook_ = 0;
 };

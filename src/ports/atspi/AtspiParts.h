@@ -1,11 +1,10 @@
-// What the parts of programs are asked, by several files. All on the accessibility thread.
+// What the parts of programs are asked, by several files, and what AT-SPI and Plume call them. All on the accessibility
+// thread.
 #pragma once
-
-#include <sys/types.h>
 
 #include <cstdint>
 #include <optional>
-#include <string>
+#include <string_view>
 #include <vector>
 
 #include "ports/atspi/AtspiBus.h"
@@ -79,6 +78,11 @@ bool hasState(AtspiBus& bus, const AtspiPart& part, AtspiState state);
 std::optional<AtspiRole> roleNumberOf(AtspiBus& bus, const AtspiPart& part);
 AtspiPart parentOf(AtspiBus& bus, const AtspiPart& part);
 std::vector<AtspiPart> childrenOf(AtspiBus& bus, const AtspiPart& part, std::int32_t most);
+
+// "AXUnknown" for a role that Plume has no use for.
+std::u16string_view roleOf(AtspiBus& bus, const AtspiPart& part);
+// Empty when it has none.
+std::u16string_view subroleOf(AtspiBus& bus, const AtspiPart& part);
 
 // A structure of a name and a path; none for what cannot be asked.
 AtspiPart partIn(BusReader reader);

@@ -55,10 +55,6 @@ void TargetChannel::reportText(int position, int removed, const std::string& ins
                   {"length", length}}));
 }
 
-void TargetChannel::reportFocus(bool in) {
-    write(lineOf({{"event", "focus"}, {"time", monotonicNanoseconds()}, {"in", in}}));
-}
-
 void TargetChannel::reportPasted(int length) {
     write(lineOf({{"event", "pasted"}, {"time", monotonicNanoseconds()}, {"length", length}}));
 }

@@ -25,7 +25,6 @@ class TargetChannel {
 
     void reportReady(unsigned long window);
     void reportText(int position, int removed, const std::string& inserted, int length);
-    void reportFocus(bool in);
     void reportPasted(int length);
 
     // Answers the requests that have arrived; false once the test has closed the line and the program should end.

@@ -68,7 +68,6 @@ bool TerminalLine::takeCharacter() {
 }
 
 void TerminalLine::perform(const std::string& sequence) {
-    if (sequence == "I" || sequence == "O") listener_.focusChanged(sequence == "I");
     if (sequence == "201~") listener_.pasted();
     if (sequence == "D" && caret_ > 0) --caret_;
     if (sequence == "C" && caret_ < characters_.size()) ++caret_;

@@ -7,13 +7,12 @@
 namespace plume::target {
 
 // What a terminal's program makes of the bytes it reads: a text with an insertion point, edited by the usual keys. It
-// knows Backspace, Delete, Home, End, the arrows to the left and right, bracketed pastes and focus reports; it ignores
-// other control sequences.
+// knows Backspace, Delete, Home, End, the arrows to the left and right, and bracketed pastes; it ignores other control
+// sequences.
 class TerminalLine {
   public:
     struct Listener {
         std::function<void(int position, int removed, const std::string& inserted)> changed;
-        std::function<void(bool in)> focusChanged;
         std::function<void()> pasted;
     };
 

@@ -65,11 +65,6 @@ void showPassword(Target& target, bool shown) {
     gtk_window_present(GTK_WINDOW(target.passwordWindow));
 }
 
-gboolean focusChanged(GtkWidget*, const GdkEventFocus* event, Target* target) {
-    target->channel->reportFocus(event->in != 0);
-    return FALSE;
-}
-
 gboolean mapped(GtkWidget* window, GdkEvent*, Target* target) {
     target->channel->reportReady(gdk_x11_window_get_xid(gtk_widget_get_window(window)));
     return FALSE;
@@ -86,8 +81,6 @@ void connectSignals(Target& target) {
     g_signal_connect(target.buffer, "delete-range", G_CALLBACK(aboutToRemove), &target);
     g_signal_connect_after(target.buffer, "delete-range", G_CALLBACK(removed), &target);
     g_signal_connect(target.buffer, "paste-done", G_CALLBACK(pasted), &target);
-    g_signal_connect(target.view, "focus-in-event", G_CALLBACK(focusChanged), &target);
-    g_signal_connect(target.view, "focus-out-event", G_CALLBACK(focusChanged), &target);
     g_signal_connect(target.window, "map-event", G_CALLBACK(mapped), &target);
     g_signal_connect(target.window, "destroy", G_CALLBACK(gtk_main_quit), nullptr);
     g_unix_fd_add(target.channel->descriptor(), static_cast<GIOCondition>(G_IO_IN | G_IO_HUP), requested, &target);

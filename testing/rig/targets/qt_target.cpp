@@ -29,16 +29,6 @@ class TargetEdit : public QTextEdit {
     TargetChannel& channel() { return channel_; }
 
   protected:
-    void focusInEvent(QFocusEvent* event) override {
-        QTextEdit::focusInEvent(event);
-        channel_.reportFocus(true);
-    }
-
-    void focusOutEvent(QFocusEvent* event) override {
-        QTextEdit::focusOutEvent(event);
-        channel_.reportFocus(false);
-    }
-
     void insertFromMimeData(const QMimeData* source) override {
         QTextEdit::insertFromMimeData(source);
         channel_.reportPasted(length());

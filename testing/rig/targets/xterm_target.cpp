@@ -40,7 +40,7 @@ class RawTerminal {
         termios raw = before_;
         cfmakeraw(&raw);
         tcsetattr(STDIN_FILENO, TCSANOW, &raw);
-        show("\x1b[?1004h\x1b[?2004h");  // report focus changes, bracket pastes
+        show("\x1b[?2004h");  // bracket pastes
     }
     ~RawTerminal() { tcsetattr(STDIN_FILENO, TCSANOW, &before_); }
     RawTerminal(const RawTerminal&) = delete;
@@ -75,7 +75,6 @@ int main(int argc, char** argv) {
                                const bool appended = removed == 0 && line.isAtEnd();
                                show(withTerminalNewlines(appended ? inserted : "\x1b[2J\x1b[H" + line.text()));
                            },
-                       .focusChanged = [&](bool in) { channel->reportFocus(in); },
                        .pasted = [&] { channel->reportPasted(line.length()); }});
     channel = std::make_unique<TargetChannel>(
         argv[1],

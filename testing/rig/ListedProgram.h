@@ -7,7 +7,7 @@
 #include <thread>
 #include <vector>
 
-#include "ports/atspi/AtspiMessages.h"
+#include "ports/atspi/AtspiBus.h"
 
 namespace plume::rig {
 

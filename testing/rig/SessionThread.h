@@ -1,4 +1,3 @@
-// The tap thread of a test: a run loop with the session's connection.
 #pragma once
 
 #include <exception>
@@ -15,20 +14,29 @@
 
 namespace plume::rig {
 
+// What a part of the port was opened with; throws RigError with what the port says when it was not.
+template <typename Value>
+Value valueOrThrow(Result<Value> result) {
+    if (!result) throw RigError(result.error().message);
+    if constexpr (!std::is_void_v<Value>) return std::move(result).value();
+}
+
+// The tap thread of Plume's X11 port: a run loop with the session's connection to the server. The parts of the port
+// that a test puts onto it are made, used and ended inside run(). The display outlives it.
 class SessionThread {
   public:
-    explicit SessionThread(const std::string& display) : session_(open(display, loop_)) {
+    explicit SessionThread(const std::string& display)  // throws RigError
+        : session_(valueOrThrow(X11Session::open(display, loop_))) {
         thread_ = std::thread([this] { loop_.run(); });
     }
     ~SessionThread() { end(); }
     SessionThread(const SessionThread&) = delete;
     SessionThread& operator=(const SessionThread&) = delete;
 
-    // Made before anything runs there; to be used in run() only.
     X11Session& session() { return *session_; }
     PollRunLoop& loop() { return loop_; }
 
-    // Calls there and waits for the result.
+    // Calls there, waits, and gives what the call gives or throws.
     template <typename Call>
     auto run(Call call) {
         std::promise<std::invoke_result_t<Call>> promise;
@@ -55,12 +63,6 @@ class SessionThread {
     }
 
   private:
-    static std::unique_ptr<X11Session> open(const std::string& display, PollRunLoop& loop) {
-        auto session = X11Session::open(display, loop);
-        if (!session) throw RigError(session.error().message);
-        return std::move(session).value();
-    }
-
     PollRunLoop loop_;
     std::unique_ptr<X11Session> session_;
     std::thread thread_;

@@ -1,4 +1,4 @@
-#include "tests/desktop/ListedProgram.h"
+#include "testing/rig/ListedProgram.h"
 
 #include <array>
 

@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "ports/atspi/AtspiMessages.h"
+#include "ports/atspi/AtspiBus.h"
 
 namespace plume::rig {
 

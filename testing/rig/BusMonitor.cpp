@@ -1,4 +1,4 @@
-#include "tests/desktop/BusMonitor.h"
+#include "testing/rig/BusMonitor.h"
 
 #include "testing/rig/RigError.h"
 
