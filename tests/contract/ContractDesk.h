@@ -39,7 +39,7 @@ class ContractLoop {
 class ContractDesk {
   public:
     enum class Program { First, Second };
-    enum class Button { Left, Right };
+    enum class Button { Left, Middle, Right, Wheel };
 
     virtual ~ContractDesk() = default;
     virtual Pasteboard& pasteboard() = 0;
@@ -63,7 +63,7 @@ class ContractDesk {
     // The user's keyboard: a, b, c, Shift and Control.
     virtual void press(KeyCode keyCode) = 0;
     virtual void release(KeyCode keyCode) = 0;
-    // The user moves the mouse there and clicks; no program minds it.
+    // The user moves the mouse there and clicks, or turns its wheel; no program minds it.
     virtual void click(Button button, Point place) = 0;
     virtual void activate(Program program) = 0;
     // What stands in the program's field.

@@ -10,13 +10,13 @@ namespace {
 
 const std::string StringType(PasteboardType::String);
 
-// Promises one text, and counts how often it is asked.
+// Promises one text, and counts how often it is asked. An empty promise is not kept.
 class Promise final : public PasteboardOwner {
   public:
     explicit Promise(std::u16string text) : text_(std::move(text)) {}
     void provideData(Pasteboard& pasteboard, std::string_view type) override {
         ++asked;
-        pasteboard.setString(text_, type);
+        if (!text_.empty()) pasteboard.setString(text_, type);
     }
     int asked = 0;
 
@@ -33,13 +33,14 @@ TEST_P(PasteboardContract, GivesBackWhatWasWritten) {
     pasteboard.setData("<b>x</b>", PasteboardType::HTML);
     pasteboard.setString(u"na\u00EFve \U0001F600", StringType);
     pasteboard.setData(odd, "org.example.odd");
+    pasteboard.setData("{\\rtf1}", PasteboardType::RTF);
 
     EXPECT_EQ(pasteboard.types(),
               (std::vector<std::string>{std::string(PasteboardType::HTML), StringType, "org.example.odd"}));
     EXPECT_EQ(pasteboard.string(), u"na\u00EFve \U0001F600");
     EXPECT_EQ(pasteboard.data(PasteboardType::HTML), "<b>x</b>");
     EXPECT_EQ(pasteboard.data("org.example.odd"), odd);
-    EXPECT_EQ(pasteboard.data("org.example.missing"), std::nullopt);
+    EXPECT_EQ(pasteboard.data(PasteboardType::RTF), std::nullopt) << "it was not declared";
     EXPECT_EQ(desk_->readElsewhere(), u"na\u00EFve \U0001F600");
 }
 
@@ -50,9 +51,11 @@ TEST_P(PasteboardContract, CountsEveryChange) {
     EXPECT_GT(own, before);
     EXPECT_EQ(pasteboard.changeCount(), own);
     pasteboard.setString(u"mine", StringType);
-    EXPECT_EQ(pasteboard.changeCount(), own) << "writing the declared content is no change of its own";
+    EXPECT_EQ(desk_->readElsewhere(), u"mine");
+    EXPECT_EQ(pasteboard.changeCount(), own) << "neither writing what was declared nor reading it is a change";
     desk_->copyElsewhere(u"theirs");
     EXPECT_TRUE(desk_->runUntil([&] { return pasteboard.changeCount() > own; }));
+    EXPECT_EQ(pasteboard.changeCount(), own + 1);
     EXPECT_EQ(pasteboard.string(), u"theirs");
 }
 
@@ -63,7 +66,14 @@ TEST_P(PasteboardContract, AsksForPromisedContentWhenSomebodyWantsIt) {
     EXPECT_TRUE(desk_->runUntil([&] { return pasteboard.types() == std::vector{StringType}; }));
     EXPECT_EQ(promise.asked, 0) << "nobody wants more than the types";
     EXPECT_EQ(desk_->readElsewhere(), u"promised");
-    EXPECT_GT(promise.asked, 0);
+    EXPECT_EQ(pasteboard.string(), u"promised");
+    EXPECT_EQ(promise.asked, 1) << "what was given is kept";
+    EXPECT_EQ(pasteboard.data("org.example.missing"), std::nullopt);
+
+    Promise broken(u"");
+    pasteboard.declareTypes({StringType}, &broken);
+    EXPECT_EQ(pasteboard.string(), std::nullopt);
+    EXPECT_EQ(desk_->readElsewhere(), std::nullopt);
 }
 
 TEST_P(PasteboardContract, ForgetsAPromiseThatWasReplaced) {

@@ -10,7 +10,7 @@ class PollLoop final : public ContractLoop {
   public:
     RunLoop& runLoop() override { return loop_; }
     void run(double seconds) override {
-        loop_.schedule(seconds, [this] { loop_.stop(); });
+        const Timer end = loop_.performAfterDelay(seconds, [this] { loop_.stop(); });
         loop_.run();
     }
 

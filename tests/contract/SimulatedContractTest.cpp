@@ -44,9 +44,9 @@ class SimulatedDesk final : public ContractDesk {
 
     void press(KeyCode keyCode) override { desktop_.keyboard().press(keyCode); }
     void release(KeyCode keyCode) override { desktop_.keyboard().release(keyCode); }
-    void click(Button, Point place) override {
+    void click(Button button, Point place) override {
         desktop_.poster().setPointerLocation(place);
-        desktop_.click();
+        if (button != Button::Wheel) desktop_.click();
     }
     void activate(Program program) override { desktop_.activate(nameOf(program)); }
     std::u16string text(Program program) override { return desktop_.application(nameOf(program)).field().text(); }

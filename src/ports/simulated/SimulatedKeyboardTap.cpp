@@ -6,13 +6,11 @@ Result<void> SimulatedKeyboardTap::create(KeyboardTapListener& listener, bool an
     if (missing_) return Error{*missing_};
     listener_ = &listener;
     annotatedSession_ = annotatedSession;
-    enabled_ = true;
     return {};
 }
 
 void SimulatedKeyboardTap::remove() {
     listener_ = nullptr;
-    enabled_ = false;
 }
 
 Result<void> SimulatedKeyboardTap::check() const {
@@ -20,14 +18,8 @@ Result<void> SimulatedKeyboardTap::check() const {
     return {};
 }
 
-void SimulatedKeyboardTap::disableByTimeout() {
-    if (!exists()) return;
-    enabled_ = false;
-    listener_->tapDisabledByTimeout();
-}
-
 bool SimulatedKeyboardTap::swallows(const TapEvent& event) {
-    return enabled_ && listener_->keyboardEvent(event);
+    return exists() && listener_->keyboardEvent(event);
 }
 
 }  // namespace plume

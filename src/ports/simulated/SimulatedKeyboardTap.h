@@ -13,14 +13,12 @@ class SimulatedKeyboardTap final : public KeyboardTap {
   public:
     Result<void> create(KeyboardTapListener& listener, bool annotatedSession) override;
     bool exists() const override { return listener_ != nullptr; }
-    void enable() override { enabled_ = exists(); }
+    void enable() override {}  // it never is disabled
     void remove() override;
     Result<void> check() const override;
 
     // Makes create() and check() fail with this message, or succeed again.
     void setMissing(std::optional<std::string> message) { missing_ = std::move(message); }
-    // What a port does when an answer took too long.
-    void disableByTimeout();
     bool listensAtAnnotatedSession() const { return annotatedSession_; }
 
     // Whether the listener swallows the event; without a listener nobody does.
@@ -28,7 +26,6 @@ class SimulatedKeyboardTap final : public KeyboardTap {
 
   private:
     KeyboardTapListener* listener_ = nullptr;
-    bool enabled_ = false;
     bool annotatedSession_ = false;
     std::optional<std::string> missing_;
 };
