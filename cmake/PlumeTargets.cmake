@@ -1,9 +1,9 @@
-# How every target of Plume is built: warnings are errors, sanitizers come from PLUME_SANITIZE.
+# How every target of Plume is built: warnings are errors where PLUME_WERROR is on, sanitizers come from PLUME_SANITIZE.
 
 add_library(plume_options INTERFACE)
 target_compile_options(plume_options INTERFACE
   -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wsign-conversion -Wnon-virtual-dtor -Woverloaded-virtual
-  -Wimplicit-fallthrough -Werror
+  -Wimplicit-fallthrough $<$<BOOL:${PLUME_WERROR}>:-Werror>
   # GCC 12 raises false alarms when it optimises: overlapping copies in plain string concatenation (its bug 105651), and
   # unset members in variants that hold strings. Clang's builds and the sanitizers keep watch over both.
   $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict> $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
