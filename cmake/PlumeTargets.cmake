@@ -22,6 +22,11 @@ function(plume_add_library name)
   target_link_libraries(${name} PUBLIC ${LIB_SEES} PRIVATE plume_options)
 endfunction()
 
+# For the sources of tests: what they test is optimised as the build says, they themselves are compiled in half the time.
+function(plume_compile_fast name)
+  target_compile_options(${name} PRIVATE -O0 -g1)
+endfunction()
+
 # All tests with the label "threads".
 add_custom_target(threads_tests)
 
@@ -32,6 +37,7 @@ function(plume_test name)
   add_executable(${name} ${TEST_SOURCES})
   target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR})
   target_link_libraries(${name} PRIVATE ${TEST_SEES} plume_options GTest::gmock GTest::gtest_main)
+  plume_compile_fast(${name})
   set(properties TIMEOUT 300)
   if("threads" IN_LIST TEST_LABELS)
     add_dependencies(threads_tests ${name})
