@@ -86,7 +86,7 @@ Scenario readScenario(const ScenarioKeys& keys, const std::string& fileName) {
 std::string readName(const JsonObject& object, std::set<std::string>& taken) {
     const std::optional<JsonNode> node = object.find("name");
     if (!node) object.node().fail("expected a \"name\" for the case");
-    const std::string name = toUtf8(node->string());
+    std::string name = toUtf8(node->string());
     if (name.empty()) node->fail("expected a name");
     if (!taken.insert(name).second) node->fail("expected a name that no case before it has");
     return name;

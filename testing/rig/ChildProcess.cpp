@@ -116,8 +116,8 @@ void ChildProcess::reap() {
 std::string ChildProcess::logTail() const {
     std::ifstream file(log_, std::ios::binary);
     std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-    constexpr std::size_t longest = 4000;
-    if (text.size() > longest) text.erase(0, text.size() - longest);
+    constexpr std::size_t Longest = 4000;
+    if (text.size() > Longest) text.erase(0, text.size() - Longest);
     return text;
 }
 

@@ -10,18 +10,18 @@ namespace plume::rig {
 
 namespace {
 
-constexpr Milliseconds startBound{10'000};
+constexpr Milliseconds StartBound{10'000};
 
 // The only settings of the caller that programs of the desktop get: how to find programs and libraries, and how
 // sanitizers report.
-constexpr const char* inherited[] = {"PATH",         "LD_LIBRARY_PATH", "TZ",           "TMPDIR",
+constexpr const char* Inherited[] = {"PATH",         "LD_LIBRARY_PATH", "TZ",           "TMPDIR",
                                      "ASAN_OPTIONS", "UBSAN_OPTIONS",   "TSAN_OPTIONS", "LSAN_OPTIONS"};
 
 }  // namespace
 
 Environment privateEnvironment(const PrivateDirectory& directory) {
     Environment environment;
-    for (const char* name : inherited) {
+    for (const char* name : Inherited) {
         if (const char* value = std::getenv(name)) environment.push_back(std::string(name) + "=" + value);
     }
     const auto add = [&](const std::string& name, const std::string& value) {
@@ -66,7 +66,7 @@ void DesktopSession::startBus() {
                         {"--session", "--nofork", "--nopidfile", "--nosyslog", "--address=" + wanted,
                          "--print-address=" + std::to_string(address.writer())},
                         {address.writer()});
-    environment_.push_back("DBUS_SESSION_BUS_ADDRESS=" + address.awaitLine(*bus_, startBound));
+    environment_.push_back("DBUS_SESSION_BUS_ADDRESS=" + address.awaitLine(*bus_, StartBound));
 }
 
 // The launcher publishes the accessibility bus on the root window once programs can use it.
@@ -75,7 +75,7 @@ void DesktopSession::startAccessibility(XClient& client) {
         requireFile({"/usr/libexec/at-spi-bus-launcher", "/usr/lib/at-spi2-core/at-spi-bus-launcher"}, "at-spi2-core");
     requireFile({"/usr/libexec/at-spi2-registryd", "/usr/lib/at-spi2-core/at-spi2-registryd"}, "at-spi2-core");
     accessibility_ = startProgram(program, {"--launch-immediately"});
-    client.await("the start of the accessibility bus", startBound, [&] {
+    client.await("the start of the accessibility bus", StartBound, [&] {
         if (!accessibility_->isRunning())
             throw RigError("the accessibility bus has ended:\n" + accessibility_->logTail());
         return !client.property(client.root(), "AT_SPI_BUS").empty();
@@ -84,7 +84,7 @@ void DesktopSession::startAccessibility(XClient& client) {
 
 void DesktopSession::startWindowManager(XClient& client) {
     windowManager_ = startProgram(requireProgram("openbox", "openbox"), {"--sm-disable"});
-    client.await("the start of openbox", startBound, [&] {
+    client.await("the start of openbox", StartBound, [&] {
         if (!windowManager_->isRunning()) throw RigError("openbox has ended:\n" + windowManager_->logTail());
         const std::string bytes = client.property(client.root(), "_NET_SUPPORTING_WM_CHECK");
         xcb_window_t window = XCB_WINDOW_NONE;
@@ -102,13 +102,13 @@ void DesktopSession::awaitManaging(XClient& client) {
     xcb_create_window(connection, XCB_COPY_FROM_PARENT, window, client.root(), 0, 0, 10, 10, 0,
                       XCB_WINDOW_CLASS_INPUT_OUTPUT, XCB_COPY_FROM_PARENT, 0, nullptr);
     const auto isManaged = [&] { return std::ranges::count(client.managedWindows(), window) > 0; };
-    client.await("managing a window", startBound, [&] {
+    client.await("managing a window", StartBound, [&] {
         if (isManaged()) return true;
         xcb_map_window(connection, window);  // does nothing when it is mapped
         return false;
     });
     xcb_destroy_window(connection, window);
-    client.await("letting a window go", startBound, [&] { return !isManaged(); });
+    client.await("letting a window go", StartBound, [&] { return !isManaged(); });
 }
 
 std::unique_ptr<ChildProcess> DesktopSession::start(const std::vector<std::string>& arguments,

@@ -13,7 +13,7 @@ namespace plume::rig {
 
 namespace {
 
-constexpr Milliseconds answerBound{5'000};
+constexpr Milliseconds AnswerBound{5'000};
 
 template <typename Event>
 Event makeEvent(xf86ITEventType type) {
@@ -83,7 +83,7 @@ void InputTestSocket::sendBytes(const void* bytes, std::size_t length) {
 
 void InputTestSocket::receive(int expectedType, std::size_t expectedLength) {
     xf86ITResponseAny response{};
-    const Deadline deadline(answerBound);
+    const Deadline deadline(AnswerBound);
     std::size_t received = 0;
     while (received < expectedLength) {
         if (!deadline.waitReadable(socket_.get())) throw RigError("the X server's test device does not answer");

@@ -63,8 +63,8 @@ void ListedProgram::enlist() {
 }
 
 void ListedProgram::serve() {
-    constexpr int turnMilliseconds = 5;
-    while (!ended_ && dbus_connection_read_write(connection_.get(), turnMilliseconds) != 0) {
+    constexpr int TurnMilliseconds = 5;
+    while (!ended_ && dbus_connection_read_write(connection_.get(), TurnMilliseconds) != 0) {
         while (const BusMessage message{dbus_connection_pop_message(connection_.get())}) {
             if (dbus_message_get_type(message.get()) == DBUS_MESSAGE_TYPE_METHOD_CALL) answer(message.get());
         }

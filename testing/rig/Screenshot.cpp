@@ -9,23 +9,23 @@ namespace plume::rig {
 void writeScreenshot(XClient& client, const std::filesystem::path& file) {
     const auto width = client.screen().width_in_pixels;
     const auto height = client.screen().height_in_pixels;
-    constexpr std::uint32_t allPlanes = ~0U;
+    constexpr std::uint32_t AllPlanes = ~0U;
     const auto cookie =
-        xcb_get_image(client.connection(), XCB_IMAGE_FORMAT_Z_PIXMAP, client.root(), 0, 0, width, height, allPlanes);
+        xcb_get_image(client.connection(), XCB_IMAGE_FORMAT_Z_PIXMAP, client.root(), 0, 0, width, height, AllPlanes);
     const auto reply = own(xcb_get_image_reply(client.connection(), cookie, nullptr));
-    constexpr int bytesPerPixel = 4;  // the server is configured with depth 24
-    if (!reply || xcb_get_image_data_length(reply.get()) < width * height * bytesPerPixel) {
+    constexpr int BytesPerPixel = 4;  // the server is configured with depth 24
+    if (!reply || xcb_get_image_data_length(reply.get()) < width * height * BytesPerPixel) {
         throw RigError("the X server gives no picture of its screen");
     }
     auto* pixels = xcb_get_image_data(reply.get());
-    for (int i = 0; i < width * height; ++i) pixels[i * bytesPerPixel + 3] = 0xFF;  // the unused byte becomes opaque
+    for (int i = 0; i < width * height; ++i) pixels[i * BytesPerPixel + 3] = 0xFF;  // the unused byte becomes opaque
 
     png_image image{};
     image.version = PNG_IMAGE_VERSION;
     image.width = width;
     image.height = height;
     image.format = PNG_FORMAT_BGRA;
-    if (png_image_write_to_file(&image, file.c_str(), 0, pixels, width * bytesPerPixel, nullptr) == 0) {
+    if (png_image_write_to_file(&image, file.c_str(), 0, pixels, width * BytesPerPixel, nullptr) == 0) {
         throw RigError("cannot write " + file.string() + ": " + image.message);
     }
 }

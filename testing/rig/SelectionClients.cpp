@@ -11,8 +11,8 @@ namespace plume::rig {
 
 namespace {
 
-constexpr Milliseconds answerBound{10'000};
-constexpr Milliseconds stopBound{20};
+constexpr Milliseconds AnswerBound{10'000};
+constexpr Milliseconds StopBound{20};
 
 std::unique_ptr<XcbConnection> connect(const std::string& display) {
     auto connection = XcbConnection::open(display);
@@ -69,7 +69,7 @@ void ForeignOwner::serve() {
         }
         connection_->flush();
         pollfd entry{connection_->descriptor(), POLLIN, 0};
-        poll(&entry, 1, static_cast<int>(stopBound.count()));
+        poll(&entry, 1, static_cast<int>(StopBound.count()));
     }
 }
 
@@ -152,7 +152,7 @@ SelectionRequestor::~SelectionRequestor() = default;
 void SelectionRequestor::comeToFront(XClient& client) {
     xcb_map_window(connection_->get(), window_);
     connection_->sync();
-    client.await("the requestor's window", answerBound, [&] {
+    client.await("the requestor's window", AnswerBound, [&] {
         const auto managed = client.managedWindows();
         return std::find(managed.begin(), managed.end(), window_) != managed.end();
     });
@@ -160,7 +160,7 @@ void SelectionRequestor::comeToFront(XClient& client) {
 }
 
 void SelectionRequestor::next(const std::string& what) {
-    const Deadline deadline(answerBound);
+    const Deadline deadline(AnswerBound);
     while (true) {
         connection_->flush();  // first: while it sends, the library may read
         const auto event = connection_->pollEvent();
@@ -195,10 +195,10 @@ bool SelectionRequestor::awaitAnswer() {
 }
 
 std::optional<SelectionData> SelectionRequestor::take(xcb_atom_t property) {
-    constexpr std::uint32_t all = 0x1FFFFFFF;
+    constexpr std::uint32_t All = 0x1FFFFFFF;
     const XcbOwned<xcb_get_property_reply_t> reply(xcb_get_property_reply(
         connection_->get(),
-        xcb_get_property(connection_->get(), 1, window_, property, XCB_GET_PROPERTY_TYPE_ANY, 0, all), nullptr));
+        xcb_get_property(connection_->get(), 1, window_, property, XCB_GET_PROPERTY_TYPE_ANY, 0, All), nullptr));
     if (!reply || reply->type == XCB_ATOM_NONE) return std::nullopt;
     return SelectionData{connection_->atomName(reply->type), reply->format,
                          std::string(static_cast<const char*>(xcb_get_property_value(reply.get())),

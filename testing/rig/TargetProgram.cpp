@@ -16,8 +16,8 @@ namespace {
 
 using nlohmann::json;
 
-constexpr Milliseconds startBound{20'000};
-constexpr Milliseconds answerBound{10'000};
+constexpr Milliseconds StartBound{20'000};
+constexpr Milliseconds AnswerBound{10'000};
 
 FileDescriptor listenAt(const std::filesystem::path& path) {
     FileDescriptor listener(socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
@@ -74,16 +74,16 @@ TargetProgram::TargetProgram(TargetKind kind, DesktopSession& session, XClient& 
     const FileDescriptor listener = listenAt(socket);
     const bool terminal = kind == TargetKind::Xterm;
     process_ = session.start(commandOf(kind, socket), terminal ? "xterm" : "(built with PLUME_DESKTOP_TESTS)");
-    if (!Deadline(startBound).waitReadable(listener.get())) throw failure("did not connect");
+    if (!Deadline(StartBound).waitReadable(listener.get())) throw failure("did not connect");
     line_ = FileDescriptor(accept4(listener.get(), nullptr, nullptr, SOCK_CLOEXEC));
     reader_ = std::thread([this] { readLines(); });
     try {
         std::unique_lock lock(mutex_);
-        told_.wait_for(lock, startBound, [this] { return ready_ || ended_; });
+        told_.wait_for(lock, StartBound, [this] { return ready_ || ended_; });
         if (!ready_) throw failure("did not show its window");
         window_ = *ready_;
         lock.unlock();
-        client_.await("showing the " + nameOf(kind) + " target", startBound,
+        client_.await("showing the " + nameOf(kind) + " target", StartBound,
                       [this] { return std::ranges::count(client_.managedWindows(), window_) > 0; });
         client_.activate(window_);
     } catch (...) {
@@ -166,7 +166,7 @@ std::string TargetProgram::ask(const std::string& request) {
         done += static_cast<std::size_t>(count);
     }
     std::unique_lock lock(mutex_);
-    told_.wait_for(lock, answerBound, [this] { return !answers_.empty() || ended_; });
+    told_.wait_for(lock, AnswerBound, [this] { return !answers_.empty() || ended_; });
     if (answers_.empty()) throw failure("does not answer");
     std::string answer = std::move(answers_.front());
     answers_.pop_front();

@@ -13,7 +13,7 @@ namespace plume::rig {
 namespace {
 
 // The server's queue of unprocessed input is bounded: it is emptied at least every so many keys.
-constexpr std::size_t keysBetweenSyncs = 50;
+constexpr std::size_t KeysBetweenSyncs = 50;
 
 std::u32string decodeUtf8(std::string_view text) {
     std::u32string decoded;
@@ -99,7 +99,7 @@ void TestKeyboard::type(std::string_view text) {
         holdModifiersOf(stroke);
         press(stroke.keycode);
         release(stroke.keycode);
-        if (++unsynced % keysBetweenSyncs == 0) sync();
+        if (++unsynced % KeysBetweenSyncs == 0) sync();
     }
     holdModifiersOf({});
     sync();
@@ -115,7 +115,7 @@ void TestKeyboard::typeRollingOver(std::string_view text, Milliseconds gap) {
         if (previous != 0) release(previous);
         previous = stroke.keycode;
         if (gap.count() > 0) poll(nullptr, 0, static_cast<int>(gap.count()));
-        if (++unsynced % keysBetweenSyncs == 0) sync();
+        if (++unsynced % KeysBetweenSyncs == 0) sync();
     }
     if (previous != 0) release(previous);
     holdModifiersOf({});

@@ -11,7 +11,7 @@ namespace plume::rig {
 class TestPointer {
   public:
     TestPointer(const std::filesystem::path& socket, const XServer::Options& screen)  // throws RigError
-        : socket_(socket), xScale_(range / screen.width), yScale_(range / screen.height) {}
+        : socket_(socket), xScale_(Range / screen.width), yScale_(Range / screen.height) {}
 
     void moveTo(int x, int y) { socket_.sendPosition((x + 0.5) * xScale_, (y + 0.5) * yScale_); }
     void press(int button = 1) { socket_.sendButton(button, true); }
@@ -21,7 +21,7 @@ class TestPointer {
     void sync() { socket_.sync(); }
 
   private:
-    static constexpr double range = 65536;  // the device's positions from one edge of the screen to the other
+    static constexpr double Range = 65536;  // the device's positions from one edge of the screen to the other
 
     InputTestSocket socket_;
     double xScale_;

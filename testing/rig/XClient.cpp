@@ -9,9 +9,9 @@ namespace plume::rig {
 
 namespace {
 
-constexpr xcb_window_t noWindow = XCB_WINDOW_NONE;
-constexpr Milliseconds activationBound{5'000};
-constexpr Milliseconds askAgain{4};  // for what the server does not announce, such as the input focus
+constexpr xcb_window_t NoWindow = XCB_WINDOW_NONE;
+constexpr Milliseconds ActivationBound{5'000};
+constexpr Milliseconds AskAgain{4};  // for what the server does not announce, such as the input focus
 
 }  // namespace
 
@@ -36,8 +36,8 @@ xcb_atom_t XClient::atom(const std::string& name) {
 }
 
 std::string XClient::property(xcb_window_t window, const std::string& name) {
-    constexpr std::uint32_t longestInWords = 1 << 20;
-    const auto cookie = xcb_get_property(connection_, 0, window, atom(name), XCB_ATOM_ANY, 0, longestInWords);
+    constexpr std::uint32_t LongestInWords = 1 << 20;
+    const auto cookie = xcb_get_property(connection_, 0, window, atom(name), XCB_ATOM_ANY, 0, LongestInWords);
     const auto reply = own(xcb_get_property_reply(connection_, cookie, nullptr));
     if (!reply) return {};
     return {static_cast<const char*>(xcb_get_property_value(reply.get())),
@@ -57,23 +57,23 @@ xcb_window_t XClient::activeWindow() {
 
 xcb_window_t XClient::focusedWindow() {
     const auto reply = own(xcb_get_input_focus_reply(connection_, xcb_get_input_focus(connection_), nullptr));
-    return reply ? reply->focus : noWindow;
+    return reply ? reply->focus : NoWindow;
 }
 
 bool XClient::isButtonDown() {
     const auto reply = own(xcb_query_pointer_reply(connection_, xcb_query_pointer(connection_, root()), nullptr));
-    constexpr std::uint16_t anyButton = XCB_BUTTON_MASK_1 | XCB_BUTTON_MASK_2 | XCB_BUTTON_MASK_3;
-    return reply && (reply->mask & anyButton) != 0;
+    constexpr std::uint16_t AnyButton = XCB_BUTTON_MASK_1 | XCB_BUTTON_MASK_2 | XCB_BUTTON_MASK_3;
+    return reply && (reply->mask & AnyButton) != 0;
 }
 
 xcb_window_t XClient::selectionOwner(const std::string& selection) {
     const auto cookie = xcb_get_selection_owner(connection_, atom(selection));
     const auto reply = own(xcb_get_selection_owner_reply(connection_, cookie, nullptr));
-    return reply ? reply->owner : noWindow;
+    return reply ? reply->owner : NoWindow;
 }
 
 void XClient::emptySelection(const std::string& selection) {
-    xcb_set_selection_owner(connection_, noWindow, atom(selection), XCB_CURRENT_TIME);
+    xcb_set_selection_owner(connection_, NoWindow, atom(selection), XCB_CURRENT_TIME);
     selectionOwner(selection);  // a round trip
 }
 
@@ -138,17 +138,17 @@ bool XClient::isInside(xcb_window_t window, xcb_window_t ancestor) {
 }
 
 void XClient::activate(xcb_window_t window) {
-    constexpr std::uint32_t askedByPager = 2;
+    constexpr std::uint32_t AskedByPager = 2;
     xcb_client_message_event_t message{};
     message.response_type = XCB_CLIENT_MESSAGE;
     message.format = 32;
     message.window = window;
     message.type = atom("_NET_ACTIVE_WINDOW");
-    message.data.data32[0] = askedByPager;
+    message.data.data32[0] = AskedByPager;
     xcb_send_event(connection_, 0, root(), XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY | XCB_EVENT_MASK_SUBSTRUCTURE_REDIRECT,
                    reinterpret_cast<const char*>(&message));
     xcb_flush(connection_);
-    await("activating window " + std::to_string(window), activationBound,
+    await("activating window " + std::to_string(window), ActivationBound,
           [&] { return activeWindow() == window && isInside(focusedWindow(), window); });
 }
 
@@ -157,7 +157,7 @@ void XClient::await(const std::string& what, Milliseconds bound, const std::func
     while (!condition()) {
         if (deadline.passed()) throw RigError(what + " did not happen in time");
         if (xcb_connection_has_error(connection_) != 0) throw RigError(what + ": the X server has gone");
-        deadline.waitReadable(xcb_get_file_descriptor(connection_), askAgain);
+        deadline.waitReadable(xcb_get_file_descriptor(connection_), AskAgain);
         while (own(xcb_poll_for_event(connection_))) {
         }
     }

@@ -10,7 +10,7 @@ namespace plume::rig {
 
 namespace {
 
-constexpr Milliseconds startBound{20'000};
+constexpr Milliseconds StartBound{20'000};
 
 std::filesystem::path requireServer() {
     const auto server = requireFile({"/usr/lib/xorg/Xorg", "/usr/libexec/Xorg", "/usr/bin/Xorg"}, "xserver-xorg-core");
@@ -24,13 +24,13 @@ std::filesystem::path requireServer() {
 
 // A mode of the wanted size at 60 pictures a second, with any blanking the driver accepts.
 std::string modeLine(const XServer::Options& options) {
-    constexpr int blanking = 40;
-    const int width = options.width + 4 * blanking;
-    const int height = options.height + 4 * blanking;
+    constexpr int Blanking = 40;
+    const int width = options.width + 4 * Blanking;
+    const int height = options.height + 4 * Blanking;
     std::ostringstream line;
     line << "  ModeLine \"wanted\" " << width * height * 60.0 / 1e6;
     for (const auto& [size, total] : {std::pair(options.width, width), std::pair(options.height, height)}) {
-        line << ' ' << size << ' ' << size + blanking << ' ' << size + 2 * blanking << ' ' << total;
+        line << ' ' << size << ' ' << size + Blanking << ' ' << size + 2 * Blanking << ' ' << total;
     }
     line << '\n';
     return line.str();
@@ -67,7 +67,7 @@ XServer::XServer(const PrivateDirectory& directory, const Options& options, cons
         .environment = environment,
         .log = directory.path() / "xorg.output",
         .keptDescriptors = {number.writer()}});
-    display_ = ":" + number.awaitLine(*process_, startBound);
+    display_ = ":" + number.awaitLine(*process_, StartBound);
 }
 
 void XServer::writeConfiguration(const std::filesystem::path& file, const Options& options) const {

@@ -48,8 +48,8 @@ struct Heard {
 
     bool operator==(const Heard&) const = default;
     friend std::ostream& operator<<(std::ostream& out, const Heard& heard) {
-        constexpr std::array<const char*, 3> names{"down", "up", "flags"};
-        out << names[static_cast<std::size_t>(heard.type)] << ' ' << numberOf(heard.keyCode) << ' ' << std::hex
+        constexpr std::array<const char*, 3> Names{"down", "up", "flags"};
+        out << Names[static_cast<std::size_t>(heard.type)] << ' ' << numberOf(heard.keyCode) << ' ' << std::hex
             << heard.flags.bits();
         for (const char16_t unit : heard.string) out << " U+" << static_cast<unsigned>(unit);
         return out << std::dec << (heard.composing ? " composing" : "") << (heard.command ? " command" : "");
@@ -167,12 +167,12 @@ class X11TapTest : public testing::Test {
 class X11TapTargetTest : public X11TapTest, public testing::WithParamInterface<TargetKind> {};
 
 TEST_P(X11TapTargetTest, SwallowsAnyHalfOfFastTyping) {
-    constexpr std::size_t keys = 2'000;
+    constexpr std::size_t Keys = 2'000;
     std::mt19937 random(static_cast<unsigned>(GetParam()) + 1);  // NOLINT(cert-msc51-cpp): the same every time
     std::string typed;
     std::string expected;
     std::vector<bool> swallow;
-    for (std::size_t i = 0; i < keys; ++i) {
+    for (std::size_t i = 0; i < Keys; ++i) {
         typed += "abcdefghijklmnopqrstuvwxyz0123456789 "[random() % 37];
         swallow.push_back(random() % 2 == 0);
         if (!swallow.back()) expected += typed.back();
@@ -185,7 +185,7 @@ TEST_P(X11TapTargetTest, SwallowsAnyHalfOfFastTyping) {
     });
     rig_->keyboard().typeRollingOver(typed);
     EXPECT_EQ(target->awaitText(expected, Milliseconds(30'000)), expected);
-    EXPECT_EQ(takeHeard(2 * keys).size(), 2 * keys);
+    EXPECT_EQ(takeHeard(2 * Keys).size(), 2 * Keys);
     await("all keys are up", [] { return keysDown().empty(); });
     removeTap();
     EXPECT_EQ(focus.takeCore(), FocusCounter::Counts{});
@@ -267,9 +267,9 @@ TEST_F(X11TapTest, CapsLockLocks) {
     rig_->keyboard().tap(Key::CapsLock);
     rig_->keyboard().type("b");
     EXPECT_EQ(target->awaitText("Ab"), "Ab");
-    constexpr EventFlag locked = EventFlag::CapsLock;
+    constexpr EventFlag Locked = EventFlag::CapsLock;
     const auto all = takeHeard(8);
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::A, locked, u"A"}));
+    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::A, Locked, u"A"}));
     EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, KeyCode::B, {}, u"b"}));
 }
 
@@ -592,7 +592,7 @@ TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThat
 }
 
 TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
-    constexpr xkb_keysym_t own = 0x1006E00;
+    constexpr xkb_keysym_t Own = 0x1006E00;
     struct KeymapChanges {
         int count = 0;
         void changed(const XkbKeyboard::Change& change) {
@@ -610,8 +610,8 @@ TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
         rig_->client().focusedWindow();
     };
     layoutChanged_ = true;  // to be undone
-    tap_->run([&] { tap_->keyboard->willWrite(spare, std::array{own}); });
-    write(spare, {own, own});
+    tap_->run([&] { tap_->keyboard->willWrite(spare, std::array{Own}); });
+    write(spare, {Own, Own});
     write(38, {XKB_KEY_q, XKB_KEY_Q});  // the user's change
     await("the layout has changed", [&] { return translate(KeyCode::A, {}) == u"q"; });
     tap_->run([&] {

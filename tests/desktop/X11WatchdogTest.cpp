@@ -1,9 +1,9 @@
 // A program that holds the keyboard goes wrong in every way: the keyboard works within a second, every time.
 
 #include <gtest/gtest.h>
-#include <signal.h>
 
 #include <chrono>
+#include <csignal>
 #include <cstdlib>
 #include <fstream>
 #include <iostream>

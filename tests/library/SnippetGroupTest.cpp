@@ -33,7 +33,7 @@ class Listener final : public SnippetGroupObserver {
     void itemRemoved(SnippetGroup&, Snippet& snippet, std::size_t index) override {
         heard.push_back("removed " + toUtf8(*snippet.abbreviation()) + " " + std::to_string(index));
     }
-    void matchingSettingsChanged(SnippetGroup&) override { heard.push_back("settings"); }
+    void matchingSettingsChanged(SnippetGroup&) override { heard.emplace_back("settings"); }
 
     std::function<void()> whenAdded;
     std::vector<std::string> take() { return std::exchange(heard, {}); }

@@ -97,7 +97,7 @@ TEST(CSVParser, RefusesSeparatorsThatCannotSeparate) {
     const auto complaint = [](std::u16string separator,
                               std::optional<CharacterSet> lines = std::nullopt) -> std::string {
         try {
-            CSVParser(u"a", std::move(separator), std::move(lines), false, {});
+            const CSVParser parser(u"a", std::move(separator), std::move(lines), false, {});
             return "";
         } catch (const std::invalid_argument& error) {
             return error.what();
