@@ -9,6 +9,8 @@
 #include "bench/Figures.h"
 #include "engine/AutoText.h"
 #include "engine/SnippetMatcher.h"
+#include "ports/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedProcessManager.h"
 
 namespace {
 std::size_t allocations = 0;
@@ -31,12 +33,14 @@ namespace {
 
 constexpr std::size_t GroupCount = 20;
 
-struct Editor final : MatchContext {
-    const std::optional<std::u16string>& bundleIdentifier() const override { return application; }
-    const std::optional<std::u16string>& inputSourceIdentifier() const override { return inputSource; }
+// Where the keys go.
+struct Editor {
+    KeyDestination destination() { return {resolver, inputSources, process}; }
 
-    std::optional<std::u16string> application = u"org.example.editor";
-    std::optional<std::u16string> inputSource = u"us";
+    SimulatedProcessManager processes;
+    SimulatedInputSources inputSources;
+    BundleIdentifierResolver resolver{processes};
+    ProcessSerialNumber process = processes.launch(u"org.example.editor");
 };
 
 class Library {
@@ -97,11 +101,11 @@ struct Miss {
 // left out beforehand.
 Miss missCost(const SnippetMatcher& matcher, std::size_t bufferLength, std::mt19937& random) {
     const std::u16string text = prose(bufferLength + KeysInBatch, random);
-    const Editor editor;
+    Editor editor;
     const auto finds = [&](std::size_t start) {
         const auto letters = std::u16string_view(text).substr(start, bufferLength + 1);
         const auto before = letters.substr(0, bufferLength);
-        return !matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty();
+        return !matcher.findSnippetsInLetters(letters, letters.back(), before, editor.destination()).empty();
     };
     std::vector<std::size_t> misses;
     for (std::size_t start = 0; start < KeysInBatch; ++start) {
@@ -149,14 +153,15 @@ void benchHits() {
             delimited.push_back(atDelimiter);
         }
     }
-    const Editor editor;
+    Editor editor;
     std::size_t found = 0;
     const double batch = medianNanoseconds(31, [&] {
         found = 0;
         for (const auto& typing : typings) {
             const std::u16string_view letters = typing;
             const auto before = letters.substr(0, letters.size() - 1);
-            found += matcher.findSnippetsInLetters(letters, letters.back(), before, editor).empty() ? 0U : 1U;
+            found +=
+                matcher.findSnippetsInLetters(letters, letters.back(), before, editor.destination()).empty() ? 0U : 1U;
         }
     });
     if (found != typings.size()) std::abort();

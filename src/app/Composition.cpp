@@ -3,13 +3,10 @@
 #include <utility>
 
 #include "Foundation/Strings.h"
-#include "app/Windowless.h"
 
 namespace plume {
 
 namespace {
-
-const NoSuggestions NothingToSuggest;
 
 std::vector<std::u16string> lines(const UserDefaults& settings, std::string_view key) {
     const auto text = settings.stringForKey(key);
@@ -46,18 +43,13 @@ void applyTo(MacInputService& service, const UserDefaults& settings) {
     service.setListenAtAnnotatedSession(settings.boolForKey("ListenAtAnnotatedSession"));
 }
 
-template <typename Factory>
-Factory orElse(const Factory& given, Factory fallback) {
-    return given ? given : fallback;
-}
-
 }  // namespace
 
-Composition::Composition(const Ports& ports, Dependencies dependencies)
+Composition::Composition(const Ports& ports, Environment environment)
     : ports_(ports),
-      dependencies_(std::move(dependencies)),
+      environment_(std::move(environment)),
       identifiers_(ports_.processManager),
-      scriptRunner_(ports_.processLauncher, dependencies_.report) {
+      scriptRunner_(ports_.processLauncher, environment_.report) {
     makeParts();
 }
 
@@ -65,35 +57,36 @@ void Composition::makeParts() {
     inputService_ = std::make_unique<MacInputService>(MacInputService::Dependencies{
         ports_.keyboardTap, ports_.mouseTap, ports_.poster, ports_.pasteboard, ports_.processManager,
         ports_.inputSources, ports_.accessibility, ports_.secureInput, ports_.systemHotKeys, identifiers_,
-        ports_.tapLoop, ports_.mainLoop, dependencies_.log, dependencies_.vmHelper});
+        ports_.tapLoop, ports_.mainLoop, environment_.log, environment_.vmHelper});
 
-    ContentEnvironment environment;
-    environment.timeZone = dependencies_.timeZone;
-    environment.locale = dependencies_.locale;
-    environment.pasteboard = &inputService_->userPasteboard();
-    environment.report = dependencies_.report;
-    parser_ = std::make_unique<SnippetParser>(std::move(environment));
+    ContentEnvironment content;
+    content.timeZone = environment_.timeZone;
+    content.locale = environment_.locale;
+    content.pasteboard = &inputService_->userPasteboard();
+    content.report = environment_.report;
+    parser_ = std::make_unique<SnippetParser>(std::move(content));
 
-    sender_ = std::make_unique<SendingPipeline>(SendingPipeline::Dependencies{
-        *inputService_, *parser_, scriptRunner_, &ports_.sounds,
-        orElse(dependencies_.makeFieldsEditor, windowlessFieldsEditors(dependencies_.report)), dependencies_.report});
-    corrector_ = std::make_unique<AutoCorrection>(AutoCorrection::Dependencies{
-        *inputService_, identifiers_, ports_.inputSources, ports_.accessibility, *sender_});
-
-    const SuggestionSource* source = dependencies_.suggestionSource;
-    using ListFactory = std::function<std::unique_ptr<SuggestionController>()>;
-    using SearchFactory = std::function<std::unique_ptr<QuickSearchController>()>;
     engine_ = std::make_unique<AutoText>(AutoText::Dependencies{
-        *inputService_, identifiers_, ports_.inputSources, dependencies_.settings, *sender_,
-        source ? *source : NothingToSuggest, corrector_.get(),
-        orElse<ListFactory>(dependencies_.makeSuggestionController, &makeWindowlessSuggestionController),
-        orElse<SearchFactory>(dependencies_.makeQuickSearchController, &makeWindowlessQuickSearchController)});
+        .inputService = *inputService_,
+        .bundleIdentifierResolver = identifiers_,
+        .inputSources = ports_.inputSources,
+        .accessibility = ports_.accessibility,
+        .userDefaults = environment_.settings,
+        .snippetParser = *parser_,
+        .scriptRunner = scriptRunner_,
+        .sounds = ports_.sounds,
+        .report = environment_.report,
+        .makeFieldsEditor = environment_.makeFieldsEditor,
+        .makeSuggestionController = environment_.makeSuggestionController,
+        .makeQuickSearchController = environment_.makeQuickSearchController,
+        .suggest = environment_.suggest,
+    });
 
     hotKeys_ = std::make_unique<HotKeyDispatch>(
         *inputService_, HotKeyDispatch::Actions{[this] {
                                                     engine_->setEnabled(!engine_->enabled());
-                                                    if (dependencies_.enabledChanged)
-                                                        dependencies_.enabledChanged(engine_->enabled());
+                                                    if (environment_.enabledChanged)
+                                                        environment_.enabledChanged(engine_->enabled());
                                                     ports_.sounds.play("Pop");
                                                 },
                                                 [this] { engine_->suggestAbbreviations(); },
@@ -108,18 +101,18 @@ Composition::~Composition() {
 }
 
 void Composition::loadPreferences() {
-    const UserDefaults& settings = dependencies_.settings;
+    const UserDefaults& settings = environment_.settings;
     engine_->setEnabled(settings.boolForKey("IsEnabled"));
-    applyTo(*corrector_, settings);
-    sender_->setPlayFeedbackSound(settings.boolForKey("PlayFeedbackSound"));
-    sender_->setFeedbackSound(toUtf8(settings.stringForKey("FeedbackSound").value_or(u"")));
+    applyTo(engine_->correction(), settings);
+    engine_->sender().setPlayFeedbackSound(settings.boolForKey("PlayFeedbackSound"));
+    engine_->sender().setFeedbackSound(toUtf8(settings.stringForKey("FeedbackSound").value_or(u"")));
     engine_->setSnippetSelectorKeyModifier(settings.integerForKey("SnippetSelectorKeyModifier"));
     applyTo(*inputService_, settings);
 }
 
 void Composition::start() {
-    if (const Result<void> registered = hotKeys_->registerHotKeys(dependencies_.settings); !registered) {
-        dependencies_.report(registered.error().message);
+    if (const Result<void> registered = hotKeys_->registerHotKeys(environment_.settings); !registered) {
+        environment_.report(registered.error().message);
     }
     inputService_->enableEvents();
 }

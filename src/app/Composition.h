@@ -12,9 +12,7 @@
 #include "app/HotKeyDispatch.h"
 #include "content/SnippetParser.h"
 #include "content/scripts/ShellScriptRunner.h"
-#include "engine/AutoCorrection.h"
 #include "engine/AutoText.h"
-#include "engine/SendingPipeline.h"
 #include "input/BundleIdentifierResolver.h"
 #include "input/MacInputService.h"
 #include "platform/ProcessLauncher.h"
@@ -43,7 +41,7 @@ class Composition {
     };
 
     // What the program around it gives; what is empty or null is done without.
-    struct Dependencies {
+    struct Environment {
         // Outlives the composition.
         const UserDefaults& settings;
         // Tells the user, in one sentence. Never empty.
@@ -53,18 +51,17 @@ class Composition {
         // Where dates are written: see ContentEnvironment.
         std::string timeZone = {};
         std::string locale = {};
-        // Windows. Without a form the user is told that the snippet needs one; without a list several matches cannot
-        // be chosen from.
+        // Windows. Without a form or a list the user is told that one is needed, and nothing is expanded.
         FieldsEditor::Factory makeFieldsEditor = {};
         std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController = {};
         std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
-        const SuggestionSource* suggestionSource = nullptr;
+        AutoText::Suggest suggest = {};
         VMHelperController* vmHelper = nullptr;
         // The switch hot key has enabled or disabled the engine.
         std::function<void(bool enabled)> enabledChanged = {};
     };
 
-    Composition(const Ports& ports, Dependencies dependencies);
+    Composition(const Ports& ports, Environment environment);
     // Ends scripts that run.
     ~Composition();
     Composition(const Composition&) = delete;
@@ -79,21 +76,17 @@ class Composition {
 
     AutoText& engine() { return *engine_; }
     MacInputService& inputService() { return *inputService_; }
-    SendingPipeline& sender() { return *sender_; }
-    AutoCorrection& corrector() { return *corrector_; }
     SnippetParser& parser() { return *parser_; }
 
   private:
     void makeParts();
 
     const Ports ports_;
-    const Dependencies dependencies_;
+    const Environment environment_;
     BundleIdentifierResolver identifiers_;
     ShellScriptRunner scriptRunner_;
     std::unique_ptr<MacInputService> inputService_;
     std::unique_ptr<SnippetParser> parser_;
-    std::unique_ptr<SendingPipeline> sender_;
-    std::unique_ptr<AutoCorrection> corrector_;
     std::unique_ptr<AutoText> engine_;
     std::unique_ptr<HotKeyDispatch> hotKeys_;
 };

@@ -34,47 +34,45 @@ bool startsWord(char16_t before) {
 
 }  // namespace
 
-AutoCorrection::AutoCorrection(Dependencies dependencies)
-    : dependencies_(dependencies),
+AutoCorrection::AutoCorrection(MacInputService& inputService, const Accessibility& accessibility)
+    : inputService_(inputService),
+      accessibility_(accessibility),
       autocorrectGroup_(SnippetGroup::make()),
       autocorrectSnippet_(std::make_shared<Snippet>()) {
     autocorrectGroup_->setExpandTrigger(ExpandTrigger::DelimiterKept);
     autocorrectGroup_->addItem(autocorrectSnippet_);
 }
 
-void AutoCorrection::autoCorrect(EngineState& engine, ZDKeyEventArgs& event, std::u16string_view context) {
-    if (!capitalizeNewSentences_ && !correctDoubleCapitals_) return;
-    if (!event.s || event.s->empty() || !mayFollowCorrection(event.s->back())) return;
+std::optional<AutoCorrection::Correction> AutoCorrection::autoCorrect(std::u16string_view letters,
+                                                                      std::u16string_view key,
+                                                                      const KeyDestination& destination) {
+    if (!capitalizeNewSentences_ && !correctDoubleCapitals_) return std::nullopt;
+    if (!mayFollowCorrection(key.back())) return std::nullopt;
 
+    const std::u16string_view context = letters.substr(0, letters.size() - key.size());
     if (context.size() >= NeededContext) {
-        const std::optional<std::u16string> corrected = capitalize(engine.letters());
-        if (corrected && isAllowedHere()) send(engine, event, context.back(), *corrected);
-        return;
+        const std::optional<std::u16string> corrected = capitalize(letters);
+        if (!corrected || !isAllowedAt(destination)) return std::nullopt;
+        return makeCorrection(context.back(), *corrected);
     }
-    if (!isAllowedHere()) return;
-    const auto text = AXUtils::getTextBeforeCaretWithMaxLength(dependencies_.accessibility, AskedContext);
-    if (!text || text->empty()) return;
-    const std::optional<std::u16string> corrected = capitalize(*text + *event.s);
-    if (corrected) send(engine, event, text->back(), *corrected);
+    if (!isAllowedAt(destination)) return std::nullopt;
+    const auto text = AXUtils::getTextBeforeCaretWithMaxLength(accessibility_, AskedContext);
+    if (!text || text->empty()) return std::nullopt;
+    const std::optional<std::u16string> corrected = capitalize(std::u16string(*text).append(key));
+    if (!corrected) return std::nullopt;
+    return makeCorrection(text->back(), *corrected);
 }
 
-bool AutoCorrection::isAllowedHere() {
-    InputService& service = dependencies_.inputService;
-    if (service.refreshContextInputSetting()->has(InputFlag::DisableCapitalization)) return false;
-    const auto& application =
-        dependencies_.bundleIdentifierResolver.getBundleIdentifier(service.lastProcessReceivedKeyEvent());
-    return autoCorrectAvailability_.admitsApplication(application) &&
-           autoCorrectAvailability_.admitsInputSource(dependencies_.inputSources.currentInputSourceIdentifier());
+bool AutoCorrection::isAllowedAt(const KeyDestination& destination) const {
+    return !inputService_.refreshContextInputSetting()->has(InputFlag::DisableCapitalization) &&
+           destination.isAdmittedBy(autoCorrectAvailability_);
 }
 
-void AutoCorrection::send(EngineState& engine, ZDKeyEventArgs& event, char16_t wrong, const std::u16string& corrected) {
-    const std::u16string abbreviation(1, wrong);
-    autocorrectSnippet_->setAbbreviation(abbreviation);
+AutoCorrection::Correction AutoCorrection::makeCorrection(char16_t wrong, std::u16string corrected) const {
+    const std::u16string typed(1, wrong);
+    autocorrectSnippet_->setAbbreviation(typed);
     autocorrectSnippet_->setPlainTextContent(corrected);
-    std::u16string letters = engine.letters();
-    event.cancel = dependencies_.sender.sendSnippet(engine, autocorrectSnippet_, abbreviation, SnippetTrigger::Typed);
-    if (letters.size() >= 2) letters.replace(letters.size() - 2, 1, corrected);
-    engine.setLetters(letters);
+    return {autocorrectSnippet_, typed, std::move(corrected)};
 }
 
 std::optional<std::u16string> AutoCorrection::capitalize(std::u16string_view text) const {

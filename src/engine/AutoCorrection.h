@@ -1,8 +1,8 @@
 // Corrects two slips while the user types: sentences that start in lower case, and words that start with two capitals.
 //
-// A correction is sent like a snippet of one letter, so it can be undone like one. Owned by the composition root,
-// outlives the engine; everything belongs to the thread that delivers the key events. A key that corrects nothing is
-// judged from the buffer alone, without a copy of it.
+// A correction is sent like a snippet of one letter, so it can be undone like one. Owned by the engine; everything
+// belongs to the thread that delivers the key events. A key that corrects nothing is judged from the buffer alone,
+// without a copy of it, and allocates nothing.
 #pragma once
 
 #include <memory>
@@ -11,31 +11,31 @@
 #include <string_view>
 #include <vector>
 
-#include "engine/AutoCorrector.h"
-#include "engine/SnippetSender.h"
-#include "input/BundleIdentifierResolver.h"
-#include "input/InputService.h"
+#include "engine/KeyDestination.h"
+#include "input/MacInputService.h"
 #include "library/PLFunctionAvailability.h"
+#include "library/SnippetGroup.h"
 #include "platform/Accessibility.h"
-#include "platform/InputSources.h"
 
 namespace plume {
 
-class AutoCorrection final : public AutoCorrector {
+class AutoCorrection {
   public:
-    // Not owned, and outlives the corrector.
-    struct Dependencies {
-        InputService& inputService;
-        BundleIdentifierResolver& bundleIdentifierResolver;
-        const InputSources& inputSources;
-        const Accessibility& accessibility;
-        SnippetSender& sender;
+    // The snippet to send in place of the letter before the key.
+    struct Correction {
+        std::shared_ptr<Snippet> snippet;
+        std::u16string typed;
+        std::u16string corrected;
     };
 
-    // Starts with both corrections off.
-    explicit AutoCorrection(Dependencies dependencies);
+    // Starts with both corrections off. Nothing is owned; all of it outlives the corrector.
+    AutoCorrection(MacInputService& inputService, const Accessibility& accessibility);
 
-    void autoCorrect(EngineState& engine, ZDKeyEventArgs& event, std::u16string_view context) override;
+    // After a key that completed no snippet and went there: `letters` is the buffer, and ends with the key's
+    // characters, one or more. Nothing when there is nothing to correct; else the snippet is good until the next
+    // correction.
+    std::optional<Correction> autoCorrect(std::u16string_view letters, std::u16string_view key,
+                                          const KeyDestination& destination);
 
     // What the second-to-last character of the text, which ends with the key that is being typed, should have been;
     // nothing when it is right.
@@ -59,13 +59,14 @@ class AutoCorrection final : public AutoCorrector {
     void setDoubleCapitalsCorrectionExclusion(Words words) { doubleCapitalsCorrectionExclusion_ = std::move(words); }
 
   private:
-    bool isAllowedHere();
+    bool isAllowedAt(const KeyDestination& destination) const;
+    Correction makeCorrection(char16_t wrong, std::u16string corrected) const;
     std::optional<std::u16string> capitalizedSentenceStart(std::u16string_view text) const;
     std::optional<std::u16string> loweredSecondCapital(std::u16string_view text) const;
     bool endsWithExcludedAbbreviation(std::u16string_view text) const;
-    void send(EngineState& engine, ZDKeyEventArgs& event, char16_t wrong, const std::u16string& corrected);
 
-    Dependencies dependencies_;
+    MacInputService& inputService_;
+    const Accessibility& accessibility_;
     bool capitalizeNewSentences_ = false;
     bool correctDoubleCapitals_ = false;
     PLFunctionAvailability autoCorrectAvailability_;

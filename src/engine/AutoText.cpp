@@ -5,7 +5,6 @@
 #include <iterator>
 #include <utility>
 
-#include "content/PLOutput.h"
 
 namespace plume {
 
@@ -21,42 +20,23 @@ bool contains(const Rectangle& frame, double x, double y) {
 
 }  // namespace
 
-// Where the last key went.
-class AutoText::LastKeyContext final : public MatchContext {
-  public:
-    explicit LastKeyContext(const Dependencies& dependencies) : dependencies_(dependencies) {}
-
-    const std::optional<std::u16string>& bundleIdentifier() const override {
-        return dependencies_.bundleIdentifierResolver.getBundleIdentifier(
-            dependencies_.inputService.lastProcessReceivedKeyEvent());
-    }
-    const std::optional<std::u16string>& inputSourceIdentifier() const override {
-        return dependencies_.inputSources.currentInputSourceIdentifier();
-    }
-
-  private:
-    const Dependencies& dependencies_;
-};
-
 AutoText::AutoText(Dependencies dependencies)
     : dependencies_(std::move(dependencies)),
       matcher_(defaultDelimiters()),
       snippetAdaptToAbbreviationCaseOption_(
-          dependencies_.userDefaults.integerForKey("SnippetAdaptToAbbreviationCaseOption")) {
+          dependencies_.userDefaults.integerForKey("SnippetAdaptToAbbreviationCaseOption")),
+      correction_(dependencies_.inputService, dependencies_.accessibility),
+      sender_({dependencies_.inputService, dependencies_.snippetParser, dependencies_.scriptRunner,
+               dependencies_.sounds, dependencies_.makeFieldsEditor, dependencies_.report},
+              [this](const SnippetSender::Sent& sent) { follow(sent); }) {
     letters_.reserve(UsualBufferLength);
-    InputService& service = dependencies_.inputService;
+    MacInputService& service = dependencies_.inputService;
     subscriptions_ = {
         service.keyDownEvent.addObserver(this, &AutoText::onSystemInputServiceKeyDown),
         service.inputContextChangedEvent.addObserver(this, &AutoText::onSystemInputServiceInputContextChanged),
         service.mouseDownEvent.addObserver(this, &AutoText::onSystemInputServiceMouseDown),
         service.unregisteredHotKeyPressedEvent.addObserver(this,
                                                            &AutoText::onSystemInputServiceUnregisteredHotKeyPressed)};
-}
-
-AutoText::~AutoText() {
-    InputService& service = dependencies_.inputService;
-    service.runLoop().cancel(scheduledList_);
-    service.runLoop().cancel(scheduledSuggestion_);
 }
 
 const CharacterSet& AutoText::defaultDelimiters() {
@@ -105,7 +85,7 @@ void AutoText::expandAtHotkey() {
     std::vector<Match> matches = findSnippetsInLetters(letters_, 0, letters_);
     if (matches.size() == 1) {
         hideSnippetSuggestion();
-        dependencies_.sender.sendSnippet(*this, matches[0].first, matches[0].second, SnippetTrigger::HotKey);
+        sendSnippet(matches[0].first, matches[0].second, SnippetTrigger::HotKey);
     } else if (!matches.empty()) {
         offerMatches(std::move(matches));
     }
@@ -113,19 +93,45 @@ void AutoText::expandAtHotkey() {
 
 std::vector<AutoText::Match> AutoText::findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                                              std::u16string_view lettersWithoutSeparator) const {
-    return matcher_.findSnippetsInLetters(letters, trigger, lettersWithoutSeparator, LastKeyContext(dependencies_));
+    return matcher_.findSnippetsInLetters(letters, trigger, lettersWithoutSeparator, lastKeyDestination());
 }
 
 AutoText::Groups AutoText::filteredGroupsByApplication() const {
-    const std::optional<std::u16string>& application = LastKeyContext(dependencies_).bundleIdentifier();
+    const std::optional<std::u16string>& application = lastKeyDestination().bundleIdentifier();
     Groups admitted;
     std::copy_if(snippetGroups_.begin(), snippetGroups_.end(), std::back_inserter(admitted),
                  [&](const auto& group) { return group->availability().admitsApplication(application); });
     return admitted;
 }
 
+KeyDestination AutoText::lastKeyDestination() const {
+    return {dependencies_.bundleIdentifierResolver, dependencies_.inputSources,
+            dependencies_.inputService.lastProcessReceivedKeyEvent()};
+}
+
+bool AutoText::sendSnippet(const std::shared_ptr<Snippet>& snippet, const std::optional<std::u16string>& abbreviation,
+                           SnippetTriggers snippetTrigger) {
+    clear();
+    const auto sent = sender_.send({snippet, abbreviation, snippetTrigger, snippetGroups_,
+                                    snippetAdaptToAbbreviationCaseOption_, dependencies_.inputService.lastKeyString()});
+    if (!sent) return false;
+    follow(*sent);
+    return sent->swallowsKey;
+}
+
 void AutoText::sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet) {
-    dependencies_.sender.sendSnippet(*this, snippet, std::nullopt, SnippetTrigger::Direct);
+    sendSnippet(snippet, std::nullopt, SnippetTrigger::Direct);
+}
+
+bool AutoText::undo(bool withTrigger) {
+    if (!undoInfo_) return false;
+    follow(sender_.undo(*undoInfo_, withTrigger));
+    return true;
+}
+
+void AutoText::follow(const SnippetSender::Sent& sent) {
+    if (sent.letters) letters_ = *sent.letters;
+    undoInfo_ = sent.undo;
 }
 
 }  // namespace plume

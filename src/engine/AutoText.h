@@ -3,6 +3,7 @@
 // Owned by the composition root. Everything here runs on the thread that delivers the input service's key events, which
 // the engine hears from its construction to its destruction; the key handlers run inside the callback that decides
 // whether the application gets the key. A key that completes nothing costs no copy of the buffer and no allocation.
+// Destroying the engine waits for scripts that run, so whoever does it stops the script runner first.
 #pragma once
 
 #include <array>
@@ -15,42 +16,48 @@
 #include <vector>
 
 #include "Foundation/Subscription.h"
-#include "engine/AutoCorrector.h"
-#include "engine/EngineState.h"
+#include "engine/AutoCorrection.h"
+#include "engine/KeyDestination.h"
 #include "engine/QuickSearchController.h"
 #include "engine/SnippetMatcher.h"
 #include "engine/SnippetSender.h"
 #include "engine/SuggestionController.h"
-#include "engine/SuggestionList.h"
-#include "engine/SuggestionSource.h"
-#include "input/BundleIdentifierResolver.h"
-#include "input/InputService.h"
+#include "input/MacInputService.h"
+#include "platform/Accessibility.h"
 #include "platform/InputSources.h"
 #include "platform/UserDefaults.h"
 
 namespace plume {
 
-class AutoText final : public EngineState {
+class AutoText {
   public:
     using Match = SnippetMatcher::Match;
+    using Groups = SnippetMatcher::Groups;
+    // The snippets of these groups that `letters`, which is not empty, may become, the best first. Called only when a
+    // list is shown or asked for, with the groups that admit the application in front.
+    using Suggest = std::function<SuggestionList(std::u16string_view letters, const Groups& groups)>;
 
     // What the engine works with; not owned, and outlives it.
     struct Dependencies {
-        InputService& inputService;
+        MacInputService& inputService;
         BundleIdentifierResolver& bundleIdentifierResolver;
         const InputSources& inputSources;
+        const Accessibility& accessibility;
         const UserDefaults& userDefaults;
-        SnippetSender& sender;
-        const SuggestionSource& suggestionSource;
-        AutoCorrector* autoCorrector;  // null: nothing is corrected
-        // Make a window when it is first needed; never null, never make null.
-        std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController;
-        std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController;
+        SnippetParser& snippetParser;
+        ScriptRunner& scriptRunner;
+        Sounds& sounds;
+        // Tells the user that something cannot work, in one sentence. Never empty.
+        std::function<void(const std::string&)> report;
+        // Make a window when it is first needed, and never make null. What is empty never shows.
+        FieldsEditor::Factory makeFieldsEditor = {};
+        std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController = {};
+        std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
+        Suggest suggest = {};  // empty: there is never anything to suggest
     };
 
     // Starts disabled.
     explicit AutoText(Dependencies dependencies);
-    ~AutoText();
     AutoText(const AutoText&) = delete;
     AutoText& operator=(const AutoText&) = delete;
 
@@ -65,14 +72,19 @@ class AutoText final : public EngineState {
     std::int64_t snippetSelectorKeyModifier() const { return snippetSelectorKeyModifier_; }
     void setSnippetSelectorKeyModifier(std::int64_t modifier);
 
-    // ---- EngineState ----
-    void clear() override;
-    const std::u16string& letters() const override { return letters_; }
-    void setLetters(std::u16string_view letters) override { letters_ = letters; }
-    const Groups& snippetGroups() const override { return snippetGroups_; }
-    std::int64_t snippetAdaptToAbbreviationCaseOption() const override { return snippetAdaptToAbbreviationCaseOption_; }
-    const std::optional<UndoInformation>& undoInfo() const override { return undoInfo_; }
-    void setUndoInfo(std::optional<UndoInformation> undoInfo) override { undoInfo_ = std::move(undoInfo); }
+    // Empties the buffer and closes the lists that are open.
+    void clear();
+    // What was typed since the last reset.
+    const std::u16string& letters() const { return letters_; }
+    // The library, in user order.
+    const Groups& snippetGroups() const { return snippetGroups_; }
+    // How content is adapted to the case in which its abbreviation was typed.
+    std::int64_t snippetAdaptToAbbreviationCaseOption() const { return snippetAdaptToAbbreviationCaseOption_; }
+    // Kept until the next key.
+    const std::optional<UndoInformation>& undoInfo() const { return undoInfo_; }
+
+    AutoCorrection& correction() { return correction_; }
+    SnippetSender& sender() { return sender_; }
 
     // ---- Matching ----
     // Expands what stands at the end of the buffer; for the hot key that does that.
@@ -85,10 +97,16 @@ class AutoText final : public EngineState {
     static void processTrigger(char16_t /*trigger*/, std::u16string_view /*triggerString*/,
                                std::u16string_view /*letters*/, std::u16string_view /*lettersWithoutSeparator*/) {}
 
+    // ---- Sending ----
+    // `abbreviation` is the text that was typed for the snippet and is erased, nothing when it was chosen in another
+    // way. Empties the buffer first, and fills it with what stands
+    // before the caret then. Whether the key that triggered it must be swallowed; false when nothing was sent.
+    bool sendSnippet(const std::shared_ptr<Snippet>& snippet, const std::optional<std::u16string>& abbreviation,
+                     SnippetTriggers snippetTrigger);
     // Sends a snippet that was chosen without typing.
     void sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet);
     // Takes the last expansion back, for the hot keys that do that. False when there is nothing to take back.
-    bool undo(bool withTrigger) { return dependencies_.sender.undo(*this, withTrigger); }
+    bool undo(bool withTrigger);
 
     // ---- The list at the caret ----
     const SuggestionList& suggestions() const { return suggestions_; }
@@ -113,8 +131,6 @@ class AutoText final : public EngineState {
     void quickSearchAtTopRightCorner();
 
   private:
-    class LastKeyContext;
-
     void onSystemInputServiceKeyDown(ZDKeyEventArgs& event);
     void onSystemInputServiceInputContextChanged(InputContextChange& change);
     void onSystemInputServiceMouseDown(ZDMouseEventArgs& event);
@@ -136,7 +152,11 @@ class AutoText final : public EngineState {
     void processNormalKeyDown(ZDKeyEventArgs& event);
     void sendTypedMatch(const Match& match, ZDKeyEventArgs& event);
     void offerMatches(std::vector<Match> matches);
-    void keyCompletedNothing(ZDKeyEventArgs& event, std::size_t lengthBefore);
+    void keyCompletedNothing(ZDKeyEventArgs& event);
+    void sendCorrection(const AutoCorrection::Correction& correction, ZDKeyEventArgs& event);
+
+    KeyDestination lastKeyDestination() const;
+    void follow(const SnippetSender::Sent& sent);
 
     void snippetSuggestionSuggestionSelected();
     void initSnippetQuickSearchController();
@@ -155,8 +175,9 @@ class AutoText final : public EngineState {
     SuggestionList suggestions_;
     std::unique_ptr<SuggestionController> snippetSuggestionController_;
     std::unique_ptr<QuickSearchController> snippetQuickSearchController_;
-    RunLoop::CallId scheduledList_ = 0;
-    RunLoop::CallId scheduledSuggestion_ = 0;
+    Timer listOpening_;
+    AutoCorrection correction_;
+    SnippetSender sender_;
 };
 
 }  // namespace plume

@@ -1,7 +1,7 @@
 // What the engine does at each key: the way it takes by its code, the digits that pick from a list, and the buffer.
 #include <utility>
 
-#include "content/PLOutput.h"
+#include "Foundation/Strings.h"
 #include "engine/AutoText.h"
 
 namespace plume {
@@ -114,7 +114,7 @@ std::optional<KeyModifiers> AutoText::selectorModifiers() const {
 }
 
 void AutoText::processSelectorKey(ZDKeyEventArgs& event) {
-    const InputService& service = dependencies_.inputService;
+    const MacInputService& service = dependencies_.inputService;
     if (selectorModifiers() != service.keyModifier()) return;
 
     char16_t character = event.c;
@@ -154,7 +154,7 @@ void AutoText::processNormalKeyDown(ZDKeyEventArgs& event) {
     std::vector<Match> matches = findSnippetsInLetters(withKey, event.s->front(), withKey.substr(0, lengthBefore));
 
     if (matches.empty()) {
-        keyCompletedNothing(event, lengthBefore);
+        keyCompletedNothing(event);
     } else if (matches.size() == 1) {
         letters_.resize(lengthBefore);
         sendTypedMatch(matches.front(), event);
@@ -165,7 +165,7 @@ void AutoText::processNormalKeyDown(ZDKeyEventArgs& event) {
 
 void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
     hideSnippetSuggestion();
-    event.cancel = dependencies_.sender.sendSnippet(*this, match.first, match.second, SnippetTrigger::Typed);
+    event.cancel = sendSnippet(match.first, match.second, SnippetTrigger::Typed);
     // The kept delimiter stands behind the expansion, in the text as in the buffer.
     const std::shared_ptr<SnippetGroup> group = match.first->parentGroup();
     if (group && group->expandTrigger() == ExpandTrigger::DelimiterKept) letters_ += *event.s;
@@ -173,24 +173,31 @@ void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
 
 void AutoText::offerMatches(std::vector<Match> matches) {
     hideSnippetSuggestion();
+    if (!dependencies_.makeSuggestionController) {
+        return dependencies_.report("Several snippets match \"" + toUtf8(matches.front().second) +
+                                    "\", and there is no list here to choose from.");
+    }
     for (Match& match : matches) suggestions_.append(std::move(match.first), std::move(match.second));
     selectingSnippet_ = true;
     // Not from inside the callback: the application has to get the key first.
-    RunLoop& loop = dependencies_.inputService.runLoop();
-    loop.cancel(scheduledList_);
-    scheduledList_ = loop.schedule(0, [this] { showSnippetSuggestion(); });
+    listOpening_ = dependencies_.inputService.runLoop().performAfterDelay(0, [this] { showSnippetSuggestion(); });
 }
 
-void AutoText::keyCompletedNothing(ZDKeyEventArgs& event, std::size_t lengthBefore) {
-    if (dependencies_.autoCorrector) {
-        const std::u16string_view context = std::u16string_view(letters_).substr(0, lengthBefore);
-        dependencies_.autoCorrector->autoCorrect(*this, event, context);
-    }
+void AutoText::keyCompletedNothing(ZDKeyEventArgs& event) {
+    const auto correction = correction_.autoCorrect(letters_, *event.s, lastKeyDestination());
+    if (correction) sendCorrection(*correction, event);
     if (selectingSnippet_) {
         hideSnippetSuggestion();
     } else {
         refreshSnippetSuggestionController();
     }
+}
+
+void AutoText::sendCorrection(const AutoCorrection::Correction& correction, ZDKeyEventArgs& event) {
+    std::u16string letters = letters_;
+    event.cancel = sendSnippet(correction.snippet, correction.typed, SnippetTrigger::Typed);
+    if (letters.size() >= 2) letters.replace(letters.size() - 2, 1, correction.corrected);
+    letters_ = letters;
 }
 
 }  // namespace plume

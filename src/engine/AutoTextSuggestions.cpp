@@ -1,9 +1,7 @@
 // The engine's two lists: suggestions at the caret, and quick search.
 #include <utility>
 
-#include "content/PLOutput.h"
 #include "engine/AutoText.h"
-#include "engine/SlowActivation.h"
 
 namespace plume {
 
@@ -18,12 +16,12 @@ void AutoText::suggestAbbreviations() {
 
 void AutoText::refreshSuggestions() {
     suggestions_.clear();
-    if (letters_.empty()) return;
-    dependencies_.suggestionSource.appendSuggestions(letters_, filteredGroupsByApplication(), suggestions_);
+    if (letters_.empty() || !dependencies_.suggest) return;
+    suggestions_ = dependencies_.suggest(letters_, filteredGroupsByApplication());
 }
 
 void AutoText::showSnippetSuggestion() {
-    if (suggestions_.isEmpty()) return;
+    if (suggestions_.isEmpty() || !dependencies_.makeSuggestionController) return;
     if (snippetSuggestionController_) {
         snippetSuggestionController_->reloadData();
     } else {
@@ -69,13 +67,8 @@ void AutoText::sendSuggestionAtIndex(std::size_t index, SnippetTriggers snippetT
     const std::shared_ptr<Snippet> snippet = std::move(suggestions_.suggestions[index]);
     const std::u16string typed = std::move(suggestions_.suggestionFilters[index]);
     hideSnippetSuggestion();
-    const auto send = [this, snippet, typed, snippetTrigger] {
-        dependencies_.sender.sendSnippet(*this, snippet, typed, snippetTrigger);
-    };
-    InputService& service = dependencies_.inputService;
-    if (!losesKeysWhileActivated(service.contextBundleIdentifier())) return send();
-    service.bringLastProcessToFront();
-    scheduledSuggestion_ = service.runLoop().schedule(ActivationDelay, send);
+    sender_.performOnceKeysAreTaken(
+        [this, snippet, typed, snippetTrigger] { sendSnippet(snippet, typed, snippetTrigger); });
 }
 
 bool AutoText::snippetQuickSearchWindowVisible() const {
@@ -83,12 +76,13 @@ bool AutoText::snippetQuickSearchWindowVisible() const {
 }
 
 void AutoText::quickSearch() {
-    if (snippetQuickSearchWindowVisible()) return;
+    if (snippetQuickSearchWindowVisible() || !dependencies_.makeQuickSearchController) return;
     initSnippetQuickSearchController();
     snippetQuickSearchController_->showWindowAtCaret();
 }
 
 void AutoText::quickSearchAtTopRightCorner() {
+    if (!dependencies_.makeQuickSearchController) return;
     initSnippetQuickSearchController();
     snippetQuickSearchController_->showWindowAtTopRightCorner();
 }

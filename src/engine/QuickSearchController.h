@@ -8,8 +8,9 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <vector>
 
-#include "engine/EngineState.h"
+#include "library/SnippetGroup.h"
 #include "platform/Accessibility.h"
 
 namespace plume {
@@ -18,7 +19,7 @@ class QuickSearchController {
   public:
     virtual ~QuickSearchController() = default;
 
-    virtual void setSnippetGroups(const EngineState::Groups& groups) = 0;
+    virtual void setSnippetGroups(const std::vector<std::shared_ptr<SnippetGroup>>& groups) = 0;
     // Called, on the thread of the key events, when the user has chosen a snippet.
     virtual void setSnippetSelectedAction(std::function<void()> action) = 0;
     // Which modifier picks entries with digit keys, for showing it: 0 none, n the one of bit n - 1.

@@ -19,15 +19,6 @@ using Trigger = AbbreviationIndex::Trigger;
 
 constexpr char16_t ObjectReplacementCharacter = 0xfffc;
 
-bool isActive(const PLFunctionAvailability& where, const MatchContext& context) {
-    if (where.availability != PLFunctionAvailability::Everywhere &&
-        !where.admitsApplication(context.bundleIdentifier())) {
-        return false;
-    }
-    return where.inputMethodsOption == PLFunctionAvailability::Everywhere ||
-           where.admitsInputSource(context.inputSourceIdentifier());
-}
-
 bool standsAt(std::u16string_view text, std::size_t position, std::u16string_view prefix) {
     return equalsIgnoringCase(text.substr(position, prefix.size()), prefix);
 }
@@ -92,8 +83,8 @@ class Search final : public AbbreviationIndex::Visitor {
     };
 
   public:
-    Search(const SnippetMatcher& matcher, char16_t trigger, const MatchContext& context)
-        : matcher_(matcher), trigger_(trigger), context_(context) {}
+    Search(const SnippetMatcher& matcher, char16_t trigger, const KeyDestination& destination)
+        : matcher_(matcher), trigger_(trigger), destination_(destination) {}
 
     void run(const AbbreviationIndex& index, Trigger way, std::u16string_view text) {
         way_ = way;
@@ -104,7 +95,8 @@ class Search final : public AbbreviationIndex::Visitor {
     void visit(const Candidate& candidate) override {
         const SnippetGroup& group = *candidate.group->group;
         if (way_ == Trigger::Delimiter && !matcher_.delimitersOf(group).contains(trigger_)) return;
-        if (!isUpToDate(candidate) || !(*candidate.snippet)->hasContent() || !isActive(group.availability(), context_))
+        if (!isUpToDate(candidate) || !(*candidate.snippet)->hasContent() ||
+            !destination_.isAdmittedBy(group.availability()))
             return;
         const bool matches = candidate.group->prefix.empty() ? matchesPlain(matcher_, candidate, text_)
                                                              : matchesPrefixed(matcher_, candidate, text_);
@@ -123,7 +115,7 @@ class Search final : public AbbreviationIndex::Visitor {
   private:
     const SnippetMatcher& matcher_;
     char16_t trigger_;
-    const MatchContext& context_;
+    const KeyDestination& destination_;
     Trigger way_ = Trigger::Immediately;
     std::u16string_view text_;
     std::vector<Found> found_;
@@ -142,8 +134,8 @@ void SnippetMatcher::setSnippetGroups(const Groups& groups) {
 
 std::vector<SnippetMatcher::Match> SnippetMatcher::findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                                                          std::u16string_view lettersWithoutSeparator,
-                                                                         const MatchContext& context) const {
-    Search search(*this, trigger, context);
+                                                                         const KeyDestination& destination) const {
+    Search search(*this, trigger, destination);
     if (trigger == 0) {
         search.run(*index_, Trigger::HotKey, lettersWithoutSeparator);
     } else {

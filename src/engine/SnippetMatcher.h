@@ -13,20 +13,12 @@
 
 #include "Foundation/CharacterSet.h"
 #include "Foundation/ZDPair.h"
+#include "engine/KeyDestination.h"
 #include "library/SnippetGroup.h"
 
 namespace plume {
 
 class AbbreviationIndex;
-
-// Where the last key went. Asked only when a snippet limited to applications or input sources could match. The answers
-// stay valid until the matcher returns.
-class MatchContext {
-  public:
-    virtual ~MatchContext() = default;
-    virtual const std::optional<std::u16string>& bundleIdentifier() const = 0;
-    virtual const std::optional<std::u16string>& inputSourceIdentifier() const = 0;
-};
 
 class SnippetMatcher {
   public:
@@ -41,10 +33,11 @@ class SnippetMatcher {
     void setSnippetGroups(const Groups& groups);
 
     // `letters` is the buffer with the typed characters appended, `trigger` the typed unit or 0 when the expand hot key
-    // asks, `lettersWithoutSeparator` the buffer before the key. Every match, in library order.
+    // asks, `lettersWithoutSeparator` the buffer before the key. Every match, in library order. Where the key went is
+    // asked only when a snippet limited to applications or input sources could match.
     std::vector<Match> findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                              std::u16string_view lettersWithoutSeparator,
-                                             const MatchContext& context) const;
+                                             const KeyDestination& destination) const;
 
     // Whether what stands before `index` satisfies the group's expandAfter rule.
     bool checkGroup(const SnippetGroup& group, std::u16string_view text, std::size_t index) const;

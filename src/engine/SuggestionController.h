@@ -8,11 +8,34 @@
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
 
-#include "engine/SuggestionList.h"
+#include "library/Snippet.h"
 #include "platform/Accessibility.h"
 
 namespace plume {
+
+// The snippets offered to the user: two lists in step: entry i of `suggestionFilters` is the text that made entry i of
+// `suggestions` one.
+struct SuggestionList {
+    std::vector<std::shared_ptr<Snippet>> suggestions;
+    std::vector<std::u16string> suggestionFilters;
+
+    std::size_t size() const { return suggestions.size(); }
+    bool isEmpty() const { return suggestions.empty(); }
+
+    void append(std::shared_ptr<Snippet> snippet, std::u16string filter) {
+        suggestions.push_back(std::move(snippet));
+        suggestionFilters.push_back(std::move(filter));
+    }
+    void clear() {
+        suggestions.clear();
+        suggestionFilters.clear();
+    }
+};
 
 class SuggestionController {
   public:

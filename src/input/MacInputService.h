@@ -1,5 +1,5 @@
-// The program's ears and hands: hears every key of the session before any program does, tells the engine, the hot keys'
-// owner and others about it, swallows what they decide to swallow, and delivers output.
+// Hears every key of the session before any program does, tells the engine, the hot keys' owner and others about it,
+// swallows what they decide to swallow, and delivers output.
 //
 // Owned by the composition root, which also owns the tap thread and runs its loop. Everything belongs to the tap thread
 // unless it says otherwise. The service is destroyed when neither loop runs calls any more. Nothing fails to its
@@ -17,25 +17,32 @@
 #include <thread>
 #include <vector>
 
+#include "Foundation/ZDEvent.h"
+#include "content/PLOutput.h"
 #include "input/AclExport.h"
+#include "input/EventArgs.h"
 #include "input/HotKeyTable.h"
-#include "input/InputService.h"
 #include "input/SRKeyCodeTransformer.h"
 #include "input/SecureInputWatch.h"
 #include "input/delivery/OutputDelivery.h"
 #include "input/delivery/VMHelperController.h"
 #include "platform/KeyboardTap.h"
 #include "platform/MouseTap.h"
+#include "platform/ProcessManager.h"
+#include "platform/RunLoop.h"
 #include "platform/SystemHotKeys.h"
 
 namespace plume {
 
 class MacInputService;
 
+// The keyboard went to another program, or a shortcut may have changed the text.
+struct InputContextChange {};
+
 // The tap was lost three times within a minute and stays off.
 struct KeyboardTapGivenUp {};
 
-class MacInputService final : public InputService, private KeyboardTapListener {
+class MacInputService final : private KeyboardTapListener {
   public:
     // Nothing is owned; all of it outlives the service. `log` is called on either thread.
     struct Dependencies {
@@ -56,17 +63,22 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     };
 
     explicit MacInputService(Dependencies dependencies);
-    ~MacInputService() override;
+    ~MacInputService();
     MacInputService(const MacInputService&) = delete;
     MacInputService& operator=(const MacInputService&) = delete;
 
+    // Raised on the tap thread, inside the callback that decides about the key: `cancel` swallows it.
+    ZDEvent<ZDKeyEventArgs> keyDownEvent;
+    ZDEvent<ZDUnregisteredHotKeyPressedEventArgs> unregisteredHotKeyPressedEvent;
+    ZDEvent<ZDHotKeysPressedEventArgs> hotKeysPressed;
+    // Raised on the tap thread.
+    ZDEvent<InputContextChange> inputContextChangedEvent;
+    ZDEvent<ZDMouseEventArgs> mouseDownEvent;
     // Raised on the main thread, where observers register before enableEvents(); nobody's answer is waited for.
     ZDEvent<ZDKeyEventArgs> keyUpEvent;
     // Raised on the main thread, where observers register.
     ZDEvent<MacInputService> secureInputChangedEvent;
     ZDEvent<KeyboardTapGivenUp> keyboardTapGivenUpEvent;
-    // Raised on the tap thread; `cancel` swallows the key.
-    ZDEvent<ZDHotKeysPressedEventArgs> hotKeysPressed;
 
     // From any thread: start and stop hearing keys, as soon as the tap thread can (at once on it). A tap that cannot be
     // created is logged, and nothing is heard.
@@ -122,16 +134,26 @@ class MacInputService final : public InputService, private KeyboardTapListener {
     // Every output has been delivered.
     bool isIdle() const { return delivery_.isIdle(); }
 
-    KeyModifiers keyModifier() const override { return hotKeys_.keyModifier(); }
-    bool isSameProcess() const override;
-    ProcessSerialNumber lastProcessReceivedKeyEvent() const override { return lastProcessReceivedKeyEvent_; }
-    std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const override;
-    const std::optional<std::u16string>& lastKeyString() const override { return lastKeyString_; }
-    const std::optional<std::u16string>& contextBundleIdentifier() const override;
-    std::shared_ptr<const ContextInputSetting> refreshContextInputSetting() override;
-    void sendOutput(std::shared_ptr<PLOutput> output) override;
-    void bringLastProcessToFront() override;
-    RunLoop& runLoop() override { return around_.tapLoop; }
+    // The modifiers held now.
+    KeyModifiers keyModifier() const { return hotKeys_.keyModifier(); }
+    // The last key went to Plume itself.
+    bool isSameProcess() const;
+    ProcessSerialNumber lastProcessReceivedKeyEvent() const { return lastProcessReceivedKeyEvent_; }
+    // What a key code produces with the modifiers of these event flags.
+    std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const;
+    // What the last key produced; nothing when it produced nothing.
+    const std::optional<std::u16string>& lastKeyString() const { return lastKeyString_; }
+
+    // The application in front when its setting was last resolved, and resolving it anew; the setting is never null.
+    const std::optional<std::u16string>& contextBundleIdentifier() const;
+    std::shared_ptr<const ContextInputSetting> refreshContextInputSetting();
+    // Erases and delivers. From any thread: at once on the tap thread, where `cancelTrigger` and the content's suffix
+    // are decided when it returns, otherwise as soon as that one can.
+    void sendOutput(std::shared_ptr<PLOutput> output);
+    void bringLastProcessToFront();
+
+    // The tap thread's.
+    RunLoop& runLoop() { return around_.tapLoop; }
 
   private:
     bool keyboardEvent(const TapEvent& event) override;

@@ -22,7 +22,7 @@ ScenarioRun::ScenarioRun(const Scenario& scenario)
     : scenario_(scenario),
       loop_(desktop_.runLoop(), {[this] { return visibleChanges(); },
                                  [this] {
-                                     if (program_) program_->sender().waitForScripts();
+                                     if (program_) program_->engine().sender().waitForScripts();
                                  }}),
       date_(movingDate(scenario, desktop_.runLoop())) {
     for (const auto& [identifier, setting] : scenario_.applicationSettings) {
@@ -33,7 +33,7 @@ ScenarioRun::ScenarioRun(const Scenario& scenario)
     activate(scenario_.application);
     desktop_.front()->setText(scenario_.text);
 
-    program_ = std::make_unique<Composition>(ports(), dependencies());
+    program_ = std::make_unique<Composition>(ports(), environment());
     for (const auto& [identifier, setting] : scenario_.applicationSettings) {
         program_->inputService().setCustomApplicationSetting(identifier, setting);
     }
@@ -62,7 +62,7 @@ Composition::Ports ScenarioRun::ports() {
             loop_};
 }
 
-Composition::Dependencies ScenarioRun::dependencies() {
+Composition::Environment ScenarioRun::environment() {
     return {*scenario_.settings,
             [this](const std::string& message) { report(message); },
             [](const std::string&) {},
@@ -71,9 +71,9 @@ Composition::Dependencies ScenarioRun::dependencies() {
             scenarioFieldsEditors(forms_, scenario_.locale),
             [this] { return makeScenarioList(list_); },
             [] { return makeScenarioSearch(); },
+            {},
             nullptr,
-            nullptr,
-            nullptr};
+            {}};
 }
 
 void ScenarioRun::activate(const std::u16string& application) {

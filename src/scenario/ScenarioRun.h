@@ -40,7 +40,7 @@ class ScenarioRun {
 
   private:
     Composition::Ports ports();
-    Composition::Dependencies dependencies();
+    Composition::Environment environment();
     void report(const std::string& message);
     std::uint64_t visibleChanges() const;
 

@@ -53,7 +53,7 @@ class ListWindow final : public SuggestionController {
 // Opens and closes; nothing can be searched in a scenario.
 class SearchWindow final : public QuickSearchController {
   public:
-    void setSnippetGroups(const EngineState::Groups& /*groups*/) override {}
+    void setSnippetGroups(const std::vector<std::shared_ptr<SnippetGroup>>& /*groups*/) override {}
     void setSnippetSelectedAction(std::function<void()> /*action*/) override {}
     void setSnippetSelectorKeyModifier(std::int64_t /*modifier*/) override {}
     void showWindowAtCaret() override { visible_ = true; }

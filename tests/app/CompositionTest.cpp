@@ -52,7 +52,7 @@ TEST_F(WindowlessProgram, Expands) {
 
 TEST_F(WindowlessProgram, TellsThatASnippetNeedsAForm) {
     add(u"Dear \u3010field:Name\u3011");
-    EXPECT_EQ(typed(u"sig"), u"");
+    EXPECT_EQ(typed(u"sig"), u"sig");
     ASSERT_EQ(told_.size(), 1u);
     EXPECT_NE(told_[0].find("\"sig\""), std::string::npos);
 }
@@ -62,6 +62,8 @@ TEST_F(WindowlessProgram, LeavesDigitsAndReturnAloneWhenSeveralMatch) {
     add(u"second");
     EXPECT_EQ(typed(u"sig"), u"sig");
     EXPECT_EQ(typed(u"1\n"), u"sig1\n");
+    ASSERT_EQ(told_.size(), 1u);
+    EXPECT_NE(told_[0].find("\"sig\""), std::string::npos);
 }
 
 }  // namespace plume

@@ -1,17 +1,14 @@
 // Sentences get their capital, words lose their second one, and nothing else is touched.
-#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
-#include "Foundation/CharacterSet.h"
-#include "Foundation/Strings.h"
+#include <algorithm>
+
 #include "engine/AutoTextUtils.h"
-#include "tests/engine/SendingDesk.h"
+#include "tests/engine/EngineDesk.h"
 
 namespace plume {
 namespace {
-
-using ::testing::SizeIs;
 
 struct CorrectionCase {
     const char* about;
@@ -19,158 +16,50 @@ struct CorrectionCase {
     std::u16string screen;
 };
 
-void PrintTo(const CorrectionCase& one, std::ostream* stream) {
-    *stream << one.about;
-}
-
-void correctEverything(AutoCorrection& correction) {
-    correction.setCapitalizeNewSentences(true);
-    correction.setCorrectDoubleCapitals(true);
-    correction.setCapitalizationExcludedAbbreviations({u"", u"ETC.", u"e.g."});
-    correction.setDoubleCapitalsCorrectionExclusion({u"IDs"});
-}
-
-class Correcting : public ::testing::TestWithParam<CorrectionCase> {};
-
-TEST_P(Correcting, WhatIsTyped) {
-    SendingDesk desk;
-    correctEverything(desk.correction);
-    desk.type(GetParam().typed);
-    EXPECT_EQ(desk.screen(), GetParam().screen);
-    // The buffer is what stands before the caret.
-    std::u16string buffer = GetParam().screen;
-    for (char16_t& unit : buffer) {
-        if (unit == u'\n') unit = u'\r';
-    }
-    EXPECT_EQ(desk.engine.letters(), buffer);
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Sentences, Correcting,
-    ::testing::Values(CorrectionCase{"after a period", u"End. the", u"End. The"},
-                      CorrectionCase{"after a question", u"Eh? the", u"Eh? The"},
-                      CorrectionCase{"after an exclamation", u"Oh!  the", u"Oh!  The"},
-                      CorrectionCase{"word of one letter", u"End. a b", u"End. A b"},
-                      CorrectionCase{"capital behind it", u"End. tH", u"End. tH"},
-                      CorrectionCase{"no space", u"x.th", u"x.th"},
-                      CorrectionCase{"in a sentence", u"Of the", u"Of the"},
-                      CorrectionCase{"after a comma", u"Oh, the", u"Oh, the"},
-                      CorrectionCase{"after a tab", u"line\tthe", u"line\tThe"},
-                      CorrectionCase{"on a new line", u"line\nthe", u"line\nThe"},
-                      CorrectionCase{"indented on a new line", u"line\n  the", u"line\n  The"},
-                      CorrectionCase{"spaces from the start", u"  the", u"  the"},
-                      CorrectionCase{"punctuation behind it", u"End. a.", u"End. a."},
-                      CorrectionCase{"excluded abbreviation", u"Pens, etc. the", u"Pens, etc. the"},
-                      CorrectionCase{"excluded in other case", u"Pens, Etc. the", u"Pens, Etc. the"},
-                      CorrectionCase{"excluded, but two spaces", u"Pens, etc.  the", u"Pens, etc.  The"},
-                      CorrectionCase{"ends like an excluded one", u"Fetc. the", u"Fetc. the"},
-                      CorrectionCase{"beyond ASCII", u"End. über", u"End. Über"}));
-
-INSTANTIATE_TEST_SUITE_P(Capitals, Correcting,
-                         ::testing::Values(CorrectionCase{"word", u"x THe", u"x The"},
-                                           CorrectionCase{"start of the text", u"THe", u"The"},
-                                           CorrectionCase{"start of a line", u"x\nTHe", u"x\nThe"},
-                                           CorrectionCase{"after a tab", u"x\tTHe", u"x\tTHe"},
-                                           CorrectionCase{"in parentheses", u"x (THe", u"x (THe"},
-                                           CorrectionCase{"three capitals", u"x THEm", u"x THEm"},
-                                           CorrectionCase{"two letters", u"x TH e", u"x TH e"},
-                                           CorrectionCase{"excluded", u"x IDs", u"x IDs"},
-                                           CorrectionCase{"excluded in other case only", u"x IDe", u"x Ide"}));
-
-TEST(Correction, SendsOneLetterLikeASnippet) {
-    SendingDesk desk;
-    correctEverything(desk.correction);
-    desk.pipeline.setPlayFeedbackSound(true);
-    desk.type(u"End. th");
-    ASSERT_THAT(desk.service.outputs(), SizeIs(1));
-    EXPECT_EQ(desk.lastOutput().backspaceCount, 1U);
-    EXPECT_EQ(desk.lastOutput().trigger, SnippetTrigger::Typed);
-    EXPECT_FALSE(desk.lastOutput().cancelTrigger);
-    EXPECT_THAT(desk.sounds.names, SizeIs(1));
-}
-
-TEST(Correction, IsUndone) {
-    for (const bool withTrigger : {false, true}) {
-        SendingDesk desk;
-        correctEverything(desk.correction);
-        desk.type(u"End. th");
-        EXPECT_TRUE(desk.undo(withTrigger));
-        EXPECT_EQ(desk.screen(), withTrigger ? u"End. th" : u"End. t");
-    }
-}
-
-TEST(Correction, IsMadeOnlyWhereItIsOnAndAllowed) {
-    struct Case {
-        const char* about;
-        std::function<void(SendingDesk&)> change;
-        bool corrects;
+TEST(Correction, ChangesSentencesAndDoubleCapitalsAsTheyAreTyped) {
+    const CorrectionCase cases[] = {
+        {"after a period", u"End. the", u"End. The"},
+        {"after a question", u"Eh? the", u"Eh? The"},
+        {"after an exclamation", u"Oh!  the", u"Oh!  The"},
+        {"word of one letter", u"End. a b", u"End. A b"},
+        {"capital behind it", u"End. tH", u"End. tH"},
+        {"no space", u"x.th", u"x.th"},
+        {"in a sentence", u"Of the", u"Of the"},
+        {"after a comma", u"Oh, the", u"Oh, the"},
+        {"after a tab", u"Line\tthe", u"Line\tThe"},
+        {"on a new line", u"Line\nthe", u"Line\nThe"},
+        {"indented on a new line", u"Line\n  the", u"Line\n  The"},
+        {"spaces from the start", u"  the", u"  the"},
+        {"punctuation behind it", u"End. a.", u"End. a."},
+        {"excluded abbreviation", u"Pens, etc. the", u"Pens, etc. the"},
+        {"excluded in other case", u"Pens, Etc. the", u"Pens, Etc. the"},
+        {"excluded, but two spaces", u"Pens, etc.  the", u"Pens, etc.  The"},
+        {"ends like an excluded one", u"Fetc. the", u"Fetc. the"},
+        {"beyond ASCII", u"End. über", u"End. Über"},
+        {"word", u"X THe", u"X The"},
+        {"start of the text", u"THe", u"The"},
+        {"start of a line", u"x\nTHe", u"x\nThe"},
+        {"after a tab", u"X\tTHe", u"X\tTHe"},
+        {"in parentheses", u"X (THe", u"X (THe"},
+        {"three capitals", u"X THEm", u"X THEm"},
+        {"two letters", u"X TH e", u"X TH e"},
+        {"excluded", u"X IDs", u"X IDs"},
+        {"excluded in other case only", u"X IDe", u"X Ide"},
     };
-    const Case cases[] = {
-        {"by itself", [](SendingDesk&) {}, true},
-        {"sentences off", [](SendingDesk& desk) { desk.correction.setCapitalizeNewSentences(false); }, false},
-        {"nowhere listed",
-         [](SendingDesk& desk) {
-             desk.correction.autoCorrectAvailability().availability = PLFunctionAvailability::OnlyListed;
-         },
-         false},
-        {"except here",
-         [](SendingDesk& desk) {
-             auto& where = desk.correction.autoCorrectAvailability();
-             where.availability = PLFunctionAvailability::ExceptListed;
-             where.applications = {u"org.example.editor"};
-         },
-         false},
-        {"not with this layout",
-         [](SendingDesk& desk) {
-             auto& where = desk.correction.autoCorrectAvailability();
-             where.inputMethodsOption = PLFunctionAvailability::ExceptListed;
-             where.inputMethods = {std::u16string(SimulatedInputSources::US)};
-         },
-         false},
-        {"an application that wants none",
-         [](SendingDesk& desk) {
-             ContextInputSetting setting;
-             setting.flags = InputFlag::DisableCapitalization;
-             desk.service.setContextInputSetting(setting);
-         },
-         false},
-    };
-    for (const Case& one : cases) {
-        SendingDesk desk;
-        correctEverything(desk.correction);
-        one.change(desk);
-        desk.type(u"End. th");
-        EXPECT_EQ(desk.screen(), one.corrects ? u"End. Th" : u"End. th") << one.about;
+    for (const CorrectionCase& one : cases) {
+        EngineDesk desk;
+        AutoCorrection& correction = desk.engine.correction();
+        correction.setCapitalizeNewSentences(true);
+        correction.setCorrectDoubleCapitals(true);
+        correction.setCapitalizationExcludedAbbreviations({u"", u"ETC.", u"e.g."});
+        correction.setDoubleCapitalsCorrectionExclusion({u"IDs"});
+        desk.type(one.typed);
+        EXPECT_EQ(desk.screen(), one.screen) << one.about;
+        // The buffer is what stands before the caret.
+        std::u16string buffer = one.screen;
+        std::replace(buffer.begin(), buffer.end(), u'\n', u'\r');
+        EXPECT_EQ(desk.engine.letters(), buffer) << one.about;
     }
-}
-
-// With less than two characters in the buffer, what stands before the caret is asked for.
-TEST(Correction, JudgesByTheTextInTheFieldAfterAClick) {
-    struct Case {
-        std::u16string field;  // before the caret
-        bool corrects;
-    };
-    for (const Case& one : {Case{u"t", true}, Case{u"End. t", true}, Case{u"of t", false}, Case{u"at", false}}) {
-        SendingDesk desk;
-        correctEverything(desk.correction);
-        const auto field = std::make_shared<SimulatedUIElement>();
-        field->setText(one.field);
-        field->setAttribute("AXSelectedTextRange", TextRange{static_cast<std::int64_t>(one.field.size()), 0});
-        const auto application = std::make_shared<SimulatedUIElement>();
-        application->setAttribute("AXFocusedUIElement", SimulatedUIElement::Element(field));
-        desk.accessibility.setFrontApplicationElement(application);
-        desk.type(u"h");
-        EXPECT_THAT(desk.service.outputs(), SizeIs(one.corrects ? 1 : 0)) << toUtf8(one.field);
-        EXPECT_EQ(desk.engine.letters(), u"h") << "what was not typed is not in the buffer";
-    }
-}
-
-TEST(Correction, GivesSnippetsTheFirstSay) {
-    SendingDesk desk;
-    correctEverything(desk.correction);
-    desk.add(u"th", u"thorium");
-    desk.type(u"End. th");
-    EXPECT_EQ(desk.screen(), u"End. thorium");
 }
 
 // The rules told once more, unit by unit.

@@ -1,6 +1,7 @@
-// Which way each key takes.
+// What keys do to the buffer and to the list.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
 
 #include "content/PLOutput.h"
 #include "tests/engine/EngineDesk.h"
@@ -9,211 +10,250 @@ namespace plume {
 namespace {
 
 using ::testing::IsEmpty;
-using ::testing::SizeIs;
+
+constexpr KeyModifiers Shift = KeyModifier::Shift;
+constexpr KeyModifiers Control = KeyModifier::Control;
+constexpr KeyModifiers Option = KeyModifier::Option;
+constexpr KeyModifiers Command = KeyModifier::Command;
 
 struct KeyCase {
     const char* about;
     KeyCode key;
     KeyModifiers modifiers;
-    std::u16string letters;  // the buffer afterwards, from "abc"
-};
-
-void PrintTo(const KeyCase& key, std::ostream* stream) {
-    *stream << key.about;
-}
-
-class KeysWithoutAList : public ::testing::TestWithParam<KeyCase> {};
-
-TEST_P(KeysWithoutAList, EditTheBufferAndReachTheApplication) {
-    EngineDesk desk;
-    desk.service.typeText(u"abc");
-    EXPECT_FALSE(desk.service.pressKey(GetParam().key, GetParam().modifiers));
-    EXPECT_EQ(desk.engine.letters(), GetParam().letters);
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Codes, KeysWithoutAList,
-    ::testing::Values(KeyCase{"Delete", KeyCode::Delete, {}, u"ab"},
-                      KeyCase{"Shift+Delete", KeyCode::Delete, KeyModifier::Shift, u"ab"},
-                      KeyCase{"Escape", KeyCode::Escape, {}, u""}, KeyCase{"Return", KeyCode::Return, {}, u"abc\r"},
-                      KeyCase{"Shift+Return", KeyCode::Return, KeyModifier::Shift, u"abc\r"},
-                      KeyCase{"Enter", KeyCode::KeypadEnter, {}, u"abc\x03"},
-                      KeyCase{"Space", KeyCode::Space, {}, u"abc "},
-                      KeyCase{"Shift+Space", KeyCode::Space, KeyModifier::Shift, u"abc "},
-                      KeyCase{"Option+Space", KeyCode::Space, KeyModifier::Option, u"abc\u00A0"},
-                      KeyCase{"Home", KeyCode::Home, {}, u""}, KeyCase{"Page Up", KeyCode::PageUp, {}, u""},
-                      KeyCase{"End", KeyCode::End, {}, u""}, KeyCase{"Page Down", KeyCode::PageDown, {}, u""},
-                      KeyCase{"Left", KeyCode::Left, {}, u""},
-                      KeyCase{"Shift+Right", KeyCode::Right, KeyModifier::Shift, u""},
-                      KeyCase{"Down", KeyCode::Down, {}, u""}, KeyCase{"Up", KeyCode::Up, {}, u""},
-                      KeyCase{"Forward Delete", KeyCode::ForwardDelete, {}, u"abc"},
-                      KeyCase{"Tab", KeyCode::Tab, {}, u"abc\t"}, KeyCase{"keypad 7", KeyCode::Keypad7, {}, u"abc7"},
-                      KeyCase{"a key that types nothing", KeyCode::F1, {}, u"abc"},
-                      KeyCase{"Option+Delete", KeyCode::Delete, KeyModifier::Option, u""},
-                      KeyCase{"Command+Left", KeyCode::Left, KeyModifier::Command, u""},
-                      KeyCase{"Control+A", KeyCode::A, KeyModifier::Control, u""}));
-
-struct ListKeyCase {
-    const char* about;
-    KeyCode key;
-    KeyModifiers modifiers;
-    bool swallowed;
     bool visible;          // the list, afterwards
     std::size_t selected;  // from entry 1 of 3
-    std::vector<std::u16string> sent;
+    std::u16string screen;
 };
 
-void PrintTo(const ListKeyCase& key, std::ostream* stream) {
-    *stream << key.about;
+TEST(Keys, DriveTheList) {
+    const KeyCase cases[] = {
+        {"Down", KeyCode::Down, {}, true, 2, u"ab"},
+        {"Up", KeyCode::Up, {}, true, 0, u"ab"},
+        {"Return", KeyCode::Return, {}, false, 1, u"content"},
+        {"Shift+Return", KeyCode::Return, Shift, false, 1, u"content"},
+        {"Enter", KeyCode::KeypadEnter, {}, false, 1, u"content"},
+        {"Escape", KeyCode::Escape, {}, false, 1, u"ab"},
+        {"Left", KeyCode::Left, {}, false, 1, u"ab"},
+        {"Forward Delete", KeyCode::ForwardDelete, {}, true, 1, u"ab"},
+        {"Shift+Space", KeyCode::Space, Shift, true, 1, u"ab "},
+        {"Space, which begins nothing", KeyCode::Space, {}, false, 1, u"ab "},
+        {"Delete, back to a shorter beginning", KeyCode::Delete, {}, true, 0, u"a"},
+    };
+    for (const KeyCase& key : cases) {
+        EngineDesk desk;
+        desk.add({u"abc", u"abd", u"abe"});
+        desk.suggest(u"ab");
+        desk.list.selected = 1;
+        desk.desktop.pressAndRelease(key.key, key.modifiers);
+        EXPECT_EQ(desk.list.visible, key.visible) << key.about;
+        EXPECT_EQ(desk.list.selected, key.selected) << key.about;
+        EXPECT_EQ(desk.screen(), key.screen) << key.about;
+    }
 }
 
-class KeysWithAList : public ::testing::TestWithParam<ListKeyCase> {};
+struct DigitCase {
+    const char* about;
+    std::int64_t setting;
+    char16_t key;
+    KeyModifiers held;
+    std::u16string screen;  // the list has "1" to "3" for "aba", "abb" and "abc"
+};
 
-TEST_P(KeysWithAList, DriveIt) {
-    const ListKeyCase& key = GetParam();
-    EngineDesk desk;
-    desk.add({u"abc", u"abd", u"abe"});
-    desk.service.typeText(u"ab");
-    desk.engine.suggestAbbreviations();
-    desk.list.selected = 1;
-
-    EXPECT_EQ(desk.service.pressKey(key.key, key.modifiers), key.swallowed);
-    EXPECT_EQ(desk.list.visible, key.visible);
-    EXPECT_EQ(desk.list.selected, key.selected);
-    std::vector<std::u16string> sent;
-    for (const auto& one : desk.sender.sent) sent.push_back(one.abbreviation);
-    EXPECT_EQ(sent, key.sent);
+TEST(Digits, PickFromTheList) {
+    const DigitCase cases[] = {
+        {"first", 0, u'1', {}, u"1"},
+        {"last", 0, u'3', {}, u"3"},
+        {"one past the end closes the list", 0, u'4', {}, u"ab"},
+        {"two past the end is typed", 0, u'5', {}, u"ab5"},
+        {"0 stands for the tenth", 0, u'0', {}, u"ab0"},
+        {"not with a modifier", 0, u'1', Option, u"ab\u00A1"},
+        {"Shift", 1, u'1', Shift, u"1"},
+        {"Shift is missing", 1, u'1', {}, u"ab1"},
+        {"Shift and more", 1, u'1', Shift | Option, u"ab\u00A1"},
+        {"Control", 2, u'2', Control, u"2"},
+        {"Control and more", 2, u'2', Control | Shift, u"ab"},
+        {"Option", 3, u'3', Option, u"3"},
+        {"Command", 4, u'1', Command, u"1"},
+        {"another than Command", 4, u'1', Control, u"ab"},
+        {"no such modifier", -1, u'1', {}, u"ab1"},
+        {"no such bit", 64, u'1', Command, u"ab"},
+    };
+    for (const DigitCase& digit : cases) {
+        EngineDesk desk;
+        desk.add(u"aba", u"1");
+        desk.add(u"abb", u"2");
+        desk.add(u"abc", u"3");
+        desk.engine.setSnippetSelectorKeyModifier(digit.setting);
+        desk.suggest(u"ab");
+        desk.press(digit.key, digit.held);
+        EXPECT_EQ(desk.screen(), digit.screen) << digit.about;
+        EXPECT_FALSE(desk.list.visible) << digit.about;
+    }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Codes, KeysWithAList,
-    ::testing::Values(ListKeyCase{"Down", KeyCode::Down, {}, true, true, 2, {}},
-                      ListKeyCase{"Up", KeyCode::Up, {}, true, true, 0, {}},
-                      ListKeyCase{"Return", KeyCode::Return, {}, true, false, 1, {u"abd"}},
-                      ListKeyCase{"Shift+Return", KeyCode::Return, KeyModifier::Shift, true, false, 1, {u"abd"}},
-                      ListKeyCase{"Enter", KeyCode::KeypadEnter, {}, true, false, 1, {u"abd"}},
-                      ListKeyCase{"Escape", KeyCode::Escape, {}, true, false, 1, {}},
-                      ListKeyCase{"Left", KeyCode::Left, {}, false, false, 1, {}},
-                      ListKeyCase{"Forward Delete", KeyCode::ForwardDelete, {}, false, true, 1, {}},
-                      ListKeyCase{"Shift+Space", KeyCode::Space, KeyModifier::Shift, false, true, 1, {}},
-                      ListKeyCase{"Space, which begins nothing", KeyCode::Space, {}, false, false, 1, {}},
-                      ListKeyCase{"Delete, back to a shorter beginning", KeyCode::Delete, {}, false, true, 0, {}}));
+TEST(Digits, PickFromQuickSearch) {
+    const DigitCase cases[] = {
+        {"plain", 0, u'2', {}, u"ab2"},        {"past the end", 0, u'3', {}, u"ab3"},
+        {"Shift", 1, u'2', Shift, u"ab2"},     {"Shift is missing", 1, u'1', {}, u"ab1"},
+        {"Command", 4, u'2', Command, u"ab2"},
+    };
+    for (const DigitCase& digit : cases) {
+        EngineDesk desk;
+        desk.search.results = {std::make_shared<Snippet>(u"one", u"first"), std::make_shared<Snippet>(u"two", u"2")};
+        desk.engine.setSnippetSelectorKeyModifier(digit.setting);
+        desk.type(u"ab");
+        desk.engine.quickSearch();
+        desk.press(digit.key, digit.held);
+        EXPECT_EQ(desk.screen(), digit.screen) << digit.about;
+        EXPECT_EQ(desk.search.visible, digit.key != u'2') << digit.about;
+    }
+}
 
-TEST(Keys, EscapeThatClosesTheListKeepsTheBuffer) {
+TEST(Digits, ReachTheTenthEntryAndAreTypedWhereThereIsNone) {
+    for (const int entries : {10, 3}) {
+        EngineDesk desk;
+        desk.openListOf(entries);
+        desk.type(u"0");
+        EXPECT_EQ(desk.screen(), entries == 10 ? u"content" : u"ab0");
+    }
+}
+
+TEST(Keys, TypedIntoQuickSearchLeaveTheEngineAlone) {
     EngineDesk desk;
     desk.add({u"abc"});
-    desk.service.typeText(u"ab");
-    desk.engine.suggestAbbreviations();
-    desk.service.pressKey(KeyCode::Escape);
+    desk.type(u"ab");
+    desk.engine.quickSearch();
+    desk.type(u"c7\b");
+    desk.desktop.pressAndRelease(KeyCode::Escape);
+    desk.desktop.pressAndRelease(KeyCode::Left);
     EXPECT_EQ(desk.engine.letters(), u"ab");
-    EXPECT_TRUE(desk.engine.suggestions().isEmpty());
+    EXPECT_TRUE(desk.search.visible);
 }
 
-TEST(Keys, ReturnSendsTheSelectedEntryAsASuggestion) {
+TEST(Keys, ToPlumeItselfEndUndoButAreNotFollowed) {
     EngineDesk desk;
-    desk.add({u"abc", u"abd"});
-    desk.service.typeText(u"ab");
-    desk.engine.suggestAbbreviations();
-    desk.service.pressKey(KeyCode::Down);
-    desk.service.pressKey(KeyCode::Return);
-    ASSERT_THAT(desk.sender.sent, SizeIs(1));
-    EXPECT_EQ(desk.sender.sent[0], (RecordingSender::Sent{u"abd", u"ab", SnippetTrigger::Suggestion, u"ab", false}));
+    desk.add(u"ab", u"Best");
+    desk.type(u"ab");
+    ASSERT_TRUE(desk.engine.undoInfo());
+    SimulatedProcessManager& processes = desk.desktop.processManager();
+    processes.setFrontProcess(processes.currentProcess());
+    desk.type(u"ab");
+    EXPECT_EQ(desk.engine.letters(), u"");
+    EXPECT_FALSE(desk.engine.undo(true));
+    desk.add({u"x"}, ExpandTrigger::HotKey);
+    desk.engine.expandAtHotkey();
+    EXPECT_THAT(desk.engine.letters(), IsEmpty());
 }
 
-class ShiftWithSpaceLikeKeys : public ::testing::TestWithParam<KeyCode> {};
-
-TEST_P(ShiftWithSpaceLikeKeys, NeverExpand) {
+TEST(Keys, WhileDisabledLeaveUndoAsItIs) {
     EngineDesk desk;
-    desk.add({u"sig"}, ExpandTrigger::DelimiterSwallowed);
-    desk.service.typeText(u"sig");
-    EXPECT_FALSE(desk.service.pressKey(GetParam(), KeyModifier::Shift));
-    EXPECT_THAT(desk.sender.sent, IsEmpty());
-    EXPECT_THAT(desk.engine.letters(), SizeIs(4));
-
-    desk.engine.clear();
-    desk.service.typeText(u"sig");
-    EXPECT_TRUE(desk.service.pressKey(GetParam()));
-}
-
-INSTANTIATE_TEST_SUITE_P(Codes, ShiftWithSpaceLikeKeys,
-                         ::testing::Values(KeyCode::Space, KeyCode::Return, KeyCode::KeypadEnter));
-
-TEST(Keys, OtherModifiersWithSpaceExpandAsUsual) {
-    EngineDesk desk;
-    const auto group = desk.add({u"sig"}, ExpandTrigger::DelimiterSwallowed);
-    group->setDelimiters(CharacterSet::withCharacters(u"\u00A0"));
-    desk.service.typeText(u"sig");
-    EXPECT_TRUE(desk.service.pressKey(KeyCode::Space, KeyModifier::Shift | KeyModifier::Option));
-}
-
-TEST(Keys, AreIgnoredWhileDisabled) {
-    EngineDesk desk;
-    desk.add({u"ab"});
+    desk.add(u"ab", u"Best");
+    desk.type(u"ab");
     desk.engine.setEnabled(false);
-    desk.engine.setUndoInfo(UndoInformation{});
-    EXPECT_EQ(desk.service.typeText(u"ab"), u"ab");
+    desk.type(u"ab");
     EXPECT_EQ(desk.engine.letters(), u"");
     EXPECT_TRUE(desk.engine.undoInfo());
 }
 
-TEST(Keys, ToPlumeItselfAreNotFollowed) {
-    EngineDesk desk;
-    desk.add({u"ab"});
-    desk.processes.setFrontProcess(desk.processes.currentProcess());
-    desk.engine.setUndoInfo(UndoInformation{});
-    EXPECT_EQ(desk.service.typeText(u"ab"), u"ab");
-    EXPECT_EQ(desk.engine.letters(), u"");
-    EXPECT_FALSE(desk.engine.undoInfo()) << "any key ends the chance to undo";
-}
-
-struct UndoCase {
+struct ClickCase {
     const char* about;
-    std::function<void(EngineDesk&)> act;
+    bool list;
+    bool search;
+    double x;
+    double y;
     bool kept;
 };
 
-TEST(Undo, EndsWithTheNextKeyButNotWithClicksAndShortcuts) {
-    const UndoCase cases[] = {
-        {"letter", [](EngineDesk& desk) { desk.service.typeText(u"a"); }, false},
-        {"Forward Delete", [](EngineDesk& desk) { desk.service.pressKey(KeyCode::ForwardDelete); }, false},
-        {"key without text", [](EngineDesk& desk) { desk.service.pressKey(KeyCode::F1); }, false},
-        {"click", [](EngineDesk& desk) { desk.service.click(1, 1); }, true},
-        {"Command+S", [](EngineDesk& desk) { desk.press(u's', KeyModifier::Command); }, true},
+TEST(Buffer, StartsAnewAtAClickOutsideTheVisibleWindow) {
+    // The list stands at (100, 100), the search window at (400, 100); both are 200 wide and 50 high.
+    const ClickCase cases[] = {
+        {"in the list", true, false, 110, 110, true},
+        {"at its first corner", true, false, 100, 100, true},
+        {"below it", true, false, 110, 151, false},
+        {"beside it", true, false, 301, 110, false},
+        {"in the search window", false, true, 410, 110, true},
+        {"outside the search window", false, true, 110, 110, false},
+        {"in the list, with both", true, true, 110, 110, true},
+        {"in the search window, with both", true, true, 410, 110, false},
     };
-    for (const UndoCase& one : cases) {
+    for (const ClickCase& one : cases) {
         EngineDesk desk;
-        desk.engine.setUndoInfo(UndoInformation{1, u"a", u"a "});
-        one.act(desk);
-        EXPECT_EQ(desk.engine.undoInfo().has_value(), one.kept) << one.about;
+        desk.add({u"abc"});
+        desk.type(u"ab");
+        if (one.list) desk.engine.suggestAbbreviations();
+        if (one.search) desk.engine.quickSearch();
+        desk.clickAt(one.x, one.y);
+        EXPECT_EQ(desk.engine.letters(), one.kept ? u"ab" : u"") << one.about;
+        EXPECT_EQ(desk.list.visible, one.list && one.kept) << one.about;
+        EXPECT_EQ(desk.search.visible, one.search && one.kept) << one.about;
     }
 }
 
-TEST(Lifetime, AnEngineThatIsGoneHearsNothingAndShowsNothing) {
+TEST(Buffer, HoldsWhatItHasLongPastItsUsualLength) {
     EngineDesk desk;
-    {
-        AutoText second({desk.service, desk.resolver, desk.sources, desk.defaults, desk.sender, desk.suggestionSource,
-                         nullptr, [] { return nullptr; }, [] { return nullptr; }});
-        second.setEnabled(true);
-        const auto group = SnippetGroup::make();
-        group->addItem(std::make_shared<Snippet>(u"x", u"1"));
-        group->addItem(std::make_shared<Snippet>(u"x", u"2"));
-        second.setSnippetGroups({group});
-        desk.service.typeText(u"x");
-        ASSERT_TRUE(desk.loop.nextDue());
-    }
-    EXPECT_FALSE(desk.loop.nextDue());
-    EXPECT_EQ(desk.service.typeText(u"x"), u"x");
-    EXPECT_EQ(desk.engine.letters(), u"xx");
+    const std::u16string text(20'000, u'q');
+    desk.type(text);
+    EXPECT_EQ(desk.engine.letters(), text);
 }
 
-TEST(Construction, ReadsHowContentIsAdaptedToCase) {
+// The buffer's rules once more, as short as they can be said, against random typing.
+RC_GTEST_PROP(BufferModel, AgreesWithTheEngine, ()) {
+    enum class Act { Letter, Delete, ForwardDelete, Left, ShiftSpace, TwoUnits, Click, Shortcut, Nothing, Switch };
+    const auto acts = *rc::gen::container<std::vector<Act>>(rc::gen::weightedElement<Act>({{10, Act::Letter},
+                                                                                           {4, Act::Delete},
+                                                                                           {1, Act::ForwardDelete},
+                                                                                           {1, Act::Left},
+                                                                                           {2, Act::ShiftSpace},
+                                                                                           {1, Act::TwoUnits},
+                                                                                           {1, Act::Click},
+                                                                                           {1, Act::Shortcut},
+                                                                                           {1, Act::Nothing},
+                                                                                           {1, Act::Switch}}));
     EngineDesk desk;
-    EXPECT_EQ(desk.engine.snippetAdaptToAbbreviationCaseOption(), 0);
-    desk.defaults.set("SnippetAdaptToAbbreviationCaseOption", std::int64_t{3});
-    const AutoText second({desk.service, desk.resolver, desk.sources, desk.defaults, desk.sender, desk.suggestionSource,
-                           nullptr, [] { return nullptr; }, [] { return nullptr; }});
-    EXPECT_EQ(second.snippetAdaptToAbbreviationCaseOption(), 3);
-    EXPECT_FALSE(second.enabled());
+    std::u16string model;
+    const auto press = [&](KeyCode key, KeyModifiers held = {}) { desk.desktop.pressAndRelease(key, held); };
+    for (const Act act : acts) {
+        switch (act) {
+            case Act::Letter:
+                desk.type(u"k");
+                model += u'k';
+                break;
+            case Act::Delete:
+                press(KeyCode::Delete);
+                if (!model.empty()) model.pop_back();
+                break;
+            case Act::ForwardDelete:
+                press(KeyCode::ForwardDelete);
+                break;
+            case Act::Left:
+                press(KeyCode::Left);
+                model.clear();
+                break;
+            case Act::ShiftSpace:
+                press(KeyCode::Space, Shift);
+                model += u' ';
+                break;
+            case Act::TwoUnits:
+                desk.desktop.typeCharacter(u"\U0001F600");
+                break;
+            case Act::Click:
+                desk.clickAt(0, 0);
+                model.clear();
+                break;
+            case Act::Shortcut:
+                desk.press(u's', Command);
+                model.clear();
+                break;
+            case Act::Nothing:
+                press(KeyCode::F1);
+                break;
+            case Act::Switch:
+                desk.engine.setEnabled(true);
+                model.clear();
+                break;
+        }
+        RC_ASSERT(desk.engine.letters() == model);
+    }
 }
 
 }  // namespace

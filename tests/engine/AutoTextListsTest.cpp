@@ -1,4 +1,4 @@
-// The list at the caret and quick search, as the engine drives them.
+// Several matches, suggestions and quick search, as the engine drives their windows.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -11,88 +11,161 @@ namespace {
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
 using ::testing::SizeIs;
-using Sent = RecordingSender::Sent;
+
+TEST(SeveralMatches, AreOfferedAfterTheKeyHasPassed) {
+    EngineDesk desk;
+    desk.add({u"ab"});
+    desk.add({u"ab", u"b", u"Ab"})->items()[2]->setCaseSensitivity(CaseSensitivity::IgnoreCase);
+    desk.type(u"a");
+    desk.desktop.typeCharacter(u"b");
+    EXPECT_EQ(desk.screen(), u"ab");
+    EXPECT_EQ(desk.engine.letters(), u"ab");
+    EXPECT_TRUE(desk.engine.selectingSnippet());
+    EXPECT_FALSE(desk.list.visible);
+    EXPECT_THAT(desk.engine.suggestions().suggestionFilters, ElementsAre(u"ab", u"ab", u"ab"));
+
+    desk.loop.runReady();
+    EXPECT_TRUE(desk.list.visible);
+    EXPECT_THAT(desk.list.entries, ElementsAre(u"ab", u"ab", u"Ab"));
+}
+
+TEST(SeveralMatches, AreWithdrawnByTheNextKeyAlsoBeforeTheyAreShown) {
+    EngineDesk desk;
+    desk.add({u"ab", u"ab"});
+    for (const char16_t c : std::u16string_view(u"abc")) desk.desktop.typeCharacter({&c, 1});
+    EXPECT_FALSE(desk.engine.selectingSnippet());
+    desk.loop.runReady();
+    EXPECT_EQ(desk.list.made, 0);
+
+    desk.engine.clear();
+    desk.openListOf(2, u"xy");
+    ASSERT_TRUE(desk.list.visible);
+    desk.type(u"z");
+    EXPECT_FALSE(desk.list.visible);
+    EXPECT_TRUE(desk.engine.suggestions().isEmpty());
+}
+
+TEST(SeveralMatches, ReplaceAnOlderOfferAndOpenTheListOnce) {
+    for (const bool opensBetween : {true, false}) {
+        EngineDesk desk;
+        desk.add({u"a", u"a"});
+        desk.add({u"a+b", u"a+b", u"a+b"});
+        desk.desktop.typeCharacter(u"a");
+        if (opensBetween) desk.loop.runReady();
+        desk.desktop.typeCharacter(u"+");
+        EXPECT_FALSE(desk.list.visible);
+        desk.desktop.typeCharacter(u"b");
+        desk.loop.runReady();
+        EXPECT_THAT(desk.list.entries, ElementsAre(u"a+b", u"a+b", u"a+b"));
+        EXPECT_EQ(desk.list.made, 1);
+        EXPECT_EQ(desk.list.shownAtCaret, opensBetween ? 2 : 1);
+    }
+}
+
+TEST(SeveralMatches, GiveWayToASingleOne) {
+    EngineDesk desk;
+    desk.add({u"a", u"a"});
+    desk.add({u"a."});
+    desk.type(u"a");
+    ASSERT_TRUE(desk.list.visible);
+    desk.type(u".");
+    EXPECT_EQ(desk.screen(), u"content");
+    EXPECT_FALSE(desk.engine.selectingSnippet());
+}
+
+TEST(SeveralMatches, AtTheHotKeyAreNotOfferedWhileQuickSearchIsOpen) {
+    EngineDesk desk;
+    desk.add({u"sig", u"sig"}, ExpandTrigger::HotKey);
+    desk.type(u"sig");
+    desk.engine.quickSearch();
+    desk.engine.expandAtHotkey();
+    EXPECT_THAT(desk.engine.suggestions().suggestions, IsEmpty());
+}
+
+TEST(SeveralMatches, OfAScriptDoNotTypeTheDigitThatPicksIt) {
+    EngineDesk desk;
+    desk.add(u"ab", u"run", ExpandTrigger::DelimiterKept, ContentType::ShellScript);
+    desk.add(u"ab", u"other", ExpandTrigger::DelimiterKept);
+    desk.type(u"ab 1");
+    desk.settle();
+    EXPECT_EQ(desk.screen(), u"<run>");
+}
 
 TEST(Suggestions, ComeUpAtTheCaretAndFollowWhatIsTyped) {
     EngineDesk desk;
     desk.add({u"abc", u"abde", u"abdf"});
-    desk.service.typeText(u"ab");
     desk.engine.suggestAbbreviations();
+    desk.suggest(u"x");
+    EXPECT_EQ(desk.list.made, 0) << "there is nothing to show";
+    desk.engine.clear();
+    desk.suggest(u"ab");
     EXPECT_THAT(desk.list.entries, ElementsAre(u"abc", u"abde", u"abdf"));
     EXPECT_EQ(desk.list.shownAtCaret, 1);
 
-    desk.service.typeText(u"d");
+    desk.type(u"d");
     EXPECT_THAT(desk.list.entries, ElementsAre(u"abde", u"abdf"));
     EXPECT_EQ(desk.list.heights, 1);
-    desk.service.pressKey(KeyCode::Delete);
+    desk.type(u"\b");
     EXPECT_THAT(desk.list.entries, SizeIs(3));
-    desk.service.typeText(u"x");
+    desk.type(u"x");
     EXPECT_FALSE(desk.list.visible);
-    EXPECT_EQ(desk.list.shownAtCaret, 1);
-}
 
-TEST(Suggestions, AreOneWindowHoweverOftenTheyAreAskedFor) {
-    EngineDesk desk;
-    desk.add({u"abc"});
-    desk.add({u"xyz"});
-    desk.service.typeText(u"ab");
-    desk.engine.suggestAbbreviations();
     desk.engine.clear();
-    desk.service.typeText(u"x");
-    desk.engine.suggestAbbreviations();
-    EXPECT_THAT(desk.list.entries, ElementsAre(u"xyz"));
-    EXPECT_EQ(desk.list.made, 1);
-    EXPECT_EQ(desk.list.shownAtCaret, 2);
+    desk.suggest(u"abd");
+    EXPECT_THAT(desk.list.entries, ElementsAre(u"abde", u"abdf"));
+    EXPECT_EQ(desk.list.made, 1) << "it is one window however often it is shown";
 }
 
-TEST(Suggestions, AreNotShownWhenThereAreNone) {
-    EngineDesk desk;
-    desk.add({u"abc"});
-    desk.engine.suggestAbbreviations();
-    desk.service.typeText(u"x");
-    desk.engine.suggestAbbreviations();
-    EXPECT_EQ(desk.list.made, 0);
-}
-
-TEST(Suggestions, LeaveOutGroupsOfOtherPrograms) {
+TEST(Suggestions, LeaveOutGroupsOfOtherProgramsWhateverTheInputSource) {
     EngineDesk desk;
     desk.add({u"abc"})->availability().availability = PLFunctionAvailability::OnlyListed;
-    desk.add({u"abd"});
-    desk.service.typeText(u"a");
-    desk.engine.suggestAbbreviations();
+    desk.add({u"abd"})->availability().inputMethodsOption = PLFunctionAvailability::OnlyListed;
+    desk.suggest(u"a");
     EXPECT_THAT(desk.list.entries, ElementsAre(u"abd"));
 }
 
-TEST(Suggestions, AClickSendsTheEntry) {
-    EngineDesk desk;
-    desk.add({u"abc", u"abd"});
-    desk.service.typeText(u"ab");
-    desk.engine.suggestAbbreviations();
-    desk.list.selected = 1;
-    desk.list.click();
-    EXPECT_THAT(desk.sender.sent, ElementsAre(Sent{u"abd", u"ab", SnippetTrigger::Digit, u"ab", false}));
-    EXPECT_FALSE(desk.list.visible);
+TEST(Suggestions, EraseWhatMadeThemOneWhenTheyAreSent) {
+    for (const bool clicked : {true, false}) {
+        EngineDesk desk;
+        desk.add({u"abc"});
+        desk.add(u"abd", u"Best", ExpandTrigger::DelimiterKept);
+        desk.suggest(u"x\rab");
+        EXPECT_FALSE(desk.list.visible);
+        desk.engine.clear();
+        desk.suggest(u"ab");
+        desk.list.selected = 1;
+        if (clicked) {
+            desk.list.click();
+        } else {
+            desk.type(u"\n");
+        }
+        EXPECT_EQ(desk.screen(), u"x\nabBest");
+        EXPECT_FALSE(desk.list.visible);
+    }
 }
 
-TEST(Suggestions, AreClosedByEverythingThatEmptiesTheBuffer) {
-    EngineDesk desk;
-    desk.openListOf(2);
-    desk.engine.clear();
-    EXPECT_FALSE(desk.list.visible);
-    EXPECT_FALSE(desk.engine.selectingSnippet());
-    EXPECT_TRUE(desk.engine.suggestions().isEmpty());
-}
-
-TEST(Suggestions, AnIndexPastTheEndClosesTheListAndKeepsTheBuffer) {
+TEST(Suggestions, PastTheEndCloseTheListAndKeepTheBuffer) {
     EngineDesk desk;
     desk.openListOf(2);
     desk.engine.sendSuggestionAtIndex(2, SnippetTrigger::Digit);
-    EXPECT_THAT(desk.sender.sent, IsEmpty());
     EXPECT_FALSE(desk.list.visible);
     EXPECT_EQ(desk.engine.letters(), u"ab");
 }
 
-TEST(QuickSearch, OpensAtTheCaretOnce) {
+TEST(Suggestions, WaitForProgramsThatTakeKeysLate) {
+    EngineDesk desk;
+    desk.add({u"sig"});
+    desk.desktop.activate(u"com.citrix.XenAppViewer");
+    desk.service.refreshContextInputSetting();
+    desk.suggest(u"si");
+    desk.type(u"\n");
+    desk.loop.advance(0.49);
+    EXPECT_EQ(desk.screen(), u"si");
+    desk.loop.advance(0.01);
+    EXPECT_EQ(desk.screen(), u"content");
+}
+
+TEST(QuickSearch, OpensAtTheCaretOnceForTheLibraryAsItIs) {
     EngineDesk desk;
     desk.add({u"abc"});
     desk.engine.quickSearch();
@@ -100,29 +173,45 @@ TEST(QuickSearch, OpensAtTheCaretOnce) {
     EXPECT_FALSE(desk.search.atTopRightCorner);
     EXPECT_EQ(desk.search.groupCount, 1U);
     desk.engine.quickSearchAtTopRightCorner();
-    EXPECT_TRUE(desk.search.atTopRightCorner);
     desk.engine.quickSearch();
     EXPECT_TRUE(desk.search.atTopRightCorner) << "a visible window stays where it is";
     EXPECT_EQ(desk.search.made, 1);
-}
-
-TEST(QuickSearch, SearchesTheLibraryAsItIsNow) {
-    EngineDesk desk;
-    desk.engine.quickSearch();
-    desk.add({u"abc"});
     desk.add({u"abd"});
     EXPECT_EQ(desk.search.groupCount, 2U);
 }
 
-TEST(QuickSearch, SendsWhatWasChosen) {
+TEST(QuickSearch, SendsWhatWasChosenWithoutErasing) {
     EngineDesk desk;
-    desk.service.typeText(u"ab");
+    desk.type(u"ab");
     desk.engine.quickSearch();
     desk.search.choose();
-    EXPECT_THAT(desk.sender.sent, IsEmpty()) << "nothing was chosen";
+    EXPECT_EQ(desk.screen(), u"ab") << "nothing was chosen";
     desk.search.selected = std::make_shared<Snippet>(u"one", u"1");
     desk.search.choose();
-    EXPECT_THAT(desk.sender.sent, ElementsAre(Sent{u"one", std::nullopt, SnippetTrigger::Direct, u"ab", false}));
+    EXPECT_EQ(desk.screen(), u"ab1");
+}
+
+TEST(SelectorModifier, IsTheSameInBothWindows) {
+    EngineDesk desk;
+    desk.engine.setSnippetSelectorKeyModifier(2);
+    desk.engine.quickSearch();
+    EXPECT_EQ(desk.search.modifier, 2);
+    desk.search.visible = false;
+    desk.openListOf(2);
+    EXPECT_EQ(desk.list.modifier, 2);
+
+    desk.engine.setSnippetSelectorKeyModifier(3);
+    EXPECT_EQ(desk.search.modifier, 3);
+    EXPECT_EQ(desk.list.modifier, 3);
+}
+
+TEST(Lifetime, AListThatIsToOpenGoesWithTheEngine) {
+    EngineDesk desk;
+    desk.add({u"x", u"x"});
+    desk.desktop.typeCharacter(u"x");
+    desk.owner.reset();
+    desk.loop.runReady();
+    EXPECT_EQ(desk.list.made, 0);
 }
 
 }  // namespace

@@ -14,36 +14,28 @@ class RecordedList final : public SuggestionController {
 
     void setSnippets(const SuggestionList& list) override {
         list_ = &list;
-        read();
+        reloadData();
     }
     void setSuggestionSelectedAction(std::function<void()> action) override { window_.click = std::move(action); }
     void setSnippetSelectorKeyModifier(std::int64_t modifier) override { window_.modifier = modifier; }
-    void reloadData() override { read(); }
+    void reloadData() override {
+        window_.entries.clear();
+        for (const auto& snippet : list_->suggestions) window_.entries.push_back(*snippet->abbreviation());
+        window_.selected = 0;
+    }
     void refreshHeight() override { ++window_.heights; }
     void showWindowAtCaret() override {
         window_.visible = true;
         ++window_.shownAtCaret;
     }
     void close() override { window_.visible = false; }
-    void nextSuggestion() override {
-        if (window_.selected + 1 < window_.entries.size()) ++window_.selected;
-    }
-    void previousSuggestion() override {
-        if (window_.selected > 0) --window_.selected;
-    }
-    std::size_t selectedSuggestionIndex() const override {
-        return window_.entries.empty() ? NotFound : window_.selected;
-    }
+    void nextSuggestion() override { ++window_.selected; }
+    void previousSuggestion() override { --window_.selected; }
+    std::size_t selectedSuggestionIndex() const override { return window_.selected; }
     bool windowVisible() const override { return window_.visible; }
     Rectangle windowFrame() const override { return window_.frame; }
 
   private:
-    void read() {
-        window_.entries.clear();
-        for (const auto& snippet : list_->suggestions) window_.entries.push_back(*snippet->abbreviation());
-        window_.selected = 0;
-    }
-
     ListWindow& window_;
     const SuggestionList* list_ = nullptr;
 };
@@ -52,7 +44,7 @@ class RecordedSearch final : public QuickSearchController {
   public:
     explicit RecordedSearch(SearchWindow& window) : window_(window) { ++window_.made; }
 
-    void setSnippetGroups(const EngineState::Groups& groups) override { window_.groupCount = groups.size(); }
+    void setSnippetGroups(const AutoText::Groups& groups) override { window_.groupCount = groups.size(); }
     void setSnippetSelectedAction(std::function<void()> action) override { window_.choose = std::move(action); }
     void setSnippetSelectorKeyModifier(std::int64_t modifier) override { window_.modifier = modifier; }
     void showWindowAtCaret() override { show(false); }
@@ -73,45 +65,69 @@ class RecordedSearch final : public QuickSearchController {
     SearchWindow& window_;
 };
 
-}  // namespace
-
-std::unique_ptr<SuggestionController> makeRecordedList(ListWindow& window) {
-    return std::make_unique<RecordedList>(window);
-}
-
-std::unique_ptr<QuickSearchController> makeRecordedSearch(SearchWindow& window) {
-    return std::make_unique<RecordedSearch>(window);
-}
-
-bool RecordingSender::sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                                  const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) {
-    sent.push_back({*snippet->abbreviation(), abbreviation, snippetTrigger, engine.letters(), *listVisible});
-    engine.clear();
-    engine.setLetters(lettersAfter);
-    return swallows;
-}
-
-void RecordingCorrector::autoCorrect(EngineState& engine, ZDKeyEventArgs& event, std::u16string_view context) {
-    asked.push_back({std::u16string(context), event.s.value_or(u""), engine.letters()});
-    event.cancel = swallows;
-}
-
-void PrefixSuggestions::appendSuggestions(std::u16string_view letters, const EngineState::Groups& groups,
-                                          SuggestionList& list) const {
+// Every snippet whose abbreviation starts with the whole buffer.
+SuggestionList whatStartsWith(std::u16string_view letters, const AutoText::Groups& groups) {
+    SuggestionList list;
     for (const auto& group : groups) {
         for (const auto& snippet : group->items()) {
             if (snippet->abbreviation()->starts_with(letters)) list.append(snippet, std::u16string(letters));
         }
     }
+    return list;
 }
 
-EngineDesk::EngineDesk()
-    : editor(processes.launch(u"org.example.editor")),
-      engine({service, resolver, sources, defaults, sender, suggestionSource, &corrector,
-              [this] { return makeRecordedList(list); }, [this] { return makeRecordedSearch(search); }}) {
-    sender.listVisible = &list.visible;
-    processes.setFrontProcess(editor);
+}  // namespace
+
+TestForm::TestForm(std::shared_ptr<SnippetExpandedContent> content, Target& target, std::vector<TestForm*>& open)
+    : content_(std::move(content)), target_(target), open_(open) {
+    open_.push_back(this);
+}
+
+TestForm::~TestForm() {
+    std::erase(open_, this);
+}
+
+void TestForm::accept(const std::u16string& value) {
+    for (const auto& field : content_->fields()) field->value = value;
+    target_.fieldsEditorWillClose(*this);
+    target_.fieldsEditorAction(*this);
+}
+
+std::optional<std::u16string> AnsweringRunner::run(std::u16string_view script, bool /*isAppleScript*/) {
+    return answer(std::u16string(script));
+}
+
+EngineDesk::EngineDesk(MemoryUserDefaults settings)
+    : defaults(std::move(settings)),
+      service({desktop.keyboardTap(), desktop.mouseTap(), desktop.poster(), desktop.pasteboard(),
+               desktop.processManager(), desktop.inputSources(), desktop.accessibility(), desktop.secureInput(),
+               desktop.systemHotKeys(), identifiers, loop, loop, [](const std::string&) {}}),
+      owner(std::make_unique<AutoText>(dependencies())),
+      engine(*owner) {
+    desktop.activate(u"org.example.editor");
+    service.setListenMouseDownEvents(true);
+    service.enableEvents();
+    loop.runReady();
     engine.setEnabled(true);
+}
+
+AutoText::Dependencies EngineDesk::dependencies() {
+    return {.inputService = service,
+            .bundleIdentifierResolver = identifiers,
+            .inputSources = desktop.inputSources(),
+            .accessibility = desktop.accessibility(),
+            .userDefaults = defaults,
+            .snippetParser = parser,
+            .scriptRunner = runner,
+            .sounds = desktop.sounds(),
+            .report = [this](const std::string& sentence) { reports.push_back(sentence); },
+            .makeFieldsEditor =
+                [this](std::shared_ptr<SnippetExpandedContent> content, FieldsEditor::Target& target) {
+                    return std::make_unique<TestForm>(std::move(content), target, forms);
+                },
+            .makeSuggestionController = [this] { return std::make_unique<RecordedList>(list); },
+            .makeQuickSearchController = [this] { return std::make_unique<RecordedSearch>(search); },
+            .suggest = whatStartsWith};
 }
 
 std::shared_ptr<SnippetGroup> EngineDesk::add(const std::vector<std::u16string>& abbreviations, ExpandTrigger trigger) {
@@ -126,14 +142,46 @@ std::shared_ptr<SnippetGroup> EngineDesk::add(const std::vector<std::u16string>&
     return group;
 }
 
-void EngineDesk::openListOf(int count, const std::u16string& abbreviation) {
-    add(std::vector<std::u16string>(static_cast<std::size_t>(count), abbreviation));
-    service.typeText(abbreviation);
-    loop.runReady();
+std::shared_ptr<Snippet> EngineDesk::add(std::u16string abbreviation, std::u16string content, ExpandTrigger trigger,
+                                         ContentType type) {
+    const std::shared_ptr<Snippet> snippet = add({std::move(abbreviation)}, trigger)->items()[0];
+    snippet->setPlainTextContent(std::move(content));
+    snippet->setContentType(type);
+    return snippet;
 }
 
-bool EngineDesk::press(char16_t character, KeyModifiers modifiers) {
-    return service.pressKey(SimulatedInputSources::strokeFor(character)->keyCode, modifiers);
+void EngineDesk::type(std::u16string_view text) {
+    for (const char16_t& character : text) {
+        desktop.typeCharacter({&character, 1});
+        loop.runReady();
+    }
+}
+
+void EngineDesk::press(char16_t character, KeyModifiers modifiers) {
+    desktop.pressAndRelease(SimulatedInputSources::strokeFor(character)->keyCode, modifiers);
+}
+
+void EngineDesk::clickAt(double x, double y) {
+    desktop.poster().setPointerLocation({x, y});
+    desktop.click();
+}
+
+void EngineDesk::suggest(std::u16string_view beginning) {
+    type(beginning);
+    engine.suggestAbbreviations();
+}
+
+void EngineDesk::openListOf(int count, const std::u16string& abbreviation) {
+    add(std::vector<std::u16string>(static_cast<std::size_t>(count), abbreviation));
+    type(abbreviation);
+}
+
+void EngineDesk::settle() {
+    loop.advance(1);
+    while (engine.sender().hasPendingScripts()) {
+        engine.sender().waitForScripts();
+        loop.advance(1);
+    }
 }
 
 }  // namespace plume

@@ -1,63 +1,20 @@
-// A desk to try the engine at: a simulated keyboard in front of it, and behind it collaborators that write down what
-// they are asked to do.
+// A desk to try the engine at: a simulated desktop with an editor in front, the real input service between them,
+// windows that write down what becomes of them, forms that the test fills in, and scripts that answer what the test
+// says.
 #pragma once
 
 #include <functional>
+#include <memory>
+#include <mutex>
 #include <optional>
 #include <string>
 #include <vector>
 
 #include "engine/AutoText.h"
 #include "library/MemoryUserDefaults.h"
-#include "ports/simulated/SimulatedInputService.h"
-#include "ports/simulated/SimulatedInputSources.h"
-#include "ports/simulated/SimulatedProcessManager.h"
-#include "ports/simulated/SimulatedRunLoop.h"
+#include "ports/simulated/SimulatedDesktop.h"
 
 namespace plume {
-
-// Sends nothing, but clears the engine as sending does.
-class RecordingSender final : public SnippetSender {
-  public:
-    struct Sent {
-        std::u16string abbreviation;  // of the snippet
-        std::optional<std::u16string> typed;
-        SnippetTriggers trigger;
-        std::u16string lettersBefore;
-        bool listVisible;
-        bool operator==(const Sent&) const = default;
-    };
-
-    bool sendSnippet(EngineState& engine, const std::shared_ptr<Snippet>& snippet,
-                     const std::optional<std::u16string>& abbreviation, SnippetTriggers snippetTrigger) override;
-    bool undo(EngineState& /*engine*/, bool /*withTrigger*/) override { return false; }
-
-    std::vector<Sent> sent;
-    bool swallows = true;
-    std::u16string lettersAfter;  // what the expansion leaves in the buffer
-    const bool* listVisible = nullptr;
-};
-
-class RecordingCorrector final : public AutoCorrector {
-  public:
-    void autoCorrect(EngineState& engine, ZDKeyEventArgs& event, std::u16string_view context) override;
-
-    struct Asked {
-        std::u16string context;
-        std::u16string key;
-        std::u16string letters;
-        bool operator==(const Asked&) const = default;
-    };
-    std::vector<Asked> asked;
-    bool swallows = false;
-};
-
-// Offers every snippet whose abbreviation starts with the whole buffer.
-class PrefixSuggestions final : public SuggestionSource {
-  public:
-    void appendSuggestions(std::u16string_view letters, const EngineState::Groups& groups,
-                           SuggestionList& list) const override;
-};
 
 // What the suggestion list looks like from outside.
 struct ListWindow {
@@ -84,36 +41,78 @@ struct SearchWindow {
     std::function<void()> choose;
 };
 
-// Windows that write down what becomes of them.
-std::unique_ptr<SuggestionController> makeRecordedList(ListWindow& window);
-std::unique_ptr<QuickSearchController> makeRecordedSearch(SearchWindow& window);
+class TestForm final : public FieldsEditor {
+  public:
+    TestForm(std::shared_ptr<SnippetExpandedContent> content, Target& target, std::vector<TestForm*>& open);
+    ~TestForm() override;
+    TestForm(const TestForm&) = delete;
+    TestForm& operator=(const TestForm&) = delete;
+
+    void show() override { shown = true; }
+    const std::shared_ptr<SnippetExpandedContent>& content() const override { return content_; }
+    // Writes the value into every field, and confirms.
+    void accept(const std::u16string& value);
+
+    bool shown = false;
+
+  private:
+    std::shared_ptr<SnippetExpandedContent> content_;
+    Target& target_;
+    std::vector<TestForm*>& open_;
+};
+
+// Runs on the engine's threads.
+class AnsweringRunner final : public ScriptRunner {
+  public:
+    std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) override;
+    // Set before anything runs. By default a script prints itself between angle brackets.
+    std::function<std::optional<std::u16string>(const std::u16string&)> answer = [](const std::u16string& script) {
+        return u"<" + script + u">";
+    };
+};
 
 class EngineDesk {
   public:
-    // An enabled engine with an editor in front of it.
-    EngineDesk();
+    // An enabled engine. `settings` are those that it reads when it is made.
+    explicit EngineDesk(MemoryUserDefaults settings = {});
 
-    // A group of its own, last in the library, for these abbreviations.
+    // A group of its own, last in the library, for these abbreviations; each stands for "content".
     std::shared_ptr<SnippetGroup> add(const std::vector<std::u16string>& abbreviations,
                                       ExpandTrigger trigger = ExpandTrigger::Immediately);
+    // The same for one snippet.
+    std::shared_ptr<Snippet> add(std::u16string abbreviation, std::u16string content,
+                                 ExpandTrigger trigger = ExpandTrigger::Immediately,
+                                 ContentType type = ContentType::PlainText);
+    // Key by key; what is due after each key happens.
+    void type(std::u16string_view text);
+    // The key that types this character, with these modifiers held.
+    void press(char16_t character, KeyModifiers modifiers);
+    void clickAt(double x, double y);
+    // Types the beginning of abbreviations and asks what it may become.
+    void suggest(std::u16string_view beginning);
     // Types what several snippets with this abbreviation match, and lets the list open.
     void openListOf(int count, const std::u16string& abbreviation = u"ab");
-    // The key that types this character, with these modifiers held.
-    bool press(char16_t character, KeyModifiers modifiers);
+    // Lets scripts end and everything that is due within a second happen.
+    void settle();
+    // What stands in the program in front.
+    const std::u16string& screen() { return desktop.front()->field().text(); }
 
-    SimulatedProcessManager processes;
-    SimulatedInputSources sources;
-    MemoryUserDefaults defaults;
-    SimulatedRunLoop loop;
-    SimulatedInputService service{processes, sources, loop};
-    BundleIdentifierResolver resolver{processes};
-    RecordingSender sender;
-    RecordingCorrector corrector;
-    PrefixSuggestions suggestionSource;
+    SimulatedDesktop desktop;
+    SimulatedRunLoop& loop = desktop.runLoop();
+    const MemoryUserDefaults defaults;
+    BundleIdentifierResolver identifiers{desktop.processManager()};
+    MacInputService service;
+    AnsweringRunner runner;
+    std::vector<TestForm*> forms;  // that exist
+    std::vector<std::string> reports;
     ListWindow list;
     SearchWindow search;
-    ProcessSerialNumber editor;
-    AutoText engine;
+    SnippetParser parser{ContentEnvironment{}};
+    std::unique_ptr<AutoText> owner;
+    AutoText& engine;
+
+  private:
+    AutoText::Dependencies dependencies();
 };
 
 }  // namespace plume

@@ -13,8 +13,8 @@ namespace {
 class NaiveMatcher {
   public:
     NaiveMatcher(std::vector<std::shared_ptr<SnippetGroup>> groups, std::u16string before, std::u16string key,
-                 Place place)
-        : groups_(std::move(groups)), before_(std::move(before)), key_(std::move(key)), place_(std::move(place)) {}
+                 const Place& place)
+        : groups_(std::move(groups)), before_(std::move(before)), key_(std::move(key)), place_(place) {}
 
     std::vector<SnippetMatcher::Match> find() const {
         std::vector<SnippetMatcher::Match> found;
@@ -118,7 +118,7 @@ class NaiveMatcher {
     std::vector<std::shared_ptr<SnippetGroup>> groups_;
     std::u16string before_;
     std::u16string key_;
-    Place place_;
+    const Place& place_;
 };
 
 // Few characters, so that random typings complete random abbreviations often.

@@ -6,6 +6,8 @@
 #include <vector>
 
 #include "engine/SnippetMatcher.h"
+#include "ports/simulated/SimulatedInputSources.h"
+#include "ports/simulated/SimulatedProcessManager.h"
 
 namespace plume {
 
@@ -14,23 +16,36 @@ inline CharacterSet testDelimiters() {
     return CharacterSet::withCharacters(u" \t\r\x03.!?,;:-\"'(){}[]/\\&+*=<>\u00ab\u00bb%^#_@$`|~");
 }
 
-struct Place final : MatchContext {
+// Where keys go. Without a name the application is one that nobody knows.
+class Place {
+  public:
     Place(std::optional<std::u16string> anApplication, std::optional<std::u16string> anInputSource)
-        : application(std::move(anApplication)), inputSource(std::move(anInputSource)) {}
-    const std::optional<std::u16string>& bundleIdentifier() const override { return application; }
-    const std::optional<std::u16string>& inputSourceIdentifier() const override { return inputSource; }
+        : application(std::move(anApplication)), inputSource(std::move(anInputSource)) {
+        if (application) process_ = processes_.launch(application);
+        sources_.setIdentifier(inputSource);
+    }
+    Place(const Place&) = delete;
+    Place& operator=(const Place&) = delete;
 
-    std::optional<std::u16string> application;
-    std::optional<std::u16string> inputSource;
+    KeyDestination destination() const { return {resolver_, sources_, process_}; }
+
+    const std::optional<std::u16string> application;
+    const std::optional<std::u16string> inputSource;
+
+  private:
+    SimulatedProcessManager processes_;
+    SimulatedInputSources sources_;
+    mutable BundleIdentifierResolver resolver_{processes_};
+    ProcessSerialNumber process_;
 };
 
 // What the matcher finds when `key` is typed after `before`; an empty key, or U+0000, stands for the expand hot key.
 inline std::vector<SnippetMatcher::Match> typeKey(const SnippetMatcher& matcher, const std::u16string& before,
                                                   const std::u16string& key,
-                                                  const Place& place = {u"org.editor", u"US"}) {
-    if (key.empty() || key[0] == 0) return matcher.findSnippetsInLetters(before, 0, before, place);
+                                                  const Place& place = Place(u"org.editor", u"US")) {
+    if (key.empty() || key[0] == 0) return matcher.findSnippetsInLetters(before, 0, before, place.destination());
     const std::u16string letters = before + key;
-    return matcher.findSnippetsInLetters(letters, key[0], before, place);
+    return matcher.findSnippetsInLetters(letters, key[0], before, place.destination());
 }
 
 inline std::vector<std::u16string> contentsOf(const std::vector<SnippetMatcher::Match>& matches) {

@@ -85,7 +85,7 @@ class Run {
     // The tap thread.
     void expand() {
         {
-            Composition composition(port_.ports(), dependencies());
+            Composition composition(port_.ports(), environment());
             composition.setSnippetGroups(library_.groups);
             composition.loadPreferences();
             MacInputService& service = composition.inputService();
@@ -107,7 +107,7 @@ class Run {
                 << ". Ctrl+C ends it." << std::endl;
     }
 
-    Composition::Dependencies dependencies() {
+    Composition::Environment environment() {
         const auto say = [this](const std::string& sentence) { voice_.say(sentence); };
         return {.settings = settings_,
                 .report = say,
@@ -117,7 +117,7 @@ class Run {
                 .makeFieldsEditor = {},
                 .makeSuggestionController = {},
                 .makeQuickSearchController = {},
-                .suggestionSource = nullptr,
+                .suggest = {},
                 .vmHelper = nullptr,
                 .enabledChanged = {}};
     }
