@@ -91,9 +91,9 @@ std::optional<std::u16string> AutoCorrection::capitalizedSentenceStart(std::u16s
 
 // Just before the one space in front of the word that was begun.
 bool AutoCorrection::endsWithExcludedAbbreviation(std::u16string_view text) const {
-    constexpr std::size_t spaceWordAndKey = 3;
-    if (text.size() < spaceWordAndKey) return false;
-    const std::u16string_view before = text.substr(0, text.size() - spaceWordAndKey);
+    constexpr std::size_t SpaceWordAndKey = 3;
+    if (text.size() < SpaceWordAndKey) return false;
+    const std::u16string_view before = text.substr(0, text.size() - SpaceWordAndKey);
     const auto standsAtEnd = [&](const std::u16string& word) {
         return !word.empty() && word.size() <= before.size() &&
                equalsIgnoringCase(before.substr(before.size() - word.size()), word);
@@ -103,11 +103,11 @@ bool AutoCorrection::endsWithExcludedAbbreviation(std::u16string_view text) cons
 }
 
 std::optional<std::u16string> AutoCorrection::loweredSecondCapital(std::u16string_view text) const {
-    constexpr std::size_t threeLetters = 3;
-    if (text.back() == u' ' || text.size() < threeLetters) return std::nullopt;
-    const std::u16string_view word = text.substr(text.size() - threeLetters);
+    constexpr std::size_t ThreeLetters = 3;
+    if (text.back() == u' ' || text.size() < ThreeLetters) return std::nullopt;
+    const std::u16string_view word = text.substr(text.size() - ThreeLetters);
     if (!isUpper(word[0]) || !isUpper(word[1])) return std::nullopt;
-    if (text.size() > threeLetters && !startsWord(text[text.size() - threeLetters - 1])) return std::nullopt;
+    if (text.size() > ThreeLetters && !startsWord(text[text.size() - ThreeLetters - 1])) return std::nullopt;
     const Words& excluded = doubleCapitalsCorrectionExclusion_;
     if (std::find(excluded.begin(), excluded.end(), word) != excluded.end()) return std::nullopt;
     return lowercased(word.substr(1, 1));

@@ -107,8 +107,8 @@ AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
 }
 
 std::optional<KeyModifiers> AutoText::selectorModifiers() const {
-    constexpr std::int64_t lastModifier = 31;
-    if (snippetSelectorKeyModifier_ < 0 || snippetSelectorKeyModifier_ > lastModifier) return std::nullopt;
+    constexpr std::int64_t LastModifier = 31;
+    if (snippetSelectorKeyModifier_ < 0 || snippetSelectorKeyModifier_ > LastModifier) return std::nullopt;
     if (snippetSelectorKeyModifier_ == 0) return KeyModifiers();
     return KeyModifiers::fromBits(std::int32_t{1} << (snippetSelectorKeyModifier_ - 1));
 }

@@ -21,9 +21,9 @@ const CharacterSet& sentenceEnds() {
 }  // namespace
 
 bool AutoTextUtils::shouldCapitalize(std::u16string_view text) {
-    constexpr std::size_t wordAndKey = 2;
-    if (text.size() <= wordAndKey) return false;
-    const std::u16string_view before = text.substr(0, text.size() - wordAndKey);
+    constexpr std::size_t WordAndKey = 2;
+    if (text.size() <= WordAndKey) return false;
+    const std::u16string_view before = text.substr(0, text.size() - WordAndKey);
     const std::size_t last = before.find_last_not_of(u' ');
     if (last == std::u16string_view::npos) return false;
     const bool spacesFollow = last + 1 < before.size();

@@ -20,8 +20,8 @@ TEST(BackgroundTasks, RunAsManySideBySideAsAllowedAndTheRestAfterThem) {
     std::promise<void> full;
     std::promise<void> gate;
     const std::shared_future<void> opened = gate.get_future().share();
-    constexpr std::size_t count = BackgroundTasks::MaximumThreads * 3;
-    for (std::size_t i = 0; i < count; ++i) {
+    constexpr std::size_t Count = BackgroundTasks::MaximumThreads * 3;
+    for (std::size_t i = 0; i < Count; ++i) {
         const auto work = [&] {
             const std::size_t now = ++running;
             if (now == BackgroundTasks::MaximumThreads) full.set_value();
@@ -35,11 +35,11 @@ TEST(BackgroundTasks, RunAsManySideBySideAsAllowedAndTheRestAfterThem) {
     EXPECT_EQ(running, BackgroundTasks::MaximumThreads);
     gate.set_value();
     tasks.waitUntilIdle();
-    EXPECT_EQ(done, count);
+    EXPECT_EQ(done, Count);
     EXPECT_EQ(finished, 0U) << "the loop has not run";
     EXPECT_TRUE(tasks.arePending());
     loop.runReady();
-    EXPECT_EQ(finished, count);
+    EXPECT_EQ(finished, Count);
     EXPECT_FALSE(tasks.arePending());
 }
 

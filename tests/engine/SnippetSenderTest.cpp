@@ -236,10 +236,10 @@ TEST(Scripts, ManyAtOnceAllArrive) {
     EngineDesk desk;
     desk.runner.answer = [](const std::u16string&) { return u"."; };
     const auto script = desk.add(u"za", u"a", AtOnce, ContentType::ShellScript);
-    constexpr std::size_t count = 50;
-    for (std::size_t i = 0; i < count; ++i) desk.engine.sendSnippetDirectly(script);
+    constexpr std::size_t Count = 50;
+    for (std::size_t i = 0; i < Count; ++i) desk.engine.sendSnippetDirectly(script);
     desk.settle();
-    EXPECT_EQ(desk.screen(), std::u16string(count, u'.'));
+    EXPECT_EQ(desk.screen(), std::u16string(Count, u'.'));
 }
 
 // Everything that a form or a script brings back after the end would reach what is gone.
