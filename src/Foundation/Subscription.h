@@ -1,5 +1,5 @@
-// Hears something for as long as it exists: whoever offers events or changes to hear returns one, and the listener keeps
-// it beside what it calls.
+// Hears something for as long as it exists: whoever offers events or changes to hear returns one, and the listener
+// keeps it beside what it calls.
 //
 // A plain value that can be moved. It may outlive what it listens to. Belongs to the thread of what it listens to.
 #pragma once

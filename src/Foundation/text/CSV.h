@@ -73,8 +73,8 @@ class CSVParser {
 // Utf8 has no byte-order mark; Utf16 is little-endian and starts with one.
 enum class CsvEncoding { Utf8, Utf16 };
 
-// Writes records that CSVParser and others read. A field that holds a newline character, the delimiter or a double quote
-// is put in double quotes, with its own doubled. Lines end in a line feed.
+// Writes records that CSVParser and others read. A field that holds a newline character, the delimiter or a double
+// quote is put in double quotes, with its own doubled. Lines end in a line feed.
 //
 // A plain object for one thread. Writing goes on without complaint when the stream fails; closeStream tells.
 class CsvWriter {

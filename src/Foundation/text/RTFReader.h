@@ -1,4 +1,5 @@
-// The RTF reader's machine: groups, destinations, and the text that comes out. RTFControlWords.cpp knows the control words.
+// The RTF reader's machine: groups, destinations, and the text that comes out. RTFControlWords.cpp knows the control
+// words.
 //
 // Internal to the core. One reader reads one document once, on one thread.
 #pragma once
