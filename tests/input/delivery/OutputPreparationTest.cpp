@@ -66,6 +66,14 @@ std::vector<PreparationCase> cases() {
         {"a suffix of its own", with(World(), [](World& w) { w.content().suffix = u"!"; }), false, x(5, u"!")},
         {"and that only once", with(World(401), [](World& w) { w.content().suffix = u"!"; }), true, x(401, u"!")},
         {"many presses", with(World(), [](World& w) { w.addKey(30); }), true, x(5, u" ")},
+        {"a delayed key at the end",
+         with(World(),
+              [](World& w) {
+                  w.addKey(1);
+                  std::static_pointer_cast<SnippetKeyVariable>(w.content().variables.back())->delay = 1;
+                  w.content().variables.back()->location = 5;
+              }),
+         true, x(5, u" ")},
         {"with a wait behind",
          with(World(),
               [](World& w) {
