@@ -99,8 +99,8 @@ class AutoText {
 
     // ---- Sending ----
     // `abbreviation` is the text that was typed for the snippet and is erased, nothing when it was chosen in another
-    // way. Empties the buffer first, and fills it with what stands
-    // before the caret then. Whether the key that triggered it must be swallowed; false when nothing was sent.
+    // way. Empties the buffer first, and fills it with what stands before the caret then. Whether the key that
+    // triggered it must be swallowed; false when nothing was sent.
     bool sendSnippet(const std::shared_ptr<Snippet>& snippet, const std::optional<std::u16string>& abbreviation,
                      SnippetTriggers snippetTrigger);
     // Sends a snippet that was chosen without typing.

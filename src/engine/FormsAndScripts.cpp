@@ -34,6 +34,7 @@ void SnippetSender::makeForm(OpenForm& form, const Expansion& content) {
 void SnippetSender::fieldsEditorWillClose(FieldsEditor& editor) {
     const auto form =
         std::find_if(forms_.begin(), forms_.end(), [&](const OpenForm& open) { return open.editor.get() == &editor; });
+    if (form == forms_.end()) return;
     // Not now: the form itself is calling, and may have more to say.
     form->next = dependencies_.inputService.runLoop().performAfterDelay(0, [this, form] { forms_.erase(form); });
 }
