@@ -18,32 +18,16 @@ struct CorrectionCase {
 
 TEST(Correction, ChangesSentencesAndDoubleCapitalsAsTheyAreTyped) {
     const CorrectionCase cases[] = {
-        {"after a period", u"End. the", u"End. The"},
-        {"after a question", u"Eh? the", u"Eh? The"},
-        {"after an exclamation", u"Oh!  the", u"Oh!  The"},
-        {"word of one letter", u"End. a b", u"End. A b"},
         {"capital behind it", u"End. tH", u"End. tH"},
-        {"no space", u"x.th", u"x.th"},
-        {"in a sentence", u"Of the", u"Of the"},
-        {"after a comma", u"Oh, the", u"Oh, the"},
-        {"after a tab", u"Line\tthe", u"Line\tThe"},
-        {"on a new line", u"Line\nthe", u"Line\nThe"},
-        {"indented on a new line", u"Line\n  the", u"Line\n  The"},
-        {"spaces from the start", u"  the", u"  the"},
         {"punctuation behind it", u"End. a.", u"End. a."},
-        {"excluded abbreviation", u"Pens, etc. the", u"Pens, etc. the"},
         {"excluded in other case", u"Pens, Etc. the", u"Pens, Etc. the"},
         {"excluded, but two spaces", u"Pens, etc.  the", u"Pens, etc.  The"},
         {"ends like an excluded one", u"Fetc. the", u"Fetc. the"},
         {"beyond ASCII", u"End. über", u"End. Über"},
-        {"word", u"X THe", u"X The"},
-        {"start of the text", u"THe", u"The"},
         {"start of a line", u"x\nTHe", u"x\nThe"},
         {"after a tab", u"X\tTHe", u"X\tTHe"},
-        {"in parentheses", u"X (THe", u"X (THe"},
         {"three capitals", u"X THEm", u"X THEm"},
         {"two letters", u"X TH e", u"X TH e"},
-        {"excluded", u"X IDs", u"X IDs"},
         {"excluded in other case only", u"X IDe", u"X Ide"},
     };
     for (const CorrectionCase& one : cases) {

@@ -78,8 +78,8 @@ SuggestionList whatStartsWith(std::u16string_view letters, const AutoText::Group
 
 }  // namespace
 
-TestForm::TestForm(std::shared_ptr<SnippetExpandedContent> content, Target& target, std::vector<TestForm*>& open)
-    : content_(std::move(content)), target_(target), open_(open) {
+TestForm::TestForm(std::shared_ptr<SnippetExpandedContent> content, std::vector<TestForm*>& open)
+    : content_(std::move(content)), open_(open) {
     open_.push_back(this);
 }
 
@@ -87,19 +87,12 @@ TestForm::~TestForm() {
     std::erase(open_, this);
 }
 
-void TestForm::accept(const std::u16string& value) {
-    for (const auto& field : content_->fields()) field->value = value;
-    target_.fieldsEditorWillClose(*this);
-    target_.fieldsEditorAction(*this);
+std::optional<std::u16string> AnsweringRunner::run(std::u16string_view script, bool isAppleScript) {
+    return answer((isAppleScript ? u"Apple's " : u"") + std::u16string(script));
 }
 
-std::optional<std::u16string> AnsweringRunner::run(std::u16string_view script, bool /*isAppleScript*/) {
-    return answer(std::u16string(script));
-}
-
-EngineDesk::EngineDesk(MemoryUserDefaults settings)
-    : defaults(std::move(settings)),
-      service({desktop.keyboardTap(), desktop.mouseTap(), desktop.poster(), desktop.pasteboard(),
+EngineDesk::EngineDesk()
+    : service({desktop.keyboardTap(), desktop.mouseTap(), desktop.poster(), desktop.pasteboard(),
                desktop.processManager(), desktop.inputSources(), desktop.accessibility(), desktop.secureInput(),
                desktop.systemHotKeys(), identifiers, loop, loop, [](const std::string&) {}}),
       owner(std::make_unique<AutoText>(dependencies())),
@@ -122,8 +115,8 @@ AutoText::Dependencies EngineDesk::dependencies() {
             .sounds = desktop.sounds(),
             .report = [this](const std::string& sentence) { reports.push_back(sentence); },
             .makeFieldsEditor =
-                [this](std::shared_ptr<SnippetExpandedContent> content, FieldsEditor::Target& target) {
-                    return std::make_unique<TestForm>(std::move(content), target, forms);
+                [this](std::shared_ptr<SnippetExpandedContent> content, FieldsEditor::Target& /*target*/) {
+                    return std::make_unique<TestForm>(std::move(content), forms);
                 },
             .makeSuggestionController = [this] { return std::make_unique<RecordedList>(list); },
             .makeQuickSearchController = [this] { return std::make_unique<RecordedSearch>(search); },
@@ -169,11 +162,6 @@ void EngineDesk::clickAt(double x, double y) {
 void EngineDesk::suggest(std::u16string_view beginning) {
     type(beginning);
     engine.suggestAbbreviations();
-}
-
-void EngineDesk::openListOf(int count, const std::u16string& abbreviation) {
-    add(std::vector<std::u16string>(static_cast<std::size_t>(count), abbreviation));
-    type(abbreviation);
 }
 
 void EngineDesk::settle() {

@@ -1,5 +1,5 @@
 // A desk to try the engine at: a simulated desktop with an editor in front, the real input service between them,
-// windows that write down what becomes of them, forms that the test fills in, and scripts that answer what the test
+// windows that write down what becomes of them, forms that stay open, and scripts that answer what the test
 // says.
 #pragma once
 
@@ -43,21 +43,17 @@ struct SearchWindow {
 
 class TestForm final : public FieldsEditor {
   public:
-    TestForm(std::shared_ptr<SnippetExpandedContent> content, Target& target, std::vector<TestForm*>& open);
+    TestForm(std::shared_ptr<SnippetExpandedContent> content, std::vector<TestForm*>& open);
     ~TestForm() override;
     TestForm(const TestForm&) = delete;
     TestForm& operator=(const TestForm&) = delete;
 
     void show() override { shown = true; }
     const std::shared_ptr<SnippetExpandedContent>& content() const override { return content_; }
-    // Writes the value into every field, and confirms.
-    void accept(const std::u16string& value);
-
     bool shown = false;
 
   private:
     std::shared_ptr<SnippetExpandedContent> content_;
-    Target& target_;
     std::vector<TestForm*>& open_;
 };
 
@@ -73,8 +69,8 @@ class AnsweringRunner final : public ScriptRunner {
 
 class EngineDesk {
   public:
-    // An enabled engine. `settings` are those that it reads when it is made.
-    explicit EngineDesk(MemoryUserDefaults settings = {});
+    // An enabled engine.
+    EngineDesk();
 
     // A group of its own, last in the library, for these abbreviations; each stands for "content".
     std::shared_ptr<SnippetGroup> add(const std::vector<std::u16string>& abbreviations,
@@ -90,8 +86,6 @@ class EngineDesk {
     void clickAt(double x, double y);
     // Types the beginning of abbreviations and asks what it may become.
     void suggest(std::u16string_view beginning);
-    // Types what several snippets with this abbreviation match, and lets the list open.
-    void openListOf(int count, const std::u16string& abbreviation = u"ab");
     // Lets scripts end and everything that is due within a second happen.
     void settle();
     // What stands in the program in front.
@@ -99,7 +93,7 @@ class EngineDesk {
 
     SimulatedDesktop desktop;
     SimulatedRunLoop& loop = desktop.runLoop();
-    const MemoryUserDefaults defaults;
+    MemoryUserDefaults defaults;
     BundleIdentifierResolver identifiers{desktop.processManager()};
     MacInputService service;
     AnsweringRunner runner;
