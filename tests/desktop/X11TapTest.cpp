@@ -1,168 +1,26 @@
 // The keyboard tap of X11 between a keyboard and real programs.
 
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
 #include <xcb/xinput.h>
 
 #include <algorithm>
-#include <array>
 #include <atomic>
 #include <chrono>
-#include <functional>
 #include <memory>
-#include <optional>
-#include <ostream>
 #include <random>
 #include <string>
 #include <utility>
 #include <vector>
 
-#include "Foundation/Strings.h"
 #include "ports/x11/keyboard/InputDevices.h"
-#include "ports/x11/keyboard/TapConnection.h"
-#include "ports/x11/keyboard/X11InputSources.h"
-#include "ports/x11/keyboard/X11KeyboardTap.h"
 #include "ports/x11/keyboard/XcbXkb.h"
-#include "ports/x11/keyboard/XkbKeyboard.h"
 #include "testing/rig/Deadline.h"
-#include "testing/rig/DesktopRig.h"
 #include "testing/rig/FocusCounter.h"
-#include "testing/rig/SessionThread.h"
 #include "testing/rig/XcbReply.h"
+#include "tests/desktop/X11TapFixture.h"
 
 namespace plume::rig {
 
 namespace {
-
-using Type = TapEvent::Type;
-
-constexpr Milliseconds Bound{10'000};
-
-struct Heard {
-    Type type = Type::KeyDown;
-    KeyCode keyCode = KeyCode::None;
-    EventFlags flags;
-    std::u16string string;
-    bool composing = false;
-    bool command = false;
-
-    bool operator==(const Heard&) const = default;
-    friend std::ostream& operator<<(std::ostream& out, const Heard& heard) {
-        constexpr std::array<const char*, 3> Names{"down", "up", "flags"};
-        out << Names[static_cast<std::size_t>(heard.type)] << ' ' << numberOf(heard.keyCode) << ' ' << std::hex
-            << heard.flags.bits();
-        for (const char16_t unit : heard.string) out << " U+" << static_cast<unsigned>(unit);
-        return out << std::dec << (heard.composing ? " composing" : "") << (heard.command ? " command" : "");
-    }
-};
-
-// Writes down what it hears and does as it is told. Tap thread.
-class Listener final : public KeyboardTapListener {
-  public:
-    bool keyboardEvent(const TapEvent& event) override {
-        heard.push_back(
-            {event.type, event.keyCode, event.flags, std::u16string(event.string), event.composing, event.command});
-        return decide && decide(event);
-    }
-    void tapDisabledByTimeout() override { ++timeouts; }
-    void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody did that"; }
-    void keysWithheld() override { ++withheld; }
-
-    std::vector<Heard> heard;
-    std::function<bool(const TapEvent&)> decide;
-    int timeouts = 0;
-    int withheld = 0;
-};
-
-// Plume's ears on a rig's display. All of it is used inside run().
-class TapThread : public SessionThread {
-  public:
-    explicit TapThread(const std::string& display) : SessionThread(display) {
-        run([&] {
-            keyboard = valueOrThrow(XkbKeyboard::open(session().connection()));
-            keyboard->listenTo(session());
-            inputSources = std::make_unique<X11InputSources>(*keyboard);
-            connection = valueOrThrow(TapConnection::open(display, *keyboard));
-            tap = std::make_unique<X11KeyboardTap>(loop(), *connection, *keyboard);
-        });
-    }
-    ~TapThread() {
-        run([this] { tap->remove(); });
-        end();
-    }
-
-    std::unique_ptr<XkbKeyboard> keyboard;
-    std::unique_ptr<X11InputSources> inputSources;
-    std::unique_ptr<TapConnection> connection;
-    std::unique_ptr<X11KeyboardTap> tap;
-};
-
-class X11TapTest : public testing::Test {
-  protected:
-    static void SetUpTestSuite() {
-        rig_ = std::make_unique<DesktopRig>();
-        rig_->keyboard().tap(Key::LeftShift);  // only a device that was used answers when asked to sync
-    }
-    static void TearDownTestSuite() { rig_.reset(); }
-
-    void SetUp() override { tap_ = std::make_unique<TapThread>(rig_->server().display()); }
-    void TearDown() override {
-        rig_->keyboard().releaseAll();
-        tap_.reset();
-        EXPECT_EQ(keysDown(), std::vector<int>{}) << "what was pressed has to come up";
-        if (layoutChanged_) setLayout({"us", "-option", ""});
-    }
-
-    void createTap() {
-        const auto created = tap_->run([this] { return tap_->tap->create(listener_, false); });
-        ASSERT_TRUE(created.ok()) << created.error().message;
-    }
-    void removeTap() {
-        tap_->run([this] { tap_->tap->remove(); });
-    }
-    void setDecision(std::function<bool(const TapEvent&)> decide) {
-        tap_->run([&] { listener_.decide = std::move(decide); });
-    }
-    std::vector<Heard> heard() {
-        return tap_->run([this] { return listener_.heard; });
-    }
-    std::vector<Heard> takeHeard(std::size_t count) {
-        await("keys are heard", [&] { return heard().size() >= count; });
-        return tap_->run([this] { return std::exchange(listener_.heard, {}); });
-    }
-    static void await(const std::string& what, const std::function<bool()>& condition) {
-        rig_->client().await(what, Bound, condition);
-    }
-
-    void setLayout(const std::vector<std::string>& arguments) {
-        layoutChanged_ = true;
-        std::vector<std::string> command{"setxkbmap"};
-        command.insert(command.end(), arguments.begin(), arguments.end());
-        const auto program = rig_->session().start(command, "x11-xkb-utils");
-        ASSERT_EQ(program->waitForExit(Bound), 0) << program->logTail();
-    }
-    std::string identifier() {
-        const auto name = tap_->run([this] { return tap_->inputSources->currentInputSourceIdentifier(); });
-        return name ? toUtf8(*name) : "";
-    }
-    std::optional<std::u16string> translate(KeyCode keyCode, EventFlags flags) {
-        return tap_->run([=, this] { return tap_->inputSources->translateKey(keyCode, flags); });
-    }
-
-    static void tapKey(int keycode) {
-        rig_->keyboard().press(keycode);
-        rig_->keyboard().release(keycode);
-        rig_->keyboard().sync();
-    }
-
-    // On the main keyboard, as programs see it.
-    static std::vector<int> keysDown() { return rig_->client().keysDown(); }
-
-    static inline std::unique_ptr<DesktopRig> rig_;
-    Listener listener_;  // outlives the tap
-    std::unique_ptr<TapThread> tap_;
-    bool layoutChanged_ = false;
-};
 
 class X11TapTargetTest : public X11TapTest, public testing::WithParamInterface<TargetKind> {};
 
@@ -256,118 +114,6 @@ TEST_F(X11TapTest, TellsEachModifierByItsKey) {
         tapKey(each.keycode);
         EXPECT_THAT(takeHeard(2), testing::ElementsAre(Heard{Type::FlagsChanged, each.keyCode, each.flags, u""},
                                                        Heard{Type::FlagsChanged, each.keyCode, {}, u""}));
-    }
-}
-
-TEST_F(X11TapTest, CapsLockLocks) {
-    const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    createTap();
-    rig_->keyboard().tap(Key::CapsLock);
-    rig_->keyboard().type("a");
-    rig_->keyboard().tap(Key::CapsLock);
-    rig_->keyboard().type("b");
-    EXPECT_EQ(target->awaitText("Ab"), "Ab");
-    constexpr EventFlag Locked = EventFlag::CapsLock;
-    const auto all = takeHeard(8);
-    EXPECT_EQ(all.at(2), (Heard{Type::KeyDown, KeyCode::A, Locked, u"A"}));
-    EXPECT_EQ(all.at(6), (Heard{Type::KeyDown, KeyCode::B, {}, u"b"}));
-}
-
-TEST_F(X11TapTest, FollowsTheLayout) {
-    const auto target = rig_->startTarget(TargetKind::QtTextEdit);
-    createTap();
-    EXPECT_EQ(identifier(), "us");
-    EXPECT_EQ(translate(KeyCode::Y, {}), u"y");
-    EXPECT_EQ(translate(KeyCode::Y, EventFlag::Shift), u"Y");
-    EXPECT_EQ(translate(KeyCode::Y, EventFlag::Option), std::nullopt);
-    EXPECT_EQ(translate(KeyCode::Keypad1, {}), u"1") << "on the keypad";
-    EXPECT_EQ(translate(KeyCode::Delete, EventFlag::Option), u"\b");
-
-    setLayout({"de"});
-    await("the layout is de", [&] { return identifier() == "de"; });
-    EXPECT_EQ(translate(KeyCode::Y, {}), u"z");
-    EXPECT_EQ(translate(KeyCode::Equal, {}), std::nullopt) << "a dead key";
-    tapKey(29);
-    EXPECT_EQ(target->awaitText("z"), "z");
-    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Y, {}, u"z"}));
-    rig_->keyboard().press(Key::AltGr);
-    tapKey(24);
-    rig_->keyboard().releaseAll();
-    EXPECT_EQ(target->awaitText("z@"), "z@");
-    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Q, {}, u"@"})) << "AltGr is not told of";
-
-    removeTap();
-    tapKey(29);
-    EXPECT_EQ(target->awaitText("z@z"), "z@z") << "the keyboard itself has to have the new layout, too";
-    createTap();
-    setLayout({"de", "-variant", "nodeadkeys"});
-    await("the variant is told", [&] { return identifier() == "de(nodeadkeys)"; });
-    EXPECT_EQ(translate(KeyCode::Equal, {}), u"\u00B4");
-}
-
-TEST_F(X11TapTest, FollowsTheGroup) {
-    const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    createTap();
-    setLayout({"-layout", "us,de", "-option", "grp:menu_toggle"});
-    await("both layouts are there",
-          [&] { return tap_->run([this] { return xkb_keymap_num_layouts(tap_->keyboard->keymap()->get()) == 2; }); });
-    EXPECT_EQ(identifier(), "us");
-    tapKey(135);  // switches
-    tapKey(29);
-    EXPECT_EQ(target->awaitText("z"), "z");
-    await("the other layout is named", [&] { return identifier() == "de"; });
-    const auto all = heard();
-    EXPECT_THAT(all, testing::Contains(Heard{Type::KeyDown, KeyCode::Y, {}, u"z"}));
-
-    // A program that switches layouts does it so.
-    XClient switcher(rig_->server().display());
-    const auto use = xcb_xkb_use_extension(switcher.connection(), 1, 0);
-    own(xcb_xkb_use_extension_reply(switcher.connection(), use, nullptr));
-    xcb_xkb_latch_lock_state(switcher.connection(), XCB_XKB_ID_USE_CORE_KBD, 0, 0, 1, 0, 0, 0, 0);
-    switcher.focusedWindow();
-    await("the first layout is back", [&] { return identifier() == "us"; });
-    takeHeard(2);
-    tapKey(29);
-    EXPECT_EQ(target->awaitText("zy"), "zy");
-    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::Y, {}, u"y"}));
-}
-
-TEST_F(X11TapTest, Composes) {
-    struct Case {
-        std::vector<std::string> layout;
-        std::vector<int> keycodes;
-        std::vector<Heard> downs;
-        std::string text;
-    };
-    const Case cases[] = {
-        {{"de"},  // dead acute, e, e
-         {21, 26, 26},
-         {{Type::KeyDown, KeyCode::Equal, {}, u"", true},
-          {Type::KeyDown, KeyCode::E, {}, u"\u00E9"},
-          {Type::KeyDown, KeyCode::E, {}, u"e"}},
-         "ée"},
-        {{"us", "-option", "compose:ralt"},  // Compose, which Apple keyboards do not have, comma, c, c
-         {108, 59, 54, 54},
-         {{Type::KeyDown, KeyCode{364}, {}, u"", true},
-          {Type::KeyDown, KeyCode::Comma, {}, u"", true},
-          {Type::KeyDown, KeyCode::C, {}, u"\u00E7"},
-          {Type::KeyDown, KeyCode::C, {}, u"c"}},
-         "çc"}};
-    const auto target = rig_->startTarget(TargetKind::Xterm);
-    createTap();
-    for (const Case& each : cases) {
-        setLayout(each.layout);
-        await("the layout composes", [&] {
-            return identifier() == each.layout.front() &&
-                   tap_->run([this] { return tap_->keyboard->keymap()->hasComposingKeys(); });
-        });
-        for (const int keycode : each.keycodes) tapKey(keycode);
-        auto all = takeHeard(2 * each.keycodes.size());
-        std::erase_if(all, [](const Heard& heard) { return heard.type == Type::KeyUp; });
-        EXPECT_EQ(all, each.downs);
-        EXPECT_EQ(target->awaitText(each.text), each.text);
-        target->clear();
-        setLayout({"us", "-option", ""});
     }
 }
 
@@ -510,7 +256,14 @@ TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEndedAndMakesUpForWhatItMissed)
         EXPECT_EQ(windows.size(), 2U);
         EXPECT_EQ(windows.back(), tap_->connection->window());
         EXPECT_EQ(listener_.timeouts, 1);
+        listener_.tapToEnable = tap_->tap.get();
     });
+    xcb_kill_client(rig_->client().connection(), windows.back());
+    rig_->client().focusedWindow();
+    await("the tap is back at once", [&] { return tap_->run([&] { return windows.size() == 3; }); });
+    tapKey(56);
+    EXPECT_EQ(takeHeard(2).front(), (Heard{Type::KeyDown, KeyCode::B, {}, u"b"}));
+    EXPECT_EQ(target->awaitText("ab"), "ab");
 }
 
 TEST_F(X11TapTest, SaysThatAnotherProgramHasTheKeyboard) {
@@ -589,38 +342,6 @@ TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThat
     second.set(false);
     rig.keyboard().type("c");
     EXPECT_EQ(target->awaitText("bc"), "bc");
-}
-
-TEST_F(X11TapTest, SymbolsOfItsOwnAreNoPartOfTheLayout) {
-    constexpr xkb_keysym_t Own = 0x1006E00;
-    struct KeymapChanges {
-        int count = 0;
-        void changed(const XkbKeyboard::Change& change) {
-            if (change == XkbKeyboard::Change::Keymap) ++count;
-        }
-    } changes;
-    Subscription counting;
-    const auto spare = tap_->run([&] {
-        counting = tap_->keyboard->changedEvent.addObserver(&changes, &KeymapChanges::changed);
-        return tap_->keyboard->keymap()->spareKeycodes().back();
-    });
-    const auto write = [&](xcb_keycode_t keycode, std::vector<xcb_keysym_t> symbols) {
-        xcb_change_keyboard_mapping(rig_->client().connection(), 1, keycode, static_cast<std::uint8_t>(symbols.size()),
-                                    symbols.data());
-        rig_->client().focusedWindow();
-    };
-    layoutChanged_ = true;  // to be undone
-    tap_->run([&] { tap_->keyboard->willWrite(spare, std::array{Own}); });
-    write(spare, {Own, Own});
-    write(38, {XKB_KEY_q, XKB_KEY_Q});  // the user's change
-    await("the layout has changed", [&] { return translate(KeyCode::A, {}) == u"q"; });
-    tap_->run([&] {
-        counting.end();
-        EXPECT_EQ(changes.count, 1);
-        EXPECT_FALSE(tap_->keyboard->keymap()->strokeFor(U'\u6E00', 0).has_value());
-        EXPECT_THAT(tap_->keyboard->keymap()->spareKeycodes(), testing::Contains(spare));
-        EXPECT_EQ(tap_->keyboard->keymap()->strokeFor(U'Q', 0)->keycode, 24) << "Q first of all where it was";
-    });
 }
 
 }  // namespace
