@@ -63,7 +63,7 @@ class MacInputService final : private KeyboardTapListener {
     };
 
     explicit MacInputService(Dependencies dependencies);
-    ~MacInputService();
+    ~MacInputService() override;
     MacInputService(const MacInputService&) = delete;
     MacInputService& operator=(const MacInputService&) = delete;
 
