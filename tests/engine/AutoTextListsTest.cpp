@@ -8,7 +8,6 @@ namespace plume {
 namespace {
 
 using ::testing::ElementsAre;
-using ::testing::IsEmpty;
 using ::testing::SizeIs;
 
 TEST(SeveralMatches, AreOfferedAfterTheKeyHasPassed) {
