@@ -22,6 +22,7 @@ struct KeyCase {
     const char* about;
     KeyCode key;
     KeyModifiers modifiers;
+    bool swallowed;
     bool visible;          // the list, afterwards
     std::size_t selected;  // from entry 1 of 3
     std::u16string screen;
@@ -29,17 +30,17 @@ struct KeyCase {
 
 TEST(Keys, DriveTheList) {
     const KeyCase cases[] = {
-        {"Down", KeyCode::Down, {}, true, 2, u"ab"},
-        {"Up", KeyCode::Up, {}, true, 0, u"ab"},
-        {"Return", KeyCode::Return, {}, false, 1, u"content"},
-        {"Shift+Return", KeyCode::Return, Shift, false, 1, u"content"},
-        {"Enter", KeyCode::KeypadEnter, {}, false, 1, u"content"},
-        {"Escape", KeyCode::Escape, {}, false, 1, u"ab"},
-        {"Left", KeyCode::Left, {}, false, 1, u"ab"},
-        {"Forward Delete", KeyCode::ForwardDelete, {}, true, 1, u"ab"},
-        {"Shift+Space", KeyCode::Space, Shift, true, 1, u"ab "},
-        {"Space, which begins nothing", KeyCode::Space, {}, false, 1, u"ab "},
-        {"Delete, back to a shorter beginning", KeyCode::Delete, {}, true, 0, u"a"},
+        {"Down", KeyCode::Down, {}, true, true, 2, u"ab"},
+        {"Up", KeyCode::Up, {}, true, true, 0, u"ab"},
+        {"Return", KeyCode::Return, {}, true, false, 1, u"content"},
+        {"Shift+Return", KeyCode::Return, Shift, true, false, 1, u"content"},
+        {"Enter", KeyCode::KeypadEnter, {}, true, false, 1, u"content"},
+        {"Escape", KeyCode::Escape, {}, true, false, 1, u"ab"},
+        {"Left", KeyCode::Left, {}, false, false, 1, u"ab"},
+        {"Forward Delete", KeyCode::ForwardDelete, {}, false, true, 1, u"ab"},
+        {"Shift+Space", KeyCode::Space, Shift, false, true, 1, u"ab "},
+        {"Space, which begins nothing", KeyCode::Space, {}, false, false, 1, u"ab "},
+        {"Delete, back to a shorter beginning", KeyCode::Delete, {}, false, true, 0, u"a"},
     };
     for (const KeyCase& key : cases) {
         EngineDesk desk;
@@ -47,6 +48,10 @@ TEST(Keys, DriveTheList) {
         desk.suggest(u"ab");
         desk.list.selected = 1;
         desk.desktop.pressAndRelease(key.key, key.modifiers);
+        const auto& events = desk.desktop.front()->events();
+        const bool passed =
+            std::any_of(events.begin(), events.end(), [&](const auto& e) { return e.keyCode == key.key; });
+        EXPECT_EQ(passed, !key.swallowed) << key.about;
         EXPECT_EQ(desk.list.visible, key.visible) << key.about;
         EXPECT_EQ(desk.list.selected, key.selected) << key.about;
         EXPECT_EQ(desk.screen(), key.screen) << key.about;

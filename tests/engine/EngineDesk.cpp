@@ -78,8 +78,8 @@ SuggestionList whatStartsWith(std::u16string_view letters, const AutoText::Group
 
 }  // namespace
 
-TestForm::TestForm(std::shared_ptr<SnippetExpandedContent> content, std::vector<TestForm*>& open)
-    : content_(std::move(content)), open_(open) {
+TestForm::TestForm(std::shared_ptr<SnippetExpandedContent> content, Target& target, std::vector<TestForm*>& open)
+    : content_(std::move(content)), target_(target), open_(open) {
     open_.push_back(this);
 }
 
@@ -115,8 +115,8 @@ AutoText::Dependencies EngineDesk::dependencies() {
             .sounds = desktop.sounds(),
             .report = [this](const std::string& sentence) { reports.push_back(sentence); },
             .makeFieldsEditor =
-                [this](std::shared_ptr<SnippetExpandedContent> content, FieldsEditor::Target& /*target*/) {
-                    return std::make_unique<TestForm>(std::move(content), forms);
+                [this](std::shared_ptr<SnippetExpandedContent> content, FieldsEditor::Target& target) {
+                    return std::make_unique<TestForm>(std::move(content), target, forms);
                 },
             .makeSuggestionController = [this] { return std::make_unique<RecordedList>(list); },
             .makeQuickSearchController = [this] { return std::make_unique<RecordedSearch>(search); },

@@ -1,5 +1,5 @@
 // A desk to try the engine at: a simulated desktop with an editor in front, the real input service between them,
-// windows that write down what becomes of them, forms that stay open, and scripts that answer what the test
+// windows that write down what becomes of them, forms that the test closes, and scripts that answer what the test
 // says.
 #pragma once
 
@@ -43,17 +43,20 @@ struct SearchWindow {
 
 class TestForm final : public FieldsEditor {
   public:
-    TestForm(std::shared_ptr<SnippetExpandedContent> content, std::vector<TestForm*>& open);
+    TestForm(std::shared_ptr<SnippetExpandedContent> content, Target& target, std::vector<TestForm*>& open);
     ~TestForm() override;
     TestForm(const TestForm&) = delete;
     TestForm& operator=(const TestForm&) = delete;
 
     void show() override { shown = true; }
     const std::shared_ptr<SnippetExpandedContent>& content() const override { return content_; }
+    void close() { target_.fieldsEditorWillClose(*this); }
+
     bool shown = false;
 
   private:
     std::shared_ptr<SnippetExpandedContent> content_;
+    Target& target_;
     std::vector<TestForm*>& open_;
 };
 

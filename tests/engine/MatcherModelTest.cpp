@@ -179,7 +179,7 @@ std::u16string plannedTyping(const std::vector<std::shared_ptr<SnippetGroup>>& g
     if (group->items().empty() || *rc::gen::inRange(0, 4) == 0) return randomText(4) + u"a";
     std::u16string typing = *(*rc::gen::elementOf(group->items()))->abbreviationWithPrefix();
     if (*rc::gen::inRange(0, 4) == 0) typing = uppercased(typing);
-    return *rc::gen::element<std::u16string>(u"", u" ", u"1", u"b") + typing +
+    return *rc::gen::element<std::u16string>(u"", u" ", u"1", u"b", u"\n") + typing +
            *rc::gen::element<std::u16string>(u"", u" ", u"b", u".");
 }
 
