@@ -144,7 +144,7 @@ TEST(PLOutput, WithoutContentHasNoFragments) {
 }
 
 TEST(PLOutput, WhatIsSentAgainHasAnEnd) {
-    constexpr std::size_t Most = 16u * 1024 * 1024;
+    constexpr std::size_t Most = std::size_t{16} * 1024 * 1024;
     SnippetExpandedContent content(std::u16string(1'000'000, u'x'));
     for (int count = 0; count < 1'000; ++count) {
         content.variables.push_back(key(KeyCode::Return, 1'000'000));
