@@ -16,7 +16,6 @@ class Timer {
     using Id = std::uint64_t;
 
     Timer() = default;
-    Timer(RunLoop& loop, Id id) : loop_(&loop), id_(id) {}
     Timer(Timer&& other) noexcept : loop_(other.loop_), id_(std::exchange(other.id_, 0)) {}
     inline Timer& operator=(Timer&& other) noexcept;
     ~Timer() { cancel(); }
@@ -28,6 +27,9 @@ class Timer {
     explicit operator bool() const { return id_ != 0; }
 
   private:
+    friend class RunLoop;
+    Timer(RunLoop& loop, Id id) : loop_(&loop), id_(id) {}
+
     RunLoop* loop_ = nullptr;
     Id id_ = 0;
 };
@@ -51,8 +53,10 @@ class RunLoop {
     // Calls on this loop's thread as soon as it can, after what was handed over before. From any thread; never waits.
     virtual void perform(Call call) = 0;
 
-    // The timer's side, on the loop's own thread: what performAfterDelay() asks for, and forgetting it again; a call
-    // that has run, or was forgotten already, is no error.
+  protected:
+    friend class Timer;
+    // What performAfterDelay() asks for, and forgetting it again; a call that has run, or was forgotten already, is no
+    // error.
     virtual CallId schedule(double delay, Call call) = 0;
     virtual void cancel(CallId id) = 0;
 };

@@ -15,17 +15,11 @@ TEST(UuidTest, ReadsEitherCaseAndWritesUpperCase) {
 }
 
 TEST(UuidTest, RefusesOtherForms) {
-    for (const std::u16string_view text : {
-             u"",
-             u"01234567-89AB-4DEF-8123-456789ABCDE",
-             u"01234567-89AB-4DEF-8123-456789ABCDEF0",
-             u"0123456789AB4DEF8123456789ABCDEF",
-             u"0123456-789AB-4DEF-8123-456789ABCDEF",
-             u"01234567-89AB-4DEF-8123-456789ABCDEG",
-             u"01234567-89AB-4DEF-8123+456789ABCDEF",
-             u"{1234567-89AB-4DEF-8123-456789ABCDE}",
-             u"01234567-89AB-4DEF-8123-\uFF1156789ABCDEF",
-         }) {
+    for (const std::u16string_view text :
+         {u"", u"01234567-89AB-4DEF-8123-456789ABCDE", u"01234567-89AB-4DEF-8123-456789ABCDEF0",
+          u"0123456789AB4DEF8123456789ABCDEF", u"0123456-789AB-4DEF-8123-456789ABCDEF",
+          u"01234567-89AB-4DEF-8123-456789ABCDEG", u"01234567-89AB-4DEF-8123+456789ABCDEF",
+          u"{1234567-89AB-4DEF-8123-456789ABCDE}", u"01234567-89AB-4DEF-8123-\uFF1156789ABCDEF"}) {
         EXPECT_EQ(Uuid::parse(text), std::nullopt);
     }
 }

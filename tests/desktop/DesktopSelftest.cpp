@@ -1,6 +1,5 @@
 // What the rig tells and takes down. That keys, texts and clicks reach its programs, the other tests show.
 
-#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -12,17 +11,37 @@
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/FocusCounter.h"
-#include "testing/rig/Screenshot.h"
 
 namespace plume::rig {
 
 namespace {
 
+// Every process of a desktop has the rig's folder in its environment, the services that D-Bus started included.
+int countProcessesOf(const std::filesystem::path& directory) {
+    int count = 0;
+    for (const auto& entry : std::filesystem::directory_iterator("/proc")) {
+        std::ifstream file(entry.path() / "environ", std::ios::binary);
+        const std::string environment{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+        if (environment.find("HOME=" + directory.string() + '/') != std::string::npos) ++count;
+    }
+    return count;
+}
+
+bool awaitNoProcessOf(const std::filesystem::path& directory) {
+    return waitUntil([&] { return countProcessesOf(directory) == 0; });
+}
+
 // All tests of the program share one desktop: what is tested is that it serves one test after the other.
 class DesktopSelftest : public testing::Test {
   protected:
     static void SetUpTestSuite() { rig_ = std::make_unique<DesktopRig>(); }
-    static void TearDownTestSuite() { rig_.reset(); }
+    static void TearDownTestSuite() {
+        const std::filesystem::path directory = rig_->directory();
+        EXPECT_GE(countProcessesOf(directory), 3);
+        rig_.reset();
+        EXPECT_TRUE(awaitNoProcessOf(directory));
+        EXPECT_FALSE(std::filesystem::exists(directory));
+    }
 
     static inline std::unique_ptr<DesktopRig> rig_;
 };
@@ -54,47 +73,6 @@ TEST_F(DesktopSelftest, GrabbedKeyboardIsCountedAsFocusEvents) {
     EXPECT_EQ(counts.in + counts.out, counts.byGrab);
 }
 
-TEST_F(DesktopSelftest, ScreenshotShowsTheWindows) {
-    const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    rig_->keyboard().type("on the picture");
-    ASSERT_EQ(target->awaitText("on the picture"), "on the picture");
-    const auto file = rig_->directory() / "screen.png";
-    writeScreenshot(rig_->client(), file);
-    std::ifstream picture(file, std::ios::binary);
-    std::string signature(8, '\0');
-    picture.read(signature.data(), 8);
-    EXPECT_EQ(signature, "\x89PNG\r\n\x1a\n");
-    EXPECT_GT(std::filesystem::file_size(file), 2'000U);  // an empty screen compresses to far less
-}
-
-// Every process of a desktop has the rig's folder in its environment, the services that D-Bus started included.
-int countProcessesOf(const std::filesystem::path& directory) {
-    int count = 0;
-    for (const auto& entry : std::filesystem::directory_iterator("/proc")) {
-        std::ifstream file(entry.path() / "environ", std::ios::binary);
-        const std::string environment{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-        if (environment.find("HOME=" + directory.string() + '/') != std::string::npos) ++count;
-    }
-    return count;
-}
-
-bool awaitNoProcessOf(const std::filesystem::path& directory) {
-    return waitUntil([&] { return countProcessesOf(directory) == 0; });
-}
-
-TEST(DesktopRigTest, LeavesNothingBehind) {
-    std::filesystem::path directory;
-    {
-        DesktopRig rig;
-        directory = rig.directory();
-        const auto terminal = rig.startTarget(TargetKind::Xterm);
-        const auto editor = rig.startTarget(TargetKind::GtkTextView);
-        EXPECT_GE(countProcessesOf(directory), 6);
-    }
-    EXPECT_TRUE(awaitNoProcessOf(directory));
-    EXPECT_FALSE(std::filesystem::exists(directory));
-}
-
 TEST(DesktopRigTest, EndsWithATestThatIsKilled) {
     std::array<int, 2> ends{};
     ASSERT_EQ(pipe(ends.data()), 0);
@@ -117,13 +95,6 @@ TEST(DesktopRigTest, EndsWithATestThatIsKilled) {
     directory.resize(static_cast<std::size_t>(length));
     EXPECT_TRUE(awaitNoProcessOf(directory));
     std::filesystem::remove_all(directory);
-}
-
-TEST(DesktopRigTest, NamesThePackageOfAMissingPart) {
-    EXPECT_THAT([] { requireProgram("no-such-window-manager", "no-such-package"); },
-                testing::ThrowsMessage<RigError>(testing::HasSubstr("install the package no-such-package")));
-    EXPECT_THAT([] { requireFile({"/nowhere/driver.so"}, "another-package"); },
-                testing::ThrowsMessage<RigError>(testing::HasSubstr("install the package another-package")));
 }
 
 }  // namespace

@@ -46,7 +46,12 @@ class ClipboardInTarget : public RobustnessInTarget {
     static SelectionOffer copiedByUser() {
         return {{"UTF8_STRING", {"UTF8_STRING", 8, "What the user copied — 日本"}},
                 {"text/html", {"text/html", 8, "<p>What the <b>user</b> copied</p>"}},
-                {"image/png", {"image/png", 8, image()}}};
+                {"image/png", {"image/png", 8, image()}},
+                {"STRING", {"STRING", 8, "What the user copied"}},
+                {"TEXT", {"COMPOUND_TEXT", 8, "What the user copied"}},
+                {"LENGTH", {"INTEGER", 32, std::string("\x06\0\0\0", 4)}},
+                {"x-words", {"CARDINAL", 16, std::string("\1\2\3\4", 4)}},
+                {"x-empty", {"x-empty", 8, ""}}};
     }
 
     // What a program that is not in front finds on the clipboard, once it is the user's again.

@@ -4,9 +4,6 @@
 
 #include <gtest/gtest.h>
 
-#include <ostream>
-#include <string>
-
 #include "ports/x11/keyboard/X11KeyCodes.h"
 
 namespace plume {
@@ -32,27 +29,30 @@ struct Typed {
     unsigned group = 0;
 };
 
-void PrintTo(const Typed& typed, std::ostream* out) {
-    *out << typed.layout << " U+" << std::hex << static_cast<unsigned>(typed.character);
+TEST(XkbKeymapTest, CharactersAreTypedWithTheFewestModifiers) {
+    const Typed cases[] = {
+        {"us", U'a', 38, 0},
+        {"us", U'A', 38, Shift},
+        {"us", U'1', 10, 0},  // not the keypad's
+        {"us", U'<', 94, 0},
+        {"us", U'\n', 36, 0},
+        {"us", U'\t', 23, 0},
+        {"de", U'z', 29, 0},
+        {"de", U'<', 94, 0},
+        {"de", U'@', 24, LevelThree},
+        {"de", U'\u00E4', 48, 0},
+        {"fr", U'1', 10, Shift},
+        {"us,de", U'z', 52, 0},
+        {"us,de", U'z', 29, 0, 1},
+        {"us,ru", U'\u0434', 46, 0, 1},
+    };
+    for (const Typed& one : cases) {
+        const auto stroke = keymapOf(one.layout).strokeFor(one.character, one.group);
+        ASSERT_TRUE(stroke.has_value()) << one.layout << ' ' << static_cast<unsigned>(one.character);
+        EXPECT_EQ(stroke->keycode, one.keycode) << one.layout << ' ' << static_cast<unsigned>(one.character);
+        EXPECT_EQ(stroke->modifiers, one.modifiers) << one.layout << ' ' << static_cast<unsigned>(one.character);
+    }
 }
-
-class XkbStrokeTest : public testing::TestWithParam<Typed> {};
-
-TEST_P(XkbStrokeTest, CharactersAreTypedWithTheFewestModifiers) {
-    const auto stroke = keymapOf(GetParam().layout).strokeFor(GetParam().character, GetParam().group);
-    ASSERT_TRUE(stroke.has_value());
-    EXPECT_EQ(stroke->keycode, GetParam().keycode);
-    EXPECT_EQ(stroke->modifiers, GetParam().modifiers);
-}
-
-INSTANTIATE_TEST_SUITE_P(All, XkbStrokeTest,
-                         testing::Values(Typed{"us", U'a', 38, 0}, Typed{"us", U'A', 38, Shift},
-                                         Typed{"us", U'1', 10, 0},  // not the keypad's
-                                         Typed{"us", U'<', 94, 0}, Typed{"us", U'\n', 36, 0}, Typed{"us", U'\t', 23, 0},
-                                         Typed{"de", U'z', 29, 0}, Typed{"de", U'<', 94, 0},
-                                         Typed{"de", U'@', 24, LevelThree}, Typed{"de", U'\u00E4', 48, 0},
-                                         Typed{"fr", U'1', 10, Shift}, Typed{"us,de", U'z', 52, 0},
-                                         Typed{"us,de", U'z', 29, 0, 1}, Typed{"us,ru", U'\u0434', 46, 0, 1}));
 
 TEST(XkbKeymapTest, CharactersOnNoKeyHaveNoStroke) {
     EXPECT_FALSE(keymapOf("us").strokeFor(U'\u65E5', 0).has_value());

@@ -113,7 +113,7 @@ AutoText::Dependencies EngineDesk::dependencies() {
             .snippetParser = parser,
             .scriptRunner = runner,
             .sounds = desktop.sounds(),
-            .report = [this](const std::string& sentence) { reports.push_back(sentence); },
+            .report = [](const std::string& /*sentence*/) {},
             .makeFieldsEditor =
                 [this](std::shared_ptr<SnippetExpandedContent> content, FieldsEditor::Target& target) {
                     return std::make_unique<TestForm>(std::move(content), target, forms);

@@ -101,7 +101,6 @@ class EngineDesk {
     MacInputService service;
     AnsweringRunner runner;
     std::vector<TestForm*> forms;  // that exist
-    std::vector<std::string> reports;
     ListWindow list;
     SearchWindow search;
     SnippetParser parser{ContentEnvironment{}};

@@ -1,7 +1,6 @@
 #include "input/BundleIdentifierResolver.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck/gtest.h>
 
 #include "ports/simulated/SimulatedProcessManager.h"
 
@@ -54,15 +53,13 @@ TEST(BundleIdentifierResolver, AsksAgainWhereItGotNoAnswer) {
 }
 
 TEST(ProcessSerialNumbers, ArePackedWithTheHighHalfAbove) {
-    EXPECT_EQ(BundleIdentifierResolver::processSerialNumberToNumber({1, 2}), 0x1'0000'0002);
-    EXPECT_EQ(BundleIdentifierResolver::processSerialNumberToNumber({0xFFFFFFFF, 0xFFFFFFFF}), -1);
+    for (const auto& [process, number] : {std::pair(ProcessSerialNumber{1, 2}, std::int64_t{0x1'0000'0002}),
+                                          std::pair(ProcessSerialNumber{0xFFFFFFFF, 0xFFFFFFFF}, std::int64_t{-1}),
+                                          std::pair(ProcessSerialNumber{}, std::int64_t{0})}) {
+        EXPECT_EQ(BundleIdentifierResolver::processSerialNumberToNumber(process), number);
+        EXPECT_EQ(BundleIdentifierResolver::numberToProcessSerialNumber(number), process);
+    }
     EXPECT_EQ(BundleIdentifierResolver::numberToProcessSerialNumber(std::nullopt), ProcessSerialNumber{});
-}
-
-RC_GTEST_PROP(ProcessSerialNumbersProperty, AreReadBackAsTheyWere, (std::uint32_t high, std::uint32_t low)) {
-    const ProcessSerialNumber process{high, low};
-    const auto number = BundleIdentifierResolver::processSerialNumberToNumber(process);
-    RC_ASSERT(BundleIdentifierResolver::numberToProcessSerialNumber(number) == process);
 }
 
 TEST(ForegroundApplication, IsWhoeverHasTheKeyboard) {
@@ -70,8 +67,7 @@ TEST(ForegroundApplication, IsWhoeverHasTheKeyboard) {
     EXPECT_FALSE(foregroundApplication(processes));
     const auto editor = processes.launch(u"org.example.editor");
     processes.setFrontProcess(editor);
-    ASSERT_TRUE(foregroundApplication(processes));
-    EXPECT_EQ(foregroundApplication(processes)->bundleIdentifier, u"org.example.editor");
+    EXPECT_EQ(foregroundApplication(processes).value().bundleIdentifier, u"org.example.editor");
     processes.terminate(editor);
     EXPECT_FALSE(foregroundApplication(processes));
 }

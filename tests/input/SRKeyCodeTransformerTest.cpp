@@ -9,19 +9,17 @@
 namespace plume {
 namespace {
 
-// The US layout with the keys of V and K changed for one another, and none on the key of Y.
+// The US layout, until the keys of V and K are changed for one another and none is on the key of Y.
 class OtherLayout final : public InputSources {
   public:
     const std::optional<std::u16string>& currentInputSourceIdentifier() const override {
         return us_.currentInputSourceIdentifier();
     }
     std::optional<std::u16string> translateKey(KeyCode keyCode, EventFlags flags) const override {
-        if (!changed) return us_.translateKey(keyCode, flags);
-        if (keyCode == KeyCode::Y) return std::nullopt;
-        return us_.translateKey(keyCode == KeyCode::V   ? KeyCode::K
-                                : keyCode == KeyCode::K ? KeyCode::V
-                                                        : keyCode,
-                                flags);
+        if (changed && keyCode == KeyCode::Y) return std::nullopt;
+        if (changed && keyCode == KeyCode::V) return us_.translateKey(KeyCode::K, flags);
+        if (changed && keyCode == KeyCode::K) return us_.translateKey(KeyCode::V, flags);
+        return us_.translateKey(keyCode, flags);
     }
     void setChangeListener(std::function<void()>) override {}
 

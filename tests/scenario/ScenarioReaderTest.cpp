@@ -14,80 +14,77 @@ struct Fault {
     std::string message;  // a part of it
 };
 
-void PrintTo(const Fault& fault, std::ostream* stream) {
-    *stream << fault.text;
-}
-
-class ScenarioFault : public testing::TestWithParam<Fault> {};
-
 ScenarioReport simulated(const std::string& text) {
     return simulate(text, "s.json");
 }
 
 }  // namespace
 
-TEST_P(ScenarioFault, IsNamedWithItsPlace) {
-    const ScenarioReport report = simulated(GetParam().text);
-    EXPECT_EQ(report.exitStatus, 2);
-    EXPECT_EQ(report.output, "") << "something was played";
-    EXPECT_TRUE(report.problems.starts_with("s.json: ")) << report.problems;
-    EXPECT_NE(report.problems.find(GetParam().message), std::string::npos) << report.problems;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Faults, ScenarioFault,
-    testing::Values(
-        Fault{"", "no JSON"}, Fault{"[]", "at $: expected an object"}, Fault{R"({"steps": []} x)", "no JSON"},
-        Fault{R"({"about": "a", "about": "b"})", "the key \"about\" twice"},
-        Fault{std::string(100, '['), "nested too deeply"}, Fault{"{\"text\": \"\xFF\"}", "no JSON"},
-        Fault{R"({"txet": ""})", "at $.txet: unknown key; expected one of about, library"},
-        Fault{R"({"text": 1})", "at $.text: expected a string"},
-        Fault{R"({"library": [{"items": [{}, {"contentType": 4}]}]})",
-              "at $.library[0].items[1].contentType: expected a whole number from 0 to 3"},
-        Fault{R"({"library": [{"expandAfter": 1.5}]})", "at $.library[0].expandAfter: expected a whole number"},
-        Fault{R"({"library": [{"availability": {"availability": 3}}]})", "availability.availability: expected"},
-        Fault{R"({"library": [{"items": [{"uuid": "x"}]}]})", "items[0].uuid: expected a UUID"},
-        Fault{R"({"library": [{"items": [{"rtf": "{\\rtf1 x}"}]}]})", "items[0].rtf: only contentType 1"},
-        Fault{R"({"library": [{"items": [{"contentType": 1, "rtf": "x"}]}]})", "items[0].rtf: expected RTF"},
-        Fault{R"({"settings": {"Nonsense": 1}})", "at $.settings.Nonsense: unknown setting"},
-        Fault{R"({"settings": {"UseClipboard": 1}})", "at $.settings.UseClipboard: expected true or false"},
-        Fault{R"({"settings": {"UseClipboardIn": 3}})", "UseClipboardIn: expected a whole number from 0 to 2"},
-        Fault{R"({"settings": {"RestoreClipboardDelay": -1}})", "RestoreClipboardDelay: expected a number from 0"},
-        Fault{R"({"settings": {"UndoHotKey": 73014444032}})", "UndoHotKey: expected a packed hot key"},
-        Fault{R"({"settings": {"UseClipboardApplications": ["a", 1]}})",
-              "$.settings.UseClipboardApplications[1]: expected a string"},
-        Fault{R"({"applicationSettings": {"org.x": {"flags": ["usesClipboard"]}}})",
-              "$.applicationSettings[\"org.x\"].flags[0]: expected one of"},
-        Fault{R"({"now": "2026-02-30T10:00:00"})", "at $.now: expected a moment"},
-        Fault{R"({"now": "2026-01-31 10:00"})", "at $.now: expected a moment"},
-        Fault{R"({"timeZone": "Mars/Olympus"})", "at $.timeZone: expected the name of a time zone"},
-        Fault{R"({"steps": [{"type": "a", "wait": 1}]})", "at $.steps[0]: expected an object that says one thing"},
-        Fault{R"({"steps": [{"key": 51, "modifiers": ["alt"]}]})", "at $.steps[0].modifiers[0]: expected one of"},
-        Fault{R"({"steps": [{"key": 128}]})", "at $.steps[0].key: expected"},
-        Fault{R"({"steps": [{"key": 1, "type": "a"}]})", "at $.steps[0].type: unknown key"},
-        Fault{R"({"steps": [{"hotKey": "UndoHotKey"}]})", "at $.steps[0].hotKey: expected a hot key that the settings"},
-        Fault{R"({"steps": [{"hotKey": "Undo"}]})", "at $.steps[0].hotKey: expected the name of a hot-key setting"},
-        Fault{R"({"steps": [{"wait": -1}]})", "at $.steps[0].wait: expected a number"},
-        Fault{R"({"steps": [{"click": false}]})", "at $.steps[0].click: expected true"},
-        Fault{R"({"steps": [{"type": "a"}, {"form": {}}]})", "at $.steps[1]: no form is open"},
-        Fault{R"({"steps": [{"choose": 0}]})", "at $.steps[0]: no list is shown"},
-        Fault{R"({"steps": [{"select": {"start": 1}}]})", "at $.steps[0]: the text in front is too short"},
-        Fault{R"({"library": [{"items": [{"abbreviation": "q", "content": "【field:A】"}]}],
+TEST(ScenarioFaults, AreNamedWithTheirPlace) {
+    const Fault faults[] = {
+        {"", "no JSON"},
+        {"[]", "at $: expected an object"},
+        {R"({"steps": []} x)", "no JSON"},
+        {R"({"about": "a", "about": "b"})", "the key \"about\" twice"},
+        {std::string(100, '['), "nested too deeply"},
+        {"{\"text\": \"\xFF\"}", "no JSON"},
+        {R"({"txet": ""})", "at $.txet: unknown key; expected one of about, library"},
+        {R"({"text": 1})", "at $.text: expected a string"},
+        {R"({"library": [{"items": [{}, {"contentType": 4}]}]})",
+         "at $.library[0].items[1].contentType: expected a whole number from 0 to 3"},
+        {R"({"library": [{"expandAfter": 1.5}]})", "at $.library[0].expandAfter: expected a whole number"},
+        {R"({"library": [{"availability": {"availability": 3}}]})", "availability.availability: expected"},
+        {R"({"library": [{"items": [{"uuid": "x"}]}]})", "items[0].uuid: expected a UUID"},
+        {R"({"library": [{"items": [{"rtf": "{\\rtf1 x}"}]}]})", "items[0].rtf: only contentType 1"},
+        {R"({"library": [{"items": [{"contentType": 1, "rtf": "x"}]}]})", "items[0].rtf: expected RTF"},
+        {R"({"settings": {"Nonsense": 1}})", "at $.settings.Nonsense: unknown setting"},
+        {R"({"settings": {"UseClipboard": 1}})", "at $.settings.UseClipboard: expected true or false"},
+        {R"({"settings": {"UseClipboardIn": 3}})", "UseClipboardIn: expected a whole number from 0 to 2"},
+        {R"({"settings": {"RestoreClipboardDelay": -1}})", "RestoreClipboardDelay: expected a number from 0"},
+        {R"({"settings": {"UndoHotKey": 73014444032}})", "UndoHotKey: expected a packed hot key"},
+        {R"({"settings": {"UseClipboardApplications": ["a", 1]}})",
+         "$.settings.UseClipboardApplications[1]: expected a string"},
+        {R"({"applicationSettings": {"org.x": {"flags": ["usesClipboard"]}}})",
+         "$.applicationSettings[\"org.x\"].flags[0]: expected one of"},
+        {R"({"now": "2026-02-30T10:00:00"})", "at $.now: expected a moment"},
+        {R"({"now": "2026-01-31 10:00"})", "at $.now: expected a moment"},
+        {R"({"timeZone": "Mars/Olympus"})", "at $.timeZone: expected the name of a time zone"},
+        {R"({"steps": [{"type": "a", "wait": 1}]})", "at $.steps[0]: expected an object that says one thing"},
+        {R"({"steps": [{"key": 51, "modifiers": ["alt"]}]})", "at $.steps[0].modifiers[0]: expected one of"},
+        {R"({"steps": [{"key": 128}]})", "at $.steps[0].key: expected"},
+        {R"({"steps": [{"key": 1, "type": "a"}]})", "at $.steps[0].type: unknown key"},
+        {R"({"steps": [{"hotKey": "UndoHotKey"}]})", "at $.steps[0].hotKey: expected a hot key that the settings"},
+        {R"({"steps": [{"hotKey": "Undo"}]})", "at $.steps[0].hotKey: expected the name of a hot-key setting"},
+        {R"({"steps": [{"wait": -1}]})", "at $.steps[0].wait: expected a number"},
+        {R"({"steps": [{"click": false}]})", "at $.steps[0].click: expected true"},
+        {R"({"steps": [{"type": "a"}, {"form": {}}]})", "at $.steps[1]: no form is open"},
+        {R"({"steps": [{"choose": 0}]})", "at $.steps[0]: no list is shown"},
+        {R"({"steps": [{"select": {"start": 1}}]})", "at $.steps[0]: the text in front is too short"},
+        {R"({"library": [{"items": [{"abbreviation": "q", "content": "【field:A】"}]}],
                  "steps": [{"type": "q"}, {"form": {"B": ""}}]})",
-              "at $.steps[1]: the form has no field \"B\""},
-        Fault{R"({"expect": {"txt": ""}})", "at $.expect.txt: unknown key"},
-        Fault{R"({"expect": {"counts": {"keys": 1}}})", "at $.expect.counts.keys: unknown key"},
-        Fault{R"({"name": "a"})", "at $.name: unknown key"},
-        Fault{R"({"cases": []})", "at $.cases: expected at least one case"},
-        Fault{R"({"cases": {}})", "at $.cases: expected a list"},
-        Fault{R"({"cases": [{"name": "a"}], "steps": []})", "at $.steps: expected inside the cases"},
-        Fault{R"({"cases": [{"name": "a"}], "expect": {}})", "at $.expect: expected inside the cases"},
-        Fault{R"({"cases": [{"about": "a"}]})", "at $.cases[0]: expected a \"name\""},
-        Fault{R"({"cases": [{"name": ""}]})", "at $.cases[0].name: expected a name"},
-        Fault{R"({"cases": [{"name": "a"}, {"name": "a"}]})", "at $.cases[1].name: expected a name that no case"},
-        Fault{R"({"cases": [{"name": "a", "cases": []}]})", "at $.cases[0].cases: unknown key"},
-        Fault{R"({"cases": [{"name": "a"}, {"name": "b", "steps": [{"wait": -1}]}]})", "at $.cases[1].steps[0].wait"},
-        Fault{R"({"text": 1, "cases": [{"name": "a"}]})", "at $.text: expected a string"}));
+         "at $.steps[1]: the form has no field \"B\""},
+        {R"({"expect": {"txt": ""}})", "at $.expect.txt: unknown key"},
+        {R"({"expect": {"counts": {"keys": 1}}})", "at $.expect.counts.keys: unknown key"},
+        {R"({"name": "a"})", "at $.name: unknown key"},
+        {R"({"cases": []})", "at $.cases: expected at least one case"},
+        {R"({"cases": {}})", "at $.cases: expected a list"},
+        {R"({"cases": [{"name": "a"}], "steps": []})", "at $.steps: expected inside the cases"},
+        {R"({"cases": [{"name": "a"}], "expect": {}})", "at $.expect: expected inside the cases"},
+        {R"({"cases": [{"about": "a"}]})", "at $.cases[0]: expected a \"name\""},
+        {R"({"cases": [{"name": ""}]})", "at $.cases[0].name: expected a name"},
+        {R"({"cases": [{"name": "a"}, {"name": "a"}]})", "at $.cases[1].name: expected a name that no case"},
+        {R"({"cases": [{"name": "a", "cases": []}]})", "at $.cases[0].cases: unknown key"},
+        {R"({"cases": [{"name": "a"}, {"name": "b", "steps": [{"wait": -1}]}]})", "at $.cases[1].steps[0].wait"},
+        {R"({"text": 1, "cases": [{"name": "a"}]})", "at $.text: expected a string"},
+    };
+    for (const Fault& fault : faults) {
+        const ScenarioReport report = simulated(fault.text);
+        EXPECT_EQ(report.exitStatus, 2) << fault.text;
+        EXPECT_EQ(report.output, "") << "something was played";
+        EXPECT_TRUE(report.problems.starts_with("s.json: ")) << report.problems;
+        EXPECT_NE(report.problems.find(fault.message), std::string::npos) << report.problems;
+    }
+}
 
 TEST(ScenarioPlayer, ShowsBothSidesOfADifference) {
     const ScenarioReport report =

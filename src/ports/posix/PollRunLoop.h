@@ -30,8 +30,6 @@ class PollRunLoop final : public RunLoop {
     PollRunLoop& operator=(const PollRunLoop&) = delete;
 
     double now() const override;
-    CallId schedule(double delay, Call call) override;
-    void cancel(CallId id) override;
     void perform(Call call) override;
 
     // Runs until stop(), also when that came first. What is not due by then stays undone.
@@ -53,6 +51,9 @@ class PollRunLoop final : public RunLoop {
         bool ended = false;
     };
     using Moment = std::pair<double, CallId>;
+
+    CallId schedule(double delay, Call call) override;
+    void cancel(CallId id) override;
 
     void drainSources();
     void runHandedOver();

@@ -10,10 +10,6 @@ SimulatedKeyboard::SimulatedKeyboard(RunLoop& runLoop, const InputSources& input
                                      SimulatedSystemHotKeys& hotKeys, Deliver deliver)
     : runLoop_(runLoop), inputSources_(inputSources), tap_(tap), hotKeys_(hotKeys), deliver_(std::move(deliver)) {}
 
-SimulatedKeyboard::~SimulatedKeyboard() {
-    runLoop_.cancel(holdLimit_);
-}
-
 void SimulatedKeyboard::press(KeyCode keyCode) {
     const bool isModifier = !modifierFlagOf(keyCode).isEmpty();
     const bool isNew = down_.insert(keyCode).second;
@@ -52,12 +48,11 @@ EventFlags SimulatedKeyboard::flags() const {
 void SimulatedKeyboard::hold() {
     if (!canHold_) return;
     holding_ = true;
-    runLoop_.cancel(holdLimit_);
-    holdLimit_ = runLoop_.schedule(LongestHold, [this] { letGo(); });
+    holdLimit_ = runLoop_.performAfterDelay(LongestHold, [this] { letGo(); });
 }
 
 void SimulatedKeyboard::letGo() {
-    runLoop_.cancel(holdLimit_);
+    holdLimit_.cancel();
     holding_ = false;
     // A key that follows may make the rest wait again, or even let go once more.
     if (lettingGo_) return;

@@ -36,7 +36,6 @@ class SimulatedKeyboard {
     // Nothing is owned; all of it outlives the keyboard.
     SimulatedKeyboard(RunLoop& runLoop, const InputSources& inputSources, SimulatedKeyboardTap& tap,
                       SimulatedSystemHotKeys& hotKeys, Deliver deliver);
-    ~SimulatedKeyboard();
     SimulatedKeyboard(const SimulatedKeyboard&) = delete;
     SimulatedKeyboard& operator=(const SimulatedKeyboard&) = delete;
 
@@ -77,7 +76,7 @@ class SimulatedKeyboard {
     bool holding_ = false;
     bool lettingGo_ = false;
     std::deque<Waiting> waiting_;
-    RunLoop::CallId holdLimit_ = 0;
+    Timer holdLimit_;
 };
 
 }  // namespace plume

@@ -72,16 +72,6 @@ void SimulatedRunLoop::advance(double seconds) {
     advanceTo(now_ + std::max(seconds, 0.0));
 }
 
-bool SimulatedRunLoop::runUntilIdle(double maximumSeconds) {
-    const double end = now_ + maximumSeconds;
-    runReady();
-    for (auto due = nextDue(); due; due = nextDue()) {
-        if (*due > end) return false;
-        advanceTo(*due);
-    }
-    return true;
-}
-
 void SimulatedRunLoop::setNow(double seconds) {
     now_ = std::max(now_, seconds);
 }

@@ -21,16 +21,12 @@ namespace plume {
 class SimulatedRunLoop final : public RunLoop {
   public:
     double now() const override { return now_; }
-    CallId schedule(double delay, Call call) override;
-    void cancel(CallId id) override;
     void perform(Call call) override;
 
     // Runs what was handed over and what is due, and all that these ask for at once; the time stays.
     void runReady();
     // Moves the time on by `seconds`, stopping at each moment at which a call is due to run it.
     void advance(double seconds);
-    // Moves the time on from call to call until none is left, but by no more than `maximumSeconds`. True when none is.
-    bool runUntilIdle(double maximumSeconds = 60);
     // Moves the time on without running anything: the calls that are due by then come late. Earlier times are ignored.
     void setNow(double seconds);
 
@@ -39,6 +35,9 @@ class SimulatedRunLoop final : public RunLoop {
 
   private:
     using Moment = std::pair<double, CallId>;
+
+    CallId schedule(double delay, Call call) override;
+    void cancel(CallId id) override;
 
     // The next call to run now, taken from where it waits; empty when there is none.
     Call takeReadyCall();

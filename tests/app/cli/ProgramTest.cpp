@@ -18,42 +18,33 @@ using ::testing::StartsWith;
 
 // ---- Arguments ----
 
-struct WrongArguments {
-    std::vector<std::string> arguments;
-    const char* says;
-    const char* rightForm;
-};
-
-void PrintTo(const WrongArguments& one, std::ostream* stream) {
-    for (const std::string& argument : one.arguments) *stream << argument << ' ';
+TEST(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
+    const struct {
+        std::vector<std::string> arguments;
+        const char* says;
+        const char* rightForm;
+    } cases[] = {
+        {{}, "there is no command", "plume run|list|search|expand|doctor|simulate"},
+        {{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|doctor|simulate"},
+        {{"--verbose"}, "--verbose", "plume run|list|search|expand|doctor|simulate"},
+        {{"run", "--librari", "x"}, "--librari", "plume run [--library FILE.json|FILE.csv]"},
+        {{"run", "--library"}, "--library", "[--settings FILE.json]"},
+        {{"run", "now"}, "now", "plume run [--library"},
+        {{"list", "--settings", "x"}, "--settings", "plume list [--library"},
+        {{"search"}, "TEXT", "plume search TEXT"},
+        {{"expand"}, "ABBREVIATION", "plume expand ABBREVIATION"},
+        {{"expand", "a", "b"}, "b", "plume expand ABBREVIATION"},
+        {{"doctor", "--all"}, "--all", "plume doctor"},
+        {{"simulate"}, "FILE", "plume simulate FILE... [--case NAME]"},
+    };
+    for (const auto& one : cases) {
+        const ProgramResult result = ProgramHome().run(one.arguments);
+        EXPECT_EQ(result.status, 2) << one.says;
+        EXPECT_THAT(result.output, IsEmpty());
+        EXPECT_THAT(result.error, AllOf(StartsWith("plume: "), HasSubstr(one.says), HasSubstr(one.rightForm)));
+        EXPECT_EQ(std::count(result.error.begin(), result.error.end(), '\n'), 1) << result.error;
+    }
 }
-
-class Arguments : public ::testing::TestWithParam<WrongArguments> {};
-
-TEST_P(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
-    const ProgramResult result = ProgramHome().run(GetParam().arguments);
-    EXPECT_EQ(result.status, 2);
-    EXPECT_THAT(result.output, IsEmpty());
-    EXPECT_THAT(result.error,
-                AllOf(StartsWith("plume: "), HasSubstr(GetParam().says), HasSubstr(GetParam().rightForm)));
-    EXPECT_EQ(std::count(result.error.begin(), result.error.end(), '\n'), 1) << result.error;
-}
-
-INSTANTIATE_TEST_SUITE_P(
-    Kinds, Arguments,
-    ::testing::Values(WrongArguments{{}, "there is no command", "plume run|list|search|expand|doctor|simulate"},
-                      WrongArguments{{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|doctor|simulate"},
-                      WrongArguments{{"--verbose"}, "--verbose", "plume run|list|search|expand|doctor|simulate"},
-                      WrongArguments{
-                          {"run", "--librari", "x"}, "--librari", "plume run [--library FILE.json|FILE.csv]"},
-                      WrongArguments{{"run", "--library"}, "--library", "[--settings FILE.json]"},
-                      WrongArguments{{"run", "now"}, "now", "plume run [--library"},
-                      WrongArguments{{"list", "--settings", "x"}, "--settings", "plume list [--library"},
-                      WrongArguments{{"search"}, "TEXT", "plume search TEXT"},
-                      WrongArguments{{"expand"}, "ABBREVIATION", "plume expand ABBREVIATION"},
-                      WrongArguments{{"expand", "a", "b"}, "b", "plume expand ABBREVIATION"},
-                      WrongArguments{{"doctor", "--all"}, "--all", "plume doctor"},
-                      WrongArguments{{"simulate"}, "FILE", "plume simulate FILE... [--case NAME]"}));
 
 TEST(Help, HasExamplesOfEveryKind) {
     const ProgramHome home;

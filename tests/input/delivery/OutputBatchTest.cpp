@@ -56,12 +56,7 @@ struct BatchCase {
 const BatchCase Cases[] = {
     {"nothing", 0, {}, 0, {"."}, true},
     {"short", 3, {Text}, 2, {"B3 T1 L2 ."}, true},
-    {"the text starts behind the last backspaces",
-     45,
-     chunks(16),
-     0,
-     {"B20 +0.04", "B20 +0.04", "B5 T15 +0.04", "T1 ."},
-     false},
+    {"text behind the last backspaces", 45, chunks(16), 0, {"B20 +0.04", "B20 +0.04", "B5 T15 +0.04", "T1 ."}, false},
     {"20 backspaces end an output", 20, {Text}, 3, {"B20 ."}, true},
     {"as the rest, too", 40, {Text}, 0, {"B20 +0.04", "B20 ."}, false},
     {"a full batch has a pause behind it", 19, {Text}, 0, {"B19 T1 +0.04", "."}, true},

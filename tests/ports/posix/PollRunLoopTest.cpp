@@ -89,7 +89,7 @@ TEST_F(PollRunLoopTest, ASourceMayEndItself) {
         reading.end();
     });
     source.write('x');
-    loop.schedule(0.001, note("woken"));
+    const Timer waking = loop.performAfterDelay(0.001, note("woken"));
     runUntil(0.005);
     EXPECT_THAT(happened, ElementsAre("drained", "woken"));
 }
