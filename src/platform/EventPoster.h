@@ -45,7 +45,8 @@ class EventPoster {
     // Whether the user holds this key now.
     virtual bool isKeyDown(KeyCode keyCode) const = 0;
 
-    // What pastes and copies in the program in front where that is not the usual keystroke (terminals), else nothing.
+    // What pastes and copies in the program in front, where the port knows; else nothing, and the usual keystroke is
+    // sent.
     virtual std::optional<CommandKeystroke> pasteKeystroke() const = 0;
     virtual std::optional<CommandKeystroke> copyKeystroke() const = 0;
 

@@ -35,7 +35,6 @@ TEST_F(SimulatedDesktopTest, EditsTextWithTheKeyboard) {
         {u"ae\u0301", KeyCode::Delete, {}, 1, u"a", {1, 0}},
         {u"a\U0001F600", KeyCode::Left, {}, 1, u"a\U0001F600", {1, 0}},
         {u"abc", KeyCode::Left, KeyModifier::Shift, 2, u"abc", {1, 2}},
-        {u"ab\ncd", KeyCode::Up, {}, 1, u"ab\ncd", {2, 0}},
         {u"ab\ncd", KeyCode::Up, {}, 2, u"ab\ncd", {0, 0}},
         {u"a\nbcd", KeyCode::Up, {}, 1, u"a\nbcd", {1, 0}},
     };
