@@ -37,7 +37,7 @@ class ForeignOwner {
     struct Options {
         std::string selection = "CLIPBOARD";
         Behaviour behaviour = Behaviour::Answers;
-        std::size_t longestPiece = 256 * 1024;                      // longer values go in pieces
+        std::size_t longestPiece = std::size_t{256} * 1024;         // longer values go in pieces
         std::function<void(const std::string&)> beforeAnswer = {};  // gets the target; on the owner's thread
     };
 
