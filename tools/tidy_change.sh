@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
 # Runs clang-tidy on the .cpp files of the change, and through them on the headers that they include.
+# What the build folder does not build (benchmarks, fuzzers) is left out.
 #   tools/tidy_change.sh [BRANCH]
 # The change is what came since HEAD left BRANCH (origin/main when none is named). When that is HEAD itself, it is what came
 # since the newest commit older than PLUME_TIDY_SINCE ("4 hours ago"), and every file when there is no such commit.
@@ -9,8 +10,9 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 most=${PLUME_TIDY_FILES:-40}
 build=${PLUME_TIDY_BUILD:-build/default}
-sources=('src/*.cpp' 'testing/*.cpp' 'tests/*.cpp' 'bench/*.cpp')
+sources=('src/*.cpp' 'testing/*.cpp' 'tests/*.cpp')
 [ -f "$build/compile_commands.json" ] || { echo "$build is no build folder: build there first" >&2; exit 2; }
+root=$(sed -n 's/^CMAKE_HOME_DIRECTORY:INTERNAL=//p' "$build/CMakeCache.txt")
 
 # The commit that the change starts from, or nothing when all is new.
 base_commit() {
@@ -26,12 +28,18 @@ base_commit() {
     echo "$base"
 }
 
-# The changed files, those with the most new lines first. A file that only moved has none and comes last.
+# The files that the build folder builds, by their paths in the tree.
+built_files() {
+    sed -nE 's,.*"file": "(.*)".*,\1,p' "$build/compile_commands.json" | sed "s,^$root/,,"
+}
+
+# The changed files among them, those with the most new lines first. A file that only moved has none and comes last.
 changed_files() {
     local since=${1:-$(git hash-object -t tree /dev/null)}
     git diff --numstat --find-renames --diff-filter=d "$since" HEAD -- "${sources[@]}" |
         cut -f1,3 | sort -k1,1nr -k2 | cut -f2 |
-        sed -E 's/\{.* => (.*)\}/\1/; s/.* => //; s,//,/,'
+        sed -E 's/\{.* => (.*)\}/\1/; s/.* => //; s,//,/,' |
+        { grep -Fxf <(built_files) || true; }
 }
 
 base=$(base_commit "$@")
