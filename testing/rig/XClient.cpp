@@ -15,7 +15,7 @@ constexpr Milliseconds AskAgain{4};  // for what the server does not announce, s
 
 }  // namespace
 
-XClient::XClient(const std::string& display) : connection_(xcb_connect(display.c_str(), nullptr)), screen_(nullptr) {
+XClient::XClient(const std::string& display) : connection_(xcb_connect(display.c_str(), nullptr)) {
     if (xcb_connection_has_error(connection_) != 0) {
         xcb_disconnect(connection_);
         throw RigError("cannot connect to the X server " + display);

@@ -77,7 +77,7 @@ class XClient {
     xcb_window_t windowProperty(xcb_window_t window, const std::string& name);
 
     xcb_connection_t* connection_;
-    xcb_screen_t* screen_;
+    xcb_screen_t* screen_ = nullptr;
 };
 
 }  // namespace plume::rig

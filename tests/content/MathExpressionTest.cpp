@@ -1,7 +1,6 @@
 #include <gmock/gmock.h>
 #include <rapidcheck/gtest.h>
 
-#include <clocale>
 #include <cmath>
 #include <limits>
 #include <map>
@@ -104,7 +103,9 @@ TEST(MathExpression, RefusesWhatIsNestedTooDeeply) {
     EXPECT_EQ(problemOf(nested(10'000)), overflow);
     EXPECT_EQ(problemOf(nested(1'000'000)), overflow);
     EXPECT_EQ(problemOf(std::u16string(1'000'000, u'-') + u"1"), overflow);
-    std::u16string powers = u"1", assignments, calls;
+    std::u16string powers = u"1";
+    std::u16string assignments;
+    std::u16string calls;
     for (int i = 0; i < 20'000; ++i) {
         powers += u"^1";
         assignments += u"a=";
@@ -118,18 +119,11 @@ TEST(MathExpression, RefusesWhatIsNestedTooDeeply) {
 TEST(MathExpression, ReadsLongTexts) {
     std::u16string sum = u"0";
     while (sum.size() < 1'000'000) sum += u"+1";
-    EXPECT_EQ(MathExpressionParser::evaluateExpression(sum), static_cast<double>(sum.size() / 2));
+    EXPECT_EQ(MathExpressionParser::evaluateExpression(sum), static_cast<double>(sum.size() - 1) / 2);
     EXPECT_EQ(MathExpressionParser::evaluateExpression(u"0." + std::u16string(1'000'000, u'0') + u"1"), 0);
     EXPECT_EQ(MathExpressionParser::evaluateExpression(std::u16string(1'000'000, u'9')), Infinity);
     const std::u16string name(300'000, u'n');
     EXPECT_EQ(MathExpressionParser::evaluateExpression(name + u"=2;" + name), 2);
-}
-
-TEST(MathExpression, ReadsADecimalPointInEveryLocale) {
-    const std::string before = std::setlocale(LC_NUMERIC, nullptr);
-    std::setlocale(LC_NUMERIC, "de_DE.UTF-8");
-    EXPECT_EQ(MathExpressionParser::evaluateExpression(u"1.5+.5"), 2);
-    std::setlocale(LC_NUMERIC, before.c_str());
 }
 
 TEST(MathExpressionParser, KeepsVariablesFromTextToText) {

@@ -81,7 +81,7 @@ TEST(DesktopRigTest, EndsWithATestThatIsKilled) {
         DesktopRig rig;
         const auto terminal = rig.startTarget(TargetKind::Xterm);
         const std::string directory = rig.directory();
-        if (write(ends[1], directory.data(), directory.size()) > 0) raise(SIGKILL);
+        if (write(ends[1], directory.data(), directory.size()) > 0) static_cast<void>(raise(SIGKILL));
         _exit(1);
     }
     close(ends[1]);

@@ -268,7 +268,7 @@ class X11HotKeyTest : public X11ProcessTest {
     std::unique_ptr<X11SystemHotKeys> make(SessionThread& thread) {
         return thread.run([&] {
             return std::make_unique<X11SystemHotKeys>(
-                thread.session(), [this](KeyCode keyCode) -> std::optional<xcb_keycode_t> {
+                thread.session(), [](KeyCode keyCode) -> std::optional<xcb_keycode_t> {
                     if (numberOf(keyCode) > 0x7F) return std::nullopt;
                     return static_cast<xcb_keycode_t>(rig_->keyboard().keycodeOf(numberOf(keyCode)));
                 });

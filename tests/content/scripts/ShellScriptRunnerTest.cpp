@@ -34,7 +34,9 @@ std::size_t openDescriptors() {
 // Whether the process is there and not merely waiting for somebody to note its end.
 bool isAlive(pid_t pid) {
     std::ifstream stat("/proc/" + std::to_string(pid) + "/stat");
-    std::string number, name, state;
+    std::string number;
+    std::string name;
+    std::string state;
     return (stat >> number >> name >> state) && state != "Z";
 }
 
@@ -211,7 +213,7 @@ TEST_F(ShellScriptRunnerTest, AShellThatEndedIsStartedAgain) {
 }
 
 TEST_F(ShellScriptRunnerTest, DeliversTheWholeOutputAndRunsTheWholeScriptHoweverLong) {
-    const std::string expected(10'000'000, 'x');
+    const auto expected = std::string().append(10'000'000, 'x');
     EXPECT_TRUE(run("head -c 10000000 /dev/zero | tr '\\0' x") == expected);
     EXPECT_TRUE(run("#!/usr/bin/perl\nprint 'x' x 10000000; print STDERR 'y' x 1000000") == expected);
     std::string script;
@@ -307,13 +309,15 @@ TEST_F(ShellScriptRunnerTest, SharesTheShellAmongThreads) {
             EXPECT_EQ(run("#!/usr/bin/perl\nprint '" + expected + "'"), expected);
         }
     };
-    std::thread first(work, "a"), second(work, "b");
+    std::thread first(work, "a");
+    std::thread second(work, "b");
     first.join();
     second.join();
 }
 
 TEST_F(ShellScriptRunnerTest, StopsWhatRunsOnAnotherThread) {
-    const std::string shellStarted = file("shell"), perlStarted = file("perl");
+    const std::string shellStarted = file("shell");
+    const std::string perlStarted = file("perl");
     std::thread shell([&] { EXPECT_EQ(run("echo a; : >'" + shellStarted + "'; sleep 60"), "(nothing)"); });
     std::thread waiting([&] { EXPECT_EQ(run("sleep 60"), "(nothing)"); });
     std::thread perl(
