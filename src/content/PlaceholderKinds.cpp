@@ -28,7 +28,8 @@ struct PlaceholderKind {
 
 // A new kind of placeholder needs
 //  - a class beside SnippetFieldVariable.h and the others, which reads its parameters and writes them back (toString);
-//  - a row here, below those whose keyword it begins with; the editor's chips and the rest of the reading follow from it;
+//  - a row here, below those whose keyword it begins with; the editor's chips and the rest of the reading follow
+//    from it;
 //  - what it asks of the world (the clock, the clipboard) as a member of ContentEnvironment, so that tests can fix it;
 //  - when text takes its place at once: a branch in PlaceholderScanner::replaceBy. Otherwise it is recorded with its
 //    location, and whoever delivers the content (PLOutput.cpp), shows it in the form or asks after it

@@ -30,7 +30,7 @@ InputTestSocket::InputTestSocket(const std::filesystem::path& path)
     sockaddr_un address{};
     address.sun_family = AF_UNIX;
     if (path.native().size() >= sizeof address.sun_path) throw RigError("too long for a socket: " + path.string());
-    std::strcpy(address.sun_path, path.c_str());
+    path.native().copy(address.sun_path, sizeof address.sun_path);
     if (connect(socket_.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0) {
         throw RigError("cannot reach the test device " + path.string() + ": " + std::strerror(errno));
     }

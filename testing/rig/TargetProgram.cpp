@@ -5,7 +5,6 @@
 
 #include <algorithm>
 #include <array>
-#include <cstring>
 #include <nlohmann/json.hpp>
 
 #include "testing/rig/Deadline.h"
@@ -24,7 +23,7 @@ FileDescriptor listenAt(const std::filesystem::path& path) {
     sockaddr_un address{};
     address.sun_family = AF_UNIX;
     if (path.native().size() >= sizeof address.sun_path) throw RigError("too long for a socket: " + path.string());
-    std::strcpy(address.sun_path, path.c_str());
+    path.native().copy(address.sun_path, sizeof address.sun_path);
     unlink(path.c_str());
     if (bind(listener.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0 ||
         listen(listener.get(), 1) != 0) {

@@ -13,7 +13,7 @@ namespace {
 constexpr Milliseconds StartBound{20'000};
 
 std::filesystem::path requireServer() {
-    const auto server = requireFile({"/usr/lib/xorg/Xorg", "/usr/libexec/Xorg", "/usr/bin/Xorg"}, "xserver-xorg-core");
+    auto server = requireFile({"/usr/lib/xorg/Xorg", "/usr/libexec/Xorg", "/usr/bin/Xorg"}, "xserver-xorg-core");
     const std::filesystem::path modules = "/usr/lib/xorg/modules";
     requireFile({modules / "input/inputtest_drv.so"}, "xserver-xorg-core");
     requireFile({modules / "drivers/dummy_drv.so"}, "xserver-xorg-video-dummy");
