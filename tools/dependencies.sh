@@ -20,8 +20,8 @@ need_packages() {
 BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config libcanberra-dev libcli11-dev libdbus-1-dev
     libicu-dev libx11-dev libxcb-xfixes0-dev libxcb-xinput-dev libxcb-xkb-dev libxcb-xtest0-dev libxcb1-dev
     libxkbcommon-dev libxkbcommon-x11-dev nlohmann-json3-dev)
-TEST_PACKAGES=(libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
-CHECK_PACKAGES=(clang clang-format clang-tidy libclang-rt-14-dev git)
+TEST_PACKAGES=(clang libclang-rt-14-dev libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
+CHECK_PACKAGES=(clang-format clang-tidy git)
 
 # build <preset> [CMake options]: configures and builds, quietly unless something is wrong.
 build() {
