@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Runs clang-tidy on the .cpp files of the change, and through them on the headers that they include.
-# What the build folder does not build (benchmarks, fuzzers) is left out.
+# What the build folder does not build (in build/default, benchmarks and fuzzers) is left out.
 #   tools/tidy_change.sh [BRANCH]
 # The change is what came since HEAD left BRANCH (origin/main when none is named). When that is HEAD itself, it is what came
 # since the newest commit older than PLUME_TIDY_SINCE ("4 hours ago"), and every file when there is no such commit.
@@ -10,7 +10,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 most=${PLUME_TIDY_FILES:-40}
 build=${PLUME_TIDY_BUILD:-build/default}
-sources=('src/*.cpp' 'testing/*.cpp' 'tests/*.cpp')
+sources=('src/*.cpp' 'testing/*.cpp' 'tests/*.cpp' 'bench/*.cpp')
 [ -f "$build/compile_commands.json" ] || { echo "$build is no build folder: build there first" >&2; exit 2; }
 root=$(sed -n 's/^CMAKE_HOME_DIRECTORY:INTERNAL=//p' "$build/CMakeCache.txt")
 

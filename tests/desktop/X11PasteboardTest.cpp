@@ -65,11 +65,7 @@ class NotingOwner final : public PasteboardOwner {
         changed_.notify_all();
     }
 
-    std::vector<std::string> taken() const {
-        const std::lock_guard lock(mutex_);
-        return taken_;
-    }
-    // What was taken, once that is so many.
+    // What was taken, once that is at least so many.
     std::vector<std::string> awaitTaken(std::size_t count) {
         std::unique_lock lock(mutex_);
         changed_.wait_for(lock, std::chrono::seconds(10), [&] { return taken_.size() >= count; });
@@ -78,7 +74,7 @@ class NotingOwner final : public PasteboardOwner {
 
   private:
     const Contents contents_;
-    mutable std::mutex mutex_;
+    std::mutex mutex_;
     std::condition_variable changed_;
     std::vector<std::string> taken_;
 };
@@ -249,7 +245,7 @@ TEST_F(X11PasteboardTest, OnlyWhatTheProgramInFrontHasReadWasTaken) {
     manager.readAll("CLIPBOARD");
     front.targets("CLIPBOARD");
     front.request("CLIPBOARD", "TIMESTAMP");
-    EXPECT_THAT(owner.taken(), IsEmpty());
+    EXPECT_THAT(owner.awaitTaken(0), IsEmpty());
     front.request("CLIPBOARD", "UTF8_STRING");
     EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
     manager.readAll("CLIPBOARD");
@@ -264,7 +260,7 @@ TEST_F(X11PasteboardTest, LongContentWasTakenWithItsLastPiece) {
     front.comeToFront(rig_->client());
     declare({String}, &owner);
     front.requestAndStop("CLIPBOARD", "UTF8_STRING");
-    EXPECT_THAT(owner.taken(), IsEmpty());
+    EXPECT_THAT(owner.awaitTaken(0), IsEmpty());
     EXPECT_EQ(front.request("CLIPBOARD", "UTF8_STRING")->bytes, text);
     EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
 }

@@ -1,7 +1,7 @@
 // How output is delivered into one application.
 //
-// A plain record. The built-in table names the applications that need something special; others
-// can be added to it. Settings in the table are never changed in place: the resolver hands out copies of table entries.
+// A plain record. The built-in table names the applications that need something special; others can be added to it.
+// Settings in the table are never changed in place: the resolver hands out copies of table entries.
 // The families found by the start or the end of an identifier are shared records, and what delivery sets in one of them
 // stays set.
 #pragma once

@@ -7,28 +7,35 @@ namespace {
 
 using enum InputFlag;
 
-struct SettingCase {
-    const char16_t* application;
-    bool isKnown;
-    InputFlags flags;
-};
-
 // By the whole identifier, its beginning, its end, a part of it, or not at all.
 TEST(ContextInputSettings, KnowsApplicationsAndTheirFamilies) {
-    const SettingCase cases[] = {
-        {u"org.example.editor", false, {}},
-        {u"com.google.Chrome", true, IncludeHTMLData | UseClipboardIfHasNewLine},
-        {u"com.jetbrains.intellij", true, UseClipboardIfHasNewLine},
-        {u"com.jetbrains", false, {}},
-        {u"com.codeweavers.CrossOverHelper.x", true, UseClipboard},
-        {u"some.game.wineskin.prefs", true, UseClipboard | UseControlKey | DoNotRestoreClipboard},
+    const InputFlags virtualMachine = DisableCapitalization | UseClipboard | AlternativePasting;
+    const struct {
+        const char16_t* application;
+        InputFlags flags;  // none: not known
+        double pastingDelay = 0;
+        double afterPastingDelay = 0;
+    } cases[] = {
+        {u"org.example.editor", {}},
+        {u"com.google.Chrome", IncludeHTMLData | UseClipboardIfHasNewLine, 0, 0.05},
+        {u"org.virtualbox.app.VirtualBoxVM", virtualMachine | UseControlKey | DelayPasting | DoNotRestoreClipboard,
+         0.2},
+        {u"com.vmware.proxyApp.1234", virtualMachine | UseVMHelper | UseControlKey | ClickAtVMHelper},
+        {u"com.parallels.winapp.x", virtualMachine | Reactivate | DoNotRestoreClipboard},
+        {u"com.jetbrains.intellij", UseClipboardIfHasNewLine},
+        {u"com.jetbrains", {}},
+        {u"com.adobe.Photoshop", UseClipboard},
+        {u"com.codeweavers.CrossOverHelper.x", UseClipboard},
+        {u"some.game.wineskin.prefs", UseClipboard | UseControlKey | DoNotRestoreClipboard},
     };
     ContextInputSettings settings;
-    for (const SettingCase& expected : cases) {
-        bool isKnown = !expected.isKnown;
+    for (const auto& expected : cases) {
+        bool isKnown = false;
         const auto setting = settings.resolve(expected.application, isKnown);
-        EXPECT_EQ(isKnown, expected.isKnown);
+        EXPECT_EQ(isKnown, !expected.flags.isEmpty());
         EXPECT_EQ(setting->flags.bits(), expected.flags.bits());
+        EXPECT_EQ(setting->pastingDelay, expected.pastingDelay);
+        EXPECT_EQ(setting->afterPastingDelay, expected.afterPastingDelay);
         EXPECT_EQ(setting->bundleIdentifier, expected.application);
     }
 }
@@ -40,16 +47,6 @@ TEST(ContextInputSettings, EntriesAreCopiedAndFamiliesAreShared) {
     EXPECT_FALSE(settings.resolve(u"com.microsoft.Word", isKnown)->has(UseClipboard));
     settings.resolve(u"com.jetbrains.clion", isKnown)->flags |= UseClipboard;
     EXPECT_TRUE(settings.resolve(u"com.jetbrains.pycharm", isKnown)->has(UseClipboard));
-}
-
-TEST(ContextInputSettings, APortAddsItsOwnApplications) {
-    ContextInputSettings settings;
-    auto terminal = std::make_shared<ContextInputSetting>();
-    terminal->flags = UseControlKey;
-    settings.set(u"xterm", terminal);
-    bool isKnown = false;
-    EXPECT_TRUE(settings.resolve(u"xterm", isKnown)->has(UseControlKey));
-    EXPECT_TRUE(isKnown);
     EXPECT_EQ(settings.resolve(std::nullopt, isKnown)->flags, InputFlags());
     EXPECT_FALSE(isKnown);
 }
