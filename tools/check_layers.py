@@ -21,7 +21,8 @@ MAY_SEE = {
     "platform": {"Foundation", "Foundation/text"},
     "ports/posix": PORT,
     "ports/simulated": PORT,
-    "ports/atspi": PORT | {"ports/posix"},
+    "ports/dbus": PORT | {"ports/posix"},
+    "ports/atspi": PORT | {"ports/posix", "ports/dbus"},
     "ports/x11": PORT | {"ports/posix"},
     "ports/x11/windows": PORT | {"ports/posix", "ports/x11"},
     "ports/x11/clipboard": PORT | {"ports/posix", "ports/x11"},
@@ -33,9 +34,9 @@ MAY_SEE = {
     "input": FOUNDATION | {"platform", "library", "content"},
     "engine": FOUNDATION | {"platform", "library", "content", "content/scripts", "input"},
     "app": CORE,
-    "app/linux": CORE | X11 | {"app", "ports/posix", "ports/atspi"},
+    "app/linux": CORE | X11 | {"app", "ports/posix", "ports/dbus", "ports/atspi"},
     "scenario": CORE | {"app", "ports/simulated", "ports/posix"},
-    "app/cli": CORE | X11 | {"app", "app/linux", "scenario", "ports/posix", "ports/atspi"},
+    "app/cli": CORE | X11 | {"app", "app/linux", "scenario", "ports/posix", "ports/dbus", "ports/atspi"},
 }
 # Foreign headers by folder; everything else that is included with <…> is the standard library's or the system's.
 FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib|nlohmann/|canberra)")
@@ -44,6 +45,7 @@ MAY_USE = {
     "": ("unicode/",),
     "ports/x11": ("xcb/", "X11/", "xkbcommon/"),
     "ports/atspi": ("dbus",),
+    "ports/dbus": ("dbus",),
     "ports/posix": ("canberra",),
     "Foundation/json": ("nlohmann/",),
     "library": ("nlohmann/",),

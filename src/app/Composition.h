@@ -15,6 +15,7 @@
 #include "engine/AutoText.h"
 #include "input/BundleIdentifierResolver.h"
 #include "input/MacInputService.h"
+#include "platform/Notices.h"
 #include "platform/ProcessLauncher.h"
 #include "platform/Sounds.h"
 #include "platform/UserDefaults.h"
@@ -35,6 +36,7 @@ class Composition {
         SecureInput& secureInput;
         SystemHotKeys& systemHotKeys;
         Sounds& sounds;
+        Notices& notices;
         ProcessLauncher& processLauncher;
         RunLoop& tapLoop;
         RunLoop& mainLoop;  // may be the same loop as tapLoop

@@ -57,6 +57,7 @@ Composition::Ports ScenarioRun::ports() {
             desktop_.secureInput(),
             desktop_.systemHotKeys(),
             desktop_.sounds(),
+            desktop_.notices(),
             launcher_,
             loop_,
             loop_};

@@ -41,7 +41,8 @@ class WindowlessProgram : public testing::Test {
     Composition program_{
         {desktop_.keyboardTap(), desktop_.mouseTap(), desktop_.poster(), desktop_.pasteboard(),
          desktop_.processManager(), desktop_.inputSources(), desktop_.accessibility(), desktop_.secureInput(),
-         desktop_.systemHotKeys(), desktop_.sounds(), launcher_, desktop_.runLoop(), desktop_.runLoop()},
+         desktop_.systemHotKeys(), desktop_.sounds(), desktop_.notices(), launcher_, desktop_.runLoop(),
+         desktop_.runLoop()},
         {*settings_, [this](const std::string& message) { told_.push_back(message); }, [](const std::string&) {}}};
 };
 

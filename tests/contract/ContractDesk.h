@@ -17,6 +17,7 @@
 #include "platform/InputSources.h"
 #include "platform/KeyboardTap.h"
 #include "platform/MouseTap.h"
+#include "platform/Notices.h"
 #include "platform/Pasteboard.h"
 #include "platform/ProcessManager.h"
 #include "platform/RunLoop.h"
@@ -51,6 +52,7 @@ class ContractDesk {
     virtual SecureInput& secureInput() = 0;
     virtual SystemHotKeys& systemHotKeys() = 0;
     virtual MouseTap& mouseTap() = 0;
+    virtual Notices& notices() = 0;
 
     // Whether the poster can make the user's keys wait.
     virtual bool canHoldUserKeys() = 0;
@@ -73,6 +75,9 @@ class ContractDesk {
     virtual std::optional<std::u16string> readElsewhere() = 0;
     // Another program takes the keyboard to itself, or gives it back.
     virtual void setKeyboardHeldElsewhere(bool held) = 0;
+    // What the notice with that title says, if it is shown; and the user presses a button of it.
+    virtual std::optional<std::string> notice(const std::string& title) = 0;
+    virtual void pressNoticeButton(const std::string& title, const std::string& label) = 0;
 };
 
 template <typename Bench>
@@ -105,6 +110,7 @@ class InputSourcesContract : public DeskContract {};
 class AccessibilityContract : public DeskContract {};
 class SecureInputContract : public DeskContract {};
 class MouseTapContract : public DeskContract {};
+class NoticesContract : public DeskContract {};
 
 class SystemHotKeysContract : public DeskContract {
   protected:

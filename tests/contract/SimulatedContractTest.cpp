@@ -1,4 +1,6 @@
 // The simulated desktop keeps what the platform's headers promise.
+#include <algorithm>
+
 #include "ports/simulated/SimulatedDesktop.h"
 #include "tests/contract/ContractDesk.h"
 
@@ -31,6 +33,7 @@ class SimulatedDesk final : public ContractDesk {
     SecureInput& secureInput() override { return desktop_.secureInput(); }
     SystemHotKeys& systemHotKeys() override { return desktop_.systemHotKeys(); }
     MouseTap& mouseTap() override { return desktop_.mouseTap(); }
+    Notices& notices() override { return desktop_.notices(); }
     bool canHoldUserKeys() override { return canHoldUserKeys_; }
 
     bool runUntil(const std::function<bool()>& condition) override {
@@ -53,6 +56,15 @@ class SimulatedDesk final : public ContractDesk {
     void copyElsewhere(const std::u16string& text) override { desktop_.pasteboard().copyFromProgram(text); }
     std::optional<std::u16string> readElsewhere() override { return desktop_.pasteboard().string(); }
     void setKeyboardHeldElsewhere(bool held) override { desktop_.secureInput().setEnabled(held); }
+
+    std::optional<std::string> notice(const std::string& title) override {
+        const auto& shown = desktop_.notices().shown();
+        const auto found = std::ranges::find(shown, title, &Notice::title);
+        return found != shown.end() ? std::optional(found->body) : std::nullopt;
+    }
+    void pressNoticeButton(const std::string& title, const std::string& label) override {
+        desktop_.notices().press(title, label);
+    }
 
   private:
     static std::u16string nameOf(Program program) {
@@ -78,5 +90,6 @@ INSTANTIATE_TEST_SUITE_P(Simulated, AccessibilityContract, testing::Values(Desk)
 INSTANTIATE_TEST_SUITE_P(Simulated, SecureInputContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(Simulated, SystemHotKeysContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(Simulated, MouseTapContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(Simulated, NoticesContract, testing::Values(Desk));
 
 }  // namespace plume

@@ -110,6 +110,17 @@ TEST_P(SystemHotKeysContract, ForgetsWhatWasUnregistered) {
     EXPECT_EQ(called, "a");
 }
 
+TEST_P(NoticesContract, TellOfTheButtonThatWasPressedAndOfNoOther) {
+    std::string pressed;
+    const auto write = [&pressed](char c) { return [&pressed, c] { pressed += c; }; };
+    desk_->notices().show({"First", "1 < 2 & so on", {{"Yes", write('y')}, {"No", write('n')}}});
+    desk_->notices().show({"Second", "Nothing to press."});
+    EXPECT_TRUE(desk_->runUntil([&] { return desk_->notice("First") && desk_->notice("Second"); }));
+    desk_->pressNoticeButton("First", "No");
+    EXPECT_TRUE(desk_->runUntil([&] { return !pressed.empty(); }));
+    EXPECT_EQ(pressed, "n");
+}
+
 TEST_P(MouseTapContract, HearsClicksWithTheirPlaceAndNoWheel) {
     using Button = ContractDesk::Button;
     struct Case {

@@ -10,6 +10,7 @@
 #include "app/linux/LinuxPort.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
+#include "testing/rig/NoticeBoard.h"
 #include "testing/rig/SelectionClients.h"
 #include "testing/rig/XcbReply.h"
 #include "tests/contract/ContractDesk.h"
@@ -32,6 +33,7 @@ const std::map<KeyCode, int> Keycodes{{KeyCode::A, 38},
 struct Desktop {
     Desktop() {
         rig.session().join();
+        notices = std::make_unique<NoticeBoard>();
         auto opened = LinuxPort::open(rig.server().display());
         if (!opened) throw RigError(opened.error().message);
         port = std::move(opened).value();
@@ -40,6 +42,7 @@ struct Desktop {
     DesktopRig rig;
     std::unique_ptr<TargetProgram> second = rig.startTarget(TargetKind::GtkTextView);
     std::unique_ptr<TargetProgram> first = rig.startTarget(TargetKind::GtkTextView);
+    std::unique_ptr<NoticeBoard> notices;
     std::unique_ptr<LinuxPort> port;
 };
 
@@ -106,6 +109,7 @@ class X11Desk final : public ContractDesk {
     SecureInput& secureInput() override { return ports_.secureInput; }
     SystemHotKeys& systemHotKeys() override { return ports_.systemHotKeys; }
     MouseTap& mouseTap() override { return ports_.mouseTap; }
+    Notices& notices() override { return ports_.notices; }
     bool canHoldUserKeys() override { return true; }
 
     bool runUntil(const std::function<bool()>& condition) override {
@@ -114,6 +118,8 @@ class X11Desk final : public ContractDesk {
         do {
             const Timer look = loop.performAfterDelay(Step, [&loop] { loop.stop(); });
             loop.run();
+            desktop_.port->mainLoop().perform([this] { desktop_.port->mainLoop().stop(); });
+            desktop_.port->mainLoop().run();
             if (condition()) return true;
         } while (!deadline.passed());
         return false;
@@ -162,6 +168,11 @@ class X11Desk final : public ContractDesk {
         });
     }
 
+    std::optional<std::string> notice(const std::string& title) override { return desktop_.notices->body(title); }
+    void pressNoticeButton(const std::string& title, const std::string& label) override {
+        desktop_.notices->press(title, label);
+    }
+
   private:
     TargetProgram& target(Program program) const {
         return program == Program::First ? *desktop_.first : *desktop_.second;
@@ -195,5 +206,6 @@ INSTANTIATE_TEST_SUITE_P(X11, AccessibilityContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(X11, SecureInputContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(X11, SystemHotKeysContract, testing::Values(Desk));
 INSTANTIATE_TEST_SUITE_P(X11, MouseTapContract, testing::Values(Desk));
+INSTANTIATE_TEST_SUITE_P(X11, NoticesContract, testing::Values(Desk));
 
 }  // namespace plume

@@ -65,6 +65,7 @@ class Run {
             signalfd_siginfo signal{};
             if (read(signals, &signal, sizeof signal) == sizeof signal) end(ExitStatus::Success);
         });
+        port_.setCannotShowNotice([this](const std::string& body) { voice_.say(body); });
         port_.setServerGone([this] {
             voice_.say("The X server is gone.");
             end(ExitStatus::Failure);

@@ -117,9 +117,8 @@ std::optional<std::u16string> LinuxPort::frontIdentifier() const {
 }
 
 Composition::Ports LinuxPort::ports() {
-    return {*keyboardTap_,    *mouseTap_,     *poster_,      *pasteboard_,    *processManager_,
-            *inputSources_,   accessibility_, *secureInput_, *systemHotKeys_, sounds_,
-            processLauncher_, tapLoop_,       mainLoop_};
+    return {*keyboardTap_, *mouseTap_,      *poster_, *pasteboard_, *processManager_, *inputSources_, accessibility_,
+            *secureInput_, *systemHotKeys_, sounds_,  notices_,     processLauncher_, tapLoop_,       mainLoop_};
 }
 
 }  // namespace plume

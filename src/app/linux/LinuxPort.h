@@ -9,10 +9,12 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "Foundation/Result.h"
 #include "app/Composition.h"
 #include "ports/atspi/AtspiAccessibility.h"
+#include "ports/dbus/DesktopNotices.h"
 #include "ports/posix/CanberraSounds.h"
 #include "ports/posix/PollRunLoop.h"
 #include "ports/posix/PosixProcessLauncher.h"
@@ -45,6 +47,8 @@ class LinuxPort {
     PollRunLoop& tapLoop() { return tapLoop_; }
     PollRunLoop& mainLoop() { return mainLoop_; }
 
+    // Told, on the main thread, what a desktop without notices cannot show. Before the loops run.
+    void setCannotShowNotice(DesktopNotices::CannotShow cannotShow) { notices_.setCannotShow(std::move(cannotShow)); }
     // Called once, on the tap thread, when the X server is gone.
     void setServerGone(std::function<void()> listener) { session_->serverGone = std::move(listener); }
     // Last of all, on the tap thread, when its loop has ended: what Plume offers on the clipboard stays there.
@@ -64,6 +68,7 @@ class LinuxPort {
     PollRunLoop tapLoop_;
     PosixProcessLauncher processLauncher_;
     CanberraSounds sounds_;
+    DesktopNotices notices_{mainLoop_};
     AtspiAccessibility accessibility_;
     SharedClipboardCopy clipboardCopy_;
     std::unique_ptr<X11Session> session_;

@@ -1,17 +1,8 @@
 #include "ports/atspi/AtspiAccessibility.h"
 
-#include <chrono>
-#include <utility>
-
 #include "ports/atspi/AtspiElement.h"
 
 namespace plume {
-
-namespace {
-
-constexpr std::chrono::milliseconds LongestGoodbye{50};
-
-}  // namespace
 
 std::string_view sentenceOf(AccessibilityStatus status) {
     switch (status) {
@@ -36,50 +27,36 @@ std::string_view sentenceOf(AccessibilityStatus status) {
     return "";
 }
 
-AtspiAccessibility::AtspiAccessibility() : session_(std::make_shared<AtspiSession>()) {
-    std::promise<void> ended;
-    ended_ = ended.get_future();
-    thread_ = std::thread([session = session_, ended = std::move(ended)]() mutable {
-        session->run();
-        ended.set_value();
-    });
-}
+AtspiAccessibility::AtspiAccessibility() : thread_(std::make_shared<AtspiSession>()) {}
 
-AtspiAccessibility::~AtspiAccessibility() {
-    session_->end();
-    if (ended_.wait_for(LongestGoodbye) == std::future_status::ready) {
-        thread_.join();
-    } else {
-        thread_.detach();
-    }
-}
+AtspiAccessibility::~AtspiAccessibility() = default;
 
 std::shared_ptr<UIElement> AtspiAccessibility::frontApplicationElement() const {
-    return session_->focus().isKnown() ? std::make_shared<AtspiApplicationElement>(session_) : nullptr;
+    return thread_->focus().isKnown() ? std::make_shared<AtspiApplicationElement>(thread_.session()) : nullptr;
 }
 
 void AtspiAccessibility::setFrontProcess(pid_t process) {
-    session_->tracker().setFrontProcess(process);
+    thread_->tracker().setFrontProcess(process);
 }
 
 void AtspiAccessibility::focusMayHaveMoved() {
-    session_->tracker().focusMayHaveMoved();
+    thread_->tracker().focusMayHaveMoved();
 }
 
 void AtspiAccessibility::userTypes() {
-    session_->tracker().userTypes();
+    thread_->tracker().userTypes();
 }
 
 bool AtspiAccessibility::focusIsPassword() const {
-    return session_->focus().isPassword();
+    return thread_->focus().isPassword();
 }
 
 pid_t AtspiAccessibility::focusedProcess() const {
-    return session_->focus().process();
+    return thread_->focus().process();
 }
 
 AccessibilityStatus AtspiAccessibility::status() const {
-    return session_->status();
+    return thread_->status();
 }
 
 }  // namespace plume

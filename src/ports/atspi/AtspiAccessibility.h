@@ -11,12 +11,11 @@
 #include <sys/types.h>
 
 #include <atomic>
-#include <future>
 #include <memory>
 #include <string_view>
-#include <thread>
 
 #include "platform/Accessibility.h"
+#include "ports/dbus/BusThread.h"
 
 namespace plume {
 
@@ -69,10 +68,8 @@ class AtspiAccessibility final : public Accessibility {
     AccessibilityStatus status() const;
 
   private:
-    std::shared_ptr<AtspiSession> session_;  // shared with the thread, which may outlive this object
     std::atomic<double> screenHeight_ = 0;
-    std::future<void> ended_;
-    std::thread thread_;
+    BusThread<AtspiSession> thread_;
 };
 
 }  // namespace plume

@@ -1,9 +1,5 @@
 #include "ports/atspi/AtspiSession.h"
 
-#include <unistd.h>
-
-#include <cstdlib>
-
 namespace plume {
 
 namespace {
@@ -11,17 +7,6 @@ namespace {
 using std::chrono::steady_clock;
 
 constexpr int AnswerBoundMilliseconds = 3'000;
-
-// Not libdbus's own search for it, which would start a bus where there is none. Empty when there is none.
-std::string sessionAddress() {
-    const char* address = std::getenv("DBUS_SESSION_BUS_ADDRESS");
-    if (address != nullptr && *address != '\0') return address;
-    const char* folder = std::getenv("XDG_RUNTIME_DIR");
-    const std::string socket = std::string(folder != nullptr ? folder : "") + "/bus";
-    if (folder == nullptr || access(socket.c_str(), F_OK) != 0) return {};
-    const std::unique_ptr<char, void (*)(void*)> escaped(dbus_address_escape_value(socket.c_str()), dbus_free);
-    return escaped ? std::string("unix:path=") + escaped.get() : std::string();
-}
 
 BusAnswer ask(DBusConnection& bus, const char* interface, const char* method,
               std::initializer_list<BusValue> arguments = {}) {
@@ -40,7 +25,7 @@ constexpr std::chrono::seconds TimeBetweenTries{30};
 }  // namespace
 
 AccessibilityBus findAccessibilityBus() {
-    const std::string session = sessionAddress();
+    const std::string session = sessionBusAddress();
     const BusConnection bus = session.empty() ? nullptr : openBus(session);
     if (!bus) return {AccessibilityStatus::NoSession, {}};
     const auto address = ask(*bus, "org.a11y.Bus", "GetAddress").values().string();
@@ -70,7 +55,6 @@ std::optional<AtspiPart> AtspiSession::askForFocus() {
 }
 
 void AtspiSession::run() {
-    dbus_threads_init_default();  // another session's thread may still be leaving
     connect();
     queue_.run();
 }

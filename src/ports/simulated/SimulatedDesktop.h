@@ -18,6 +18,7 @@
 #include "ports/simulated/SimulatedKeyboard.h"
 #include "ports/simulated/SimulatedKeyboardTap.h"
 #include "ports/simulated/SimulatedMouseTap.h"
+#include "ports/simulated/SimulatedNotices.h"
 #include "ports/simulated/SimulatedPasteboard.h"
 #include "ports/simulated/SimulatedProcessManager.h"
 #include "ports/simulated/SimulatedRunLoop.h"
@@ -46,6 +47,7 @@ class SimulatedDesktop {
     SimulatedSecureInput& secureInput() { return secureInput_; }
     SimulatedSystemHotKeys& systemHotKeys() { return systemHotKeys_; }
     SimulatedSounds& sounds() { return sounds_; }
+    SimulatedNotices& notices() { return notices_; }
 
     // The program with this bundle identifier, which is started when it does not run yet. Good as long as the desktop.
     SimulatedApplication& application(const std::u16string& bundleIdentifier);
@@ -80,6 +82,7 @@ class SimulatedDesktop {
     SimulatedEventPoster poster_;
     SimulatedSecureInput secureInput_;
     SimulatedSounds sounds_;
+    SimulatedNotices notices_;
     std::map<std::u16string, std::unique_ptr<SimulatedApplication>> applications_;
 };
 

@@ -1,0 +1,56 @@
+// A connection to a bus on which services are called, and heard, without waiting for them.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <map>
+#include <string>
+
+#include "ports/dbus/BusMessages.h"
+#include "ports/posix/PollRunLoop.h"
+
+namespace plume {
+
+// Belongs to the thread of its loop, which outlives it.
+class ServiceBus {
+  public:
+    using Reply = std::function<void(const BusAnswer& answer)>;
+
+    explicit ServiceBus(PollRunLoop& loop) : loop_(loop) {}
+    ~ServiceBus() { disconnect(); }
+    ServiceBus(const ServiceBus&) = delete;
+    ServiceBus& operator=(const ServiceBus&) = delete;
+
+    // Every signal that was listened for. It may call anything here.
+    std::function<void(DBusMessage& signal)> heard;
+    // The bus is gone.
+    std::function<void()> lost;
+
+    // Instead of an earlier connection. May wait for the bus for as long as libdbus does.
+    bool connect(const std::string& address);
+    // Calls that wait for an answer are forgotten.
+    void disconnect();
+    bool isConnected() const { return connection_ != nullptr; }
+
+    // The answer comes later, from the loop; an empty one when the service refuses, or says nothing for some seconds.
+    void call(const BusMessage& message, Reply reply);
+    // From now on, signals of this match rule.
+    void listen(const std::string& rule);
+
+  private:
+    struct Waiting {
+        Reply reply;
+        Timer limit;
+    };
+
+    void drain();
+    void take(DBusMessage& message);
+    void answer(std::uint32_t serial, BusAnswer answer);
+
+    PollRunLoop& loop_;
+    BusConnection connection_;
+    std::map<std::uint32_t, Waiting> waiting_;
+    Subscription source_;
+};
+
+}  // namespace plume
