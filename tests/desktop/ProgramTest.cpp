@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <fstream>
 #include <string>
 
 #include "testing/rig/Deadline.h"
@@ -71,7 +72,6 @@ TEST_P(ProgramInTarget, ExpandsWhatIsTyped) {
 
 // A snippet that leaves a mark elsewhere tells whether Plume listened: what a password field holds is nobody's
 // business.
-// A terminal does not tell that a password is typed into it.
 class ProgramInPasswordField : public ProgramInTarget {};
 
 TEST_P(ProgramInPasswordField, DoesNotListen) {
@@ -88,6 +88,24 @@ TEST_P(ProgramInPasswordField, DoesNotListen) {
     EXPECT_FALSE(listens());
     target->showPassword(false);
     EXPECT_TRUE(waitUntil(listens, Bound)) << log();
+}
+
+TEST_F(Program, DoesNotListenToWhatAPromptInATerminalHides) {
+    const auto home = rig_->directory() / "home";
+    const xcb_window_t before = rig_->client().focusedWindow();
+    const auto terminal = rig_->session().start(
+        {"xterm", "-e", "sh", "-c",
+         "cd; read a; stty -echo; >hidden; read b; stty echo; >shown; read c; echo \"$a|$b|$c\" >all; mv all read"},
+        "xterm");
+    ASSERT_TRUE(waitUntil([&] { return rig_->client().focusedWindow() != before; }, Bound));
+    for (const char* next : {"hidden", "shown", "read"}) {
+        rig_->keyboard().type(";sig");
+        rig_->keyboard().tap(Key::Return);
+        ASSERT_TRUE(waitUntil([&] { return std::filesystem::exists(home / next); }, Bound)) << next << log();
+    }
+    std::string read;
+    std::getline(std::ifstream(home / "read"), read);
+    EXPECT_EQ(read, "Kind regards, Jo|;sig|Kind regards, Jo");
 }
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,

@@ -57,7 +57,7 @@ Result<void> LinuxPort::openKeyboard(const std::string& display) {
 }
 
 Result<void> LinuxPort::openDesktop(const std::string& display) {
-    const auto focusIsPassword = [this] { return accessibility_.focusIsPassword(); };
+    const auto focusIsPassword = [this] { return accessibility_.focusIsPassword() || hiddenPrompts_.isWaiting(); };
     if (auto opened = keep(X11Pasteboard::open(*session_), pasteboard_); !opened) return opened;
     if (auto opened = keep(X11SecureInput::open(display, focusIsPassword), secureInput_); !opened) return opened;
     mouseTap_ = std::make_unique<X11MouseTap>(*session_);
@@ -68,7 +68,8 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
             const xcb_keycode_t keycode = keyboard_->keymap()->keycodeOf(keyCode);
             return keycode != 0 ? std::optional(keycode) : std::nullopt;
         });
-    keyboardTap_->setFocusIsPassword(focusIsPassword);
+    keyboardTap_->setFocusIsPassword(
+        [this] { return accessibility_.focusIsPassword() || hiddenPrompts_.isWaitingForKey(); });
     return {};
 }
 
@@ -90,20 +91,28 @@ void LinuxPort::connectParts() {
 void LinuxPort::followFocus() {
     keyboardTap_->setUserTyped([this](KeyCode keyCode, EventFlags flags) {
         if (movesFocus(keyCode, flags)) {
-            accessibility_.focusMayHaveMoved();
+            focusMayHaveMoved();
         } else {
             accessibility_.userTypes();
+            hiddenPrompts_.userTypes();
         }
     });
-    mouseTap_->clicked = [this] { accessibility_.focusMayHaveMoved(); };
+    mouseTap_->clicked = [this] { focusMayHaveMoved(); };
     processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
     tapLoop_.perform([this] { tellFrontProcess(); });
 }
 
 void LinuxPort::tellFrontProcess() {
     const auto application = foregroundApplication(*processManager_);
-    accessibility_.setFrontProcess(application ? static_cast<pid_t>(application->processIdentifier) : 0);
+    const pid_t process = application ? static_cast<pid_t>(application->processIdentifier) : 0;
+    accessibility_.setFrontProcess(process);
+    hiddenPrompts_.setFrontProcess(process);
+    focusMayHaveMoved();
+}
+
+void LinuxPort::focusMayHaveMoved() {
     accessibility_.focusMayHaveMoved();
+    hiddenPrompts_.promptMayHaveCome();
 }
 
 Result<void> LinuxPort::startWatchdog() {

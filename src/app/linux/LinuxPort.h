@@ -16,6 +16,7 @@
 #include "ports/atspi/AtspiAccessibility.h"
 #include "ports/dbus/DesktopNotices.h"
 #include "ports/posix/CanberraSounds.h"
+#include "ports/posix/HiddenPrompts.h"
 #include "ports/posix/PollRunLoop.h"
 #include "ports/posix/PosixProcessLauncher.h"
 #include "ports/x11/X11Session.h"
@@ -62,6 +63,7 @@ class LinuxPort {
     void connectParts();
     void followFocus();
     void tellFrontProcess();
+    void focusMayHaveMoved();
     std::optional<std::u16string> frontIdentifier() const;
 
     PollRunLoop mainLoop_;
@@ -70,6 +72,7 @@ class LinuxPort {
     CanberraSounds sounds_;
     DesktopNotices notices_{mainLoop_};
     AtspiAccessibility accessibility_;
+    HiddenPrompts hiddenPrompts_;
     SharedClipboardCopy clipboardCopy_;
     std::unique_ptr<X11Session> session_;
     std::unique_ptr<XkbKeyboard> keyboard_;
