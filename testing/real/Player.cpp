@@ -1,0 +1,246 @@
+#include "testing/real/Player.h"
+
+#include <algorithm>
+#include <fstream>
+#include <utility>
+
+#include "testing/real/CopyWatch.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/Screenshot.h"
+#include "testing/rig/SelectionClients.h"
+
+namespace plume::real {
+
+namespace {
+
+using rig::Key;
+using rig::Milliseconds;
+
+constexpr Milliseconds StartBound{40'000};
+constexpr Milliseconds ReadyBound{20'000};
+constexpr Milliseconds TextBound{3'000};
+constexpr Milliseconds CharacterBound{10};  // for each of a long text
+constexpr Milliseconds ClipboardBound{2'000};
+constexpr Milliseconds AskAgain{20};
+
+// As the package system has noted it.
+std::string versionOf(const std::string& package) {
+    std::ifstream status("/var/lib/dpkg/status");
+    const std::string version = "Version: ";
+    bool isPackage = false;
+    for (std::string line; std::getline(status, line);) {
+        if (line.starts_with("Package: ")) isPackage = line == "Package: " + package;
+        if (isPackage && line.starts_with(version)) return line.substr(version.size());
+    }
+    return {};
+}
+
+void replaceAll(std::string& text, const std::string& from, const std::string& to) {
+    for (auto at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size())) {
+        text.replace(at, from.size(), to);
+    }
+}
+
+std::string filled(std::string text, const std::filesystem::path& folder) {
+    replaceAll(text, "{}", folder);
+    return text;
+}
+
+// Ends of lines and spaces as they were typed: pages show a space at an end as one that does not break.
+std::string plain(std::string text) {
+    replaceAll(text, "\r\n", "\n");
+    replaceAll(text, "\u00A0", " ");
+    return text;
+}
+
+std::string fileNameOf(std::string text) {
+    std::replace_if(
+        text.begin(), text.end(), [](char c) { return c == ' ' || c == '/' || c == ',' || c == '+'; }, '-');
+    return text;
+}
+
+bool contains(const std::vector<Needs>& offers, Needs need) {
+    return std::find(offers.begin(), offers.end(), need) != offers.end();
+}
+
+}  // namespace
+
+Player::Player(rig::DesktopRig& rig, std::filesystem::path pictures, Choice choice, Tell tell)
+    : rig_(rig), pictures_(std::move(pictures)), choice_(std::move(choice)), tell_(std::move(tell)) {}
+
+void Player::play(const RealProgram& program) {
+    program_ = &program;
+    version_ = versionOf(program.package);
+    std::unique_ptr<rig::ChildProcess> process;  // still there for the picture of what went wrong
+    try {
+        process = start(program);
+        window_ = awaitWindow(program, *process);
+        rig_.client().activate(window_);
+        for (const Place& place : program.places) playPlace(place);
+    } catch (const rig::RigError& problem) {
+        Outcome outcome{program.name, version_, "", "start", "", problem.what()};
+        finish(outcome);
+    }
+    reader_.reset();
+}
+
+std::unique_ptr<rig::ChildProcess> Player::start(const RealProgram& program) {
+    folder_ = rig_.directory() / fileNameOf(program.name);
+    std::filesystem::create_directories(folder_);
+    for (const auto& [name, content] : program.files) {
+        std::filesystem::create_directories((folder_ / name).parent_path());
+        std::ofstream(folder_ / name) << filled(content, folder_);
+    }
+    std::vector<std::string> command{"env"};
+    for (const auto& line : program.environment) command.push_back(filled(line, folder_));
+    for (const auto& argument : program.command) command.push_back(filled(argument, folder_));
+    return rig_.session().start(command, program.package);
+}
+
+xcb_window_t Player::awaitWindow(const RealProgram& program, rig::ChildProcess& process) {
+    xcb_window_t found = XCB_WINDOW_NONE;
+    const bool shown = rig::waitUntil(
+        [&] {
+            for (const xcb_window_t window : rig_.client().managedWindows()) {
+                const std::string names = rig_.client().property(window, "WM_CLASS");
+                if (names.find(program.windowClass) != std::string::npos) found = window;
+            }
+            return found != XCB_WINDOW_NONE;
+        },
+        StartBound);
+    std::string others;
+    for (const xcb_window_t window : rig_.client().managedWindows()) {
+        others += rig_.client().property(window, "WM_CLASS") + " ";
+    }
+    if (!shown) throw rig::RigError("shows no window, but there are " + others + process.logTail());
+    return found;
+}
+
+void Player::playPlace(const Place& place) {
+    const auto isPlayed = [&](const Story& story) { return isChosen(place, story); };
+    if (std::none_of(stories().begin(), stories().end(), isPlayed)) return;
+    enter(place);
+    for (const Story& story : stories()) {
+        if (!isPlayed(story)) continue;
+        for (int i = 0; i < choice_.times; ++i) {
+            Outcome outcome = playStory(place, story);
+            finish(outcome);
+        }
+    }
+}
+
+bool Player::isChosen(const Place& place, const Story& story) const {
+    if (!choice_.place.empty() && choice_.place != place.name) return false;
+    if (!choice_.story.empty() && choice_.story != story.name) return false;
+    if (contains(place.offers, Needs::Password)) return story.needs == Needs::Password;
+    return story.needs == Needs::Nothing || contains(place.offers, story.needs);
+}
+
+void Player::enter(const Place& place) {
+    if (place.enter) place.enter(rig_);
+    reader_ = makeReader(place.reading, rig_, window_, folder_ / "text");
+    awaitReady(place);
+}
+
+// A window that has the focus may not take keys yet: it does once one of them has become text.
+void Player::awaitReady(const Place& place) {
+    const rig::Deadline deadline(ReadyBound);
+    while (true) {
+        clear(place);
+        rig_.keyboard().type("Q");
+        if (awaitText("Q") == "Q") return;
+        if (deadline.passed()) throw rig::RigError("takes no keys " + place.name + ", has " + reader_->read());
+    }
+}
+
+void Player::clear(const Place& place) {
+    if (place.clear) return place.clear(rig_);
+    if (place.reading == Reading::Lines) return rig_.keyboard().chord({Key::LeftControl}, U'u');
+    rig_.keyboard().chord({Key::LeftControl}, U'a');
+    rig_.keyboard().tap(Key::Backspace);
+    rig_.keyboard().sync();
+}
+
+void Player::type(const Story& story) {
+    std::string pending;
+    const auto flush = [&] {
+        if (story.typing == Typing::RollingOver) {
+            rig_.keyboard().typeRollingOver(pending);
+        } else {
+            rig_.keyboard().type(pending);
+        }
+        pending.clear();
+    };
+    for (const char c : story.typed) {
+        if (c != LeftKey) {
+            pending += c;
+            continue;
+        }
+        flush();
+        rig_.keyboard().tap(Key::Left);
+    }
+    flush();
+}
+
+Outcome Player::playStory(const Place& place, const Story& story) {
+    Outcome outcome{program_->name, version_, place.name, story.name, story.expected, {}};
+    const auto own = place.expected.find(story.name);
+    if (own != place.expected.end()) outcome.expected = own->second;
+    clear(place);
+    if (place.reading == Reading::Title || place.reading == Reading::File) awaitText("");
+    const auto start = std::chrono::steady_clock::now();
+    if (story.then == Then::ReadClipboard) {
+        outcome.got = playClipboard(story);
+    } else {
+        type(story);
+        if (story.then == Then::Undo) rig_.keyboard().chord({Key::LeftControl, Key::LeftAlt}, U'z');
+        outcome.got = awaitText(outcome.expected);
+    }
+    outcome.milliseconds = std::chrono::duration<double, std::milli>(std::chrono::steady_clock::now() - start).count();
+    return outcome;
+}
+
+// A program may still be at work at the first reading.
+std::string Player::awaitText(const std::string& expected) {
+    const rig::Deadline deadline(TextBound + CharacterBound * static_cast<int>(expected.size()));
+    std::string text;
+    do {
+        text = plain(reader_->read());
+        if (text == expected) return text;
+        rig::waitUntil([] { return false; }, AskAgain);
+    } while (reader_->leavesText() && !deadline.passed());
+    return text;
+}
+
+std::string Player::playClipboard(const Story& story) {
+    const std::string display = rig_.server().display();
+    const rig::SelectionData data{"UTF8_STRING", 8, CopiedBefore};
+    const rig::ForeignOwner owner(display, {{"UTF8_STRING", data}, {"STRING", data}});
+    CopyWatch watch(display);
+    type(story);
+    if (!watch.awaitOwner(TextBound, [&](xcb_window_t window) { return window != owner.window(); })) {
+        return "nothing was pasted";
+    }
+    rig::SelectionRequestor requestor(display);
+    std::string text;
+    rig::waitUntil(
+        [&] {
+            const auto got = requestor.request("CLIPBOARD", "UTF8_STRING");
+            text = got ? got->bytes : "";
+            return text == CopiedBefore;
+        },
+        ClipboardBound);
+    return text;
+}
+
+void Player::finish(Outcome& outcome) {
+    outcome.isRight = outcome.story != "start" && outcome.got == outcome.expected;
+    if (!outcome.isRight) {
+        std::filesystem::create_directories(pictures_);
+        const std::string name = outcome.program + "-" + outcome.place + "-" + outcome.story + ".png";
+        rig::writeScreenshot(rig_.client(), pictures_ / fileNameOf(name));
+    }
+    tell_(outcome);
+}
+
+}  // namespace plume::real

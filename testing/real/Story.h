@@ -1,0 +1,40 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace plume::real {
+
+// What a story asks of the place that it is played in.
+enum class Needs { Nothing, Lines, Indentation, Password, Proposals };
+
+// How it is typed.
+enum class Typing { AtOnce, RollingOver };
+
+// What is done once it is typed, before the text is read.
+enum class Then { Read, Undo, ReadClipboard };
+
+// Something typed, and the text that must stand there afterwards.
+struct Story {
+    std::string name;
+    std::string typed;
+    std::string expected;
+    Needs needs = Needs::Nothing;
+    Typing typing = Typing::AtOnce;
+    Then then = Then::Read;
+};
+
+// In a story's typed text: the Left key.
+constexpr char LeftKey = '\x02';
+
+// Played from the first to the last.
+const std::vector<Story>& stories();
+
+// The library that they are typed with, and the settings, as files.
+std::string library();
+std::string settings();
+
+// What is on the clipboard while a story is played that looks after it.
+extern const std::string CopiedBefore;
+
+}  // namespace plume::real
