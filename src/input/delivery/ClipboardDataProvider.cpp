@@ -8,6 +8,14 @@
 
 namespace plume {
 
+namespace {
+
+bool isWithinALine(std::u16string_view text) {
+    return text.find_first_of(u"\n\r\u2029") == std::u16string_view::npos;
+}
+
+}  // namespace
+
 ClipboardDataProvider::ClipboardDataProvider(Pasteboard& pasteboard, RunLoop& runLoop)
     : pasteboard_(pasteboard), runLoop_(runLoop) {}
 
@@ -66,7 +74,8 @@ void ClipboardDataProvider::provideExpansion(Pasteboard& pasteboard, std::string
         pasteboard.setData(rtfFromAttributedString(*attributedStringData_), type);
     } else if (type == PasteboardType::HTML) {
         auto excluded = defaultExcludedTags();
-        if (excludeParagraphTag) excluded.emplace_back("p");
+        // Programs start a new paragraph for each that is pasted, which words within a line are not.
+        if (excludeParagraphTag || isWithinALine(attributedStringData_->string())) excluded.emplace_back("p");
         pasteboard.setData(htmlFromAttributedString(*attributedStringData_, excluded), type);
     }
 }

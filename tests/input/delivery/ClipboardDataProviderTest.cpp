@@ -77,6 +77,8 @@ TEST_F(ClipboardDataProviderTest, RichContentIsOfferedInItsRichFormsOnly) {
     provider.setAttributedString(boldText(u"a\nb"));
     EXPECT_THAT(pasteboard.types(), ElementsAre(RTFD, RTF, HTML));
     EXPECT_NE(pasteboard.data(HTML)->find("<p>"), std::string::npos);
+    provider.setAttributedString(boldText(u"a b"));
+    EXPECT_EQ(pasteboard.data(HTML)->find("<p"), std::string::npos) << "a part of a line";
     provider.excludeParagraphTag = true;
     provider.setAttributedString(boldText(u"a\nb"));
     EXPECT_EQ(pasteboard.data(HTML)->find("<p"), std::string::npos);
