@@ -8,6 +8,9 @@ namespace plume {
 
 namespace {
 
+// A JSON object of rows.
+constexpr const char* OwnApplications = "CustomApplicationSettings";
+
 std::vector<std::u16string> lines(const UserDefaults& settings, std::string_view key) {
     const auto text = settings.stringForKey(key);
     return text ? split(*text, u'\n') : std::vector<std::u16string>();
@@ -58,6 +61,7 @@ void Composition::makeParts() {
         ports_.keyboardTap, ports_.mouseTap, ports_.poster, ports_.pasteboard, ports_.processManager,
         ports_.inputSources, ports_.accessibility, ports_.secureInput, ports_.systemHotKeys, identifiers_,
         ports_.tapLoop, ports_.mainLoop, environment_.log, environment_.vmHelper});
+    if (environment_.applications) inputService_->setApplicationTable(environment_.applications);
 
     ContentEnvironment content;
     content.timeZone = environment_.timeZone;
@@ -108,6 +112,10 @@ void Composition::loadPreferences() {
     engine_->sender().setFeedbackSound(toUtf8(settings.stringForKey("FeedbackSound").value_or(u"")));
     engine_->setSnippetSelectorKeyModifier(settings.integerForKey("SnippetSelectorKeyModifier"));
     applyTo(*inputService_, settings);
+    const std::string rows = toUtf8(settings.stringForKey(OwnApplications).value_or(u""));
+    if (const auto read = inputService_->setOwnApplicationRows(rows, OwnApplications); !read) {
+        environment_.report(read.error().message);
+    }
 }
 
 void Composition::start() {

@@ -59,6 +59,8 @@ class Composition {
         std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
         AutoText::Suggest suggest = {};
         VMHelperController* vmHelper = nullptr;
+        // How the platform's applications are typed to; null: as the built-in table says.
+        std::shared_ptr<const ApplicationTable> applications = {};
         // The switch hot key has enabled or disabled the engine.
         std::function<void(bool enabled)> enabledChanged = {};
     };

@@ -143,6 +143,14 @@ void MacInputService::setCustomApplicationSetting(const std::u16string& bundleId
     resolver_.applicationSettings.set(bundleIdentifier, std::move(setting));
 }
 
+void MacInputService::setApplicationTable(std::shared_ptr<const ApplicationTable> table) {
+    resolver_.applicationSettings.setTable(std::move(table));
+}
+
+Result<void> MacInputService::setOwnApplicationRows(std::string_view text, const std::string& fileName) {
+    return resolver_.applicationSettings.setOwnRows(text, fileName);
+}
+
 std::vector<RunningApplication> MacInputService::tappingProcesses() const {
     const auto own = around_.processManager.runningApplication(around_.processManager.currentProcess());
     std::vector<RunningApplication> others;
@@ -159,7 +167,8 @@ void MacInputService::sendCopyCommand() {
     const auto front = around_.processManager.frontProcess();
     const bool isX11 =
         front && around_.bundleIdentifierResolver.getBundleIdentifier(*front) == u"org.macosforge.xquartz.X11";
-    delivery_.sender().sendCopyCommand(isX11 || resolver_.setting()->has(InputFlag::UseControlKey));
+    delivery_.sender().sendCopyCommand(*resolver_.setting(),
+                                       isX11 || resolver_.setting()->has(InputFlag::UseControlKey));
 }
 
 void MacInputService::exportACLs() {

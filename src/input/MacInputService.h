@@ -112,6 +112,10 @@ class MacInputService final : private KeyboardTapListener {
     void setCustomApplicationSetting(const std::u16string& bundleIdentifier,
                                      std::shared_ptr<const ContextInputSetting> setting);
 
+    // A platform's own table of applications, and the user's rows: see ContextInputSettings.
+    void setApplicationTable(std::shared_ptr<const ApplicationTable> table);
+    Result<void> setOwnApplicationRows(std::string_view text, const std::string& fileName);
+
     // State from any thread; the name on the main thread, nothing when it is not known or secure input is off.
     bool secureInput() const { return secureInputWatch_.state(); }
     const std::optional<std::u16string>& lastAppEnabledSecureInput() const {

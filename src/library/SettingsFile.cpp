@@ -4,6 +4,7 @@
 #include <limits>
 #include <vector>
 
+#include "Foundation/Strings.h"
 #include "library/MemoryUserDefaults.h"
 
 namespace plume {
@@ -48,6 +49,12 @@ Defaults::Value string(const JsonNode& node) {
 
 Defaults::Value strings(const JsonNode& node) {
     return node.strings();
+}
+
+// Kept as it is written; who needs it reads it.
+Defaults::Value object(const JsonNode& node) {
+    node.members();
+    return fromUtf8(node.value().dump());
 }
 
 // The modifiers in the upper half, the key code in the lower.
@@ -101,6 +108,7 @@ const std::vector<Setting>& knownSettings() {
         {"UseClipboardIn", availability},
         {"UseClipboardApplications", strings},
         {"UseClipboardForLongText", boolean},
+        {"CustomApplicationSettings", object},
         {"ListenAtAnnotatedSession", boolean},
         {"SUEnableAutomaticChecks", boolean},
         {"SyncEnabled", boolean},

@@ -4,8 +4,6 @@
 // was posted reaches the program in front in that order, and the tap never reports it as typed.
 #pragma once
 
-#include <optional>
-#include <string>
 #include <string_view>
 
 #include "Foundation/KeyCode.h"
@@ -22,14 +20,6 @@ struct SynthesisedKey {
     std::u16string_view text;
 };
 
-// A key with modifiers that does what a command does.
-struct CommandKeystroke {
-    KeyCode keyCode = KeyCode::None;
-    EventFlags flags = {};
-
-    bool operator==(const CommandKeystroke&) const = default;
-};
-
 class EventPoster {
   public:
     virtual ~EventPoster() = default;
@@ -42,13 +32,11 @@ class EventPoster {
     // Whether post() can produce every character of this text now; otherwise it has to be pasted.
     virtual bool canType(std::u16string_view text) const = 0;
 
+    // The key of a shortcut with this small letter or other ASCII character. Never none.
+    virtual KeyCode keyCodeOfLetter(char16_t letter) const = 0;
+
     // Whether the user holds this key now.
     virtual bool isKeyDown(KeyCode keyCode) const = 0;
-
-    // What pastes and copies in the program in front, where the port knows; else nothing, and the usual keystroke is
-    // sent.
-    virtual std::optional<CommandKeystroke> pasteKeystroke() const = 0;
-    virtual std::optional<CommandKeystroke> copyKeystroke() const = 0;
 
     // From the top left of the main screen.
     virtual Point pointerLocation() const = 0;

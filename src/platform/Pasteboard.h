@@ -51,6 +51,9 @@ class Pasteboard : public PasteboardReader {
     // Replaces the content by these types and returns the new change count. With an owner the data is promised;
     // without one it is written right after. No types at all empty the pasteboard.
     virtual std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) = 0;
+    // What is promised from now on is for a program that pastes what is selected: platforms where that is something of
+    // its own offer it there, too, as long as it is promised.
+    virtual void setPastesPrimary(bool /*pastesPrimary*/) {}
     virtual void setString(std::u16string_view string, std::string_view type) = 0;
     virtual void setData(std::string_view bytes, std::string_view type) = 0;
 };

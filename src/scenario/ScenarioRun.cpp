@@ -74,6 +74,7 @@ Composition::Environment ScenarioRun::environment() {
             [] { return makeScenarioSearch(); },
             {},
             nullptr,
+            {},
             {}};
 }
 

@@ -8,46 +8,11 @@
 #include <string_view>
 
 #include "Foundation/Strings.h"
+#include "input/delivery/ApplicationRow.h"
 
 namespace plume {
 
 namespace {
-
-constexpr double LongestDelay = 24 * 60 * 60;  // seconds
-
-struct NamedFlag {
-    std::string_view name;
-    InputFlag flag;
-};
-
-constexpr auto Flags = std::to_array<NamedFlag>({
-    {"disableCapitalization", InputFlag::DisableCapitalization},
-    {"useClipboard", InputFlag::UseClipboard},
-    {"useClipboardIfHasNewLine", InputFlag::UseClipboardIfHasNewLine},
-    {"doNotRestoreClipboard", InputFlag::DoNotRestoreClipboard},
-    {"alternativePasting", InputFlag::AlternativePasting},
-    {"useVMHelper", InputFlag::UseVMHelper},
-    {"clickAtVMHelper", InputFlag::ClickAtVMHelper},
-    {"clickAtVM", InputFlag::ClickAtVM},
-    {"deleteAfterActivateVM", InputFlag::DeleteAfterActivateVM},
-    {"reactivate", InputFlag::Reactivate},
-    {"doNotSetModifier", InputFlag::DoNotSetModifier},
-    {"delayPasting", InputFlag::DelayPasting},
-    {"postToSessionEventTap", InputFlag::PostToSessionEventTap},
-    {"useControlKey", InputFlag::UseControlKey},
-    {"includeHTMLData", InputFlag::IncludeHTMLData},
-    {"excludeParagraphTag", InputFlag::ExcludeParagraphTag},
-});
-
-InputFlag flag(const JsonNode& node) {
-    const std::string name = toUtf8(node.string());
-    std::string expected = "expected one of";
-    for (const NamedFlag& named : Flags) {
-        if (named.name == name) return named.flag;
-        expected += " " + std::string(named.name);
-    }
-    node.fail(expected);
-}
 
 struct LocalTime {
     int year = 0;
@@ -72,19 +37,7 @@ std::optional<LocalTime> localTimeIn(const std::string& text) {
 }  // namespace
 
 std::shared_ptr<const ContextInputSetting> readApplicationSetting(const JsonNode& node) {
-    const JsonObject object = node.object({"flags", "pastingDelay", "afterPastingDelay", "blockLength"});
-    auto setting = std::make_shared<ContextInputSetting>();
-    object.whenSet("flags", [&](const JsonNode& n) {
-        for (const JsonNode& element : n.elements()) setting->flags |= flag(element);
-    });
-    object.whenSet("pastingDelay", [&](const JsonNode& n) { setting->pastingDelay = n.number(0, LongestDelay); });
-    object.whenSet("afterPastingDelay",
-                   [&](const JsonNode& n) { setting->afterPastingDelay = n.number(0, LongestDelay); });
-    object.whenSet("blockLength", [&](const JsonNode& n) {
-        constexpr std::int64_t Longest = 1'000'000;
-        setting->blockLength = static_cast<std::uint64_t>(n.integer(0, Longest));
-    });
-    return setting;
+    return std::make_shared<const ContextInputSetting>(readApplicationRow(node, {}, {}));
 }
 
 std::string readTimeZone(const JsonNode& node) {

@@ -22,6 +22,7 @@ constexpr const char* Library = R"json([
       { "abbreviation": "sig", "content": "Kind regards, Jo" },
       { "abbreviation": "cut", "content": "1234567890123456789😀x" },
       { "abbreviation": "uni", "content": "naïve Ünïcödé — 日本語 【】 😀" },
+      { "abbreviation": "two", "content": "a\n  b" },
       { "abbreviation": "tag", "content": "<b>【|】</b>" },
       { "abbreviation": "run", "contentType": 3, "content": "echo out$((6*7))" },
       { "abbreviation": "mark", "contentType": 3, "content": "echo mark >> \"$HOME/marks\"" },
@@ -63,6 +64,7 @@ TEST_P(ProgramInTarget, ExpandsWhatIsTyped) {
     typeAndExpect("x ;sig", "x Kind regards, Jo");
     typeAndExpect("btw, Btw BTW ", "by the way, By the way BY THE WAY ");
     typeAndExpect("x ;uni.", "x naïve Ünïcödé — 日本語 【】 😀.");
+    typeAndExpect("x ;two", "x a\n  b");
     typeAndExpect("x ;tagbold", "x <b>bold</b>");
     typeAndExpect("x ;cut", "x 1234567890123456789😀x");
     typeAndExpect("x ;run", "x out42");

@@ -343,8 +343,7 @@ TEST_F(X11PasteboardTest, AnOwnerThatDiesInTheMiddleIsNotWaitedFor) {
 // ---- The selection for terminals ----
 
 TEST_F(X11PasteboardTest, TerminalsFindTheExpansionInPrimaryAndThenWhatWasSelected) {
-    bool isTerminal = true;
-    thread_->run([&] { pasteboard_->pastesPrimary = [&] { return isTerminal; }; });
+    thread_->run([&] { pasteboard_->setPastesPrimary(true); });
     ForeignOwner::Options primary;
     primary.selection = "PRIMARY";
     const ForeignOwner selected(display(), {{"UTF8_STRING", utf8("selected")}}, primary);
@@ -357,13 +356,13 @@ TEST_F(X11PasteboardTest, TerminalsFindTheExpansionInPrimaryAndThenWhatWasSelect
     declare({String, "UTF8_STRING"}, &owner);
     EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("selected"));
     EXPECT_EQ(program.request("CLIPBOARD", "UTF8_STRING"), utf8("given back"));
-    isTerminal = false;
+    thread_->run([&] { pasteboard_->setPastesPrimary(false); });
     declare({String}, &owner);
     EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("selected"));
 }
 
 TEST_F(X11PasteboardTest, PrimaryIsLeftAloneAfterANewSelectionAndEmptyWhenItWas) {
-    thread_->run([&] { pasteboard_->pastesPrimary = [] { return true; }; });
+    thread_->run([&] { pasteboard_->setPastesPrimary(true); });
     NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
     SelectionRequestor program(display());
     declare({String}, &owner);

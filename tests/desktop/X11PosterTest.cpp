@@ -7,7 +7,6 @@
 #include <string>
 
 #include "Foundation/Strings.h"
-#include "ports/x11/keyboard/TerminalApplications.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/KeyboardPort.h"
@@ -157,47 +156,6 @@ TEST_P(X11PosterKeysTest, AKeyThatTheUserHoldsNeitherRepeatsIntoTheTextNorHidesI
     EXPECT_EQ(target_->awaitText("xxx, boxx"), "xxx, boxx");
 }
 
-TEST_P(X11PosterKeysTest, CopiesAndPastesAsTheProgramInFrontWantsIt) {
-    std::optional<std::u16string> front;
-    port_->run([&] { port_->poster().frontIdentifier = [&] { return front; }; });
-    target_->setText("copied");
-    const auto send = [&](bool pastes) {
-        port_->run([&] {
-            auto& poster = port_->poster();
-            const auto stroke = pastes ? poster.pasteKeystroke() : poster.copyKeystroke();
-            poster.begin();
-            poster.post({.keyCode = stroke->keyCode, .flags = stroke->flags, .down = true, .text = {}}, false);
-            poster.post({.keyCode = stroke->keyCode, .flags = stroke->flags, .down = false, .text = {}}, false);
-            poster.end();
-        });
-    };
-    const auto selectAll = [&] {
-        rig_->keyboard().chord({Key::LeftControl}, U'a');
-        rig_->client().await("the selection", Milliseconds(5'000), [&] {
-            return rig_->client().areOfSameClient(rig_->client().selectionOwner("PRIMARY"), target_->window());
-        });
-    };
-    selectAll();
-    send(false);
-    rig_->client().await("the copy", Milliseconds(5'000), [&] {
-        return rig_->client().areOfSameClient(rig_->client().selectionOwner("CLIPBOARD"), target_->window());
-    });
-    port_->run([&] { port_->poster().post({.keyCode = KeyCode::End, .flags = {}, .down = true, .text = {}}, false); });
-    send(true);
-    EXPECT_EQ(target_->awaitText("copiedcopied"), "copiedcopied");
-    selectAll();  // which is what the terminal pastes
-
-    front = u"debian-xterm";
-    const auto terminal = rig_->startTarget(TargetKind::Xterm);
-    rig_->keyboard().type("typed ");
-    ASSERT_EQ(terminal->awaitText("typed "), "typed ");
-    send(false);  // Control+C would end what runs there
-    rig_->keyboard().type("on");
-    EXPECT_EQ(terminal->awaitText("typed on"), "typed on");
-    send(true);
-    EXPECT_TRUE(terminal->awaitPaste(Milliseconds(5'000)));
-}
-
 INSTANTIATE_TEST_SUITE_P(All, X11PosterKeysTest, testing::Values(TargetKind::GtkTextView),
                          [](const auto& tested) { return nameOf(tested.param); });
 
@@ -223,16 +181,6 @@ TEST(X11PosterLayoutTest, TypesTextOnTheLayoutAndTheGroupInForce) {
         typed = target->awaitText(mixed, Milliseconds(200));
     }
     EXPECT_EQ(typed, mixed);
-}
-
-TEST(TerminalApplicationsTest, AreFoundByTheirWholeNameInAnyCase) {
-    for (const std::u16string_view xterm : {u"XTerm", u"debian-xterm.desktop"}) {
-        EXPECT_EQ(pasteStyleOf(xterm), PasteStyle::ShiftInsert);
-        EXPECT_TRUE(pastesPrimary(xterm));
-    }
-    EXPECT_EQ(pasteStyleOf(u"org.gnome.Terminal.desktop"), PasteStyle::ControlShift);
-    EXPECT_FALSE(pastesPrimary(u"org.gnome.Terminal.desktop"));
-    for (const std::u16string_view other : {u"", u"xtermcontrol"}) EXPECT_EQ(pasteStyleOf(other), PasteStyle::Control);
 }
 
 }  // namespace

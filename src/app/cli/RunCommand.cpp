@@ -14,6 +14,7 @@
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
 #include "app/cli/InstanceLock.h"
+#include "app/linux/LinuxApplications.h"
 #include "app/linux/LinuxPort.h"
 #include "library/SettingsFile.h"
 
@@ -120,7 +121,15 @@ class Run {
                 .makeQuickSearchController = {},
                 .suggest = {},
                 .vmHelper = nullptr,
+                .applications = applications(),
                 .enabledChanged = {}};
+    }
+
+    std::shared_ptr<const ApplicationTable> applications() {
+        const auto file = dataFolder() / "applications.json";
+        const LinuxApplications read = readLinuxApplications(readWholeFile(file), file.string());
+        if (read.problem) voice_.say(read.problem->message + " What Plume was built with counts in its place.");
+        return read.table;
     }
 
     void keyboardLost(KeyboardTapGivenUp& /*event*/) {

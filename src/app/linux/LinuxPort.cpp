@@ -10,7 +10,6 @@
 #include "Foundation/KeyCode.h"
 #include "Foundation/KeyModifiers.h"
 #include "input/BundleIdentifierResolver.h"
-#include "ports/x11/keyboard/TerminalApplications.h"
 
 namespace plume {
 
@@ -77,8 +76,6 @@ void LinuxPort::connectParts() {
     keyboard_->listenTo(*session_);
     pasteboard_->setSharedCopy(&clipboardCopy_);
     followFocus();
-    poster_->frontIdentifier = [this] { return frontIdentifier(); };
-    pasteboard_->pastesPrimary = [this] { return pastesPrimary(frontIdentifier().value_or(u"")); };
     accessibility_.setMainScreenHeight(session_->connection().screen().height_in_pixels);
 
     // Whoever waits on the tap thread tells the watchdog that this is no hang.
@@ -118,11 +115,6 @@ void LinuxPort::focusMayHaveMoved() {
 Result<void> LinuxPort::startWatchdog() {
     watchdog_->setTapWindow(tapConnection_->window());
     return watchdog_->start();
-}
-
-std::optional<std::u16string> LinuxPort::frontIdentifier() const {
-    const auto application = foregroundApplication(*processManager_);
-    return application ? application->bundleIdentifier : std::nullopt;
 }
 
 Composition::Ports LinuxPort::ports() {

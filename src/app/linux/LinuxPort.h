@@ -64,7 +64,6 @@ class LinuxPort {
     void followFocus();
     void tellFrontProcess();
     void focusMayHaveMoved();
-    std::optional<std::u16string> frontIdentifier() const;
 
     PollRunLoop mainLoop_;
     PollRunLoop tapLoop_;

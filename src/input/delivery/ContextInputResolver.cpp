@@ -19,6 +19,10 @@ constexpr int MaximumAncestors = 1000;
 constexpr std::size_t HeldKeyMinimumLength = 21;
 constexpr KeyCode HeldKey = KeyCode::A;
 
+// Units in a typed chunk of a text with many characters that no key of the layout types: so many of them as a batch
+// has room for can be typed before the poster gives up waiting for free key codes.
+constexpr std::uint64_t BlockLengthWithoutKeys = 2;
+
 bool isString(const std::optional<std::u16string>& value, std::u16string_view expected) {
     return value && *value == expected;
 }
@@ -51,6 +55,11 @@ void ContextInputResolver::refresh() {
 
 void ContextInputResolver::prepareSending(const SnippetExpandedContent* content) {
     refresh();
+    decide(content);
+    if (!setting_->canPaste()) typeThisOne(content);
+}
+
+void ContextInputResolver::decide(const SnippetExpandedContent* content) {
     if (has(InputFlag::UseClipboard)) return;
     askFocusedElement();
     if (content && content->isRich()) {
@@ -61,11 +70,21 @@ void ContextInputResolver::prepareSending(const SnippetExpandedContent* content)
     if (!content || has(InputFlag::UseClipboard)) return;
     if (mustPaste(content->string())) {
         setting_->flags |= InputFlag::UseClipboard;
-    } else if (!poster_.canType(content->string())) {
-        // A copy: that this text has letters no key produces says nothing about the next one.
-        setting_ = std::make_shared<ContextInputSetting>(*setting_);
-        setting_->flags |= InputFlag::UseClipboard;
+    } else if (!canBeTyped(content->string())) {
+        pasteThisOne();
     }
+}
+
+// A copy: that this text cannot be typed says nothing about the next one.
+void ContextInputResolver::pasteThisOne() {
+    setting_ = std::make_shared<ContextInputSetting>(*setting_);
+    setting_->flags |= InputFlag::UseClipboard;
+}
+
+void ContextInputResolver::typeThisOne(const SnippetExpandedContent* content) {
+    setting_ = std::make_shared<ContextInputSetting>(*setting_);
+    setting_->flags -= InputFlag::UseClipboard;
+    if (content && !poster_.canType(content->string())) setting_->blockLength = BlockLengthWithoutKeys;
 }
 
 void ContextInputResolver::askFocusedElement() {
@@ -115,6 +134,13 @@ bool ContextInputResolver::mustPaste(std::u16string_view text) const {
     if (has(InputFlag::UseClipboardIfHasNewLine) && text.find(u'\n') != std::u16string_view::npos) return true;
     if (preferences.useClipboardForLongText && isLong(text)) return true;
     return text.size() >= HeldKeyMinimumLength && poster_.isKeyDown(HeldKey);
+}
+
+bool ContextInputResolver::canBeTyped(std::u16string_view text) const {
+    const auto isSurrogate = [](char16_t unit) { return unit >= 0xD800 && unit <= 0xDFFF; };
+    if (setting_->longestTyped > 0 && text.size() > setting_->longestTyped) return false;
+    if (!setting_->typesBeyondBmp && std::any_of(text.begin(), text.end(), isSurrogate)) return false;
+    return poster_.canType(text);
 }
 
 bool ContextInputResolver::isLong(std::u16string_view text) const {

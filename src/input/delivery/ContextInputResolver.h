@@ -41,7 +41,8 @@ class ContextInputResolver {
 
     // Resolves the setting of the application in front.
     void refresh();
-    // The same, and decides between typing and pasting. `content` is null when there is only something to erase.
+    // The same, and decides between typing and pasting. `content` is null when there is only something to erase. Where
+    // no key pastes, everything is typed.
     void prepareSending(const SnippetExpandedContent* content);
 
     // As last resolved; the setting is never null.
@@ -50,11 +51,15 @@ class ContextInputResolver {
 
   private:
     bool has(InputFlag flag) const { return setting_->has(flag); }
+    void decide(const SnippetExpandedContent* content);
+    void pasteThisOne();
+    void typeThisOne(const SnippetExpandedContent* content);
     void askFocusedElement();
     void lookForDocumentEditor(std::shared_ptr<UIElement> element);
     void applyPreference();
     bool mustPaste(std::u16string_view text) const;
     bool isLong(std::u16string_view text) const;
+    bool canBeTyped(std::u16string_view text) const;
 
     const ProcessManager& processManager_;
     BundleIdentifierResolver& identifiers_;

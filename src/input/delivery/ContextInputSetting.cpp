@@ -3,6 +3,8 @@
 #include <initializer_list>
 #include <utility>
 
+#include "input/delivery/ApplicationTable.h"
+
 namespace plume {
 
 namespace {
@@ -73,7 +75,9 @@ const TableRow TableRows[] = {
 }  // namespace
 
 std::shared_ptr<ContextInputSetting> ContextInputSetting::copy() const {
-    return makeSetting(flags, pastingDelay, afterPastingDelay, blockLength);
+    auto setting = std::make_shared<ContextInputSetting>(*this);
+    setting->bundleIdentifier.reset();
+    return setting;
 }
 
 ContextInputSettings::ContextInputSettings()
@@ -99,7 +103,32 @@ void ContextInputSettings::set(const std::u16string& bundleIdentifier,
     applications_[bundleIdentifier] = std::move(setting);
 }
 
-std::shared_ptr<ContextInputSetting> ContextInputSettings::familyOf(std::u16string_view bundleIdentifier) const {
+void ContextInputSettings::setTable(std::shared_ptr<const ApplicationTable> table) {
+    table_ = std::move(table);
+    applications_.clear();
+}
+
+Result<void> ContextInputSettings::setOwnRows(std::string_view text, const std::string& fileName) {
+    ownRows_.reset();
+    if (text.empty()) return {};
+    auto rows = (table_ ? *table_ : ApplicationTable()).readRows(text, fileName);
+    if (!rows) return rows.error();
+    ownRows_ = std::make_shared<const ApplicationRows>(std::move(rows).value());
+    return {};
+}
+
+SharedSetting ContextInputSettings::entryOf(const std::u16string& bundleIdentifier) const {
+    if (ownRows_) {
+        if (const auto* own = ownRows_->find(bundleIdentifier)) return own->copy();
+    }
+    const auto found = applications_.find(bundleIdentifier);
+    if (found != applications_.end()) return found->second->copy();
+    if (!table_) return familyOf(bundleIdentifier);
+    const auto* const row = table_->find(bundleIdentifier);
+    return row ? row->copy() : nullptr;
+}
+
+SharedSetting ContextInputSettings::familyOf(std::u16string_view bundleIdentifier) const {
     if (bundleIdentifier.starts_with(u"com.vmware.proxyApp.")) return fusionApp_;
     if (bundleIdentifier.starts_with(u"com.codeweavers.CrossOverHelper.")) return crossOverApp_;
     if (bundleIdentifier.ends_with(u".wineskin.prefs")) return wineskinApp_;
@@ -111,13 +140,9 @@ std::shared_ptr<ContextInputSetting> ContextInputSettings::familyOf(std::u16stri
 
 std::shared_ptr<ContextInputSetting> ContextInputSettings::resolve(
     const std::optional<std::u16string>& bundleIdentifier, bool& isKnown) {
-    SharedSetting setting;
-    if (bundleIdentifier) {
-        const auto found = applications_.find(*bundleIdentifier);
-        setting = found != applications_.end() ? found->second->copy() : familyOf(*bundleIdentifier);
-    }
+    SharedSetting setting = bundleIdentifier ? entryOf(*bundleIdentifier) : nullptr;
     isKnown = setting != nullptr;
-    if (!setting) setting = std::make_shared<ContextInputSetting>();
+    if (!setting) setting = table_ ? table_->otherwise().copy() : std::make_shared<ContextInputSetting>();
     setting->bundleIdentifier = bundleIdentifier;
     return setting;
 }

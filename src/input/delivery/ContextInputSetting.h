@@ -12,8 +12,12 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "Foundation/Flags.h"
+#include "Foundation/KeyCode.h"
+#include "Foundation/KeyModifiers.h"
+#include "Foundation/Result.h"
 
 namespace plume {
 
@@ -42,6 +46,18 @@ constexpr InputFlags operator|(InputFlag a, InputFlag b) {
     return InputFlags(a) | b;
 }
 
+// A key with modifiers, named as a shortcut is: by what it types, or by its code where it types nothing.
+struct Keystroke {
+    char16_t letter = 0;              // a small letter, or other ASCII; without modifiers it is typed
+    KeyCode keyCode = KeyCode::None;  // counts where there is no letter
+    EventFlags flags = {};
+
+    bool operator==(const Keystroke&) const = default;
+};
+
+// Pressed one after the other.
+using Keystrokes = std::vector<Keystroke>;
+
 struct ContextInputSetting {
     std::optional<std::u16string> bundleIdentifier;  // of the application it was resolved for
     InputFlags flags;
@@ -49,11 +65,28 @@ struct ContextInputSetting {
     double afterPastingDelay = 0;   // seconds
     std::uint64_t blockLength = 0;  // units in a typed chunk; 0 means 20
 
+    // What pastes and copies. Nothing: V and C with Command, or as the flags say. Empty: no key does, and everything is
+    // typed.
+    std::optional<Keystrokes> pasteKeys = {};
+    std::optional<Keystrokes> copyKeys = {};
+    bool pastesPrimary = false;  // those keys paste what is selected, not what was copied
+    // What has to pass behind Backspace, arrows and other keys before text may follow, in seconds: for programs that
+    // do what keys say later than they insert text.
+    double afterErasingDelay = 0;
+    // The program proposes the rest of a word as selected text, which the first Backspace would remove alone.
+    bool overtypesCompletion = false;
+    bool typesBeyondBmp = true;      // characters beyond U+FFFF can be typed
+    std::uint64_t longestTyped = 0;  // units; longer texts are pasted; 0 means no limit
+
     bool has(InputFlag flag) const { return flags.contains(flag); }
+    bool canPaste() const { return !pasteKeys || !pasteKeys->empty(); }
 
     // Everything but the identifier, which belongs to a resolution.
     std::shared_ptr<ContextInputSetting> copy() const;
 };
+
+class ApplicationTable;
+class ApplicationRows;
 
 // Settings by bundle identifier, with the families of identifiers.
 class ContextInputSettings {
@@ -61,17 +94,27 @@ class ContextInputSettings {
     // With the built-in applications.
     ContextInputSettings();
 
+    // A platform's own table, which replaces the built-in applications and families. Not null.
+    void setTable(std::shared_ptr<const ApplicationTable> table);
+    // The user's rows, a JSON object in the form of that table's; they come before everything else. Those that there
+    // were before are gone. An empty text is none. The error names `fileName`, the place and what was expected.
+    Result<void> setOwnRows(std::string_view text, const std::string& fileName);
+
     // Replaces or adds one application.
     void set(const std::u16string& bundleIdentifier, std::shared_ptr<const ContextInputSetting> setting);
 
     // The setting for an application: a copy of its entry, the shared record of its family, or a fresh one with nothing
-    // set. Its bundleIdentifier is the one asked for. Never null; `isKnown` is set to whether there was an entry or
-    // family.
+    // set but what the platform's table says of all others. Its bundleIdentifier is the one asked for. Never null;
+    // `isKnown` is set to whether there was an entry or family.
     std::shared_ptr<ContextInputSetting> resolve(const std::optional<std::u16string>& bundleIdentifier, bool& isKnown);
 
   private:
     std::shared_ptr<ContextInputSetting> familyOf(std::u16string_view bundleIdentifier) const;
 
+    std::shared_ptr<ContextInputSetting> entryOf(const std::u16string& bundleIdentifier) const;
+
+    std::shared_ptr<const ApplicationTable> table_;
+    std::shared_ptr<const ApplicationRows> ownRows_;
     std::map<std::u16string, std::shared_ptr<const ContextInputSetting>, std::less<>> applications_;
     std::shared_ptr<ContextInputSetting> newLine_;
     std::shared_ptr<ContextInputSetting> fusionApp_;

@@ -11,6 +11,8 @@ namespace {
 
 // Carries typed text; which key it is does not matter.
 constexpr KeyCode TextKey = KeyCode::A;
+// A letter that no word is likely to go on with.
+constexpr std::u16string_view Overtyping = u"x";
 
 }  // namespace
 
@@ -37,12 +39,26 @@ void KeySender::press(KeyCode keyCode, EventFlags flags) {
     post(keyCode, flags, false);
 }
 
+void KeySender::type(std::u16string_view text) {
+    post(TextKey, {}, true, text);
+    post(TextKey, {}, false, text);
+}
+
+void KeySender::press(const Keystrokes& keys) {
+    for (const Keystroke& key : keys) {
+        if (key.letter == 0) {
+            press(key.keyCode, key.flags);
+        } else if (key.flags.isEmpty()) {
+            type({&key.letter, 1});
+        } else {
+            press(poster_.keyCodeOfLetter(key.letter), key.flags);
+        }
+    }
+}
+
 void KeySender::sendPlainText(std::u16string_view text) {
     const Sending sending(*this);
-    for (const auto& chunk : fragmentsForPlainText(text, setting_ ? *setting_ : ContextInputSetting{})) {
-        post(TextKey, {}, true, chunk);
-        post(TextKey, {}, false, chunk);
-    }
+    for (const auto& chunk : fragmentsForPlainText(text, setting_ ? *setting_ : ContextInputSetting{})) type(chunk);
 }
 
 void KeySender::sendKey(KeyCode keyCode, EventFlags flags, std::uint64_t count) {
@@ -53,7 +69,9 @@ void KeySender::sendKey(KeyCode keyCode, EventFlags flags, std::uint64_t count) 
 void KeySender::sendBackspaces(std::uint64_t count) {
     if (count == 0) return;
     const Sending sending(*this);
-    if (AXUtils::getSelectedTextLength(accessibility_) != 0) press(KeyCode::ForwardDelete, {});
+    // A proposal that was overwritten may still be told as selected.
+    const bool mayBeSelected = !setting_ || !setting_->overtypesCompletion;
+    if (mayBeSelected && AXUtils::getSelectedTextLength(accessibility_) != 0) press(KeyCode::ForwardDelete, {});
     for (std::uint64_t i = 0; i < count; ++i) press(KeyCode::Delete, {});
 }
 
@@ -65,16 +83,22 @@ void KeySender::sendShiftTab() {
     sendKey(KeyCode::Tab, EventFlag::Shift);
 }
 
-void KeySender::sendCopyCommand(bool withControl) {
+void KeySender::overtypeCompletion() {
     const Sending sending(*this);
-    if (const auto own = poster_.copyKeystroke()) return press(own->keyCode, own->flags);
+    type(Overtyping);
+    press(KeyCode::Delete, {});
+}
+
+void KeySender::sendCopyCommand(const ContextInputSetting& setting, bool withControl) {
+    const Sending sending(*this);
+    if (setting.copyKeys) return press(*setting.copyKeys);
     post(commandKeys_.c, withControl ? EventFlag::Control : EventFlag::Command, true);
     post(commandKeys_.c, {}, false);
 }
 
 void KeySender::sendPasteCommand(const ContextInputSetting& setting) {
     const Sending sending(*this);
-    if (const auto own = poster_.pasteKeystroke()) return press(own->keyCode, own->flags);
+    if (setting.pasteKeys && !setting.has(InputFlag::AlternativePasting)) return press(*setting.pasteKeys);
     const EventFlag modifier = setting.has(InputFlag::UseControlKey) ? EventFlag::Control : EventFlag::Command;
     // A V that the user still holds would make our press of it no press at all.
     if (poster_.isKeyDown(commandKeys_.v)) post(commandKeys_.v, {}, false);

@@ -40,7 +40,11 @@ class KeySender {
     void sendBackspaces(std::uint64_t count);
     void sendLeftArrowKeys(std::uint64_t count);
     void sendShiftTab();
-    void sendCopyCommand(bool withControl);
+    // For a program that proposes how a word goes on: what it has proposed is overwritten, and the text stands as it
+    // was typed. Without a proposal nothing changes.
+    void overtypeCompletion();
+    // Control in place of Command counts where the setting names no keys.
+    void sendCopyCommand(const ContextInputSetting& setting, bool withControl);
     void sendPasteCommand(const ContextInputSetting& setting);
 
   private:
@@ -58,6 +62,8 @@ class KeySender {
 
     void post(KeyCode keyCode, EventFlags flags, bool down, std::u16string_view text = {});
     void press(KeyCode keyCode, EventFlags flags);
+    void type(std::u16string_view text);
+    void press(const Keystrokes& keys);
     void sendAlternativePaste(const ContextInputSetting& setting, EventFlag modifier);
 
     EventPoster& poster_;

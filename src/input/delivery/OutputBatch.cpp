@@ -22,6 +22,13 @@ bool isKey(const PLOutput::Fragment& fragment) {
     return std::holds_alternative<KeyFragment>(fragment);
 }
 
+// Text would overtake the keys at the end of the batch.
+bool hasToSettle(const OutputBatch& batch, const ContextInputSetting& setting) {
+    if (setting.afterErasingDelay <= 0 || batch.steps.empty()) return false;
+    const Kind last = batch.steps.back().kind;
+    return last != Kind::Text && last != Kind::Paste;
+}
+
 // Takes one batch apart, front to back.
 class BatchTaker {
   public:
@@ -30,10 +37,12 @@ class BatchTaker {
     OutputBatch take() {
         if (!takeBackspaces()) return std::move(batch_);
         // Exactly a whole batch of backspaces ends an output: what programs have come to expect.
-        if (budget_ == 0) return std::move(batch_);
+        if (budget_ == 0 && !hasToSettle(batch_, setting_)) return std::move(batch_);
         const bool goesOn = takeFragments();
         output_.fragments.erase(output_.fragments.begin(), output_.fragments.begin() + taken_);
         if (goesOn) takeLeftArrows();
+        // What the user types next is to find the keys' work done, too.
+        if (!batch_.pause && hasToSettle(batch_, setting_)) pauseFor(setting_.afterErasingDelay);
         return std::move(batch_);
     }
 
@@ -49,6 +58,7 @@ class BatchTaker {
     bool takeFragments() {
         while (static_cast<std::size_t>(taken_) < output_.fragments.size()) {
             PLOutput::Fragment& fragment = output_.fragments[static_cast<std::size_t>(taken_)];
+            if (!isKey(fragment) && hasToSettle(batch_, setting_)) return pauseFor(setting_.afterErasingDelay);
             const bool goesOn = isKey(fragment) ? takeKey(fragment) : takeText(fragment);
             if (!goesOn) return false;
             if (budget_ == 0) return pauseFor(BatchPause);
@@ -107,7 +117,7 @@ class BatchTaker {
     }
 
     bool pauseFor(double seconds) {
-        batch_.pause = seconds;
+        batch_.pause = hasToSettle(batch_, setting_) ? std::max(seconds, setting_.afterErasingDelay) : seconds;
         return false;
     }
 
@@ -128,6 +138,7 @@ bool isSentInOneBatch(const PLOutput& output, const ContextInputSetting& setting
     PLOutput rest = output;
     const OutputBatch first = takeBatch(rest, setting);
     if (!first.pause) return true;
+    if (hasToSettle(first, setting)) return false;
     const bool pastesLater =
         pauseAfterPaste(setting) > 0 && std::any_of(first.steps.begin(), first.steps.end(),
                                                     [](const OutputStep& step) { return step.kind == Kind::Paste; });

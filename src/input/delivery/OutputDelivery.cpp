@@ -67,6 +67,7 @@ void OutputDelivery::start() {
     current_->tookOverRestore = provider_.cancelRestore();
     // A backup may have to read megabytes from a program: only for what goes through the clipboard.
     if (current_->restoresClipboard && current_->setting->has(InputFlag::UseClipboard)) provider_.backup();
+    if (current_->setting->overtypesCompletion && current_->output->backspaceCount > 0) sender_.overtypeCompletion();
     sendBatch();
 }
 
@@ -145,6 +146,7 @@ void OutputDelivery::paste(const PLOutput::Fragment& fragment) {
 }
 
 void OutputDelivery::offer(const PLOutput::Fragment& fragment) {
+    dependencies_.pasteboard.setPastesPrimary(current_->setting->pastesPrimary);
     if (const auto* text = std::get_if<std::u16string>(&fragment)) {
         provider_.setString(*text);
     } else if (const auto* rich = std::get_if<AttributedString>(&fragment)) {

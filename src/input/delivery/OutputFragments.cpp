@@ -16,6 +16,12 @@ bool isOwnChunk(char16_t unit) {
     return unit == u'\t' || CharacterSet::newlines().contains(unit);
 }
 
+void typeRichText(std::vector<PLOutput::Fragment>& fragments) {
+    for (PLOutput::Fragment& fragment : fragments) {
+        if (const auto* rich = std::get_if<AttributedString>(&fragment)) fragment = std::u16string(rich->string());
+    }
+}
+
 }  // namespace
 
 std::vector<std::u16string> fragmentsForPlainText(std::u16string_view text, const ContextInputSetting& setting) {
@@ -50,7 +56,8 @@ void refreshFragmentsForOuput(PLOutput& output, const ContextInputSetting& setti
     const std::int64_t distance = content ? content->caretDistanceFromEnding() : 0;
     output.leftArrowCount = static_cast<std::uint64_t>(std::max<std::int64_t>(distance, 0));
     output.refreshFragments();
-    if (content && !content->isRich() && !setting.has(InputFlag::UseClipboard)) {
+    if (!setting.canPaste()) typeRichText(output.fragments);
+    if (content && (!content->isRich() || !setting.canPaste()) && !setting.has(InputFlag::UseClipboard)) {
         output.fragments = fragmentsForOutputFragments(output.fragments, setting);
     }
 }

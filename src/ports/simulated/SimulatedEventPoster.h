@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "platform/EventPoster.h"
+#include "ports/simulated/SimulatedInputSources.h"
 #include "ports/simulated/SimulatedKeyboard.h"
 
 namespace plume {
@@ -25,9 +26,10 @@ class SimulatedEventPoster final : public EventPoster {
         deliver_(key);
     }
     bool canType(std::u16string_view text) const override { return !canType_ || canType_(text); }
+    KeyCode keyCodeOfLetter(char16_t letter) const override {
+        return SimulatedInputSources::strokeFor(letter).value_or(SimulatedInputSources::Stroke()).keyCode;
+    }
     bool isKeyDown(KeyCode keyCode) const override { return keyboard_.isDown(keyCode); }
-    std::optional<CommandKeystroke> pasteKeystroke() const override { return pasteKeystroke_; }
-    std::optional<CommandKeystroke> copyKeystroke() const override { return copyKeystroke_; }
     Point pointerLocation() const override { return pointer_; }
     void click(Point location) override { clicks_.push_back(location); }
     void holdUserKeys() override { keyboard_.hold(); }
@@ -36,8 +38,6 @@ class SimulatedEventPoster final : public EventPoster {
     void setPointerLocation(Point location) { pointer_ = location; }
     // Which texts the keyboard has keys for; every text at first.
     void setCanType(std::function<bool(std::u16string_view)> canType) { canType_ = std::move(canType); }
-    void setPasteKeystroke(std::optional<CommandKeystroke> keystroke) { pasteKeystroke_ = keystroke; }
-    void setCopyKeystroke(std::optional<CommandKeystroke> keystroke) { copyKeystroke_ = keystroke; }
     // Where Plume clicked, in order.
     const std::vector<Point>& clicks() const { return clicks_; }
     int postedPastTap() const { return postedPastTap_; }
@@ -47,8 +47,6 @@ class SimulatedEventPoster final : public EventPoster {
     const Deliver deliver_;
     Point pointer_;
     std::function<bool(std::u16string_view)> canType_;
-    std::optional<CommandKeystroke> pasteKeystroke_;
-    std::optional<CommandKeystroke> copyKeystroke_;
     std::vector<Point> clicks_;
     int postedPastTap_ = 0;
 };

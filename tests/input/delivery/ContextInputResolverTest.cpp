@@ -74,6 +74,22 @@ TEST_F(ContextInputResolverTest, TheNewLineRuleStaysInAFamilyAndWhatNoKeyProduce
     EXPECT_TRUE(pastes(u"text"));
 }
 
+TEST_F(ContextInputResolverTest, PastesWhatAnApplicationDoesNotTakeTypedUnlessNoKeyPastes) {
+    auto setting = std::make_shared<ContextInputSetting>();
+    setting->longestTyped = 3;
+    setting->typesBeyondBmp = false;
+    poster.untypeable = u'\u4E00';
+    for (const bool canPaste : {true, false}) {
+        if (!canPaste) setting->pasteKeys = Keystrokes();
+        resolver.applicationSettings.set(u"editor", std::make_shared<ContextInputSetting>(*setting));
+        activate(u"editor");
+        EXPECT_FALSE(pastes(u"abc"));
+        for (const char16_t* text : {u"abcd", u"\U0001F600", u"\u4E00"}) EXPECT_EQ(pastes(text), canPaste);
+        EXPECT_EQ(resolver.setting()->blockLength, canPaste ? 0U : 2U) << "in portions that wait for free key codes";
+        EXPECT_EQ(pastes(AttributedString(u"rich")), canPaste);
+    }
+}
+
 TEST_F(ContextInputResolverTest, ErasingAloneFollowsThePreference) {
     activate(u"editor");
     resolver.preferences.useClipboardForLongText = true;

@@ -73,9 +73,13 @@ TEST_F(KeySenderTest, PastesAsTheApplicationWantsIt) {
         EXPECT_EQ(poster.take(), c.events) << c.about;
     }
     poster.held.clear();
-    poster.own = CommandKeystroke{KeyCode::Help, EventFlag::Shift};
-    sender.sendPasteCommand(with({}));
-    EXPECT_THAT(poster.take(), ElementsAre("v114/1", "^114/1")) << "the program's own keystroke";
+    ContextInputSetting named;
+    named.pasteKeys = {{u'y', KeyCode::None, EventFlag::Control}, {u'+'}, {0, KeyCode::Help, EventFlag::Shift}};
+    sender.sendPasteCommand(named);
+    EXPECT_EQ(poster.takeLine(), "v16/2 ^16/2 v+ ^+ v114/1 ^114/1") << "the keys of the setting before all others";
+    named.copyKeys = Keystrokes();
+    sender.sendCopyCommand(named, true);
+    EXPECT_EQ(poster.takeLine(), "") << "no key copies";
 }
 
 }  // namespace

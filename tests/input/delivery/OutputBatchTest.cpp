@@ -51,6 +51,7 @@ struct BatchCase {
     InputFlags flags = {};
     double pastingDelay = 0;
     double afterPastingDelay = 0;
+    double afterErasingDelay = 0;
 };
 
 const BatchCase Cases[] = {
@@ -82,6 +83,18 @@ const BatchCase Cases[] = {
     {"never no wait", 0, {Text}, 0, {"P1 +0.005", "."}, false, UseClipboard | DelayPasting},
     {"by way of activation", 0, {Text}, 0, {"P1 +0.4", "."}, false, UseClipboard | Reactivate, 0, 0.05},
     {"typed all the same", 0, {Text}, 0, {"T1 ."}, true, DelayPasting},
+    {"keys settle",
+     25,
+     {Text, key(1), key(1), Text},
+     2,
+     {"B20 +0.04", "B5 +0.03", "T1 K2 +0.03", "T1 L2 +0.03", "."},
+     false,
+     {},
+     0,
+     0,
+     0.03},
+    {"at the end, too", 20, {key(1, 0.01)}, 0, {"B20 +0.03", "K1 +0.03", "."}, false, {}, 0, 0, 0.03},
+    {"nothing has to", 0, {Text}, 0, {"T1 ."}, true, {}, 0, 0, 0.03},
 };
 
 TEST(OutputBatch, TakesAnOutputApart) {
@@ -94,6 +107,7 @@ TEST(OutputBatch, TakesAnOutputApart) {
         setting.flags = c.flags;
         setting.pastingDelay = c.pastingDelay;
         setting.afterPastingDelay = c.afterPastingDelay;
+        setting.afterErasingDelay = c.afterErasingDelay;
         EXPECT_EQ(isSentInOneBatch(output, setting), c.isSentInOneBatch) << c.about;
         std::vector<std::string> batches;
         for (bool more = true; more && batches.size() < 10;) {

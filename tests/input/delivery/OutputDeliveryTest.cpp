@@ -83,6 +83,18 @@ TEST(OutputDelivery, KeysLetGoBetweenOutputsMayOrderAnother) {
     EXPECT_EQ(desk.poster.takeLine(), "vfirst ^first release hold vsecond ^second release hold vlate ^late release");
 }
 
+TEST(OutputDelivery, ACompletionThatIsProposedIsOverwrittenBeforeItIsErased) {
+    InputDesk desk;
+    auto setting = std::make_shared<ContextInputSetting>();
+    setting->overtypesCompletion = true;
+    setting->pasteKeys = Keystrokes();
+    desk.service.setCustomApplicationSetting(u"editor", setting);
+    const auto output = InputDesk::output(u"", 2);
+    output->snippetExpandedContent->content = AttributedString(u"rich");
+    desk.service.sendOutput(output);
+    EXPECT_EQ(desk.poster.takeLine(), "hold vx ^x v51*3 vrich ^rich release") << "and no key pastes rich text";
+}
+
 struct PasteCase {
     const char* about;
     InputFlags flags;

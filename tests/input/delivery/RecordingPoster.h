@@ -32,9 +32,8 @@ class RecordingPoster final : public EventPoster {
         if (onPost) onPost(key);
     }
     bool canType(std::u16string_view text) const override { return text.find(untypeable) == std::u16string_view::npos; }
+    KeyCode keyCodeOfLetter(char16_t letter) const override { return letter == u'v' ? KeyCode::V : KeyCode::Y; }
     bool isKeyDown(KeyCode keyCode) const override { return held.contains(keyCode); }
-    std::optional<CommandKeystroke> pasteKeystroke() const override { return own; }
-    std::optional<CommandKeystroke> copyKeystroke() const override { return own; }
     Point pointerLocation() const override { return {30, 40}; }
     void click(Point) override { write("click"); }
     void holdUserKeys() override { write("hold"); }
@@ -76,7 +75,6 @@ class RecordingPoster final : public EventPoster {
     const RunLoop* clock = nullptr;
     std::set<KeyCode> held;
     char16_t untypeable = u'\uFFFF';
-    std::optional<CommandKeystroke> own;
     std::function<void(const SynthesisedKey&)> onPost;
     std::function<void()> onRelease;
 

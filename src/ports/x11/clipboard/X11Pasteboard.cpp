@@ -140,7 +140,7 @@ void X11Pasteboard::setData(std::string_view bytes, std::string_view type) {
 }
 
 void X11Pasteboard::offerPrimary() {
-    if (content_->isExpansion() && pastesPrimary && pastesPrimary()) {
+    if (content_->isExpansion() && pastesPrimary_) {
         if (!primary_->isOwner()) selectedBefore_ = selectedText();
         primary_->own(content_);
     } else if (primary_->isOwner() && primary_->content() != selectedBefore_) {

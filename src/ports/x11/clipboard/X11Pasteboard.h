@@ -32,10 +32,6 @@ class X11Pasteboard final : public Pasteboard {
     X11Pasteboard(const X11Pasteboard&) = delete;
     X11Pasteboard& operator=(const X11Pasteboard&) = delete;
 
-    // Whether the program in front pastes the PRIMARY selection. While it does, an expansion is offered there, too, and
-    // the text that was selected before returns with the clipboard's content.
-    std::function<bool()> pastesPrimary;
-
     // Keeps what is read of other programs' content, as long as it is the newest. Outlives the pasteboard.
     void setSharedCopy(SharedClipboardCopy* copy) { sharedCopy_ = copy; }
     // Offers what another Plume read before it ended. Nobody must hold the clipboard.
@@ -51,6 +47,8 @@ class X11Pasteboard final : public Pasteboard {
     std::int64_t changeCount() const override;
     bool tellsWhenTaken() const override { return true; }
     std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) override;
+    // The PRIMARY selection: the text that was selected before returns with the clipboard's content.
+    void setPastesPrimary(bool pastesPrimary) override { pastesPrimary_ = pastesPrimary; }
     void setString(std::u16string_view string, std::string_view type) override;
     void setData(std::string_view bytes, std::string_view type) override;
 
@@ -69,6 +67,7 @@ class X11Pasteboard final : public Pasteboard {
 
     X11Session& session_;
     SharedClipboardCopy* sharedCopy_ = nullptr;
+    bool pastesPrimary_ = false;
     std::int64_t changeCount_ = 0;
     std::int64_t declaredCount_ = 0;  // of the last declaration
     // What programs gave along with their data: a backup of it is given back alike.

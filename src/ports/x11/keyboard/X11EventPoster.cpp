@@ -233,36 +233,7 @@ bool X11EventPoster::awaitSpare(double deadline) const {
     return true;
 }
 
-// ---- What programs want, and what the user does ----
-
-PasteStyle X11EventPoster::pasteStyle() const {
-    const auto identifier = frontIdentifier ? frontIdentifier() : std::nullopt;
-    return identifier ? pasteStyleOf(*identifier) : PasteStyle::Control;
-}
-
-std::optional<CommandKeystroke> X11EventPoster::pasteKeystroke() const {
-    switch (pasteStyle()) {
-        case PasteStyle::ShiftInsert:
-            return CommandKeystroke{KeyCode::Help, EventFlag::Shift};
-        case PasteStyle::ControlShift:
-            return CommandKeystroke{keyCodeOfLetter(u'v'), EventFlag::Control | EventFlag::Shift};
-        case PasteStyle::Control:
-            break;
-    }
-    return CommandKeystroke{keyCodeOfLetter(u'v'), EventFlag::Control};
-}
-
-std::optional<CommandKeystroke> X11EventPoster::copyKeystroke() const {
-    switch (pasteStyle()) {
-        case PasteStyle::ShiftInsert:
-            return CommandKeystroke{KeyCode::None, {}};  // the usual keystroke would interrupt what runs there
-        case PasteStyle::ControlShift:
-            return CommandKeystroke{keyCodeOfLetter(u'c'), EventFlag::Control | EventFlag::Shift};
-        case PasteStyle::Control:
-            break;
-    }
-    return CommandKeystroke{keyCodeOfLetter(u'c'), EventFlag::Control};
-}
+// ---- The keyboard and the pointer ----
 
 KeyCode X11EventPoster::keyCodeOfLetter(char16_t letter) const {
     const XkbKeymap& keymap = *keyboard_.keymap();

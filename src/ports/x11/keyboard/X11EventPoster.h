@@ -14,9 +14,7 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
-#include <optional>
 #include <span>
-#include <string>
 #include <string_view>
 #include <vector>
 
@@ -25,7 +23,6 @@
 #include "ports/x11/keyboard/SpareKeyWriter.h"
 #include "ports/x11/keyboard/SpareKeycodes.h"
 #include "ports/x11/keyboard/TapConnection.h"
-#include "ports/x11/keyboard/TerminalApplications.h"
 #include "ports/x11/keyboard/X11KeyboardTap.h"
 #include "ports/x11/keyboard/XkbKeyboard.h"
 
@@ -40,8 +37,6 @@ class X11EventPoster final : public EventPoster {
     X11EventPoster(const X11EventPoster&) = delete;
     X11EventPoster& operator=(const X11EventPoster&) = delete;
 
-    // Which program is in front, by its identifier: it decides what pastes and copies.
-    std::function<std::optional<std::u16string>()> frontIdentifier;
     // Called at least every 100 ms while something is waited for.
     std::function<void()> heartbeat;
 
@@ -49,9 +44,8 @@ class X11EventPoster final : public EventPoster {
     void end() override;
     void post(const SynthesisedKey& key, bool pastTap) override;
     bool canType(std::u16string_view text) const override;
+    KeyCode keyCodeOfLetter(char16_t letter) const override;
     bool isKeyDown(KeyCode keyCode) const override;
-    std::optional<CommandKeystroke> pasteKeystroke() const override;
-    std::optional<CommandKeystroke> copyKeystroke() const override;
     Point pointerLocation() const override;
     void click(Point location) override;
     void holdUserKeys() override { tap_.hold(); }
@@ -74,8 +68,6 @@ class X11EventPoster final : public EventPoster {
     void sendItem(const Item& item);
     void setModifiers(std::uint8_t wanted);
     bool awaitSpare(double deadline) const;
-    PasteStyle pasteStyle() const;
-    KeyCode keyCodeOfLetter(char16_t letter) const;
 
     const RunLoop& loop_;
     TapConnection& connection_;
