@@ -5,6 +5,7 @@
 #include <fstream>
 #include <string>
 
+#include "Foundation/Strings.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/PlumeProgram.h"
 
@@ -41,9 +42,9 @@ class Program : public testing::Test {
 
     void SetUp() override { start(Library); }
 
-    void start(const std::string& library) {
+    void start(const std::string& library, const std::string& settings = R"({ "PlayFeedbackSound": false })") {
         plume_.reset();
-        plume_ = std::make_unique<PlumeProgram>(*rig_, library, R"({ "PlayFeedbackSound": false })");
+        plume_ = std::make_unique<PlumeProgram>(*rig_, library, settings);
     }
     std::string log() { return plume_->process().logTail(); }
 
@@ -108,6 +109,17 @@ TEST_F(Program, DoesNotListenToWhatAPromptInATerminalHides) {
     std::string read;
     std::getline(std::ifstream(home / "read"), read);
     EXPECT_EQ(read, "Kind regards, Jo|;sig|Kind regards, Jo");
+}
+
+// More new characters at once than there are spare key codes.
+TEST_F(Program, TypesAllOfATextWhereNoKeyPastes) {
+    std::u16string text = u"|";
+    for (char16_t c = 0x4E00; c < 0x4E64; ++c) text += c;
+    start(R"([{"items": [{"abbreviation": "cjk", "content": ")" + toUtf8(text) + R"("}]}])",
+          R"({"PlayFeedbackSound": false, "CustomApplicationSettings": {"gtk_*": {"pasteKeys": "none"}}})");
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    rig_->keyboard().type("cjk");
+    EXPECT_EQ(target->awaitText(toUtf8(text)), toUtf8(text)) << log();
 }
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,
