@@ -14,6 +14,7 @@ namespace plume {
 namespace {
 
 constexpr char16_t LineSeparator = 0x2028;
+constexpr char16_t NoBreakSpace = 0xa0;
 constexpr char16_t ParagraphSeparator = 0x2029;
 constexpr char16_t ObjectReplacementCharacter = 0xfffc;
 
@@ -115,6 +116,22 @@ std::string styleOf(const ParagraphStyle& paragraph) {
     const double first = paragraph.firstLineHeadIndent - paragraph.headIndent;
     if (first != 0) style += "text-indent:" + number(first) + "pt;";
     return style;
+}
+
+bool isLineBreak(char16_t c) {
+    return c == LineSeparator || c == u'\v' || c == u'\f';
+}
+
+// HTML folds a space into one before it, whatever elements are between, and drops one at the start of a line or at the
+// end of what is pasted.
+std::u16string withKeptSpaces(std::u16string text, bool endsAll) {
+    char16_t before = LineSeparator;
+    for (char16_t& c : text) {
+        if (c == u' ' && (before == u' ' || isLineBreak(before))) c = NoBreakSpace;
+        before = c;
+    }
+    if (endsAll && text.ends_with(u' ')) text.back() = NoBreakSpace;
+    return text;
 }
 
 bool isOrdered(const TextList& list) {
@@ -236,9 +253,10 @@ class Exporter {
 
     void writeRuns(Range range) {
         const AttributedString piece = text_.substring(range);
+        const std::u16string text = withKeptSpaces(piece.string(), range.end() == text_.string().size());
         std::size_t position = 0;
         for (const auto& run : piece.runs()) {
-            writeRun(std::u16string_view(piece.string()).substr(position, run.length), run.attributes);
+            writeRun(std::u16string_view(text).substr(position, run.length), run.attributes);
             position += run.length;
         }
     }
@@ -267,23 +285,21 @@ class Exporter {
     }
 
     void writeText(std::u16string_view text, const TextAttributes& look) {
-        bool afterSpace = markup_.html.empty() || markup_.html.back() == '>';
         for (std::size_t i = 0; i < text.size(); ++i) {
             const char16_t c = text[i];
             if (c == ObjectReplacementCharacter && look.attachment) {
                 writeImage(*look.attachment);
-            } else if (c == LineSeparator || c == u'\v' || c == u'\f') {
+            } else if (isLineBreak(c)) {
                 markup_.start("br");
             } else if (c == u'\t') {
                 markup_.html += "<span style=\"white-space:pre\">\t</span>";
-            } else if (c == u' ' && afterSpace) {
-                markup_.html += "&nbsp;";  // HTML would fold it into the one before
+            } else if (c == NoBreakSpace) {
+                markup_.html += "&nbsp;";
             } else if (c >= u' ' || c == 0) {
                 const bool isPair = (c & 0xfc00) == 0xd800 && i + 1 < text.size();
                 appendEscaped(markup_.html, c == 0 ? u"\xfffd" : text.substr(i, isPair ? 2 : 1));
                 i += isPair ? 1 : 0;
             }
-            afterSpace = c == u' ' && !afterSpace;
         }
     }
 

@@ -32,14 +32,14 @@ TEST(HTMLExport, WritesWhatTheTextLooksLike) {
         {"line ends", AttributedString(u"a\r\nb\u2029c\u2028d"), "<p>a</p><p>b</p><p>c<br>d</p>"},
         {"no paragraphs", AttributedString(u"a\nb"), "a<br>b", false},
         {"no paragraphs, break at the end", AttributedString(u"a\n\nb\n"), "a<br><br>b<br>", false},
-        {"spaces", AttributedString(u" a  b "), "<p>&nbsp;a &nbsp;b </p>"},
+        {"spaces", AttributedString(u" a  b \n c "), "<p>&nbsp;a &nbsp;b </p><p>&nbsp;c&nbsp;</p>"},
         {"tab", AttributedString(u"a\tb"), "<p>a<span style=\"white-space:pre\">\t</span>b</p>"},
         {"bold",
-         joined({AttributedString(u"a"), attributed(u"b",
+         joined({AttributedString(u"a"), attributed(u" b",
                                                     [](auto& a) {
                                                         a.font = FontAttribute{u"", 0, true, true};
                                                     })}),
-         "<p>a<b><i>b</i></b></p>"},
+         "<p>a<b><i> b</i></b></p>"},
         {"font",
          attributed(u"a",
                     [](auto& a) {
