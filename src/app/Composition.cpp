@@ -91,7 +91,7 @@ void Composition::makeParts() {
                                                     engine_->setEnabled(!engine_->enabled());
                                                     if (environment_.enabledChanged)
                                                         environment_.enabledChanged(engine_->enabled());
-                                                    ports_.sounds.play("Pop");
+                                                    ports_.sounds.playOrBeep("Pop");
                                                 },
                                                 [this] { engine_->suggestAbbreviations(); },
                                                 [this] { engine_->quickSearch(); }, [this] { engine_->clear(); },

@@ -1,4 +1,4 @@
-// The system's sounds, by name ("Pop").
+// Sounds by name ("Pop").
 #pragma once
 
 #include <string_view>
@@ -8,9 +8,11 @@ namespace plume {
 class Sounds {
   public:
     virtual ~Sounds() = default;
-    // Starts the sound and returns at once; one that is missing is a beep, and without any device nothing. From any
-    // thread.
+    // Both start the sound and return at once; without any device there is none. From any thread.
+    // One that is missing is silence.
     virtual void play(std::string_view name) = 0;
+    // One that is missing is a beep: for what the user must not miss.
+    virtual void playOrBeep(std::string_view name) = 0;
 };
 
 }  // namespace plume

@@ -161,11 +161,9 @@ class Examination {
     }
 
     void examineSounds() {
-        for (const char* folder : {"/usr/share/sounds/freedesktop", "/usr/local/share/sounds/freedesktop"}) {
-            std::error_code problem;
-            if (std::filesystem::is_directory(folder, problem)) return good("sounds", "the sound theme is installed");
-        }
-        warn("sounds", "there is no sound theme, so expansions are silent; install sound-theme-freedesktop.");
+        std::error_code problem;
+        if (std::filesystem::is_directory(soundFolder(), problem)) return good("sounds", "Plume's own are there");
+        warn("sounds", soundFolder().string() + " is not there, so expansions are silent; install Plume again.");
     }
 
     void examineWatchdog() {

@@ -52,4 +52,8 @@ std::filesystem::path dataFolder() {
     return programFolder().parent_path() / "share" / "plume";
 }
 
+std::filesystem::path soundFolder() {
+    return dataFolder() / "sounds";
+}
+
 }  // namespace plume

@@ -15,6 +15,8 @@ Result<std::string> readWholeFile(const std::filesystem::path& path);
 std::filesystem::path configurationFolder();
 // What came with this program, found from where the program lies: ../share/plume beside its folder.
 std::filesystem::path dataFolder();
+// Plume's own sounds, of which some may be missing.
+std::filesystem::path soundFolder();
 // Where this program lies; empty when the system does not tell.
 std::filesystem::path programFolder();
 

@@ -160,7 +160,7 @@ int runInSession(const ChosenLibrary& library, const std::optional<std::string>&
     if (!settings) return refuse(settings.error(), ExitStatus::WrongInput);
 
     const FileDescriptor signals = endSignals();
-    const auto port = LinuxPort::open({});
+    const auto port = LinuxPort::open({}, soundFolder());
     if (!port) return refuse(port.error(), ExitStatus::MissingSystem);
     const Result<InstanceLock> lock = InstanceLock::take({});
     if (!lock) return refuse(lock.error(), ExitStatus::Failure);

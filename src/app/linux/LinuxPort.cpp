@@ -32,8 +32,8 @@ bool movesFocus(KeyCode keyCode, EventFlags flags) {
 
 }  // namespace
 
-Result<std::unique_ptr<LinuxPort>> LinuxPort::open(const std::string& display) {
-    std::unique_ptr<LinuxPort> port(new LinuxPort());
+Result<std::unique_ptr<LinuxPort>> LinuxPort::open(const std::string& display, const std::filesystem::path& ownSounds) {
+    std::unique_ptr<LinuxPort> port(new LinuxPort(ownSounds));
     if (const auto begun = port->begin(display); !begun) return begun.error();
     return port;
 }

@@ -6,6 +6,7 @@
 // more and nobody uses the ports.
 #pragma once
 
+#include <filesystem>
 #include <functional>
 #include <memory>
 #include <string>
@@ -37,8 +38,10 @@ namespace plume {
 
 class LinuxPort {
   public:
-    // An empty display means $DISPLAY. The error says what the desktop lacks, and what to install or to switch on.
-    static Result<std::unique_ptr<LinuxPort>> open(const std::string& display);
+    // An empty display means $DISPLAY; `ownSounds` is the folder with Plume's sounds, if there is one. The error says
+    // what the desktop lacks, and what to install or to switch on.
+    static Result<std::unique_ptr<LinuxPort>> open(const std::string& display,
+                                                   const std::filesystem::path& ownSounds = {});
     // The watchdog, without which the keyboard must not be taken. On the tap thread, or before its loop runs.
     Result<void> startWatchdog();
     LinuxPort(const LinuxPort&) = delete;
@@ -56,7 +59,7 @@ class LinuxPort {
     void leave() { pasteboard_->handOver(); }
 
   private:
-    LinuxPort() = default;
+    explicit LinuxPort(const std::filesystem::path& ownSounds) : sounds_(ownSounds) {}
     Result<void> begin(const std::string& display);
     Result<void> openKeyboard(const std::string& display);
     Result<void> openDesktop(const std::string& display);

@@ -2,7 +2,6 @@
 
 #include <canberra.h>
 
-#include <array>
 #include <condition_variable>
 #include <cstdlib>
 #include <deque>
@@ -13,21 +12,14 @@
 #include <string>
 #include <system_error>
 #include <thread>
+#include <utility>
+
+#include "ports/posix/SoundSource.h"
 
 namespace plume {
 
 namespace {
 
-struct EventName {
-    std::string_view sound;
-    const char* event;
-};
-
-// What comes closest in the freedesktop sound theme to the sounds that Plume knows by name.
-constexpr std::array EventNames = {
-    EventName{"Basso", "dialog-error"}, EventName{"Funk", "dialog-warning"}, EventName{"Glass", "complete"},
-    EventName{"Ping", "bell"},          EventName{"Pop", "message"},         EventName{"Tink", "button-pressed"},
-};
 constexpr const char* Beep = "bell";
 
 constexpr std::size_t MostWaiting = 4;
@@ -35,13 +27,6 @@ constexpr std::size_t MostWaiting = 4;
 struct ContextDestroy {
     void operator()(ca_context* context) const { ca_context_destroy(context); }
 };
-
-std::string eventOf(std::string_view sound) {
-    for (const EventName& name : EventNames) {
-        if (name.sound == sound) return name.event;
-    }
-    return std::string(sound);
-}
 
 // Without any, libcanberra's ALSA driver would write lines of complaints about it to standard error.
 bool hasSoundDevice() {
@@ -51,19 +36,29 @@ bool hasSoundDevice() {
            (runtime && std::filesystem::exists(std::filesystem::path(runtime) / "pulse", ignored));
 }
 
-int start(ca_context* context, const char* event) {
-    return ca_context_play(context, 0, CA_PROP_EVENT_ID, event, CA_PROP_CANBERRA_CACHE_CONTROL, "volatile", nullptr);
+struct Order {
+    std::string name;
+    bool beepsInstead;  // where the sound is missing
+};
+
+int start(ca_context* context, const SoundSource& source) {
+    const char* const property = source.file.empty() ? CA_PROP_EVENT_ID : CA_PROP_MEDIA_FILENAME;
+    const std::string& value = source.file.empty() ? source.event : source.file.native();
+    return ca_context_play(context, 0, property, value.c_str(), CA_PROP_MEDIA_ROLE, "event",
+                           CA_PROP_CANBERRA_CACHE_CONTROL, "volatile", nullptr);
 }
 
 }  // namespace
 
 class CanberraSounds::Player {
   public:
-    void play(const std::shared_ptr<Player>& self, std::string_view name) {
+    explicit Player(std::filesystem::path ownSounds) : ownSounds_(std::move(ownSounds)) {}
+
+    void play(const std::shared_ptr<Player>& self, std::string_view name, bool beepsInstead) {
         const std::scoped_lock lock(mutex_);
         // A server that hangs must not make sounds pile up and all play later.
         if (waiting_.size() >= MostWaiting) return;
-        waiting_.emplace_back(name);
+        waiting_.push_back({std::string(name), beepsInstead});
         if (!isRunning_) std::thread([self] { self->run(); }).detach();
         isRunning_ = true;
         changed_.notify_one();
@@ -77,20 +72,20 @@ class CanberraSounds::Player {
 
   private:
     void run() {
-        while (const auto name = next()) playNow(*name);
+        while (const auto order = next()) playNow(*order);
         context_.reset();
     }
 
-    std::optional<std::string> next() {
+    std::optional<Order> next() {
         std::unique_lock lock(mutex_);
         changed_.wait(lock, [this] { return ended_ || !waiting_.empty(); });
         if (ended_) return std::nullopt;
-        std::string name = std::move(waiting_.front());
+        Order order = std::move(waiting_.front());
         waiting_.pop_front();
-        return name;
+        return order;
     }
 
-    void playNow(const std::string& name) {
+    void playNow(const Order& order) {
         if (!context_) {
             if (!hasSoundDevice()) return;
             ca_context* context = nullptr;
@@ -99,25 +94,32 @@ class CanberraSounds::Player {
             ca_context_change_props(context, CA_PROP_APPLICATION_NAME, "Plume", nullptr);
         }
         // Every other failure means that there is no device, or that the user wants no sounds.
-        if (start(context_.get(), eventOf(name).c_str()) == CA_ERROR_NOTFOUND) start(context_.get(), Beep);
+        const bool isMissing = start(context_.get(), soundSourceOf(order.name, ownSounds_)) == CA_ERROR_NOTFOUND;
+        if (isMissing && order.beepsInstead) start(context_.get(), {.file = {}, .event = Beep});
     }
 
+    const std::filesystem::path ownSounds_;
     std::unique_ptr<ca_context, ContextDestroy> context_;  // the thread's own
     std::mutex mutex_;                                     // over all that follows
     std::condition_variable changed_;
-    std::deque<std::string> waiting_;
+    std::deque<Order> waiting_;
     bool isRunning_ = false;
     bool ended_ = false;
 };
 
-CanberraSounds::CanberraSounds() : player_(std::make_shared<Player>()) {}
+CanberraSounds::CanberraSounds(std::filesystem::path ownSounds)
+    : player_(std::make_shared<Player>(std::move(ownSounds))) {}
 
 CanberraSounds::~CanberraSounds() {
     player_->end();
 }
 
 void CanberraSounds::play(std::string_view name) {
-    player_->play(player_, name);
+    player_->play(player_, name, false);
+}
+
+void CanberraSounds::playOrBeep(std::string_view name) {
+    player_->play(player_, name, true);
 }
 
 }  // namespace plume

@@ -11,6 +11,7 @@ namespace plume {
 class SimulatedSounds final : public Sounds {
   public:
     void play(std::string_view name) override { played_.emplace_back(name); }
+    void playOrBeep(std::string_view name) override { play(name); }
     const std::vector<std::string>& played() const { return played_; }
 
   private:
