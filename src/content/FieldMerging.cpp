@@ -14,6 +14,10 @@ using Fields = std::vector<std::shared_ptr<SnippetFieldVariable>>;
 
 void emptyUnusedFields(const Fields& fields) {
     for (const auto& field : fields) {
+        if (field->script) {
+            field->script->isSelected = field->isSelected;
+            field->value = u"";
+        }
         if (!field->value || (field->isOptional && !field->isSelected)) field->value = u"";
     }
 }
@@ -53,23 +57,30 @@ void insertValues(SnippetExpandedContent& content, const Fields& fields) {
 
 // Moves what is listed behind a field on by the length of its value, and lengthens the scripts that it lies in.
 void moveVariables(const SnippetExpandedContent& content, bool fieldsAscend) {
+    struct Script {
+        SnippetAbbreviationVariable* variable;
+        std::size_t lastInner;  // in the list: what stands at its end and is listed up to here lies in it
+    };
     std::size_t shift = 0;
-    std::vector<SnippetAbbreviationVariable*> scripts;  // that a further field may lie in
-    for (const auto& variable : content.variables) {
-        const auto* field = dynamic_cast<const SnippetFieldVariable*>(variable.get());
+    std::vector<Script> scripts;  // that a further field may lie in
+    for (std::size_t index = 0; index < content.variables.size(); ++index) {
+        SnippetVariable& variable = *content.variables[index];
+        const auto* field = dynamic_cast<const SnippetFieldVariable*>(&variable);
         if (field == nullptr) {
-            variable->location += shift;
-            if (auto* script = dynamic_cast<SnippetAbbreviationVariable*>(variable.get())) scripts.push_back(script);
+            variable.location += shift;
+            if (auto* script = dynamic_cast<SnippetAbbreviationVariable*>(&variable)) {
+                scripts.push_back({script, index + script->innerVariables});
+            }
             continue;
         }
         const std::size_t place = field->location + shift;
         const std::size_t length = lengthOfValue(*field, content.isRich());
-        const auto endsBefore = [place](const SnippetAbbreviationVariable* script) {
-            return script->location + script->scriptLength <= place;
+        const auto endsBefore = [place, index](const Script& script) {
+            return script.lastInner < index && script.variable->location + script.variable->scriptLength <= place;
         };
         if (fieldsAscend) std::erase_if(scripts, endsBefore);
-        for (auto* script : scripts) {
-            if (!endsBefore(script)) script->scriptLength += length;
+        for (const Script& script : scripts) {
+            if (!endsBefore(script)) script.variable->scriptLength += length;
         }
         shift += length;
     }

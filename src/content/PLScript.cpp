@@ -24,12 +24,14 @@ void PLScript::execute(ScriptRunner& runner) {
         PLScript* owner;
         std::size_t nextNested;
     };
+    if (!isWanted()) return;
     std::vector<Level> levels{{this, 0}};
     while (!levels.empty()) {
         Level& level = levels.back();
         PLScript* const current = level.owner;
         if (level.nextNested < current->nestedScripts.size()) {
-            levels.push_back({current->nestedScripts[level.nextNested++].get(), 0});
+            PLScript* const nested = current->nestedScripts[level.nextNested++].get();
+            if (nested->isWanted()) levels.push_back({nested, 0});
         } else {
             levels.pop_back();
             current->runMerged(runner);
@@ -42,6 +44,10 @@ void PLScript::mergerNestedScriptResults() {
         const Text& output = (*nested)->result;
         if (output) script.insert(std::min((*nested)->location, script.size()), *output);
     }
+}
+
+bool PLScript::isWanted() const {
+    return !snippetVariable || !snippetVariable->isOptional || snippetVariable->isSelected;
 }
 
 void PLScript::runMerged(ScriptRunner& runner) {

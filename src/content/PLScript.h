@@ -36,12 +36,15 @@ class PLScript {
     Text suffix;  // appended to an output that is not empty
 
     // Runs the nested scripts in order, puts their results into the text, runs it, sets `result`. Blocks, whatever the
-    // scripts do no longer than the runner lets them.
+    // scripts do no longer than the runner lets them. An optional script that was not ticked gives nothing, and nothing
+    // of it is run.
     void execute(ScriptRunner& runner);
     // Puts the nested results into `script`, each at its location; one that has no result adds nothing.
     void mergerNestedScriptResults();
 
   private:
+    // False for an optional script that was not ticked.
+    bool isWanted() const;
     // Runs this script alone.
     void runMerged(ScriptRunner& runner);
 };

@@ -101,7 +101,7 @@ class PlaceholderScanner {
     void replaceByNested(std::shared_ptr<SnippetAbbreviationVariable> variable) {
         const std::shared_ptr<Snippet> nested = context_.nestedSnippet(*variable);
         if (!nested || !context_.takeUnits(nested->contentLength())) return;
-        if (variable->isOptional && nested->isSimpleSnippet()) {
+        if (variable->isOptional && nested->isSimpleSnippet() && !nested->isScript()) {
             SnippetFieldVariable& field = addField(*variable);
             field.value = nested->plainTextContent();
             if (context_.snippet().contentType() == ContentType::RichText) {
@@ -109,6 +109,7 @@ class PlaceholderScanner {
             }
         } else if (nested->isScript()) {
             variable->snippet = nested;
+            if (variable->isOptional) addTickFor(variable);
             replaceByScript(std::move(variable));
         } else if (nested->contentType() == ContentType::PlainText || nested->contentType() == ContentType::RichText) {
             text_.putBack(*nested, attributes_);
@@ -123,11 +124,21 @@ class PlaceholderScanner {
         if (!script || !context_.takeUnits(script->string().size())) return;
 
         for (const auto& inner : script->variables) inner->location += text_.location();
+        variable->innerVariables = script->variables.size();
         variable->scriptLength = script->string().size();
         variable->isAppleScript = variable->snippet->contentType() == ContentType::AppleScript;
         variables_.push_back(std::move(variable));
         std::move(script->variables.begin(), script->variables.end(), std::back_inserter(variables_));
         text_.write(script->string(), attributes_);
+    }
+
+    // The form shows the script's name with it.
+    void addTickFor(const std::shared_ptr<SnippetAbbreviationVariable>& script) {
+        SnippetFieldVariable& field = addField(*script);
+        field.isReadonly = true;
+        field.value = script->snippet->label().value_or(u"");
+        if (field.value->empty()) field.value = script->snippet->abbreviation();
+        field.script = script;
     }
 
     // A field in the place of an optional placeholder.

@@ -22,7 +22,8 @@ class SnippetAbbreviationVariable final : public SnippetVariable {
     Text uuid;
     // Set by the parser when the included snippet is a script.
     std::shared_ptr<Snippet> snippet;
-    std::size_t scriptLength = 0;  // of its expanded text in the content
+    std::size_t scriptLength = 0;    // of its expanded text in the content
+    std::size_t innerVariables = 0;  // so many of the variables listed behind it stand in that text
     bool isAppleScript = false;
 };
 

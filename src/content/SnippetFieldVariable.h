@@ -2,8 +2,10 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 
+#include "content/SnippetAbbreviationVariable.h"
 #include "content/SnippetVariable.h"
 
 namespace plume {
@@ -37,6 +39,8 @@ class SnippetFieldVariable final : public SnippetVariable {
     Text value;                              // the initial text; for a pop-up menu its items, one a line
     std::optional<AttributedString> richTextValue;
     std::int64_t defaultIndex = 0;
+    // The field ticks this optional script: what it shows is never delivered. Else null.
+    std::shared_ptr<SnippetAbbreviationVariable> script;
 
   private:
     std::int64_t width_ = 30;

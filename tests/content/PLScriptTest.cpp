@@ -23,6 +23,8 @@ class FakeRunner final : public ScriptRunner {
         return answer_(script);
     }
 
+    bool canRunAppleScript() override { return true; }
+
     std::vector<std::u16string> ran;
     std::vector<std::u16string> appleScripts;
 

@@ -64,6 +64,7 @@ class TestForm final : public FieldsEditor {
 class AnsweringRunner final : public ScriptRunner {
   public:
     std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) override;
+    bool canRunAppleScript() override { return true; }
     // Set before anything runs. By default a script prints itself between angle brackets.
     std::function<std::optional<std::u16string>(const std::u16string&)> answer = [](const std::u16string& script) {
         return u"<" + script + u">";

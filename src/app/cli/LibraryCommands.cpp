@@ -156,7 +156,12 @@ int expandSnippet(const ChosenLibrary& library, const std::string& abbreviation,
     }
     PosixProcessLauncher launcher;
     ShellScriptRunner runner(launcher, report);
-    output << toUtf8(runScripts(*snippet, *content, runner)) << '\n';
+    const std::u16string text = runScripts(*snippet, *content, runner);
+    if (runner.allSucceeded() || !text.empty()) output << toUtf8(text) << '\n';
+    if (!runner.allSucceeded()) {
+        error << "plume: a script of \"" << abbreviation << "\" did not succeed\n";
+        return ExitStatus::Failure;
+    }
     return ExitStatus::Success;
 }
 

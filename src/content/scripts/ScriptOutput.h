@@ -25,6 +25,7 @@ struct ScriptOutput {
     std::string output;
     std::string error;
     ScriptEnd end = ScriptEnd::Finished;
+    bool failed = false;  // it finished, and said itself that it did not succeed
     std::string problem;  // why it was not started
 
     static ScriptOutput notStarted(const Error& reason);

@@ -81,6 +81,7 @@ ScriptOutput runScriptProcess(const ScriptProcess& script, ProcessLauncher& laun
         }
         process.wait(streams, watch.nextLook());
     }
+    written.failed = process.exitStatus().value_or(0) != 0;
     written.readRest(process.output(), process.error());
     return written;
 }

@@ -14,6 +14,8 @@ class ScriptRunner {
     // output stayed empty) without one trailing line feed; nothing when there was none. Blocks; where scripts share a
     // shell, one at a time has it and the others wait. From any thread.
     virtual std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) = 0;
+    // False where nothing here runs AppleScript; the user is told so the first time. From any thread.
+    virtual bool canRunAppleScript() = 0;
 };
 
 }  // namespace plume

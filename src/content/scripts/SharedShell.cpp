@@ -68,7 +68,7 @@ Result<SharedShell::Task> SharedShell::prepare(std::string_view script) {
     auto error = launcher_.makeNamedStream();
     if (!error) return error.error();
     return Task{std::move(file).value(), std::move(output).value(), std::move(error).value(),
-                toUtf8(Uuid::random().toString())};
+                toUtf8(Uuid::random().toString()), toUtf8(Uuid::random().toString())};
 }
 
 // "command" keeps the shell alive when the script has a syntax error, which would otherwise end it. A function of that
@@ -78,9 +78,12 @@ Result<SharedShell::Task> SharedShell::prepare(std::string_view script) {
 // a function read-only. A script that no marker ends runs into its time limit, and the next one has a new shell.
 Result<void> SharedShell::sendToShell(const Task& task, const ScriptWatch& watch) {
     const std::string command = "\\unset -f command; \\command ";
+    const auto telling = [&command](const std::string& marker) {
+        return command + "printf '%s\\n' " + quoted(marker) + ";; ";
+    };
     const std::string line = command + ". " + quoted(task.file->path()) + " </dev/null >" +
-                             quoted(task.output->path()) + " 2>" + quoted(task.error->path()) + "; " + command +
-                             "printf '%s\\n' " + quoted(task.endMarker) + "\n";
+                             quoted(task.output->path()) + " 2>" + quoted(task.error->path()) + "; case $? in 0) " +
+                             telling(task.endMarker) + "*) " + telling(task.failureMarker) + "esac\n";
     if (shell_ && shell_->exitStatus()) shell_.reset();
     if (shell_ && shell_->write(line, watch.deadline())) return {};
     shell_.reset();
@@ -105,7 +108,8 @@ ScriptOutput SharedShell::follow(const Task& task, const ScriptWatch& watch) {
     for (;;) {
         const bool hasExited = shell_->exitStatus().has_value();
         shellsOwn.read(shell_->output(), shell_->error());
-        const bool hasFinished = shellsOwn.output.find(task.endMarker) != std::string::npos;
+        const bool hasFailed = shellsOwn.output.find(task.failureMarker) != std::string::npos;
+        const bool hasFinished = hasFailed || shellsOwn.output.find(task.endMarker) != std::string::npos;
         if (hasExited || hasFinished) {
             written.readRest(*task.output, *task.error);
             if (!hasFinished) {
@@ -114,6 +118,7 @@ ScriptOutput SharedShell::follow(const Task& task, const ScriptWatch& watch) {
                 written.output += shellsOwn.output;
                 written.error += shellsOwn.error;
             }
+            written.failed = hasFailed || (!hasFinished && shell_->exitStatus() != 0);
             if (hasExited) shell_.reset();
             return written;
         }

@@ -36,6 +36,7 @@ class SharedShell {
         std::unique_ptr<NamedStream> output;
         std::unique_ptr<NamedStream> error;
         std::string endMarker;
+        std::string failureMarker;  // written instead where the script failed
     };
 
     Result<Task> prepare(std::string_view script);

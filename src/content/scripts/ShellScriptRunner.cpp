@@ -50,11 +50,15 @@ ShellScriptRunner::ShellScriptRunner(ProcessLauncher& launcher, Report report, S
     : launcher_(launcher), report_(std::move(report)), limits_(limits), shell_(launcher) {}
 
 std::optional<std::u16string> ShellScriptRunner::run(std::u16string_view script, bool isAppleScript) {
-    if (isAppleScript && !canRunAppleScript()) return std::nullopt;
+    if (isAppleScript && !canRunAppleScript()) {
+        allSucceeded_ = false;
+        return std::nullopt;
+    }
     const std::string text = toUtf8(script);
     const ScriptOutput written =
         !isAppleScript && belongsToSharedShell(text) ? runInSharedShell(text) : runInOwnProcess(text, isAppleScript);
     reportEnd(written);
+    if (written.failed || written.end != ScriptEnd::Finished) allSucceeded_ = false;
     const bool isDelivered = written.end == ScriptEnd::Finished || written.end == ScriptEnd::TimeLimit;
     return isDelivered ? written.text() : std::nullopt;
 }

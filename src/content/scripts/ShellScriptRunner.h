@@ -29,6 +29,9 @@ class ShellScriptRunner final : public ScriptRunner {
     ShellScriptRunner(ProcessLauncher& launcher, Report report, ScriptLimits limits = {});
 
     std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) override;
+    bool canRunAppleScript() override;
+    // Every script that was asked for has run to its end, and none said that it failed. From any thread.
+    bool allSucceeded() const { return allSucceeded_; }
     // Ends what runs, within moments, and runs nothing from now on: for quitting while a script is at work on another
     // thread. From any thread.
     void stop() { stopped_ = true; }
@@ -36,13 +39,13 @@ class ShellScriptRunner final : public ScriptRunner {
   private:
     ScriptOutput runInSharedShell(std::string_view script);
     ScriptOutput runInOwnProcess(std::string_view script, bool isAppleScript);
-    bool canRunAppleScript();
     void reportEnd(const ScriptOutput& written) const;
 
     ProcessLauncher& launcher_;
     const Report report_;
     const ScriptLimits limits_;
     std::atomic<bool> stopped_ = false;
+    std::atomic<bool> allSucceeded_ = true;
     std::atomic<bool> toldAboutAppleScript_ = false;
     std::mutex shellMutex_;
     SharedShell shell_;  // guarded by shellMutex_

@@ -109,6 +109,23 @@ TEST(Expand, SaysWhatItCannotDo) {
     EXPECT_THAT(unknown.error, HasSubstr("\"nothing\""));
 }
 
+TEST(Expand, FailsWithItsScripts) {
+    const ProgramHome home;
+    const std::string file = home.write("scripts.json", R"([{"items": [
+        {"abbreviation": "shared", "content": "echo out; false", "contentType": 3},
+        {"abbreviation": "own", "content": "#!/bin/cat /nowhere", "contentType": 3},
+        {"abbreviation": "exit", "content": "exit 3", "contentType": 3},
+        {"abbreviation": "exit0", "content": "echo out; exit 0", "contentType": 3},
+        {"abbreviation": "nested", "content": "<【snippet:exit】>"},
+        {"abbreviation": "apple", "content": "return 1", "contentType": 2}]}])");
+    for (const auto& [abbreviation, status] :
+         {std::pair{"shared", 1}, {"own", 1}, {"exit", 1}, {"exit0", 0}, {"nested", 1}, {"apple", 1}}) {
+        const ProgramResult result = home.run({"expand", abbreviation, "--library", file});
+        EXPECT_EQ(result.status, status) << abbreviation;
+        EXPECT_EQ(result.error.empty(), status == 0) << abbreviation;
+    }
+}
+
 TEST(Search, FindsEveryWordAnywhereInASnippet) {
     const ProgramHome home;
     const ProgramResult arrows = home.run({"search", "ARROW left"});

@@ -110,7 +110,7 @@ std::size_t InPlaceModel::replaceByNested(InPlaceExpansion& expansion, const Ran
     const auto nested = findSnippetBySnippetAbbreviationVariable(*variable, *snippet_, groups_);
     if (!nested || nested == snippet_) return putIn(expansion, range, u"");
     const auto content = nested->plainTextContent();
-    if (variable->isOptional && nested->isSimpleSnippet()) {
+    if (variable->isOptional && nested->isSimpleSnippet() && !nested->isScript()) {
         auto richValue = snippet_->contentType() == ContentType::RichText ? nested->richTextContent() : std::nullopt;
         return putInField(expansion, range, *variable, {content, std::move(richValue)});
     }
@@ -118,6 +118,7 @@ std::size_t InPlaceModel::replaceByNested(InPlaceExpansion& expansion, const Ran
         putIn(expansion, range, content.value_or(u""));
         return range.location;
     }
+    if (variable->isOptional) putInField(expansion, {range.location, 0}, *variable, {nested->abbreviation()}, true);
     const bool before = std::exchange(optionalDatesBecomeFields, true);
     InPlaceExpansion script = expand(content.value_or(u""));
     optionalDatesBecomeFields = before;
