@@ -11,6 +11,8 @@ namespace plume {
 namespace {
 
 constexpr double FormDelay = 0.1;  // seconds
+// A person does not notice that a key comes later by this.
+constexpr double LongestKeysHold = 0.3;  // seconds
 // Whatever sound announces expansions, a form is announced by this one.
 constexpr const char* FormSound = "Pop";
 
@@ -46,41 +48,50 @@ void SnippetSender::fieldsEditorAction(FieldsEditor& editor) {
 void SnippetSender::fieldsEditorDidClose(const Expansion& content) {
     mergeFields(*content);
     processScripts(*content);
+    const bool runsScripts = !content->scripts.empty() || content->originalSnippet->isScript();
+    const KeysHold hold = runsScripts ? holdKeysForScripts() : nullptr;
     if (content->scripts.empty()) {
-        sendContent(content, SnippetTrigger::Digit);
+        sendContent(content, SnippetTrigger::Digit, hold);
     } else {
-        executeScripts(content);
+        executeScripts(content, hold);
     }
 }
 
 // ---- Scripts ----
 
-void SnippetSender::executeScripts(const Expansion& content) {
+SnippetSender::KeysHold SnippetSender::holdKeysForScripts() {
+    return dependencies_.inputService.holdUserKeys(LongestKeysHold);
+}
+
+void SnippetSender::executeScripts(const Expansion& content, const KeysHold& hold) {
     performInBackground(
         [&runner = dependencies_.scriptRunner, content] {
             for (const auto& script : content->scripts) script->execute(runner);
             mergeScriptResults(*content);
         },
-        [this, content] { sendContent(content, SnippetTrigger::ScriptResult); });
+        [this, content, hold] { sendContent(content, SnippetTrigger::ScriptResult, hold); });
 }
 
-void SnippetSender::runScriptSnippet(const Expansion& content) {
+void SnippetSender::runScriptSnippet(const Expansion& content, const KeysHold& hold) {
     lastUsedSnippet_ = content->originalSnippet;
     const auto script = std::make_shared<PLScript>();
     script->script = content->string();
     script->isAppleScript = content->originalSnippet->contentType() == ContentType::AppleScript;
     script->suffix = content->suffix;
     performInBackground([&runner = dependencies_.scriptRunner, script] { script->execute(runner); },
-                        [this, script] { onScriptExecuted(*script); });
+                        [this, script, hold] { onScriptExecuted(*script); });
 }
 
 void SnippetSender::onScriptExecuted(const PLScript& script) {
-    if (!script.result) return;
+    const std::u16string suffix = script.suffix.value_or(u"");
+    const bool isSilent = !script.result || script.result->empty();
+    if (isSilent && suffix.empty()) return;
     const auto output = std::make_shared<PLOutput>();
     output->trigger = SnippetTrigger::ScriptResult;
-    output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(*script.result);
+    // The delimiter that was typed behind the abbreviation is the user's own.
+    output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(isSilent ? suffix : *script.result);
     dependencies_.inputService.sendOutput(output);
-    playFeedback(feedbackSound_);
+    if (!isSilent) playFeedback(feedbackSound_);
     // What was typed while the script ran stands in front of its output, and the kept delimiter behind it.
     sentLater_({.letters = script.suffix});
 }

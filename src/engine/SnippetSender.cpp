@@ -1,6 +1,7 @@
 // From a chosen snippet to the first output, and back by undo.
 #include "engine/SnippetSender.h"
 
+#include <algorithm>
 #include <utility>
 
 #include "Foundation/Strings.h"
@@ -51,6 +52,12 @@ std::u16string keptDelimiter(const Request& request) {
     return isKept ? request.keyString.value_or(u"") : u"";
 }
 
+bool holdsAppleScript(const Request& request, const SnippetExpandedContent& content) {
+    if (request.snippet->contentType() == ContentType::AppleScript) return true;
+    const auto nested = content.abbreviations();
+    return std::any_of(nested.begin(), nested.end(), [](const auto& script) { return script->isAppleScript; });
+}
+
 UndoInformation undoOf(const Request& request, const PLOutput& output) {
     UndoInformation undo;
     undo.backspaceCount = output.snippetExpandedContent->string().size() + (output.cancelTrigger ? 0 : 1);
@@ -96,19 +103,21 @@ std::optional<SnippetSender::Sent> SnippetSender::send(const Request& request) {
 
     // The abbreviation goes at once, the content comes when the form is filled in or the script has run.
     output->cancelTrigger = true;
+    const KeysHold hold = needsForm ? nullptr : holdKeysForScripts();
     dependencies_.inputService.sendOutput(output);
     content->suffix = keptDelimiter(request);
     if (needsForm) {
         showFieldsEditor(content);
     } else if (content->scripts.empty()) {
-        runScriptSnippet(content);
+        runScriptSnippet(content, hold);
     } else {
-        executeScripts(content);
+        executeScripts(content, hold);
     }
     return Sent{.swallowsKey = output->cancelTrigger};
 }
 
 bool SnippetSender::refuses(const Request& request, const SnippetExpandedContent& content) const {
+    if (holdsAppleScript(request, content) && !dependencies_.scriptRunner.canRunAppleScript()) return true;
     if (content.fields().empty() || dependencies_.makeFieldsEditor) return false;
     dependencies_.report("The snippet \"" + toUtf8(request.snippet->abbreviation().value_or(u"")) +
                          "\" has fields to fill in, and there is no form here to do it.");
@@ -121,9 +130,9 @@ SnippetSender::Sent SnippetSender::sendAtOnce(const Request& request, const Expa
     return sent;
 }
 
-void SnippetSender::sendContent(const Expansion& content, SnippetTriggers snippetTrigger) {
+void SnippetSender::sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const KeysHold& hold) {
     if (content->originalSnippet->isScript()) {
-        runScriptSnippet(content);
+        runScriptSnippet(content, hold);
         return sentLater_({});
     }
     const auto output = std::make_shared<PLOutput>();

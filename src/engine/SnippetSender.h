@@ -94,6 +94,8 @@ class SnippetSender final : private FieldsEditor::Target {
   private:
     using Expansion = std::shared_ptr<SnippetExpandedContent>;
     using Output = std::shared_ptr<PLOutput>;
+    // Shared by what runs for one snippet, which may be one script after the other; null where no key waits.
+    using KeysHold = std::shared_ptr<UserKeysHold>;
     struct OpenForm {
         std::unique_ptr<FieldsEditor> editor;  // null until it is time to make it
         Timer next;                            // makes the form, shows it, or lets it go
@@ -103,7 +105,7 @@ class SnippetSender final : private FieldsEditor::Target {
     Sent sendAtOnce(const Request& request, const Expansion& content, const Output& output);
     Sent sendText(const Expansion& content, const Output& output);
     // What a form or scripts have completed.
-    void sendContent(const Expansion& content, SnippetTriggers snippetTrigger);
+    void sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const KeysHold& hold);
 
     void showFieldsEditor(const Expansion& content);
     void makeForm(OpenForm& form, const Expansion& content);
@@ -111,8 +113,10 @@ class SnippetSender final : private FieldsEditor::Target {
     void fieldsEditorAction(FieldsEditor& editor) override;
     void fieldsEditorDidClose(const Expansion& content);
 
-    void executeScripts(const Expansion& content);
-    void runScriptSnippet(const Expansion& content);
+    // The user's keys wait for a script that is soon done, and follow behind what it gives.
+    KeysHold holdKeysForScripts();
+    void executeScripts(const Expansion& content, const KeysHold& hold);
+    void runScriptSnippet(const Expansion& content, const KeysHold& hold);
     void onScriptExecuted(const PLScript& script);
     void performInBackground(std::function<void()> work, std::function<void()> finish);
 

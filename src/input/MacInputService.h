@@ -24,6 +24,7 @@
 #include "input/HotKeyTable.h"
 #include "input/SRKeyCodeTransformer.h"
 #include "input/SecureInputWatch.h"
+#include "input/UserKeysHold.h"
 #include "input/delivery/OutputDelivery.h"
 #include "input/delivery/VMHelperController.h"
 #include "platform/KeyboardTap.h"
@@ -154,6 +155,10 @@ class MacInputService final : private KeyboardTapListener {
     // Erases and delivers. From any thread: at once on the tap thread, where `cancelTrigger` and the content's suffix
     // are decided when it returns, otherwise as soon as that one can.
     void sendOutput(std::shared_ptr<PLOutput> output);
+    // The user's keys from now on wait until the hold is gone, these seconds at most.
+    std::unique_ptr<UserKeysHold> holdUserKeys(double seconds) {
+        return std::make_unique<UserKeysHold>(delivery_, around_.tapLoop, seconds);
+    }
     void bringLastProcessToFront();
 
     // The tap thread's.

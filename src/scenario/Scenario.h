@@ -78,9 +78,11 @@ struct Scenario {
     std::u16string application = u"org.example.editor";
     std::u16string inputSource = u"org.example.keylayout.US";
     std::map<std::u16string, std::shared_ptr<const ContextInputSetting>> applicationSettings;
-    std::optional<Date> now;  // nothing: the real time
-    std::string timeZone;     // empty: the system's
-    std::string locale;       // empty: the user's
+    std::optional<Date> now;     // nothing: the real time
+    bool keepsKeysBack = false;  // the keyboard can, while Plume sends
+    double scriptTime = 0;       // seconds that a script takes on the scenario's clock
+    std::string timeZone;        // empty: the system's
+    std::string locale;          // empty: the user's
     std::optional<std::u16string> clipboard;
     std::u16string text;
     std::vector<ScenarioStep> steps;

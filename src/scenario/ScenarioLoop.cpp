@@ -37,6 +37,28 @@ void ScenarioLoop::run(CallId id, const Call& call) {
     next->second.repeats = own.repeats || hooks_.visibleChanges() == before;
 }
 
+void ScenarioLoop::perform(Call call) {
+    if (std::this_thread::get_id() == thread_) return loop_.perform(std::move(call));
+    const std::lock_guard lock(mutex_);
+    scriptResults_.push_back(std::move(call));
+}
+
+bool ScenarioLoop::takeScriptResults() {
+    std::vector<Call> results;
+    {
+        const std::lock_guard lock(mutex_);
+        results.swap(scriptResults_);
+    }
+    for (Call& result : results) {
+        if (scriptTime_ > 0) {
+            schedule(scriptTime_, std::move(result));
+        } else {
+            loop_.perform(std::move(result));
+        }
+    }
+    return !results.empty();
+}
+
 void ScenarioLoop::markPendingAsRepeating() {
     runReady();
     for (auto& [id, pending] : pending_) pending.repeats = true;
@@ -45,7 +67,11 @@ void ScenarioLoop::markPendingAsRepeating() {
 void ScenarioLoop::runReady() {
     loop_.runReady();
     hooks_.waitForScripts();
-    loop_.runReady();
+    // What a script has given may begin another one.
+    while (takeScriptResults()) {
+        loop_.runReady();
+        hooks_.waitForScripts();
+    }
 }
 
 bool ScenarioLoop::isIdle() const {

@@ -7,6 +7,8 @@
 
 #include <functional>
 #include <map>
+#include <mutex>
+#include <thread>
 #include <vector>
 
 #include "ports/simulated/SimulatedRunLoop.h"
@@ -22,11 +24,13 @@ class ScenarioLoop final : public RunLoop {
         std::function<void()> waitForScripts;
     };
 
-    // The loop is not owned and outlives this one.
-    ScenarioLoop(SimulatedRunLoop& loop, Hooks hooks) : loop_(loop), hooks_(std::move(hooks)) {}
+    // The loop is not owned and outlives this one. What scripts have given comes `scriptTime` seconds after they began.
+    ScenarioLoop(SimulatedRunLoop& loop, double scriptTime, Hooks hooks)
+        : loop_(loop), scriptTime_(scriptTime), hooks_(std::move(hooks)) {}
 
     double now() const override { return loop_.now(); }
-    void perform(Call call) override { loop_.perform(std::move(call)); }
+    // Other threads hand over what scripts have given.
+    void perform(Call call) override;
 
     // The calls that wait now count as timers that repeat for good.
     void markPendingAsRepeating();
@@ -48,10 +52,15 @@ class ScenarioLoop final : public RunLoop {
 
     void run(CallId id, const Call& call);
     void runReady();
+    bool takeScriptResults();
     bool isIdle() const;
 
     SimulatedRunLoop& loop_;
+    const double scriptTime_;
     const Hooks hooks_;
+    const std::thread::id thread_ = std::this_thread::get_id();
+    std::mutex mutex_;
+    std::vector<Call> scriptResults_;  // guarded by mutex_
     CallId lastId_ = 0;
     std::map<CallId, Pending> pending_;
     std::vector<CallId> scheduledByCall_;  // what the call that runs has asked for

@@ -12,6 +12,8 @@ namespace plume {
 
 namespace {
 
+constexpr double LongestScript = 10;  // seconds
+
 // The keys of a scenario: its own, and those of the file for what it leaves out.
 class ScenarioKeys {
   public:
@@ -62,6 +64,8 @@ void readCircumstances(const ScenarioKeys& keys, Scenario& scenario) {
     keys.whenSet("timeZone", [&](const JsonNode& n) { scenario.timeZone = readTimeZone(n); });
     keys.whenSet("locale", [&](const JsonNode& n) { scenario.locale = toUtf8(n.string()); });
     keys.whenSet("now", [&](const JsonNode& n) { scenario.now = readNow(n, scenario.timeZone); });
+    keys.whenSet("keepsKeysBack", [&](const JsonNode& n) { scenario.keepsKeysBack = n.boolean(); });
+    keys.whenSet("scriptTime", [&](const JsonNode& n) { scenario.scriptTime = n.number(0, LongestScript); });
     keys.whenSet("clipboard", [&](const JsonNode& n) { scenario.clipboard = n.string(); });
     keys.whenSet("text", [&](const JsonNode& n) { scenario.text = n.string(); });
 }
@@ -99,9 +103,9 @@ std::vector<Scenario> readCases(const JsonNode& cases, const JsonObject& file, c
     std::vector<Scenario> scenarios;
     std::set<std::string> names;
     for (const JsonNode& node : cases.elements()) {
-        const JsonObject object =
-            node.object({"name", "about", "library", "settings", "application", "inputSource", "applicationSettings",
-                         "now", "timeZone", "locale", "clipboard", "text", "steps", "expect"});
+        const JsonObject object = node.object({"name", "about", "library", "settings", "application", "inputSource",
+                                               "applicationSettings", "now", "timeZone", "locale", "scriptTime",
+                                               "keepsKeysBack", "clipboard", "text", "steps", "expect"});
         const std::string name = readName(object, names);
         scenarios.push_back(readScenario(ScenarioKeys(object, file), fileName));
         scenarios.back().name = name;
@@ -111,9 +115,9 @@ std::vector<Scenario> readCases(const JsonNode& cases, const JsonObject& file, c
 }
 
 std::vector<Scenario> readFrom(const JsonNode& node, const std::string& fileName) {
-    const JsonObject file =
-        node.object({"about", "library", "settings", "application", "inputSource", "applicationSettings", "now",
-                     "timeZone", "locale", "clipboard", "text", "steps", "expect", "cases"});
+    const JsonObject file = node.object({"about", "library", "settings", "application", "inputSource",
+                                         "applicationSettings", "now", "timeZone", "locale", "scriptTime",
+                                         "keepsKeysBack", "clipboard", "text", "steps", "expect", "cases"});
     const std::optional<JsonNode> cases = file.find("cases");
     if (cases && !cases->isNull()) return readCases(*cases, file, fileName);
     return {readScenario(ScenarioKeys(file), fileName)};

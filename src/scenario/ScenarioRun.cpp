@@ -20,15 +20,17 @@ std::function<Date()> movingDate(const Scenario& scenario, SimulatedRunLoop& loo
 
 ScenarioRun::ScenarioRun(const Scenario& scenario)
     : scenario_(scenario),
-      loop_(desktop_.runLoop(), {[this] { return visibleChanges(); },
-                                 [this] {
-                                     if (program_) program_->engine().sender().waitForScripts();
-                                 }}),
+      loop_(desktop_.runLoop(), scenario.scriptTime,
+            {[this] { return visibleChanges(); },
+             [this] {
+                 if (program_) program_->engine().sender().waitForScripts();
+             }}),
       date_(movingDate(scenario, desktop_.runLoop())) {
     for (const auto& [identifier, setting] : scenario_.applicationSettings) {
         applicationSettings_.set(identifier, setting);
     }
     desktop_.inputSources().setIdentifier(scenario_.inputSource);
+    desktop_.keyboard().setCanHold(scenario_.keepsKeysBack);
     if (scenario_.clipboard) desktop_.pasteboard().copyFromProgram(*scenario_.clipboard);
     activate(scenario_.application);
     desktop_.front()->setText(scenario_.text);

@@ -63,7 +63,7 @@ void OutputDelivery::startNext() {
 }
 
 void OutputDelivery::start() {
-    dependencies_.poster.holdUserKeys();
+    holdUserKeys();
     current_->tookOverRestore = provider_.cancelRestore();
     // A backup may have to read megabytes from a program: only for what goes through the clipboard.
     if (current_->restoresClipboard && current_->setting->has(InputFlag::UseClipboard)) provider_.backup();
@@ -124,8 +124,18 @@ void OutputDelivery::finish() {
 void OutputDelivery::completeIfDone() {
     if (!current_ || !current_->allSent || keystrokesToCome_ > 0) return;
     current_.reset();
-    dependencies_.poster.releaseUserKeys();
+    releaseUserKeys();
     startNext();
+}
+
+// Each time: the port may have let them go because they had waited for long enough.
+void OutputDelivery::holdUserKeys() {
+    ++holds_;
+    dependencies_.poster.holdUserKeys();
+}
+
+void OutputDelivery::releaseUserKeys() {
+    if (--holds_ == 0) dependencies_.poster.releaseUserKeys();
 }
 
 void OutputDelivery::paste(const PLOutput::Fragment& fragment) {

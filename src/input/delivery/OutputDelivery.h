@@ -57,6 +57,10 @@ class OutputDelivery {
     // Every output has been delivered.
     bool isIdle() const { return !current_ && queue_.empty(); }
 
+    // The user's keys wait from the first hold to the last release, besides while an output is on its way.
+    void holdUserKeys();
+    void releaseUserKeys();
+
     KeySender& sender() { return sender_; }
     ClipboardDataProvider& clipboardDataProvider() { return provider_; }
     const ClipboardDataProvider& clipboardDataProvider() const { return provider_; }
@@ -98,6 +102,7 @@ class OutputDelivery {
     std::optional<Delivery> current_;
     OutputBatch batch_;              // of the current delivery
     std::size_t nextStep_ = 0;       // in batch_
+    int holds_ = 0;                  // of the user's keys
     bool startsNext_ = false;        // inside startNext()
     bool pasting_ = false;           // a delayed paste keystroke is to come
     int keystrokesToCome_ = 0;       // paste keystrokes, delayed ones and those to virtual machines
