@@ -128,7 +128,10 @@ class Run {
     std::shared_ptr<const ApplicationTable> applications() {
         const auto file = dataFolder() / "applications.json";
         const LinuxApplications read = readLinuxApplications(readWholeFile(file), file.string());
-        if (read.problem) voice_.say(read.problem->message + " What Plume was built with counts in its place.");
+        if (read.problem) {
+            voice_.say(read.problem->message);
+            voice_.say("In place of that file, the table of applications counts that Plume was built with.");
+        }
         return read.table;
     }
 
