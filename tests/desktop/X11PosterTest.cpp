@@ -181,6 +181,19 @@ TEST(X11PosterLayoutTest, TypesTextOnTheLayoutAndTheGroupInForce) {
         typed = target->awaitText(mixed, Milliseconds(200));
     }
     EXPECT_EQ(typed, mixed);
+
+    // A shortcut whose letter no key of the layout has.
+    const auto keyOfA = [&] { return port.run([&] { return port.poster().keyCodeOfLetter(u'a'); }); };
+    EXPECT_EQ(keyOfA(), KeyCode::A);
+    const auto other = rig.session().start({"setxkbmap", "ru"}, "x11-xkb-utils");
+    ASSERT_EQ(other->waitForExit(Milliseconds(10'000)), 0);
+    ASSERT_TRUE(waitUntil([&] { return keyOfA() != KeyCode::A; }));
+    const KeyCode selectAll = keyOfA();
+    port.run([&] {
+        port.poster().post({.keyCode = selectAll, .flags = EventFlag::Control, .down = true, .text = {}}, false);
+    });
+    port.type(u"all");
+    EXPECT_EQ(target->awaitText("all"), "all");
 }
 
 }  // namespace
