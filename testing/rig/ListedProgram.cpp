@@ -92,14 +92,14 @@ void ListedProgram::focus(Field field) {
 // The root, its window, panel in panel in panel, and in the last one the fields.
 std::vector<std::string> ListedProgram::childrenOf(const std::string& path) const {
     if (path == RootPath) return {WindowPath};
-    if (path == TextPath || path == PasswordPath) return {};
+    if (path == TextPath || path == PasswordPath || (hidesParts_ && path == WindowPath)) return {};
     const int level = path.starts_with(PanelPath) ? std::stoi(path.substr(PanelPath.size())) : 0;
     if (level == depth_) return {TextPath, PasswordPath};
     return {PanelPath + std::to_string(level + 1)};
 }
 
 std::uint32_t ListedProgram::stateOf(const std::string& path) const {
-    if (path == WindowPath) return bit(AtspiState::Active);
+    if (path == WindowPath) return hidesParts_ ? 0 : bit(AtspiState::Active);
     if (path == pathOf(focused_)) return bit(AtspiState::Showing) | bit(AtspiState::Focused);
     return bit(AtspiState::Showing);
 }
@@ -124,6 +124,10 @@ void ListedProgram::answer(DBusMessage* call) {
         const std::array<std::uint32_t, 2> words{stateOf(path), 0};
         dbus_message_iter_open_container(&values, DBUS_TYPE_ARRAY, "u", &list);
         for (const std::uint32_t word : words) dbus_message_iter_append_basic(&list, DBUS_TYPE_UINT32, &word);
+        dbus_message_iter_close_container(&values, &list);
+    } else if (method == "GetRelationSet") {
+        hidesParts_ = false;
+        dbus_message_iter_open_container(&values, DBUS_TYPE_ARRAY, "(ua(so))", &list);
         dbus_message_iter_close_container(&values, &list);
     } else if (method == "GetRole") {
         const AtspiRole role = path == PasswordPath ? AtspiRole::PasswordText : AtspiRole::Entry;

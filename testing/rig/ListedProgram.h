@@ -25,6 +25,9 @@ class ListedProgram {
 
     // Tells whoever listens.
     void focus(Field field);
+    // From now on the window is neither active nor has any parts until somebody asks for its relations, as with
+    // Chromium.
+    void hideParts() { hidesParts_ = true; }
 
   private:
     void enlist();
@@ -39,6 +42,7 @@ class ListedProgram {
     BusConnection connection_;
     std::string name_;
     std::atomic<Field> focused_ = Field::Text;
+    std::atomic<bool> hidesParts_ = false;
     std::atomic<bool> ended_ = false;
     std::thread thread_;
 };

@@ -192,6 +192,13 @@ TEST_F(AccessibilityFocusTest, ADeepProgramIsListenedToWhileItIsInFront) {
     EXPECT_TRUE(waitUntil([&] { return client.registeredEvents() == 0; }));
 }
 
+TEST_F(AccessibilityFocusTest, AProgramThatHidesItsPartsIsAskedForThem) {
+    ListedProgram program(address(), 3);
+    program.hideParts();
+    accessibility_->setFrontProcess(getpid());
+    EXPECT_TRUE(awaitTyping([] { return accessibility_->focusedProcess() == getpid(); }));
+}
+
 // ---- A bus that goes ----
 
 TEST_F(AccessibilityFocusTest, ABusThatGoesIsTold) {

@@ -22,7 +22,7 @@ AtspiFocusFinder::Found AtspiFocusFinder::find(pid_t process) {
     const bool isOnTheBus = std::ranges::any_of(programs_, isOfProcess);
     Found found;
     for (const Program& program : programs_) {
-        if ((!isOnTheBus || isOfProcess(program)) && findIn(program, found)) break;
+        if ((!isOnTheBus || isOfProcess(program)) && findIn(program, isOnTheBus, found)) break;
     }
     return found;
 }
@@ -37,6 +37,14 @@ const std::string& AtspiFocusFinder::toolkitOf(const std::string& program) {
         found->toolkit = answer.values().inside().string().value_or("");
     }
     return found->toolkit;
+}
+
+void AtspiFocusFinder::askForParts(const std::string& program) {
+    const auto found = std::ranges::find(programs_, program, [](const Program& each) { return each.root.program; });
+    if (found == programs_.end()) return;
+    for (const AtspiPart& window : childrenOf(bus_, found->root, MostChildren)) {
+        bus_.call(window, AccessibleInterface, "GetRelationSet");
+    }
 }
 
 void AtspiFocusFinder::updatePrograms() {
@@ -55,7 +63,8 @@ AtspiFocusFinder::Program AtspiFocusFinder::programAt(const AtspiPart& root) {
     return {root, static_cast<pid_t>(process.value_or(0)), {}, false};
 }
 
-bool AtspiFocusFinder::findIn(const Program& program, Found& found) {
+bool AtspiFocusFinder::findIn(const Program& program, bool isInFront, Found& found) {
+    if (isInFront) found = {{}, program.root.program, program.process};
     for (const AtspiPart& window : childrenOf(bus_, program.root, MostChildren)) {
         const auto states = statesOf(bus_, window);
         if (!states || !states->has(AtspiState::Active)) continue;

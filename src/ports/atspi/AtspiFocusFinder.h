@@ -19,15 +19,17 @@ class AtspiFocusFinder {
     explicit AtspiFocusFinder(AtspiBus& bus) : bus_(bus) {}
 
     struct Found {
-        AtspiPart part;  // none when nothing below has the focus
-        std::string program;
-        pid_t process = 0;  // as the bus sees it
+        AtspiPart part;       // none when nothing below has the focus
+        std::string program;  // the one in front, also when no window of it says that it is active
+        pid_t process = 0;    // as the bus sees it
     };
     // In the program with that process. When none has it (a sandbox has numbers of its own) or it is 0, in the program
     // whose window says that it is the active one.
     Found find(pid_t process);
     // What a program of the bus is made with; empty when it does not tell.
     const std::string& toolkitOf(const std::string& program);
+    // Chromium shows its windows without their parts until somebody asks for the relations between them.
+    void askForParts(const std::string& program);
 
   private:
     struct Program {
@@ -39,7 +41,7 @@ class AtspiFocusFinder {
 
     void updatePrograms();
     Program programAt(const AtspiPart& root);
-    bool findIn(const Program& program, Found& found);
+    bool findIn(const Program& program, bool isInFront, Found& found);
     AtspiPart focusedBelow(const AtspiPart& part, const AtspiStates& states, int depth, int& left);
 
     AtspiBus& bus_;

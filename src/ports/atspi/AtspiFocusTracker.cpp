@@ -124,6 +124,7 @@ void AtspiFocusTracker::listenWhereItHelps(const AtspiFocus::Front& front, const
     listenedFront_ = front;
     listenedProcess_ = found.process;
     listener_.listenTo(found.program, *address);
+    if (!found.part) finder_.askForParts(found.program);
 }
 
 void AtspiFocusTracker::setPause(milliseconds pause) {
