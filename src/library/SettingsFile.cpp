@@ -89,6 +89,7 @@ const std::vector<Setting>& knownSettings() {
         {"ListenMouseDownEvents", boolean, true},
         {"RestoreClipboard", boolean, true},
         {"RestoreClipboardDelay", seconds, 0.4},
+        {"LetProgramsTellPasswordFields", boolean},
         {"LongTextLength", integer, std::int64_t{100}},
         {"CapitalizationExcludedAbbreviations", string, Text(u"etc.\ne.g.\ni.e.")},
         {"MainWindowSearchBy", integer, EveryField},

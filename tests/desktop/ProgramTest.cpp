@@ -6,7 +6,9 @@
 #include <string>
 
 #include "Foundation/Strings.h"
+#include "ports/atspi/AtspiSession.h"
 #include "testing/rig/Deadline.h"
+#include "testing/rig/NoticeBoard.h"
 #include "testing/rig/PlumeProgram.h"
 
 namespace plume::rig {
@@ -127,6 +129,21 @@ INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInTarget,
                          testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm));
+
+TEST_F(Program, AsksOnceWhetherProgramsMayTellAboutPasswordFields) {
+    plume_.reset();
+    rig_->session().join();
+    NoticeBoard board;
+    const auto isAsked = [&] { return board.body("Password fields in browsers").has_value(); };
+    start(Library, R"({ "LetProgramsTellPasswordFields": false })");
+    start(Library, "{}");
+    ASSERT_TRUE(waitUntil(isAsked, Bound)) << log();
+    EXPECT_EQ(findAccessibilityBus().status, AccessibilityStatus::SwitchedOff);
+    board.press("Password fields in browsers", "Switch on");
+    EXPECT_TRUE(waitUntil([] { return findAccessibilityBus().status == AccessibilityStatus::Working; }, Bound));
+    start(Library, "{}");
+    EXPECT_FALSE(waitUntil(isAsked, Milliseconds(700)));
+}
 
 TEST_F(Program, SaysThatASnippetNeedsAFormAndErasesNothing) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);

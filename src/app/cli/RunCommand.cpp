@@ -16,6 +16,7 @@
 #include "app/cli/InstanceLock.h"
 #include "app/linux/LinuxApplications.h"
 #include "app/linux/LinuxPort.h"
+#include "app/linux/PasswordFieldConsent.h"
 #include "library/SettingsFile.h"
 
 namespace plume {
@@ -71,6 +72,9 @@ class Run {
             voice_.say("The X server is gone.");
             end(ExitStatus::Failure);
         });
+        PasswordFieldConsent consent({port_.accessibility(), port_.ports().notices, port_.mainLoop(), settings_,
+                                      [this](const std::string& sentence) { voice_.say(sentence); }});
+        consent.begin();
         std::thread tapThread([this] { expand(); });
         port_.mainLoop().run();
         port_.tapLoop().stop();

@@ -48,6 +48,7 @@ class LinuxPort {
     LinuxPort& operator=(const LinuxPort&) = delete;
 
     Composition::Ports ports();
+    AtspiAccessibility& accessibility() { return accessibility_; }
     PollRunLoop& tapLoop() { return tapLoop_; }
     PollRunLoop& mainLoop() { return mainLoop_; }
 

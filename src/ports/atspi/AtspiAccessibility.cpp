@@ -11,10 +11,10 @@ std::string_view sentenceOf(AccessibilityStatus status) {
         case AccessibilityStatus::Working:
             return "Accessibility works.";
         case AccessibilityStatus::SwitchedOff:
-            return "Accessibility is not switched on for this session: programs made with GTK 3 tell about their "
-                   "texts, "
-                   "those made with Qt and browsers do not. To switch it on, run \"gsettings set "
-                   "org.gnome.desktop.interface toolkit-accessibility true\" and start those programs again.";
+            return "Accessibility is not switched on for this session: programs made with GTK 3 tell about their texts "
+                   "and password fields, those made with Qt and browsers do not. To switch it on, set "
+                   "\"LetProgramsTellPasswordFields\" to true in Plume's settings, or run \"gsettings set "
+                   "org.gnome.desktop.interface toolkit-accessibility true\"; Chromium has to be started again then.";
         case AccessibilityStatus::NotInstalled:
             return "The accessibility bus cannot be started: install the package at-spi2-core.";
         case AccessibilityStatus::NoSession:
@@ -53,6 +53,10 @@ bool AtspiAccessibility::focusIsPassword() const {
 
 pid_t AtspiAccessibility::focusedProcess() const {
     return thread_->focus().process();
+}
+
+void AtspiAccessibility::switchOn() {
+    thread_->switchOn();
 }
 
 AccessibilityStatus AtspiAccessibility::status() const {

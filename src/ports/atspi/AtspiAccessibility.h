@@ -67,6 +67,10 @@ class AtspiAccessibility final : public Accessibility {
     // From any thread, never waits.
     AccessibilityStatus status() const;
 
+    // Switches the desktop's accessibility on, as its own settings do: it stays so. From any thread, never waiting; the
+    // status tells in the end whether it worked. Chromium looks at it only when it starts.
+    void switchOn();
+
   private:
     std::atomic<double> screenHeight_ = 0;
     BusThread<AtspiSession> thread_;

@@ -35,6 +35,13 @@ AccessibilityBus findAccessibilityBus() {
     return {on ? AccessibilityStatus::Working : AccessibilityStatus::SwitchedOff, *address};
 }
 
+void switchAccessibilityOn() {
+    const std::string session = sessionBusAddress();
+    const BusConnection bus = session.empty() ? nullptr : openBus(session);
+    // Not "ScreenReaderEnabled", which makes desktops start one.
+    if (bus) ask(*bus, DBUS_INTERFACE_PROPERTIES, "Set", {"org.a11y.Status", "IsEnabled", BusFlag{true}});
+}
+
 void AtspiQueue::end() {
     ended_ = true;
     loop_.stop();
@@ -52,6 +59,13 @@ AtspiSession::AtspiSession() : tracker_(queue_.loop(), bus_, [this] { return con
 
 std::optional<AtspiPart> AtspiSession::askForFocus() {
     return queue_.ask<AtspiPart>([this] { return std::optional(tracker_.focusedNow()); });
+}
+
+void AtspiSession::switchOn() {
+    queue_.loop().perform([this] {
+        switchAccessibilityOn();
+        connect();
+    });
 }
 
 void AtspiSession::run() {

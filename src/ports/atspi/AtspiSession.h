@@ -25,6 +25,9 @@ struct AccessibilityBus {
 // thread.
 AccessibilityBus findAccessibilityBus();
 
+// Asks the session's D-Bus to have programs tell of their user interface. May wait for seconds, too.
+void switchAccessibilityOn();
+
 // Hands questions to the accessibility thread and waits for their answers, never for long.
 class AtspiQueue {
   public:
@@ -91,6 +94,9 @@ class AtspiSession {
     }
     // What has the focus at this moment.
     std::optional<AtspiPart> askForFocus();
+
+    // From any thread.
+    void switchOn();
 
     // The thread itself, until end().
     void run();

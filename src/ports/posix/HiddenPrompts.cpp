@@ -1,6 +1,8 @@
 #include "ports/posix/HiddenPrompts.h"
 
 #include <algorithm>
+#include <array>
+#include <utility>
 
 #include "ports/posix/TerminalDevices.h"
 
@@ -12,9 +14,10 @@ using std::chrono::milliseconds;
 
 constexpr milliseconds LongestWait{30};
 constexpr milliseconds Pause{250};
-// New tabs and windows bring new terminals.
+// New tabs and windows bring new terminals; a program has none yet when its first window comes.
 constexpr milliseconds CollectingPause{2'000};
-constexpr double MomentForAnswer = 0.5;  // seconds
+constexpr milliseconds New{2'000};
+constexpr std::array TimesBetweenLooks = {0.25, 0.75};
 
 }  // namespace
 
@@ -27,18 +30,20 @@ HiddenPrompts::~HiddenPrompts() {
 
 void HiddenPrompts::setFrontProcess(pid_t process) {
     if (front_.exchange(process) == process) return;
-    waiting_ = false;
+    inFrontSince_ = Clock::now().time_since_epoch().count();
     hasTerminals_ = false;
-    looked_.owe();
-    loop_.perform([this] { look(true); });
+    waiting_ = false;
+    collected_.owe();
+    loop_.perform([this] {
+        collect();
+        collectAfter(0);
+    });
 }
 
 void HiddenPrompts::promptMayHaveCome() {
     unsure_ = true;
-    // The prompt that is known may be over: nobody types to find it out.
-    if (waiting_) {
-        loop_.perform([this] { laterLook_ = loop_.performAfterDelay(MomentForAnswer, [this] { look(false); }); });
-    }
+    // A prompt that is known may be over, and nobody types to find it out.
+    loop_.perform([this] { collectAfter(0); });
 }
 
 void HiddenPrompts::userTypes() {
@@ -47,37 +52,50 @@ void HiddenPrompts::userTypes() {
     if (now < next) return;
     const Clock::rep later = now + Clock::duration(Pause).count();
     if (!nextLook_.compare_exchange_strong(next, later, std::memory_order_relaxed)) return;
-    loop_.perform([this] { look(false); });
+    loop_.perform([this] {
+        if (Clock::now() - collectedAt_ >= CollectingPause) return collect();
+        waiting_ = hides();
+    });
 }
 
 bool HiddenPrompts::isWaitingForKey() {
-    if (unsure_.exchange(false) && hasTerminals_) {
-        looked_.owe();
-        loop_.perform([this] { look(false); });
+    if (unsure_.exchange(false)) {
+        const Clock::duration inFront = Clock::now().time_since_epoch() - Clock::duration(inFrontSince_);
+        if (hasTerminals_) {
+            waiting_ = hides();
+        } else if (inFront < New) {
+            collected_.owe();
+            loop_.perform([this] { collect(); });
+        }
     }
-    looked_.await(LongestWait);
+    collected_.await(LongestWait);
     return waiting_;
 }
 
-void HiddenPrompts::look(bool anew) {
+void HiddenPrompts::collectAfter(std::size_t step) {
+    nextOfSeries_ = loop_.performAfterDelay(TimesBetweenLooks.at(step), [this, step] {
+        if (step + 1 < TimesBetweenLooks.size()) collectAfter(step + 1);
+        collect();
+    });
+}
+
+void HiddenPrompts::collect() {
     const pid_t front = front_;
-    const Clock::time_point now = Clock::now();
-    const bool isKnown = front == process_;
-    const auto waits = [this] { return std::ranges::any_of(devices_, hidesInput); };
-    // Those that are known answer at once.
-    if (isKnown && !anew) {
-        waiting_ = waits();
-        looked_.give();
+    std::vector<std::string> devices = front != 0 ? terminalDevicesBelow(front) : std::vector<std::string>();
+    if (front != front_) return;  // somebody collects again
+    collectedAt_ = Clock::now();
+    hasTerminals_ = !devices.empty();
+    {
+        const std::scoped_lock lock(mutex_);
+        devices_ = std::move(devices);
     }
-    if (isKnown && !anew && now - collectedAt_ < CollectingPause) return;
-    process_ = front;
-    collectedAt_ = now;
-    devices_ = front != 0 ? terminalDevicesBelow(front) : std::vector<std::string>();
-    const bool found = waits();
-    if (front != front_) return;  // somebody looks again
-    hasTerminals_ = !devices_.empty();
-    waiting_ = found;
-    looked_.give();
+    waiting_ = hides();
+    collected_.give();
+}
+
+bool HiddenPrompts::hides() const {
+    const std::scoped_lock lock(mutex_);
+    return std::ranges::any_of(devices_, hidesInput);
 }
 
 }  // namespace plume

@@ -1,13 +1,15 @@
 // Whether the program in front is a terminal in which a prompt hides what is typed: sudo, ssh, passwd, `read -s`.
 //
-// The terminals' devices are asked, never a program, on a thread of its own. A program with several windows or tabs
-// does not tell which of them takes the keys, so a prompt in any of them counts.
+// The terminals' devices are asked, never a program; which ones there are is found out on a thread of its own. A
+// program with several windows or tabs does not tell which of them takes the keys, so a prompt in any of them counts.
 #pragma once
 
 #include <sys/types.h>
 
 #include <atomic>
 #include <chrono>
+#include <cstddef>
+#include <mutex>
 #include <string>
 #include <thread>
 #include <vector>
@@ -35,28 +37,31 @@ class HiddenPrompts {
     bool isWaiting() const { return waiting_; }
 
     // ---- On the tap thread ----
-    // The same; but the first key after one that may have brought a prompt waits until somebody has looked, 30 ms at
-    // most.
+    // The same; but at the first key after what may have brought a prompt the devices are asked anew. The first one in
+    // a program that has just come to the front waits until they are known, 30 ms at most.
     bool isWaitingForKey();
 
   private:
     using Clock = std::chrono::steady_clock;
 
-    void look(bool anew);
+    void collect();
+    void collectAfter(std::size_t step);
+    bool hides() const;
 
     std::atomic<bool> waiting_ = false;
     std::atomic<bool> hasTerminals_ = false;
     std::atomic<bool> unsure_ = false;  // nobody looked since a prompt may have come
     std::atomic<Clock::rep> nextLook_ = 0;
+    std::atomic<Clock::rep> inFrontSince_ = 0;
     std::atomic<pid_t> front_ = 0;
-    OwedAnswer looked_;
+    OwedAnswer collected_;
+    mutable std::mutex mutex_;
+    std::vector<std::string> devices_;  // guarded by mutex_, which is held for microseconds
 
     // On the thread.
     PollRunLoop loop_;
-    pid_t process_ = 0;  // whose terminals are known
-    std::vector<std::string> devices_;
     Clock::time_point collectedAt_{};
-    Timer laterLook_;
+    Timer nextOfSeries_;  // of looks after a change
     std::thread thread_;
 };
 
