@@ -141,6 +141,18 @@ TEST_F(AccessibilityFocusTest, APasswordFieldIsNoticedByTypingAlone) {
     EXPECT_LE(quickest, std::chrono::milliseconds(500));
 }
 
+TEST_F(AccessibilityFocusTest, TheFirstKeyInAnotherProgramKnowsWhetherItIsAPassword) {
+    const auto target = startFocused(TargetKind::GtkTextView);
+    target->showPassword(true);
+    ASSERT_TRUE(awaitTyping([] { return accessibility_->focusIsPassword(); }));
+    EXPECT_TRUE(waitUntil([&] {  // a busy machine may take longer than the bound
+        accessibility_->setFrontProcess(0);
+        EXPECT_FALSE(accessibility_->focusIsPassword());
+        accessibility_->setFrontProcess(target->pid());
+        return accessibility_->focusIsPasswordForKey();
+    }));
+}
+
 TEST_F(AccessibilityFocusTest, APasswordStaysOneWhenItsProgramHangs) {
     const auto target = startFocused(TargetKind::GtkTextView);
     target->showPassword(true);

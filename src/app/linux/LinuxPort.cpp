@@ -68,7 +68,7 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
             return keycode != 0 ? std::optional(keycode) : std::nullopt;
         });
     keyboardTap_->setFocusIsPassword(
-        [this] { return accessibility_.focusIsPassword() || hiddenPrompts_.isWaitingForKey(); });
+        [this] { return accessibility_.focusIsPasswordForKey() || hiddenPrompts_.isWaitingForKey(); });
     return {};
 }
 

@@ -51,6 +51,11 @@ bool AtspiAccessibility::focusIsPassword() const {
     return thread_->focus().isPassword();
 }
 
+bool AtspiAccessibility::focusIsPasswordForKey() {
+    thread_->tracker().awaitFirstLook();
+    return focusIsPassword();
+}
+
 pid_t AtspiAccessibility::focusedProcess() const {
     return thread_->focus().process();
 }

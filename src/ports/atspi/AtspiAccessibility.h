@@ -62,6 +62,9 @@ class AtspiAccessibility final : public Accessibility {
 
     // Whether a password is typed into what has the focus. From any thread, never waits.
     bool focusIsPassword() const;
+    // The same, for a key that is typed now: the first one in a program that has just come to the front waits until the
+    // program was asked, 50 ms at most. On the tap thread.
+    bool focusIsPasswordForKey();
     // The process that has the focus, by the bus's account; 0 when it is not known. From any thread, never waits.
     pid_t focusedProcess() const;
     // From any thread, never waits.

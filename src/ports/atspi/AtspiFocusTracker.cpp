@@ -21,6 +21,7 @@ constexpr std::array PausesAfterNothing = {milliseconds(500), milliseconds(1'000
 constexpr std::array TimesBetweenLooks = {0.015, 0.045, 0.190, 0.750};
 constexpr milliseconds Fresh{50};
 constexpr milliseconds LookBound{1'000};
+constexpr milliseconds LongestWait{50};
 
 // Those of which every text is found by walking.
 bool isWalkedThrough(std::string_view toolkit) {
@@ -41,6 +42,7 @@ AtspiFocusTracker::AtspiFocusTracker(PollRunLoop& loop, AtspiBus& bus, BusAddres
 
 void AtspiFocusTracker::setFrontProcess(pid_t process) {
     if (!focus_.setFront(process)) return;
+    firstLook_.owe();
     loop_.perform([this] {
         listener_.stop();
         lookSeveralTimes();
@@ -79,8 +81,17 @@ void AtspiFocusTracker::lookAfter(std::size_t step) {
     });
 }
 
+void AtspiFocusTracker::awaitFirstLook() {
+    firstLook_.await(LongestWait);
+}
+
 void AtspiFocusTracker::look() {
     const AtspiFocus::Front front = focus_.front();
+    lookAt(front);
+    if (front.turn == focus_.front().turn) firstLook_.give();
+}
+
+void AtspiFocusTracker::lookAt(const AtspiFocus::Front& front) {
     lookedAt_ = Clock::now();
     if (address_() == nullptr) return setPause(PauseWithoutBus);
     bus_.begin(LookBound);

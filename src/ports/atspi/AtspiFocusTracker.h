@@ -14,6 +14,7 @@
 #include <utility>
 
 #include "ports/atspi/AtspiFocusFinder.h"
+#include "ports/posix/OwedAnswer.h"
 
 namespace plume {
 
@@ -84,6 +85,10 @@ class AtspiFocusTracker {
     void focusMayHaveMoved();
     void userTypes();
 
+    // ---- On the tap thread ----
+    // Waits for the first look at a program that has come to the front, 50 ms at most and once a program.
+    void awaitFirstLook();
+
     // ---- On the accessibility thread ----
     // What has the focus now, or a moment ago.
     AtspiPart focusedNow();
@@ -94,6 +99,7 @@ class AtspiFocusTracker {
     void lookSeveralTimes();
     void lookAfter(std::size_t step);
     void look();
+    void lookAt(const AtspiFocus::Front& front);
     void search(const AtspiFocus::Front& front);
     void becomeFocused(const AtspiFocus::Front& front, const AtspiPart& part, pid_t process);
     void listenWhereItHelps(const AtspiFocus::Front& front, const AtspiFocusFinder::Found& found);
@@ -111,6 +117,7 @@ class AtspiFocusTracker {
     Clock::time_point lookedAt_{};
     std::size_t misses_ = 0;  // looks in a row that found nothing, without those of a series
     Timer nextOfSeries_;      // of looks after a move; none after the last one
+    OwedAnswer firstLook_;
     // From when on a key makes for a look.
     std::atomic<Clock::rep> nextLook_ = 0;
 };
