@@ -193,6 +193,23 @@ TEST_F(Program, DoctorFindsAllThatIsNeededHere) {
     EXPECT_NE(doctor->logTail().find("already running"), std::string::npos) << doctor->logTail();
 }
 
+TEST_F(Program, DoctorNamesProgramsThatTellNothingOfTheirPasswordFields) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    const auto doctorSays = [&](const std::string& words) {
+        const auto doctor = rig_->session().start({plumeProgram(), "doctor"}, "doctor");
+        doctor->waitForExit(Milliseconds(5'000));
+        return doctor->logTail().find(words) != std::string::npos;
+    };
+    EXPECT_TRUE(waitUntil([&] { return doctorSays("every program that has a window"); }, Bound));
+    // The window passes for one of this program, which is on no bus.
+    XClient& client = rig_->client();
+    const auto process = static_cast<std::uint32_t>(getpid());
+    xcb_change_property(client.connection(), XCB_PROP_MODE_REPLACE, target->window(), client.atom("_NET_WM_PID"),
+                        XCB_ATOM_CARDINAL, 32, 1, &process);
+    xcb_flush(client.connection());
+    EXPECT_TRUE(waitUntil([&] { return doctorSays("do not tell about them: program_test"); }, Bound));
+}
+
 }  // namespace
 
 }  // namespace plume::rig

@@ -14,6 +14,7 @@
 #include <string>
 #include <system_error>
 #include <thread>
+#include <vector>
 
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
@@ -21,7 +22,9 @@
 #include "app/cli/LibraryChoice.h"
 #include "app/cli/Version.h"
 #include "ports/atspi/AtspiAccessibility.h"
+#include "ports/atspi/AtspiSession.h"
 #include "ports/posix/PollRunLoop.h"
+#include "ports/posix/TerminalDevices.h"
 #include "ports/x11/X11Session.h"
 #include "ports/x11/clipboard/X11Pasteboard.h"
 #include "ports/x11/keyboard/TapConnection.h"
@@ -66,6 +69,33 @@ std::set<std::string> runningPrograms() {
     return names;
 }
 
+std::string nameOfProcess(pid_t process) {
+    const auto name = readWholeFile("/proc/" + std::to_string(process) + "/comm");
+    return name ? name.value().substr(0, name.value().find('\n')) : std::string();
+}
+
+std::vector<std::uint32_t> numbersOf(XcbConnection& connection, xcb_window_t window, const char* property) {
+    constexpr std::uint32_t Most = 4'096;
+    const auto cookie =
+        xcb_get_property(connection.get(), 0, window, connection.atom(property), XCB_GET_PROPERTY_TYPE_ANY, 0, Most);
+    const XcbOwned<xcb_get_property_reply_t> reply(xcb_get_property_reply(connection.get(), cookie, nullptr));
+    constexpr int Bits = 32;
+    if (!reply || reply->format != Bits) return {};
+    const auto* const first = static_cast<const std::uint32_t*>(xcb_get_property_value(reply.get()));
+    return {first, first + reply->value_len};
+}
+
+// The processes that have windows, as far as these tell.
+std::set<pid_t> processesWithWindows(XcbConnection& connection) {
+    std::set<pid_t> processes;
+    for (const xcb_window_t window : numbersOf(connection, connection.root(), "_NET_CLIENT_LIST")) {
+        for (const std::uint32_t process : numbersOf(connection, window, "_NET_WM_PID")) {
+            processes.insert(static_cast<pid_t>(process));
+        }
+    }
+    return processes;
+}
+
 class Examination {
   public:
     explicit Examination(std::ostream& output) : output_(output) {}
@@ -78,6 +108,8 @@ class Examination {
             examineSecureInput();
         }
         examineAccessibility();
+        if (session_) examinePasswordFields();
+        examineInputMethods();
         examineSounds();
         examineWatchdog();
         examineScripts();
@@ -158,6 +190,36 @@ class Examination {
         const std::string sentence(sentenceOf(status));
         if (status == AccessibilityStatus::Working) return good("accessibility", sentence);
         warn("accessibility", sentence);
+    }
+
+    void examinePasswordFields() {
+        const AccessibilityBus bus = findAccessibilityBus();
+        if (bus.address.empty()) return;
+        const std::set<pid_t> telling = processesOnBus(bus);
+        std::set<std::string> silent;
+        for (const pid_t process : processesWithWindows(session_->connection())) {
+            // In a terminal, its device tells of hidden prompts.
+            if (!telling.contains(process) && terminalDevicesBelow(process).empty()) {
+                silent.insert(nameOfProcess(process));
+            }
+        }
+        if (silent.empty()) return good("password fields", "every program that has a window now tells about its own");
+        std::string names;
+        for (const std::string& name : silent) names += (names.empty() ? "" : ", ") + name;
+        warn("password fields",
+             "Plume hears what is typed into those of programs that do not tell about them: " + names);
+    }
+
+    // Their engines work inside the programs, behind the keys.
+    void examineInputMethods() {
+        const std::set<std::string> running = runningPrograms();
+        for (const char* program : {"ibus-daemon", "fcitx5", "fcitx", "uim-xim"}) {
+            if (!running.contains(program)) continue;
+            good("input method",
+                 std::string(program) +
+                     " is running: while an engine of it turns keys into other text (Japanese, Chinese, "
+                     "Korean), Plume hears the keys, not the text; switch Plume off meanwhile.");
+        }
     }
 
     void examineSounds() {

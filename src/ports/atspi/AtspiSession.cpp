@@ -1,5 +1,7 @@
 #include "ports/atspi/AtspiSession.h"
 
+#include "ports/atspi/AtspiParts.h"
+
 namespace plume {
 
 namespace {
@@ -33,6 +35,21 @@ AccessibilityBus findAccessibilityBus() {
     // Toolkits look at either.
     const bool on = isOn(*bus, "IsEnabled") || isOn(*bus, "ScreenReaderEnabled");
     return {on ? AccessibilityStatus::Working : AccessibilityStatus::SwitchedOff, *address};
+}
+
+std::set<pid_t> processesOnBus(const AccessibilityBus& bus) {
+    std::set<pid_t> processes;
+    AtspiBus connection;
+    if (bus.address.empty() || !connection.connect(bus.address)) return processes;
+    constexpr std::chrono::seconds Bound{1};
+    constexpr int MostPrograms = 1'000;
+    connection.begin(Bound);
+    const AtspiPart desktop{"org.a11y.atspi.Registry", "/org/a11y/atspi/accessible/root"};
+    for (const AtspiPart& program : childrenOf(connection, desktop, MostPrograms)) {
+        const auto process = connection.callBus("GetConnectionUnixProcessID", {program.program}).values().uint32();
+        if (process) processes.insert(static_cast<pid_t>(*process));
+    }
+    return processes;
 }
 
 void switchAccessibilityOn() {

@@ -7,6 +7,7 @@
 #include <future>
 #include <memory>
 #include <optional>
+#include <set>
 #include <string>
 #include <utility>
 
@@ -24,6 +25,9 @@ struct AccessibilityBus {
 // Asked of the session's D-Bus. Starts the bus when it can be started. May wait for seconds: on the accessibility
 // thread.
 AccessibilityBus findAccessibilityBus();
+
+// The processes that tell of their user interface there. May wait for a second.
+std::set<pid_t> processesOnBus(const AccessibilityBus& bus);
 
 // Asks the session's D-Bus to have programs tell of their user interface. May wait for seconds, too.
 void switchAccessibilityOn();
