@@ -3,6 +3,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <variant>
 #include <vector>
@@ -23,6 +24,8 @@ class PLOutput {
     SnippetTriggers trigger;
     bool cancelTrigger = false;  // the triggering key is not passed on
     std::uint64_t backspaceCount = 0;
+    // What the backspaces erase, where that is known: then the program's way of counting says how many are sent.
+    std::optional<std::u16string> erasedText;
     std::uint64_t leftArrowCount = 0;
     std::shared_ptr<SnippetExpandedContent> snippetExpandedContent;  // null: only erase
     std::vector<Fragment> fragments;

@@ -24,18 +24,20 @@ ExpandTrigger expandTriggerOf(const Snippet& snippet) {
 }
 
 // What stands in the text of the abbreviation, and of the key that triggered it, and has to go.
-std::uint64_t backspaceCount(const Request& request) {
-    if (!request.abbreviation) return 0;
-    const std::size_t typedLength = request.abbreviation->size();
+std::u16string textToErase(const Request& request) {
+    std::u16string typed = request.abbreviation.value_or(u"");
+    if (!request.abbreviation) return typed;
     const ExpandTrigger expandTrigger = expandTriggerOf(*request.snippet);
     if (expandTrigger == ExpandTrigger::Immediately) {
         // The last key of the abbreviation is being swallowed: the application never got it.
-        return request.snippetTrigger == SnippetTrigger::Typed && typedLength > 0 ? typedLength - 1 : typedLength;
+        if (request.snippetTrigger == SnippetTrigger::Typed && !typed.empty()) typed.pop_back();
+        return typed;
     }
     // The delimiter went through when the list of matches opened.
     const bool delimiterStands =
         request.snippetTrigger.contains(SnippetTrigger::FromSeveralMatches) && expandTrigger != ExpandTrigger::HotKey;
-    return delimiterStands ? typedLength + 1 : typedLength;
+    if (delimiterStands) typed += u' ';
+    return typed;
 }
 
 // The user would see the text erased and typed again.
@@ -60,7 +62,9 @@ bool holdsAppleScript(const Request& request, const SnippetExpandedContent& cont
 
 UndoInformation undoOf(const Request& request, const PLOutput& output) {
     UndoInformation undo;
-    undo.backspaceCount = output.snippetExpandedContent->string().size() + (output.cancelTrigger ? 0 : 1);
+    undo.erasedText = output.snippetExpandedContent->string();
+    if (!output.cancelTrigger) undo.erasedText += u' ';
+    undo.backspaceCount = undo.erasedText.size();
     undo.text = request.abbreviation.value_or(u"");
     undo.textWithTrigger = undo.text;
     if (expandTriggerOf(*request.snippet) != ExpandTrigger::Immediately) {
@@ -94,7 +98,8 @@ std::optional<SnippetSender::Sent> SnippetSender::send(const Request& request) {
 
     const auto output = std::make_shared<PLOutput>();
     output->trigger = request.snippetTrigger;
-    output->backspaceCount = backspaceCount(request);
+    output->erasedText = textToErase(request);
+    output->backspaceCount = output->erasedText->size();
     output->cancelTrigger = expandTriggerOf(snippet) != ExpandTrigger::DelimiterKept || content->hasCaretOrFields();
 
     const bool needsForm = !content->fields().empty();
@@ -155,6 +160,7 @@ SnippetSender::Sent SnippetSender::undo(const UndoInformation& undo, bool withTr
     const auto output = std::make_shared<PLOutput>();
     output->trigger = SnippetTrigger::HotKey;
     output->backspaceCount = undo.backspaceCount;
+    output->erasedText = undo.erasedText;
     output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(text);
     dependencies_.inputService.sendOutput(output);
     playFeedback(feedbackSound_);

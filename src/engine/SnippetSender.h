@@ -27,7 +27,8 @@ namespace plume {
 
 // What the last expansion did, as far as taking it back needs to know.
 struct UndoInformation {
-    std::uint64_t backspaceCount = 0;  // erases the expansion
+    std::uint64_t backspaceCount = 0;  // of the expansion's units
+    std::u16string erasedText;         // the expansion
     std::u16string text;               // what was typed, without the key that triggered the expansion
     std::u16string textWithTrigger;    // the same with that key
 };

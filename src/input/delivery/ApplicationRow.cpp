@@ -112,6 +112,15 @@ Keystrokes keystrokes(const JsonNode& node) {
     return keys;
 }
 
+ErasedAtOnce erasedAtOnce(const JsonNode& node) {
+    const std::u16string name = node.string();
+    if (name == u"character") return ErasedAtOnce::Character;
+    if (name == u"emojiPart") return ErasedAtOnce::EmojiPart;
+    if (name == u"emoji") return ErasedAtOnce::Emoji;
+    if (name == u"letter") return ErasedAtOnce::Letter;
+    node.fail("expected one of character emojiPart emoji letter");
+}
+
 const ContextInputSetting& family(const JsonNode& node, const ApplicationFamilies& families) {
     const auto found = families.find(toUtf8(node.string()));
     if (found != families.end()) return found->second;
@@ -130,7 +139,7 @@ ContextInputSetting readApplicationRow(const JsonNode& node, const ContextInputS
                                        const ApplicationFamilies& families) {
     const JsonObject row = node.object({"about", "family", "flags", "pasteKeys", "copyKeys", "pastesPrimary",
                                         "pastingDelay", "afterPastingDelay", "afterErasingDelay", "overtypesCompletion",
-                                        "typesBeyondBmp", "longestTyped", "blockLength"});
+                                        "typesBeyondBmp", "erasesAtOnce", "longestTyped", "blockLength"});
     ContextInputSetting setting = otherwise;
     const auto set = [&](std::string_view key, auto& field, auto read) {
         row.whenSet(key, [&](const JsonNode& value) { field = read(value); });
@@ -148,6 +157,7 @@ ContextInputSetting readApplicationRow(const JsonNode& node, const ContextInputS
     set("afterErasingDelay", setting.afterErasingDelay, delay);
     set("overtypesCompletion", setting.overtypesCompletion, isSo);
     set("typesBeyondBmp", setting.typesBeyondBmp, isSo);
+    set("erasesAtOnce", setting.erasesAtOnce, erasedAtOnce);
     set("longestTyped", setting.longestTyped, length);
     set("blockLength", setting.blockLength, length);
     return setting;

@@ -18,6 +18,7 @@
 #include "Foundation/KeyCode.h"
 #include "Foundation/KeyModifiers.h"
 #include "Foundation/Result.h"
+#include "input/delivery/StepCounts.h"
 
 namespace plume {
 
@@ -75,7 +76,8 @@ struct ContextInputSetting {
     double afterErasingDelay = 0;
     // The program proposes the rest of a word as selected text, which the first Backspace would remove alone.
     bool overtypesCompletion = false;
-    bool typesBeyondBmp = true;      // characters beyond U+FFFF can be typed
+    bool typesBeyondBmp = true;  // characters beyond U+FFFF can be typed
+    ErasedAtOnce erasesAtOnce = ErasedAtOnce::Character;
     std::uint64_t longestTyped = 0;  // units; longer texts are pasted; 0 means no limit
 
     bool has(InputFlag flag) const { return flags.contains(flag); }

@@ -23,6 +23,9 @@ void OutputDelivery::send(std::shared_ptr<PLOutput> output, const TriggerKey& tr
     ContextInputResolver& resolver = dependencies_.resolver;
     resolver.prepareSending(output->snippetExpandedContent.get());
     output->contextInputSetting = resolver.setting();
+    if (output->erasedText) {
+        output->backspaceCount = backspacesFor(*output->erasedText, resolver.setting()->erasesAtOnce);
+    }
     prepareOutput(*output, *resolver.setting(), triggerKey, !isIdle());
 
     Delivery delivery;

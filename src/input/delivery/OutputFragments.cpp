@@ -5,6 +5,7 @@
 #include <variant>
 
 #include "Foundation/CharacterSet.h"
+#include "input/delivery/StepCounts.h"
 
 namespace plume {
 
@@ -20,6 +21,16 @@ void typeRichText(std::vector<PLOutput::Fragment>& fragments) {
     for (PLOutput::Fragment& fragment : fragments) {
         if (const auto* rich = std::get_if<AttributedString>(&fragment)) fragment = std::u16string(rich->string());
     }
+}
+
+std::uint64_t arrowsToCaret(const SnippetExpandedContent& content) {
+    const std::int64_t behindCaret = content.caretDistanceFromEndingIgnoreKeys();
+    // A caret located past the end asks for no arrows.
+    if (behindCaret < 0) return 0;
+    const std::u16string_view text = content.string();
+    const auto length = static_cast<std::size_t>(behindCaret);
+    const auto typedByKeys = static_cast<std::uint64_t>(content.caretDistanceFromEnding() - behindCaret);
+    return leftArrowsFor(text.substr(text.size() - length)) + typedByKeys;
 }
 
 }  // namespace
@@ -52,9 +63,7 @@ std::vector<PLOutput::Fragment> fragmentsForOutputFragments(const std::vector<PL
 
 void refreshFragmentsForOuput(PLOutput& output, const ContextInputSetting& setting) {
     const auto& content = output.snippetExpandedContent;
-    // A caret located past the end asks for no arrows.
-    const std::int64_t distance = content ? content->caretDistanceFromEnding() : 0;
-    output.leftArrowCount = static_cast<std::uint64_t>(std::max<std::int64_t>(distance, 0));
+    output.leftArrowCount = content ? arrowsToCaret(*content) : 0;
     output.refreshFragments();
     if (!setting.canPaste()) typeRichText(output.fragments);
     if (content && (!content->isRich() || !setting.canPaste()) && !setting.has(InputFlag::UseClipboard)) {

@@ -1,0 +1,114 @@
+#include "input/delivery/StepCounts.h"
+
+#include <unicode/ubrk.h>
+#include <unicode/uchar.h>
+#include <unicode/uscript.h>
+#include <unicode/utf16.h>
+
+#include <algorithm>
+#include <array>
+#include <memory>
+#include <string>
+
+namespace plume {
+
+namespace {
+
+constexpr UChar32 Joiner = 0x200D;
+constexpr UChar32 KeycapMark = 0x20E3;
+
+// Below combining marks, and no end of a line of two units.
+bool isSimple(std::u16string_view text) {
+    constexpr char16_t FirstMark = 0x300;
+    return std::all_of(text.begin(), text.end(), [](char16_t unit) { return unit < FirstMark && unit != u'\r'; });
+}
+
+template <class Visit>
+void forEachCluster(std::u16string_view text, Visit visit) {
+    UErrorCode status = U_ZERO_ERROR;
+    const std::unique_ptr<UBreakIterator, void (*)(UBreakIterator*)> clusters(
+        ubrk_open(UBRK_CHARACTER, "", text.data(), static_cast<std::int32_t>(text.size()), &status), ubrk_close);
+    if (U_FAILURE(status)) return;
+    std::int32_t start = 0;
+    for (auto end = ubrk_next(clusters.get()); end != UBRK_DONE; end = ubrk_next(clusters.get())) {
+        visit(text.substr(static_cast<std::size_t>(start), static_cast<std::size_t>(end - start)));
+        start = end;
+    }
+}
+
+// What one extended grapheme cluster is made of.
+struct Cluster {
+    explicit Cluster(std::u16string_view text) {
+        for (std::size_t i = 0; i < text.size();) {
+            UChar32 c = 0;
+            U16_NEXT(text.data(), i, text.size(), c);
+            if (characters++ == 0) {
+                first = c;
+            } else {
+                const std::int8_t type = u_charType(c);
+                hasOnlyMarks = hasOnlyMarks && (type == U_NON_SPACING_MARK || type == U_ENCLOSING_MARK);
+            }
+            if (c == Joiner) ++joiners;
+            hasTags = hasTags || (c >= 0xE0020 && c <= 0xE007F);
+            isKeycap = isKeycap || c == KeycapMark;
+        }
+    }
+
+    bool isEmoji() const {
+        return isKeycap || u_hasBinaryProperty(first, UCHAR_EXTENDED_PICTOGRAPHIC) ||
+               u_hasBinaryProperty(first, UCHAR_REGIONAL_INDICATOR);
+    }
+    bool isEndOfLine() const { return first == u'\r'; }
+    // Of other scripts GTK deletes one mark after the other.
+    bool isMarkedLetter() const {
+        constexpr std::array Scripts = {USCRIPT_LATIN, USCRIPT_GREEK, USCRIPT_CYRILLIC, USCRIPT_HIRAGANA,
+                                        USCRIPT_KATAKANA};
+        UErrorCode status = U_ZERO_ERROR;
+        const UScriptCode script = uscript_getScript(first, &status);
+        return hasOnlyMarks && std::find(Scripts.begin(), Scripts.end(), script) != Scripts.end();
+    }
+
+    UChar32 first = 0;
+    std::uint64_t characters = 0;
+    std::uint64_t joiners = 0;
+    bool hasOnlyMarks = true;  // behind the first character
+    bool hasTags = false;
+    bool isKeycap = false;
+};
+
+std::uint64_t backspacesForCluster(const Cluster& cluster, ErasedAtOnce atOnce) {
+    if (cluster.isEndOfLine()) return 1;
+    switch (atOnce) {
+        case ErasedAtOnce::Character:
+            break;
+        case ErasedAtOnce::EmojiPart:
+            if (cluster.isEmoji() && !cluster.hasTags) return 1 + cluster.joiners;
+            break;
+        case ErasedAtOnce::Emoji:
+            if (cluster.isEmoji()) return 1;
+            break;
+        case ErasedAtOnce::Letter:
+            if (cluster.isEmoji() && !cluster.hasTags) return 1;
+            if (cluster.isMarkedLetter()) return 1;
+            break;
+    }
+    return cluster.characters;
+}
+
+}  // namespace
+
+std::uint64_t backspacesFor(std::u16string_view text, ErasedAtOnce atOnce) {
+    if (isSimple(text)) return text.size();
+    std::uint64_t count = 0;
+    forEachCluster(text, [&](std::u16string_view piece) { count += backspacesForCluster(Cluster(piece), atOnce); });
+    return count;
+}
+
+std::uint64_t leftArrowsFor(std::u16string_view text) {
+    if (isSimple(text)) return text.size();
+    std::uint64_t count = 0;
+    forEachCluster(text, [&](std::u16string_view /*piece*/) { ++count; });
+    return count;
+}
+
+}  // namespace plume
