@@ -167,6 +167,18 @@ TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {
     }
 }
 
+TEST_F(Program, LetsWhatIsTypedWhileAShortScriptRunsFollowItsOutput) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    // A busy machine may be slower than keys wait for it.
+    const auto follows = [&] {
+        target->clear();
+        rig_->keyboard().tap(Key::Home);
+        rig_->keyboard().type("x ;run and on");
+        return target->awaitText("x out42 and on", Milliseconds(1'000)) == "x out42 and on";
+    };
+    EXPECT_TRUE(waitUntil(follows, Bound)) << log();
+}
+
 TEST_F(Program, EndsInTheMiddleOfAScript) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     start(R"([{"expandTrigger": 0, "items": [
