@@ -10,6 +10,7 @@
 #include <fstream>
 #include <functional>
 #include <iostream>
+#include <map>
 #include <memory>
 #include <sstream>
 #include <string>
@@ -91,25 +92,29 @@ double percentile(std::vector<double> values, double part) {
 // What expands: Plume, the bare synthesiser, or another program.
 using Expand = std::function<Expansion(const Case&, const std::string& expected)>;
 
-int measure(const std::string& prefix, const std::vector<Case>& cases, const std::string& target,
-            const Expand& expand) {
+// Milliseconds, by case.
+using Times = std::map<std::string, std::vector<double>>;
+
+int measure(Times& times, const std::vector<Case>& cases, const Expand& expand) {
     int wrong = 0;
     for (const Case& tested : cases) {
-        std::vector<double> times;
         for (int run = 0; run < tested.runs; ++run) {
             const Expansion expansion = expand(tested, textOf(tested.length, true));
             if (expansion.isRight) {
-                times.push_back(expansion.milliseconds);
+                times[tested.name].push_back(expansion.milliseconds);
             } else {
                 ++wrong;
             }
         }
-        if (times.empty()) continue;
-        const std::string name = prefix + tested.name + "." + target;
-        print(name + ".median", median(times), "ms");
-        print(name + ".p95", percentile(times, 0.95), "ms");
     }
     return wrong;
+}
+
+void printTimes(const std::string& prefix, const Times& times, const std::string& target) {
+    for (const auto& [name, values] : times) {
+        print(prefix + name + "." + target + ".median", median(values), "ms");
+        print(prefix + name + "." + target + ".p95", percentile(values, 0.95), "ms");
+    }
 }
 
 std::string shortName(TargetKind kind) {
@@ -117,18 +122,6 @@ std::string shortName(TargetKind kind) {
 }
 
 constexpr TargetKind Targets[] = {TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm};
-
-int measurePlume(DesktopRig& rig, const std::vector<Case>& cases, bool paste) {
-    int wrong = 0;
-    const PlumeProgram plume(rig, library(cases, true), settings(paste));
-    for (const TargetKind kind : Targets) {
-        const auto target = rig.startTarget(kind);
-        wrong += measure("delivery.", cases, shortName(kind), [&](const Case& tested, const std::string& expected) {
-            return rig::typeAndAwait(rig, *target, tested.abbreviation, expected);
-        });
-    }
-    return wrong;
-}
 
 // A tenth of the runs: it takes its time.
 void measurePeer(DesktopRig& rig) {
@@ -144,10 +137,11 @@ void measurePeer(DesktopRig& rig) {
                 runs += tested.runs /= 10;
             }
             const PeerProgram peer(rig, phrases, kind == TargetKind::Xterm);
-            wrong +=
-                measure("peer.delivery.", cases, shortName(kind), [&](const Case& tested, const std::string& text) {
-                    return rig::typeAndAwait(rig, *target, tested.abbreviation, text);
-                });
+            Times times;
+            wrong += measure(times, cases, [&](const Case& tested, const std::string& text) {
+                return rig::typeAndAwait(rig, *target, tested.abbreviation, text);
+            });
+            printTimes("peer.delivery.", times, shortName(kind));
         }
     }
     print("peer.delivery.wrong", wrong, "count");
@@ -235,20 +229,50 @@ class BareExpander {
     std::unique_ptr<rig::ForeignOwner> owner_;
 };
 
-void measureFloor(DesktopRig& rig) {
-    BareExpander bare(rig);
-    for (const TargetKind kind : Targets) {
-        const auto target = rig.startTarget(kind);
-        const bool isTerminal = kind == TargetKind::Xterm;
-        measure("floor.delivery.", Typed, shortName(kind), [&](const Case&, const std::string& expected) {
-            return rig::awaitExpansion(*target, expected, [&] { bare.type(expected); });
-        });
-        measure("floor.delivery.", Pasted, shortName(kind), [&](const Case&, const std::string& expected) {
-            bare.offer(expected, isTerminal);
-            return rig::awaitExpansion(*target, expected, [&] { bare.paste(isTerminal); });
+// Plume and the floor take turns, each a few runs at a time: what else the machine does slows both alike, and their
+// ratio holds.
+class Turns {
+  public:
+    explicit Turns(DesktopRig& rig) : rig_(rig), bare_(rig) {}
+
+    // How many texts did not arrive exactly.
+    int measure(TargetKind kind, bool paste) {
+        std::vector<Case> cases = paste ? Pasted : Typed;
+        for (Case& tested : cases) tested.runs /= Count;
+        const auto target = rig_.startTarget(kind);
+        Times floor;
+        Times plume;
+        int wrong = 0;
+        for (int turn = 0; turn < Count; ++turn) {
+            takeFloor(floor, cases, *target, paste, kind == TargetKind::Xterm);
+            const PlumeProgram program(rig_, library(cases, true), settings(paste));
+            wrong += bench::measure(plume, cases, [&](const Case& tested, const std::string& expected) {
+                return rig::typeAndAwait(rig_, *target, tested.abbreviation, expected);
+            });
+        }
+        printTimes("floor.delivery.", floor, shortName(kind));
+        printTimes("delivery.", plume, shortName(kind));
+        for (const auto& [name, times] : plume) {
+            if (!floor.contains(name)) continue;
+            print("delivery." + name + "." + shortName(kind) + ".ratio", median(times) / median(floor[name]), "times");
+        }
+        return wrong;
+    }
+
+  private:
+    static constexpr int Count = 5;
+
+    void takeFloor(Times& times, const std::vector<Case>& cases, TargetProgram& target, bool paste, bool isTerminal) {
+        bench::measure(times, cases, [&](const Case&, const std::string& expected) {
+            if (!paste) return rig::awaitExpansion(target, expected, [&] { bare_.type(expected); });
+            bare_.offer(expected, isTerminal);
+            return rig::awaitExpansion(target, expected, [&] { bare_.paste(isTerminal); });
         });
     }
-}
+
+    DesktopRig& rig_;
+    BareExpander bare_;
+};
 
 // Of the process and all its threads, in seconds.
 double processorTime(pid_t process) {
@@ -310,10 +334,10 @@ void measureFootprint(DesktopRig& rig) {
 int measureAll(bool withPeer) {
     if (withPeer && !PeerProgram::isInstalled()) throw rig::RigError("install the package autokey-gtk");
     DesktopRig rig;
-    measureFloor(rig);
     if (withPeer) measurePeer(rig);
-    int wrong = measurePlume(rig, Typed, false);
-    wrong += measurePlume(rig, Pasted, true);
+    int wrong = 0;
+    Turns turns(rig);
+    for (const TargetKind kind : Targets) wrong += turns.measure(kind, false) + turns.measure(kind, true);
     wrong += countWrong(rig, false) + countWrong(rig, true);
     print("delivery.wrong", wrong, "count");
     measureFootprint(rig);
