@@ -185,7 +185,7 @@ void SelectionRequestor::convert(const std::string& selection, const std::string
     answer_.reset();
     pieces_ = 0;
     xcb_convert_selection(connection_->get(), window_, connection_->atom(selection), connection_->atom(target),
-                          property, XCB_CURRENT_TIME);
+                          property, requestTime_);
 }
 
 bool SelectionRequestor::awaitAnswer() {
@@ -194,11 +194,12 @@ bool SelectionRequestor::awaitAnswer() {
     return *answer_ != XCB_ATOM_NONE;
 }
 
-std::optional<SelectionData> SelectionRequestor::take(xcb_atom_t property) {
+std::optional<SelectionData> SelectionRequestor::take(xcb_atom_t property, bool removes) {
     constexpr std::uint32_t All = 0x1FFFFFFF;
     const XcbOwned<xcb_get_property_reply_t> reply(xcb_get_property_reply(
         connection_->get(),
-        xcb_get_property(connection_->get(), 1, window_, property, XCB_GET_PROPERTY_TYPE_ANY, 0, All), nullptr));
+        xcb_get_property(connection_->get(), removes ? 1 : 0, window_, property, XCB_GET_PROPERTY_TYPE_ANY, 0, All),
+        nullptr));
     if (!reply || reply->type == XCB_ATOM_NONE) return std::nullopt;
     return SelectionData{connection_->atomName(reply->type), reply->format,
                          std::string(static_cast<const char*>(xcb_get_property_value(reply.get())),
@@ -228,6 +229,13 @@ std::optional<SelectionData> SelectionRequestor::request(const std::string& sele
     convert(selection, target, property);
     if (!awaitAnswer()) return std::nullopt;
     return takeWhole(property);
+}
+
+std::optional<SelectionData> SelectionRequestor::requestAndLeave(const std::string& selection,
+                                                                 const std::string& target) {
+    const xcb_atom_t property = connection_->atom("RIG_SELECTION");
+    convert(selection, target, property);
+    return awaitAnswer() ? take(property, false) : std::nullopt;
 }
 
 std::map<std::string, SelectionData> SelectionRequestor::requestMultiple(const std::string& selection,

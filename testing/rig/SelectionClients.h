@@ -88,6 +88,8 @@ class SelectionRequestor {
 
     // What the owner gives; nothing when it refuses. Throws RigError when it does not answer.
     std::optional<SelectionData> request(const std::string& selection, const std::string& target);
+    // The same, but what was given stays in its place, as some programs leave it.
+    std::optional<SelectionData> requestAndLeave(const std::string& selection, const std::string& target);
     // Several targets by one MULTIPLE request; refused ones are missing.
     std::map<std::string, SelectionData> requestMultiple(const std::string& selection,
                                                          const std::vector<std::string>& targets);
@@ -97,6 +99,9 @@ class SelectionRequestor {
     // Asks, waits for the answer and leaves it lying, or takes the announcement of pieces and no piece.
     void requestAndStop(const std::string& selection, const std::string& target);
 
+    // The moment that requests are for from now on; none in particular at first.
+    void setRequestTime(xcb_timestamp_t time) { requestTime_ = time; }
+
     // How many pieces the last value came in; 0 for one that came whole.
     int pieces() const { return pieces_; }
 
@@ -104,7 +109,7 @@ class SelectionRequestor {
     void next(const std::string& what);
     void convert(const std::string& selection, const std::string& target, xcb_atom_t property);
     bool awaitAnswer();
-    std::optional<SelectionData> take(xcb_atom_t property);
+    std::optional<SelectionData> take(xcb_atom_t property, bool removes = true);
     SelectionData takeWhole(xcb_atom_t property);
 
     std::unique_ptr<XcbConnection> connection_;
@@ -112,6 +117,7 @@ class SelectionRequestor {
     std::map<xcb_atom_t, int> newValues_;
     std::optional<xcb_atom_t> answer_;
     int pieces_ = 0;
+    xcb_timestamp_t requestTime_ = XCB_CURRENT_TIME;
 };
 
 std::vector<std::uint32_t> wordsOf(const std::string& bytes);

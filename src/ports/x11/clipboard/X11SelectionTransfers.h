@@ -30,7 +30,8 @@ class X11SelectionTransfers {
     X11SelectionTransfers& operator=(const X11SelectionTransfers&) = delete;
 
     // Writes the value, in place of what was under way to the same property. `taken` is called when the requestor has
-    // removed the last of it.
+    // removed the last of it, or asks for something else there; for a requestor that removes nothing, 0.3 s after it
+    // was written. A value in pieces has to be removed.
     void send(xcb_window_t requestor, xcb_atom_t property, X11SelectionValue value, std::function<void()> taken);
 
   private:
@@ -39,18 +40,21 @@ class X11SelectionTransfers {
         X11Session::WindowEvents requestorEvents;
         X11SelectionValue value;
         std::function<void()> taken;
+        std::uint32_t written = 0;  // the request that wrote last, by its sequence number
         bool isIncremental = false;
         bool isComplete = false;  // the last piece is there
         std::size_t sent = 0;     // bytes
         double lastMoved = 0;
+        Timer presumedTaken = {};
     };
 
     void begin(const Key& key, Transfer& transfer);
     void sendPiece(const Key& key, Transfer& transfer);
-    void propertyWasRemoved(const Key& key);
+    void propertyWasRemoved(const Key& key, std::uint32_t sequence);
+    void presumeTaken(const Key& key);
     void forgetWindow(xcb_window_t window);
     void forgetIdle();
-    void write(const Key& key, const X11SelectionValue& value, std::size_t from, std::size_t count) const;
+    void write(const Key& key, Transfer& transfer, std::size_t from, std::size_t count) const;
 
     X11Session& session_;
     const std::size_t longestPiece_;  // bytes
