@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -48,6 +49,12 @@ class Pasteboard : public PasteboardReader {
     // Whether owners hear when the program in front has taken their content. Where they do, a paste goes on after the
     // keystroke, and others (a clipboard manager) may read promised content too.
     virtual bool tellsWhenTaken() const = 0;
+    // Pastes what was declared last: calls `sendKeystroke` when the program in front will find it, at once or from the
+    // run loop, 0.2 s later at most.
+    virtual void paste(std::function<void()> sendKeystroke) = 0;
+    // Whether the program that got the last paste's keystroke is still in front and does nothing: it hangs, or is
+    // stopped. It still gets what was pasted when it goes on, also if something else has been declared by then.
+    virtual bool isPasteAwaited() const = 0;
     // Replaces the content by these types and returns the new change count. With an owner the data is promised;
     // without one it is written right after. No types at all empty the pasteboard.
     virtual std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) = 0;

@@ -86,6 +86,19 @@ TEST_P(PasteboardContract, ForgetsAPromiseThatWasReplaced) {
     EXPECT_EQ(first.asked, 0);
 }
 
+TEST_P(PasteboardContract, SendsTheKeystrokeOfAPasteOnce) {
+    Pasteboard& pasteboard = desk_->pasteboard();
+    Promise promise(u"promised");
+    for (const int round : {1, 2}) {
+        pasteboard.declareTypes({StringType}, &promise);
+        int sent = 0;
+        pasteboard.paste([&] { ++sent; });
+        EXPECT_TRUE(desk_->runUntil([&] { return sent == 1; })) << round;
+        EXPECT_FALSE(pasteboard.isPasteAwaited()) << "no program hangs";
+    }
+    pasteboard.declareTypes({}, nullptr);
+}
+
 TEST_P(PasteboardContract, IsEmptiedByDeclaringNothing) {
     Pasteboard& pasteboard = desk_->pasteboard();
     desk_->copyElsewhere(u"theirs");

@@ -1,6 +1,7 @@
 // The whole program while the user does what users do: keeps things on the clipboard, holds keys, types on.
 #include "tests/desktop/Robustness.h"
 
+#include <chrono>
 #include <csignal>
 #include <ostream>
 #include <vector>
@@ -140,6 +141,48 @@ TEST_P(ClipboardAfterTheEnd, IsTheUsersUntilSomethingNewIsCopied) {
 INSTANTIATE_TEST_SUITE_P(Targets, ClipboardAfterTheEnd, testing::Values(TargetKind::GtkTextView), targetName);
 
 INSTANTIATE_TEST_SUITE_P(Targets, ClipboardInTarget, testing::ValuesIn(Targets), targetName);
+
+// Stopped while it gets a paste: the clipboard is the user's within two seconds all the same.
+class StoppedTarget : public ClipboardInTarget {
+  protected:
+    static SelectionOffer text() { return {{"UTF8_STRING", {"UTF8_STRING", 8, "What the user copied"}}}; }
+
+    static void pasteInto(TargetProgram& stopped, const std::string& typed) {
+        const ForeignOwner user(rig_->server().display(), text());
+        kill(stopped.pid(), SIGSTOP);
+        const auto start = std::chrono::steady_clock::now();
+        rig_->keyboard().type(typed);
+        const auto isPlumes = [&] { return rig_->client().selectionOwner("CLIPBOARD") != user.window(); };
+        ASSERT_TRUE(waitUntil(isPlumes, Milliseconds(5'000)));
+        expectOnClipboard(text());
+        EXPECT_LE(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(2'000));
+    }
+};
+
+TEST_P(StoppedTarget, GetsThePasteWhenItGoesOnAndThenTheKeys) {
+    startPlume(Way::Pasted);
+    const auto target = rig_->startTarget(GetParam());
+    pasteInto(*target, LongAscii.abbreviation + "xyz");
+    EXPECT_FALSE(target->awaitPaste(Milliseconds(2'000))) << "longer than keys wait otherwise";
+    kill(target->pid(), SIGCONT);
+    expectText(*target, LongAscii.content + "xyz", "after four seconds");
+    expectOnClipboard(text());
+}
+
+TEST_P(StoppedTarget, HoldsNoKeysBackFromAnother) {
+    startPlume(Way::Pasted);
+    const auto other = rig_->startTarget(TargetKind::QtTextEdit);
+    const auto target = rig_->startTarget(GetParam());
+    pasteInto(*target, LongAscii.abbreviation);
+    other->activate();
+    rig_->keyboard().type("at once");
+    EXPECT_EQ(other->awaitText("at once", Milliseconds(1'000)), "at once");
+    kill(target->pid(), SIGCONT);
+    expectText(*target, LongAscii.content, "in the background");
+}
+
+INSTANTIATE_TEST_SUITE_P(Targets, StoppedTarget, testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit),
+                         targetName);
 
 // ---- Keys that are held ----
 

@@ -135,7 +135,21 @@ class X11PasteboardTest : public testing::Test {
         return owner;
     }
 
+    // Whether the keystroke is sent at once.
+    bool startsPaste() {
+        return thread_->run([&] {
+            pasted_ = false;
+            pasteboard_->paste([&] { pasted_ = true; });
+            return pasted_;
+        });
+    }
+    void awaitPaste() {
+        const auto isPasted = [&] { return thread_->run([&] { return pasted_; }); };
+        rig_->client().await("the keystroke", Milliseconds(10'000), isPasted);
+    }
+
     static inline std::unique_ptr<DesktopRig> rig_;
+    bool pasted_ = false;  // the tap thread's
     std::unique_ptr<SessionThread> thread_;
     std::unique_ptr<X11Pasteboard> pasteboard_;
 };
@@ -227,6 +241,7 @@ TEST_F(X11PasteboardTest, ClipboardManagersAreToldToForgetExpansionsAlone) {
     SelectionRequestor manager(display());
     declare({String}, &owner);
     EXPECT_EQ(manager.request("CLIPBOARD", "x-kde-passwordManagerHint")->bytes, "secret");
+    EXPECT_EQ(manager.request("CLIPBOARD", "application/x-copyq-hidden")->bytes, "1");
     declare({String, "UTF8_STRING"}, &owner);
     EXPECT_EQ(manager.request("CLIPBOARD", "x-kde-passwordManagerHint"), std::nullopt);
     EXPECT_EQ(manager.request("CLIPBOARD", "UTF8_STRING")->bytes, "given back");
@@ -263,6 +278,56 @@ TEST_F(X11PasteboardTest, LongContentWasTakenWithItsLastPiece) {
     EXPECT_THAT(owner.awaitTaken(0), IsEmpty());
     EXPECT_EQ(front.request("CLIPBOARD", "UTF8_STRING")->bytes, text);
     EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
+}
+
+TEST_F(X11PasteboardTest, WhatIsLeftLyingWasTakenAndSoWasWhatGivesWayToAnotherAnswer) {
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
+    SelectionRequestor front(display());
+    front.comeToFront(rig_->client());
+    declare({String}, &owner);
+    front.requestAndLeave("CLIPBOARD", "UTF8_STRING");
+    EXPECT_THAT(owner.awaitTaken(1), ElementsAre(String));
+    front.requestAndLeave("CLIPBOARD", "UTF8_STRING");
+    front.targets("CLIPBOARD");
+    EXPECT_THAT(owner.awaitTaken(2), ElementsAre(String, String));
+}
+
+// ---- Pasting ----
+
+TEST_F(X11PasteboardTest, PastesWhenAProgramThatAsksForTheTargetsHasThem) {
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
+    SelectionRequestor front(display());
+    front.comeToFront(rig_->client());
+    declare({String}, &owner);
+    EXPECT_FALSE(startsPaste()) << "a stranger may be about to ask";
+    awaitPaste();
+    EXPECT_TRUE(startsPaste()) << "it did not";
+    declare({String}, &owner);
+    front.targets("CLIPBOARD");
+    EXPECT_TRUE(startsPaste()) << "it has asked";
+    declare({String}, &owner);
+    EXPECT_FALSE(startsPaste()) << "it always asks";
+    front.targets("CLIPBOARD");
+    awaitPaste();
+}
+
+TEST_F(X11PasteboardTest, APasteThatWasNotTakenIsStillForItsProgramAlone) {
+    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
+    SelectionRequestor front(display());
+    front.comeToFront(rig_->client());
+    SelectionRequestor manager(display());
+    declare({String}, &owner);
+    const auto time = thread_->run([&] { return thread_->session().serverTime(); });
+    startsPaste();
+    awaitPaste();
+    declare({String, "UTF8_STRING"}, &owner);
+    manager.setRequestTime(time);
+    EXPECT_EQ(manager.request("CLIPBOARD", "UTF8_STRING"), utf8("given back"));
+    front.setRequestTime(time);
+    EXPECT_EQ(front.request("CLIPBOARD", "UTF8_STRING"), utf8("expansion"));
+    EXPECT_THAT(owner.awaitTaken(1), Contains(String));
+    const auto isOver = [&] { return front.request("CLIPBOARD", "UTF8_STRING") == utf8("given back"); };
+    rig_->client().await("the end of the paste", Milliseconds(10'000), isOver);
 }
 
 // ---- Reading ----

@@ -160,6 +160,26 @@ TEST_F(X11TapTest, HeldBackKeysWaitTwoSecondsAtMost) {
     EXPECT_GT(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(1'900));
 }
 
+TEST_F(X11TapTest, KeysThatAreKeptWaitingFollowAClickOrAKeyWithAlt) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    setDecision([this](const TapEvent& event) {
+        if (event.type == Type::KeyDown && event.string == u"x") tap_->tap->hold();
+        return false;
+    });
+    for (const bool click : {true, false}) {
+        target->clear();
+        rig_->keyboard().type("xy");
+        tap_->run([this] { tap_->tap->keepHolding(); });
+        const auto start = std::chrono::steady_clock::now();
+        rig_->keyboard().type("z");
+        if (click) tap_->run([this] { tap_->tap->userClicked(); });
+        if (!click) rig_->keyboard().tap(Key::LeftAlt);
+        EXPECT_EQ(target->awaitText("xyz"), "xyz");
+        EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(1'500));
+    }
+}
+
 TEST_F(X11TapTest, KeysHeldWhileItComesAndGoesComeUp) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     rig_->keyboard().press(Key::LeftShift);

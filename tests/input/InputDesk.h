@@ -75,6 +75,8 @@ class TellingPasteboard final : public Pasteboard {
     std::optional<std::string> data(std::string_view type) const override { return content.data(type); }
     std::int64_t changeCount() const override { return content.changeCount(); }
     bool tellsWhenTaken() const override { return tells; }
+    void paste(std::function<void()> sendKeystroke) override { sendKeystroke(); }
+    bool isPasteAwaited() const override { return awaited; }
     std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* anOwner) override {
         owner = anOwner;
         return content.declareTypes(types, anOwner);
@@ -92,6 +94,7 @@ class TellingPasteboard final : public Pasteboard {
     SimulatedPasteboard content;
     PasteboardOwner* owner = nullptr;
     bool tells = false;
+    bool awaited = false;
 };
 
 struct InputDesk {

@@ -94,7 +94,10 @@ void LinuxPort::followFocus() {
             hiddenPrompts_.userTypes();
         }
     });
-    mouseTap_->clicked = [this] { focusMayHaveMoved(); };
+    mouseTap_->clicked = [this] {
+        keyboardTap_->userClicked();
+        focusMayHaveMoved();
+    };
     processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
     tapLoop_.perform([this] { tellFrontProcess(); });
 }

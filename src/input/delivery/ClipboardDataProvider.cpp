@@ -10,6 +10,9 @@ namespace plume {
 
 namespace {
 
+// Within two seconds from the paste the user's clipboard is back, come what may.
+constexpr double LongestOffer = 1.8;  // seconds
+
 bool isWithinALine(std::u16string_view text) {
     return text.find_first_of(u"\n\r\u2029") == std::u16string_view::npos;
 }
@@ -26,6 +29,11 @@ void ClipboardDataProvider::prepareSetData() {
     providedData_ = false;
     stringData_.reset();
     attributedStringData_.reset();
+    wasPasted();
+}
+
+void ClipboardDataProvider::wasPasted() {
+    pasted_ = runLoop_.now();
 }
 
 void ClipboardDataProvider::setString(std::u16string string) {
@@ -55,7 +63,8 @@ void ClipboardDataProvider::provideData(Pasteboard& pasteboard, std::string_view
 }
 
 void ClipboardDataProvider::dataWasTaken(std::string_view /*type*/) {
-    if (provideBackupData_) return;
+    // What was given back before the program took it comes to it all the same, and only then does taking count.
+    if (provideBackupData_ && providedData_) return;
     providedData_ = true;
     if (restoresWhenTaken_) restoreAfterDelay();
     if (onTaken) onTaken();
@@ -96,15 +105,18 @@ void ClipboardDataProvider::restore() {
     // Somebody has copied something since: that is what the user wants to find there.
     if (pasteboard_.changeCount() != changeCount_) return;
     if (!providedData_) {
-        if (pasteboard_.tellsWhenTaken()) {
+        if (!pasteboard_.tellsWhenTaken()) return restoreAfterDelay();
+        const double left = pasted_ + LongestOffer - runLoop_.now();
+        if (left > 0) {
             restoresWhenTaken_ = true;
-        } else {
-            restoreAfterDelay();
+            pendingRestore_ = runLoop_.performAfterDelay(left, [this] { restore(); });
+            return;
         }
-        return;
     }
-    provideBackupData_ = true;
+    // Until the clipboard has changed, whoever is asked for is asked for the expansion.
     changeCount_ = pasteboard_.declareTypes(*types_, this);
+    provideBackupData_ = true;
+    restoresWhenTaken_ = false;
 }
 
 void ClipboardDataProvider::restoreAfterDelay() {

@@ -2,8 +2,9 @@
 // read the expansion.
 //
 // Owned by the input service for its whole life; runs on the tap thread, its delayed restores on that thread's run
-// loop. A restore is never forced: content that nobody reads stays, and the restore tries again every restoreDelay, or,
-// where the pasteboard tells when content was taken, restoreDelay after that.
+// loop. Where the pasteboard tells when content was taken, what was there comes back restoreDelay after that, or 1.8 s
+// after the paste if nobody takes the expansion. Elsewhere content that nobody reads stays, and the restore tries again
+// every restoreDelay.
 #pragma once
 
 #include <cstdint>
@@ -32,17 +33,20 @@ class ClipboardDataProvider final : public PasteboardOwner {
     // The program in front has taken the expansion; called inside the pasteboard's own call. Only where that tells.
     std::function<void()> onTaken;
 
+    // The keystroke that pastes was sent.
+    void wasPasted();
     void setString(std::u16string string);
     void setAttributedString(AttributedString string);
 
     // Remembers the clipboard's content, unless it is this provider's own.
     void backup();
-    // Promises the remembered content again, or tries again later when nobody has read the expansion yet. Does nothing
-    // when the clipboard holds something newer than the expansion.
+    // Promises the remembered content again, or tries again later when somebody may still read the expansion. Does
+    // nothing when the clipboard holds something newer than the expansion.
     void restore();
     void restoreAfterDelay();
     // Whether a restore was pending.
     bool cancelRestore();
+    bool isRestoring() const { return pendingRestore_ || provideBackupData_; }
 
     // The clipboard holds the expansion, and the user's own content is the remembered one.
     bool isOffering() const;
@@ -66,7 +70,8 @@ class ClipboardDataProvider final : public PasteboardOwner {
     std::optional<std::vector<std::string>> types_;
     std::int64_t backupChangeCount_ = 0;  // the clipboard's when the content was remembered
     bool providedData_ = false;           // the expansion was read
-    bool restoresWhenTaken_ = false;      // a restore is due as soon as it was
+    bool restoresWhenTaken_ = false;      // a restore waits for that
+    double pasted_ = 0;                   // when its keystroke was sent, or it was offered
     bool provideBackupData_ = false;
     Timer pendingRestore_;
 };

@@ -8,6 +8,9 @@ namespace plume {
 namespace {
 // An application that has not taken what was pasted by then is not waited for.
 constexpr double TakingLimit = 1.0;  // seconds from the keystroke
+// But for one that hangs, until somebody else is in front.
+constexpr double HangingLimit = 10.0;
+constexpr double BetweenLooks = 0.05;
 }  // namespace
 
 OutputDelivery::OutputDelivery(const Dependencies& dependencies)
@@ -180,12 +183,19 @@ void OutputDelivery::pasteByActivation() {
 }
 
 void OutputDelivery::sendPasteCommand() {
+    dependencies_.pasteboard.paste([this] { sendPasteKeystroke(); });
+}
+
+void OutputDelivery::sendPasteKeystroke() {
     pasting_ = false;
     --keystrokesToCome_;
     hasAskedForPaste_ = true;
+    pasted_ = dependencies_.tapLoop.now();
+    pastedInto_ = dependencies_.processManager.frontProcess();
+    provider_.wasPasted();
     sender_.sendPasteCommand(*current_->setting);
     if (awaitsTaking_ && hasAskedForPaste_) {
-        behindPaste_ = dependencies_.tapLoop.performAfterDelay(TakingLimit, [this] { goOnBehindPaste(); });
+        behindPaste_ = dependencies_.tapLoop.performAfterDelay(TakingLimit, [this] { takingIsOverdue(); });
     }
     completeIfDone();
 }
@@ -195,6 +205,18 @@ void OutputDelivery::wasTaken() {
     if (!awaitsTaking_ || !hasAskedForPaste_) return;
     hasAskedForPaste_ = false;
     behindPaste_ = dependencies_.tapLoop.performAfterDelay(0, [this] { goOnBehindPaste(); });
+}
+
+void OutputDelivery::takingIsOverdue() {
+    // What is left was meant for the program that got the paste.
+    if (dependencies_.processManager.frontProcess() != pastedInto_) abandon();
+    const bool mayTakeIt =
+        dependencies_.pasteboard.isPasteAwaited() && dependencies_.tapLoop.now() - pasted_ < HangingLimit;
+    if (!mayTakeIt) return goOnBehindPaste();
+    // Keys that it got now would come before the text.
+    dependencies_.poster.keepHoldingUserKeys();
+    if (current_->restoresClipboard && !provider_.isRestoring()) provider_.restoreAfterDelay();
+    behindPaste_ = dependencies_.tapLoop.performAfterDelay(BetweenLooks, [this] { takingIsOverdue(); });
 }
 
 void OutputDelivery::goOnBehindPaste() {

@@ -3,7 +3,8 @@
 //
 // Owned by the input service; belongs to the tap thread. What is sent without a pause goes out inside send(), the rest
 // in batches on the tap thread's run loop. Nothing here waits or fails: an application that never takes what was pasted
-// delays what follows by a second. The user's own keys are held while an output is on its way, where the port can.
+// delays what follows by a second, one that hangs by ten. The user's own keys are held while an output is on its way,
+// where the port can.
 #pragma once
 
 #include <cstddef>
@@ -91,7 +92,9 @@ class OutputDelivery {
     void offer(const PLOutput::Fragment& fragment);
     void pasteByActivation();
     void sendPasteCommand();
+    void sendPasteKeystroke();
     void wasTaken();
+    void takingIsOverdue();
     void goOnBehindPaste();
 
     Dependencies dependencies_;
@@ -111,6 +114,9 @@ class OutputDelivery {
     Timer nextBatch_;
     Timer keystroke_;    // the delayed one
     Timer behindPaste_;  // when the paste was taken, or is waited for no longer
+    // When the last paste's keystroke was sent, and to which program.
+    double pasted_ = 0;
+    std::optional<ProcessSerialNumber> pastedInto_;
 };
 
 }  // namespace plume

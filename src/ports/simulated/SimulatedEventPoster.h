@@ -34,6 +34,7 @@ class SimulatedEventPoster final : public EventPoster {
     void click(Point location) override { clicks_.push_back(location); }
     void holdUserKeys() override { keyboard_.hold(); }
     void releaseUserKeys() override { keyboard_.letGo(); }
+    void keepHoldingUserKeys() override {}
 
     void setPointerLocation(Point location) { pointer_ = location; }
     // Which texts the keyboard has keys for; every text at first.

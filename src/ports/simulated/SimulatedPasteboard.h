@@ -20,6 +20,8 @@ class SimulatedPasteboard final : public Pasteboard {
 
     std::int64_t changeCount() const override { return changeCount_; }
     bool tellsWhenTaken() const override { return false; }
+    void paste(std::function<void()> sendKeystroke) override { sendKeystroke(); }
+    bool isPasteAwaited() const override { return false; }
     std::int64_t declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) override;
     // Only for declared types.
     void setString(std::u16string_view string, std::string_view type) override;

@@ -292,11 +292,40 @@ TEST_F(TakingTest, ASecondIsLongEnough) {
     EXPECT_EQ(desk.poster.takeLine(), "release hold v9/8 ^9");
     desk.loop.advance(1);
     EXPECT_TRUE(desk.service.isIdle());
-    desk.loop.advance(10);
+    desk.loop.advance(0.7);
     EXPECT_EQ(desk.pasteboard.string(), u"two") << "nobody in front has taken it, whoever else has read it";
-    desk.pasteboard.take();
-    desk.loop.advance(0.31);
+    desk.loop.advance(0.1);
+    EXPECT_EQ(desk.pasteboard.string(), u"user's") << "and it is no use to anybody";
+}
+
+TEST_F(TakingTest, AProgramThatHangsGetsThePasteFirst) {
+    desk.pasteboard.awaited = true;
+    desk.service.sendOutput(InputDesk::output(u"one"));
+    desk.service.sendOutput(InputDesk::output(u"two"));
+    desk.loop.advance(2);
     EXPECT_EQ(desk.pasteboard.string(), u"user's");
+    desk.loop.advance(2);
+    EXPECT_EQ(desk.poster.takeLine(), "hold v9/8 ^9");
+    EXPECT_GE(desk.poster.holds, 2) << "its keys wait for more than two seconds";
+    desk.pasteboard.take();
+    desk.loop.advance(0);
+    EXPECT_EQ(desk.poster.takeLine(), "release hold v9/8 ^9");
+    desk.loop.advance(9.9);
+    EXPECT_EQ(desk.poster.takeLine(), "");
+    desk.loop.advance(0.2);
+    EXPECT_EQ(desk.poster.takeLine(), "release") << "ten seconds at most";
+}
+
+TEST_F(TakingTest, WhatIsLeftForAProgramThatHangsGoesToNoOther) {
+    desk.pasteboard.awaited = true;
+    const auto output = InputDesk::output(u"abc");
+    addKey(*output, 1);
+    desk.service.sendOutput(output);
+    desk.loop.advance(3);
+    desk.activate(u"another");
+    desk.pasteboard.awaited = false;
+    desk.loop.advance(0.1);
+    EXPECT_EQ(desk.poster.takeLine(), "hold v9/8 ^9 release");
 }
 
 TEST_F(TakingTest, TheApplicationsOwnWaitComesBehind) {

@@ -37,6 +37,7 @@ class RecordingPoster final : public EventPoster {
     Point pointerLocation() const override { return {30, 40}; }
     void click(Point) override { write("click"); }
     void holdUserKeys() override { write("hold"); }
+    void keepHoldingUserKeys() override { ++holds; }
     void releaseUserKeys() override {
         write("release");
         if (onRelease) onRelease();
@@ -70,6 +71,7 @@ class RecordingPoster final : public EventPoster {
     }
 
     int open = 0;
+    int holds = 0;  // how often they were kept waiting
     std::vector<std::string> events;
     std::vector<std::pair<double, std::string>> timeline;
     const RunLoop* clock = nullptr;

@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "Foundation/Strings.h"
+#include "ports/x11/clipboard/X11FrontPrograms.h"
 #include "ports/x11/clipboard/X11PasteboardContent.h"
 #include "ports/x11/clipboard/X11SelectionOwner.h"
 #include "ports/x11/clipboard/X11SelectionReader.h"
@@ -44,24 +45,39 @@ X11Pasteboard::X11Pasteboard(X11Session& session)
     : session_(session),
       transfers_(std::make_unique<X11SelectionTransfers>(session)),
       reader_(std::make_unique<X11SelectionReader>(session, "CLIPBOARD")),
-      primaryReader_(std::make_unique<X11SelectionReader>(session, "PRIMARY")) {
+      primaryReader_(std::make_unique<X11SelectionReader>(session, "PRIMARY")),
+      target_(session),
+      questions_(session) {
     clipboard_ =
         std::make_unique<X11SelectionOwner>(session, *transfers_, "CLIPBOARD", [this](bool ours) { noteChange(ours); });
     primary_ = std::make_unique<X11SelectionOwner>(session, *transfers_, "PRIMARY",
                                                    [this](bool) { primaryReader_->ownerChanged(); });
-    const auto counts = [this](xcb_window_t requestor) { return isInFront(requestor); };
-    clipboard_->readingCounts = counts;
-    primary_->readingCounts = counts;
+    connectOwners();
 }
 
 X11Pasteboard::~X11Pasteboard() = default;
+
+void X11Pasteboard::connectOwners() {
+    for (X11SelectionOwner* const owner : {clipboard_.get(), primary_.get()}) {
+        owner->readingCounts = [this](xcb_window_t requestor) { return isInFront(session_, requestor); };
+        owner->wasRead = [this](xcb_window_t requestor) {
+            if (target_.isOf(requestor)) target_.wasTaken();
+        };
+        owner->contentInstead = [this](xcb_window_t requestor, xcb_timestamp_t time) {
+            return lateContent_ && target_.isLate(requestor, time) ? lateContent_ : nullptr;
+        };
+    }
+    clipboard_->toldTargets = [this](xcb_window_t requestor) { questions_.wasAnswered(requestor); };
+}
 
 void X11Pasteboard::noteChange(bool ours) {
     ++changeCount_;
     if (ours) declaredCount_ = changeCount_;
     if (!ours && sharedCopy_) sharedCopy_->clear();
+    if (!ours) lateContent_.reset();
     if (!ours && ownershipLost) ownershipLost();
     reader_->ownerChanged();
+    questions_.ownerChanged();
 }
 
 void X11Pasteboard::offer(const std::vector<SharedClipboardCopy::Entry>& entries) {
@@ -118,17 +134,32 @@ std::optional<std::string> X11Pasteboard::data(std::string_view type) const {
 
 std::int64_t X11Pasteboard::declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) {
     session_.collect();
+    keepForTarget();
     content_ = std::make_shared<X11PasteboardContent>(session_.connection(), *this, types, owner, forms_);
     declaredCount_ = 0;
-    if (types.empty()) {
+    if (types.empty() && !lateContent_) {
         clipboard_->release();
     } else {
         clipboard_->own(content_);
     }
     // The server may have refused, or be gone: even so what was declared is something new.
     if (declaredCount_ == 0) declaredCount_ = ++changeCount_;
+    if (lateContent_) target_.contentWasReplaced(clipboard_->ownedSince());
     offerPrimary();
     return declaredCount_;
+}
+
+// The content that was pasted and not taken, when something else takes its place.
+void X11Pasteboard::keepForTarget() {
+    lateContent_ = content_ && content_->isExpansion() && target_.isToTake() ? content_ : nullptr;
+    if (lateContent_) lateContent_->redeemAll();
+}
+
+void X11Pasteboard::paste(std::function<void()> sendKeystroke) {
+    questions_.whenAnswered([this, sendKeystroke = std::move(sendKeystroke)] {
+        target_.begin();
+        sendKeystroke();
+    });
 }
 
 void X11Pasteboard::setString(std::u16string_view string, std::string_view type) {
@@ -161,24 +192,6 @@ std::shared_ptr<X11PasteboardContent> X11Pasteboard::selectedText() {
         std::make_shared<X11PasteboardContent>(session_.connection(), *this, std::vector{type}, nullptr, forms_);
     text->set(*value->bytes, type);
     return text;
-}
-
-// The server numbers the windows of one program alike.
-bool X11Pasteboard::isInFront(xcb_window_t requestor) const {
-    xcb_connection_t* const connection = session_.get();
-    const auto focusCookie = xcb_get_input_focus(connection);
-    const auto activeCookie = xcb_get_property(connection, 0, session_.connection().root(),
-                                               session_.connection().atom("_NET_ACTIVE_WINDOW"), XCB_ATOM_WINDOW, 0, 1);
-    const XcbOwned<xcb_get_input_focus_reply_t> focus(xcb_get_input_focus_reply(connection, focusCookie, nullptr));
-    const XcbOwned<xcb_get_property_reply_t> active(xcb_get_property_reply(connection, activeCookie, nullptr));
-    const auto isOfSameProgram = [&](xcb_window_t window) {
-        return ((window ^ requestor) & ~xcb_get_setup(connection)->resource_id_mask) == 0;
-    };
-    if (focus && isOfSameProgram(focus->focus)) return true;
-    if (!active || xcb_get_property_value_length(active.get()) != sizeof(xcb_window_t)) return false;
-    xcb_window_t window = XCB_WINDOW_NONE;
-    std::memcpy(&window, xcb_get_property_value(active.get()), sizeof window);
-    return isOfSameProgram(window);
 }
 
 void X11Pasteboard::handOver() {

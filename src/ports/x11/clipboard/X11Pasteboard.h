@@ -17,10 +17,12 @@
 #include "platform/Pasteboard.h"
 #include "ports/x11/X11Session.h"
 #include "ports/x11/clipboard/SharedClipboardCopy.h"
+#include "ports/x11/clipboard/X11PasteTarget.h"
 #include "ports/x11/clipboard/X11PasteboardContent.h"
 #include "ports/x11/clipboard/X11SelectionOwner.h"
 #include "ports/x11/clipboard/X11SelectionReader.h"
 #include "ports/x11/clipboard/X11SelectionTransfers.h"
+#include "ports/x11/clipboard/X11TargetsQuestions.h"
 
 namespace plume {
 
@@ -51,6 +53,8 @@ class X11Pasteboard final : public Pasteboard {
     void setPastesPrimary(bool pastesPrimary) override { pastesPrimary_ = pastesPrimary; }
     void setString(std::u16string_view string, std::string_view type) override;
     void setData(std::string_view bytes, std::string_view type) override;
+    void paste(std::function<void()> sendKeystroke) override;
+    bool isPasteAwaited() const override { return target_.isAwaited(); }
 
     // Whether what was declared last stands on the clipboard, for the server too: a paste will find it.
     bool isOffering() const;
@@ -63,7 +67,8 @@ class X11Pasteboard final : public Pasteboard {
     void noteChange(bool ours);
     void offerPrimary();
     std::shared_ptr<X11PasteboardContent> selectedText();
-    bool isInFront(xcb_window_t requestor) const;
+    void connectOwners();
+    void keepForTarget();
 
     X11Session& session_;
     SharedClipboardCopy* sharedCopy_ = nullptr;
@@ -77,7 +82,10 @@ class X11Pasteboard final : public Pasteboard {
     const std::unique_ptr<X11SelectionReader> primaryReader_;
     std::unique_ptr<X11SelectionOwner> clipboard_;
     std::unique_ptr<X11SelectionOwner> primary_;
+    X11PasteTarget target_;
+    X11TargetsQuestions questions_;
     std::shared_ptr<X11PasteboardContent> content_;         // what was declared last
+    std::shared_ptr<X11PasteboardContent> lateContent_;     // what the target of the last paste is still to have
     std::shared_ptr<X11PasteboardContent> selectedBefore_;  // what PRIMARY held before an expansion was offered there
 };
 

@@ -8,7 +8,17 @@ namespace plume {
 
 namespace {
 
-constexpr std::string_view Secret = "secret";
+// What asks clipboard managers to keep nothing of an expansion, by the target's name. CopyQ reads the second up to its
+// version 7.
+constexpr std::pair<std::string_view, std::string_view> HistoryHints[] = {
+    {SelectionTarget::PasswordManagerHint, "secret"}, {SelectionTarget::CopyQHidden, "1"}};
+
+// Empty for other targets.
+std::string_view historyHint(std::string_view target) {
+    const auto* const found =
+        std::ranges::find(HistoryHints, target, &std::pair<std::string_view, std::string_view>::first);
+    return found == std::end(HistoryHints) ? std::string_view() : found->second;
+}
 
 bool isOfPasteboardTypes(const std::vector<std::string>& types) {
     return !types.empty() && std::all_of(types.begin(), types.end(), [](const std::string& type) {
@@ -57,6 +67,10 @@ X11PasteboardContent::Bytes X11PasteboardContent::redeemed(std::string_view type
     return found == data_.end() ? nullptr : found->second;
 }
 
+void X11PasteboardContent::redeemAll() {
+    for (const std::string& name : targetNames()) redeemed(typeBehind(name));
+}
+
 std::vector<std::string> X11PasteboardContent::targetNames() const {
     std::vector<std::string> names;
     for (const std::string& type : types_) {
@@ -75,7 +89,7 @@ std::vector<std::string> X11PasteboardContent::targetNames() const {
     if (declares(PasteboardType::RTFD)) append(names, targetsOfType(PasteboardType::HTML));
     append(names, targetsOfType(PasteboardType::String));
     // Clipboard managers keep nothing of it: it was never the user's own.
-    names.emplace_back(SelectionTarget::PasswordManagerHint);
+    for (const auto& hint : HistoryHints) names.emplace_back(hint.first);
     return names;
 }
 
@@ -90,9 +104,8 @@ std::string_view X11PasteboardContent::typeBehind(std::string_view target) const
 }
 
 X11PasteboardContent::Bytes X11PasteboardContent::bytesFor(std::string_view target) {
-    if (target == SelectionTarget::PasswordManagerHint && isExpansion_) {
-        return std::make_shared<const std::string>(Secret);
-    }
+    const std::string_view hint = isExpansion_ ? historyHint(target) : std::string_view();
+    if (!hint.empty()) return std::make_shared<const std::string>(hint);
     Bytes bytes = redeemed(typeBehind(target));
     if (!bytes || declares(target) || target != SelectionTarget::Latin1String) return bytes;
     return std::make_shared<const std::string>(latin1FromUtf8(*bytes));
@@ -111,7 +124,7 @@ std::optional<X11SelectionValue> X11PasteboardContent::value(xcb_atom_t target) 
 
 void X11PasteboardContent::wasTaken(xcb_atom_t target) {
     const std::string name = connection_.atomName(target);
-    if (owner_ && name != SelectionTarget::PasswordManagerHint) owner_->dataWasTaken(typeBehind(name));
+    if (owner_ && historyHint(name).empty()) owner_->dataWasTaken(typeBehind(name));
 }
 
 }  // namespace plume

@@ -34,6 +34,8 @@ class X11PasteboardContent final : public X11SelectionContent {
     void set(std::string bytes, std::string_view type);
     // Promised for a paste, as nothing that comes from another program is: such content has the program's names, too.
     bool isExpansion() const { return isExpansion_; }
+    // Asks for everything that is still only promised.
+    void redeemAll();
 
     std::vector<xcb_atom_t> targets() override;
     std::optional<X11SelectionValue> value(xcb_atom_t target) override;

@@ -83,9 +83,16 @@ void X11SelectionOwner::answer(const xcb_selection_request_event_t& request) {
     const bool isMultiple = request.target == session_.connection().atom("MULTIPLE");
     bool given = false;
     if (isOwner() && content_) {
-        given = isMultiple ? giveMultiple(request.requestor, request.property)
-                           : give(request.requestor, request.target, property);
+        const Content instead = contentInstead ? contentInstead(request.requestor, request.time) : nullptr;
+        const Content content = instead ? instead : content_;
+        given = isMultiple ? giveMultiple(content, request.requestor, request.property)
+                           : give(content, request.requestor, request.target, property);
     }
+    sendNotify(request, given ? property : xcb_atom_t{XCB_ATOM_NONE});
+    if (given && toldTargets && request.target == session_.connection().atom("TARGETS")) toldTargets(request.requestor);
+}
+
+void X11SelectionOwner::sendNotify(const xcb_selection_request_event_t& request, xcb_atom_t property) {
     // Events are always sent as 32 bytes.
     union {
         xcb_selection_notify_event_t notify;
@@ -96,28 +103,28 @@ void X11SelectionOwner::answer(const xcb_selection_request_event_t& request) {
     event.notify.requestor = request.requestor;
     event.notify.selection = request.selection;
     event.notify.target = request.target;
-    event.notify.property = given ? property : xcb_atom_t{XCB_ATOM_NONE};
+    event.notify.property = property;
     xcb_send_event(session_.get(), 0, request.requestor, XCB_EVENT_MASK_NO_EVENT, event.bytes);
     session_.flush();
 }
 
-bool X11SelectionOwner::give(xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property) {
+bool X11SelectionOwner::give(const Content& content, xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property) {
     XcbConnection& connection = session_.connection();
     if (target == connection.atom("TARGETS")) {
-        transfers_.send(requestor, property, offeredTargets(), nullptr);
+        transfers_.send(requestor, property, targetsOf(*content), nullptr);
         return true;
     }
     if (target == connection.atom("TIMESTAMP")) {
         transfers_.send(requestor, property, words(XCB_ATOM_INTEGER, {ownedSince_}), nullptr);
         return true;
     }
-    const auto content = content_;
     auto value = content->value(target);
     if (!value) return false;
     std::function<void()> taken;
     if (readingCounts && readingCounts(requestor)) {
         // Content that has been replaced since was taken by somebody, but it is no longer what its owner offers.
-        taken = [weak = std::weak_ptr(content), target] {
+        taken = [this, weak = std::weak_ptr(content), requestor, target] {
+            if (wasRead) wasRead(requestor);
             if (const auto still = weak.lock()) still->wasTaken(target);
         };
     }
@@ -126,7 +133,7 @@ bool X11SelectionOwner::give(xcb_window_t requestor, xcb_atom_t target, xcb_atom
 }
 
 // The property holds pairs of target and property; where a target cannot be had its property becomes none.
-bool X11SelectionOwner::giveMultiple(xcb_window_t requestor, xcb_atom_t property) {
+bool X11SelectionOwner::giveMultiple(const Content& content, xcb_window_t requestor, xcb_atom_t property) {
     if (property == XCB_ATOM_NONE) return false;
     const XcbOwned<xcb_get_property_reply_t> reply(xcb_get_property_reply(
         session_.get(),
@@ -139,18 +146,18 @@ bool X11SelectionOwner::giveMultiple(xcb_window_t requestor, xcb_atom_t property
     const xcb_atom_t multiple = session_.connection().atom("MULTIPLE");
     for (std::size_t i = 0; i + 1 < pairs.size(); i += 2) {
         const bool isPlain = pairs[i] != multiple && pairs[i + 1] != XCB_ATOM_NONE;
-        if (!isPlain || !give(requestor, pairs[i], pairs[i + 1])) pairs[i + 1] = XCB_ATOM_NONE;
+        if (!isPlain || !give(content, requestor, pairs[i], pairs[i + 1])) pairs[i + 1] = XCB_ATOM_NONE;
     }
     xcb_change_property(session_.get(), XCB_PROP_MODE_REPLACE, requestor, property, reply->type, 32,
                         static_cast<std::uint32_t>(pairs.size()), pairs.data());
     return true;
 }
 
-X11SelectionValue X11SelectionOwner::offeredTargets() const {
+X11SelectionValue X11SelectionOwner::targetsOf(X11SelectionContent& content) const {
     XcbConnection& connection = session_.connection();
     std::vector<std::uint32_t> targets = {connection.atom("TARGETS"), connection.atom("TIMESTAMP"),
                                           connection.atom("MULTIPLE")};
-    const auto offered = content_->targets();
+    const auto offered = content.targets();
     targets.insert(targets.end(), offered.begin(), offered.end());
     return words(XCB_ATOM_ATOM, targets);
 }

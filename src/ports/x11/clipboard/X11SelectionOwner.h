@@ -40,6 +40,12 @@ class X11SelectionOwner {
 
     // Whether reading by this window counts; asked when its request comes.
     std::function<bool(xcb_window_t)> readingCounts;
+    // This window has read something to its end, and that counts. May be empty.
+    std::function<void(xcb_window_t)> wasRead;
+    // Other content than what is offered, for those who still are to have it; null for all others. May be empty.
+    std::function<std::shared_ptr<X11SelectionContent>(xcb_window_t requestor, xcb_timestamp_t time)> contentInstead;
+    // This window has asked what is on offer, and the answer was sent. May be empty.
+    std::function<void(xcb_window_t)> toldTargets;
 
     // Takes the selection and offers this content; false when the server did not give it to us.
     bool own(std::shared_ptr<X11SelectionContent> content);
@@ -47,6 +53,8 @@ class X11SelectionOwner {
     void release();
     // As far as it is known: collect() first.
     bool isOwner() const { return owner_ == session_.window(); }
+    // Since when, in the server's time, if it is ours.
+    xcb_timestamp_t ownedSince() const { return ownedSince_; }
     // Any owner at all.
     bool hasOwner() const { return owner_ != XCB_WINDOW_NONE; }
     // What is or was offered last.
@@ -55,10 +63,13 @@ class X11SelectionOwner {
   private:
     void noteOwner(const xcb_generic_event_t& event);
     xcb_window_t askOwner() const;
+    using Content = std::shared_ptr<X11SelectionContent>;
+
     void answer(const xcb_selection_request_event_t& request);
-    bool give(xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property);
-    bool giveMultiple(xcb_window_t requestor, xcb_atom_t property);
-    X11SelectionValue offeredTargets() const;
+    void sendNotify(const xcb_selection_request_event_t& request, xcb_atom_t property);
+    bool give(const Content& content, xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property);
+    bool giveMultiple(const Content& content, xcb_window_t requestor, xcb_atom_t property);
+    X11SelectionValue targetsOf(X11SelectionContent& content) const;
 
     X11Session& session_;
     X11SelectionTransfers& transfers_;

@@ -19,7 +19,9 @@ inline constexpr std::string_view Latin1String = "STRING";
 inline constexpr std::string_view TextRtf = "text/rtf";
 inline constexpr std::string_view ApplicationRtf = "application/rtf";
 inline constexpr std::string_view TextHtml = "text/html";
+// What clipboard managers look for in content that they are to forget.
 inline constexpr std::string_view PasswordManagerHint = "x-kde-passwordManagerHint";
+inline constexpr std::string_view CopyQHidden = "application/x-copyq-hidden";
 }  // namespace SelectionTarget
 
 // The targets that hold a pasteboard type, the best first; none for types that go by their own names.

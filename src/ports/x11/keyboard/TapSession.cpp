@@ -92,7 +92,7 @@ void TapSession::end() {
 void TapSession::passOnUnheard() {
     TapConnection& connection = dependencies_.connection;
     if (waiting_) connection.sendKey(waiting_->keycode, waiting_->down);
-    while (const auto event = connection.connection().pollEvent()) {
+    while (const auto event = nextEvent()) {
         const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(*event);
         if (!isKey(*event)) continue;
         const auto keycode = static_cast<xcb_keycode_t>(key.detail);
@@ -115,11 +115,32 @@ void TapSession::drain() {
     const auto kept = shared_from_this();  // the listener may end the session
     const TapConnection& connection = dependencies_.connection;
     while (!ended_ && !held_) {
-        const auto event = connection.connection().pollEvent();
+        const auto event = nextEvent();
         if (!event) break;
         handle(*event);
     }
+    if (!ended_ && readsAhead_) readAhead();
     if (!ended_ && connection.isBroken()) dependencies_.lost();
+}
+
+XcbOwned<xcb_generic_event_t> TapSession::nextEvent() {
+    if (readAhead_.empty()) return dependencies_.connection.connection().pollEvent();
+    auto event = std::move(readAhead_.front());
+    readAhead_.pop_front();
+    return event;
+}
+
+void TapSession::readAhead() {
+    while (auto event = dependencies_.connection.connection().pollEvent()) {
+        readAhead_.push_back(std::move(event));
+        if (isForWindowManager(*readAhead_.back())) return release();
+    }
+}
+
+// A key with Alt or Super, also the release of either by itself.
+bool TapSession::isForWindowManager(const xcb_generic_event_t& event) const {
+    const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(event);
+    return isKey(event) && (key.mods.effective & (XCB_MOD_MASK_1 | XCB_MOD_MASK_4)) != 0;
 }
 
 void TapSession::handle(const xcb_generic_event_t& event) {
@@ -244,8 +265,21 @@ void TapSession::hold() {
     holdLimit_ = dependencies_.loop.performAfterDelay(LongestHold, [this] { release(); });
 }
 
+void TapSession::keepHolding() {
+    if (ended_ || !held_) return;
+    holdLimit_ = dependencies_.loop.performAfterDelay(LongestHold, [this] { release(); });
+    if (std::exchange(readsAhead_, true)) return;
+    dependencies_.loop.setSourcePaused(descriptor_, false);
+    nextDrain_ = dependencies_.loop.performAfterDelay(0, [this] { drain(); });
+}
+
+void TapSession::userClicked() {
+    if (readsAhead_) release();
+}
+
 void TapSession::release() {
     if (ended_ || !std::exchange(held_, false)) return;
+    readsAhead_ = false;
     holdLimit_.cancel();
     dependencies_.loop.setSourcePaused(descriptor_, false);
     if (waiting_) inject(*std::exchange(waiting_, {}));

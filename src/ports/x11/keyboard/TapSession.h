@@ -10,6 +10,7 @@
 
 #include <array>
 #include <cstdint>
+#include <deque>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -53,6 +54,9 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void keyboardChanged(XkbKeyboard::Change change);
     void hold();
     void release();
+    // See EventPoster::keepHoldingUserKeys().
+    void keepHolding();
+    void userClicked();
 
   private:
     struct Injection {
@@ -65,6 +69,9 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void addSource();
     void passOnUnheard();
     void drain();
+    void readAhead();
+    XcbOwned<xcb_generic_event_t> nextEvent();
+    bool isForWindowManager(const xcb_generic_event_t& event) const;
     bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;
     bool isKey(const xcb_generic_event_t& event) const;
     void handle(const xcb_generic_event_t& event);
@@ -94,6 +101,8 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     bool held_ = false;
     std::optional<Injection> waiting_;
     Timer holdLimit_;
+    bool readsAhead_ = false;                              // held for long: keys are looked at, and wait here
+    std::deque<XcbOwned<xcb_generic_event_t>> readAhead_;  // in front of what is unread
 
     Subscription source_;
     Timer nextDrain_;

@@ -50,6 +50,7 @@ class X11EventPoster final : public EventPoster {
     void click(Point location) override;
     void holdUserKeys() override { tap_.hold(); }
     void releaseUserKeys() override { tap_.release(); }
+    void keepHoldingUserKeys() override { tap_.keepHolding(); }
 
   private:
     // One key up or down, or one character typed.

@@ -94,4 +94,12 @@ void X11KeyboardTap::release() {
     if (session_) session_->release();
 }
 
+void X11KeyboardTap::keepHolding() {
+    if (session_) session_->keepHolding();
+}
+
+void X11KeyboardTap::userClicked() {
+    if (session_) session_->userClicked();
+}
+
 }  // namespace plume

@@ -41,6 +41,10 @@ class X11KeyboardTap final : public KeyboardTap {
     // about if it passes; then they follow in order.
     void hold();
     void release();
+    // Goes on holding for 2 seconds, unless the user clicks, or presses a key with Alt or Super.
+    void keepHolding();
+    // To be told of clicks.
+    void userClicked();
 
   private:
     Result<void> begin();
