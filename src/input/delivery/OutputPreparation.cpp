@@ -1,5 +1,8 @@
 #include "input/delivery/OutputPreparation.h"
 
+#include <memory>
+#include <variant>
+
 #include "Foundation/KeyCode.h"
 #include "Foundation/KeyModifiers.h"
 #include "input/delivery/OutputBatch.h"
@@ -44,6 +47,7 @@ class Preparation {
         }
         if (!suffixApplied) applySuffix();
         refreshFragmentsForOuput(output_, setting_);
+        pressSuffixBehindPaste();
     }
 
   private:
@@ -64,6 +68,23 @@ class Preparation {
 
     void applySuffix() {
         if (content_) content_->applySuffix();
+    }
+
+    // Pasted, a Return or a Tab is text at best, but people mean the key: it sends, or leaves the field.
+    void pressSuffixBehindPaste() {
+        const bool isPasted = setting_.has(InputFlag::UseClipboard) && !pastesByActivation(setting_);
+        const KeyCode code = content_ ? keyOfSuffix(content_->suffix) : KeyCode::None;
+        if (!isPasted || code == KeyCode::None || output_.fragments.empty()) return;
+        auto* const text = std::get_if<std::u16string>(&output_.fragments.back());
+        if (!text || !text->ends_with(content_->suffix)) return;
+        text->resize(text->size() - content_->suffix.size());
+        if (text->empty()) output_.fragments.pop_back();
+        output_.fragments.emplace_back(std::make_shared<SnippetKeyVariable>(content_->suffix, code));
+    }
+
+    static KeyCode keyOfSuffix(std::u16string_view suffix) {
+        if (suffix == u"\r") return KeyCode::Return;
+        return suffix == u"\t" ? KeyCode::Tab : KeyCode::None;
     }
 
     PLOutput& output_;
