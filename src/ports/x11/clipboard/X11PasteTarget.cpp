@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <utility>
 #include <vector>
 
 namespace plume {
@@ -11,6 +12,7 @@ namespace {
 constexpr double PingDelay = 0.3;  // seconds from the keystroke
 // The questions of one paste follow one another, and an answer to the ping may overtake them, within so many seconds.
 constexpr double Grace = 0.3;
+constexpr double LongestSettling = 0.3;
 constexpr std::uint32_t MostProtocols = 64;
 
 }  // namespace
@@ -34,11 +36,23 @@ void X11PasteTarget::end() {
     firstLate_.reset();
     ping_.cancel();
     rootEvents_ = {};
+    tell_ = nullptr;
+    settling_.cancel();
 }
 
-void X11PasteTarget::wasTaken() {
-    if (replaced_ == 0) return end();
-    if (!answered_) answered_ = session_.runLoop().now();
+void X11PasteTarget::wasTaken(std::function<void()> tell) {
+    if (replaced_ != 0 && !answered_) answered_ = session_.runLoop().now();
+    if (!tell_) settling_ = session_.runLoop().performAfterDelay(LongestSettling, [this] { settle(); });
+    tell_ = std::move(tell);
+    readsOn_ = false;
+    if (!ping()) settle();
+}
+
+void X11PasteTarget::settle() {
+    const auto tell = std::exchange(tell_, nullptr);
+    settling_.cancel();
+    if (replaced_ == 0) end();
+    if (tell) tell();
 }
 
 bool X11PasteTarget::isOf(xcb_window_t requestor) const {
@@ -46,8 +60,9 @@ bool X11PasteTarget::isOf(xcb_window_t requestor) const {
     return client == clientOf(session_, windows_.focus) || client == clientOf(session_, windows_.active);
 }
 
-void X11PasteTarget::ping() {
-    if (!understandsPing()) return;
+bool X11PasteTarget::ping() {
+    ping_.cancel();
+    if (!understandsPing()) return false;
     XcbConnection& connection = session_.connection();
     rootEvents_ = session_.listen(connection.root(), XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY);
     xcb_client_message_event_t message{};
@@ -56,12 +71,13 @@ void X11PasteTarget::ping() {
     message.window = windows_.active;
     message.type = connection.atom("WM_PROTOCOLS");
     message.data.data32[0] = connection.atom("_NET_WM_PING");
-    message.data.data32[1] = session_.serverTime();
+    message.data.data32[1] = pinged_ = session_.serverTime();
     message.data.data32[2] = windows_.active;
     xcb_send_event(session_.get(), 0, windows_.active, XCB_EVENT_MASK_NO_EVENT,
                    reinterpret_cast<const char*>(&message));
     session_.flush();
     asked_ = true;
+    return true;
 }
 
 bool X11PasteTarget::understandsPing() const {
@@ -86,8 +102,10 @@ void X11PasteTarget::noteAnswer(const xcb_generic_event_t& event) {
         asked_ && message.window == connection.root() && message.type == connection.atom("WM_PROTOCOLS") &&
         message.data.data32[0] == connection.atom("_NET_WM_PING") && message.data.data32[2] == windows_.active;
     if (!isAnswer) return;
-    rootEvents_ = {};
     if (!answered_) answered_ = session_.runLoop().now();
+    if (message.data.data32[1] != pinged_) return;
+    rootEvents_ = {};
+    if (tell_ && !readsOn_) settle();
 }
 
 bool X11PasteTarget::hasAnswered() const {

@@ -2,11 +2,13 @@
 // to that paste when the clipboard holds something else by then.
 //
 // A program that hangs or is stopped answers no ping; it is asked 0.3 s after the keystroke, because a program that
-// pastes has been heard of by then. Belongs to the tap thread.
+// pastes has been heard of by then. Some read the content twice, and paste what they get the second time: a program
+// that has read it is asked, too, and what it reads before it answers is waited for. Belongs to the tap thread.
 #pragma once
 
 #include <xcb/xcb.h>
 
+#include <functional>
 #include <optional>
 
 #include "ports/x11/X11Session.h"
@@ -25,8 +27,11 @@ class X11PasteTarget {
     void begin();
     // The paste is of no interest any more.
     void end();
-    // It has taken something: what it asks from now on, but for a moment, is no part of the paste.
-    void wasTaken();
+    // It is given something.
+    void isGiven() { readsOn_ = true; }
+    // It has taken something: `tell` is called when it reads no more, 0.3 s later at most. What it asks after that is
+    // no part of the paste.
+    void wasTaken(std::function<void()> tell);
     // The clipboard holds something else from this moment of the server's on.
     void contentWasReplaced(xcb_timestamp_t time) { replaced_ = time; }
 
@@ -40,8 +45,9 @@ class X11PasteTarget {
     bool isLate(xcb_window_t requestor, xcb_timestamp_t time);
 
   private:
-    void ping();
+    bool ping();
     bool understandsPing() const;
+    void settle();
     void noteAnswer(const xcb_generic_event_t& event);
     bool hasAnswered() const;
 
@@ -52,6 +58,10 @@ class X11PasteTarget {
     std::optional<double> answered_;   // when
     std::optional<double> firstLate_;  // when it first asked after the content was replaced
     Timer ping_;
+    xcb_timestamp_t pinged_ = 0;  // the latest ping, by its time
+    std::function<void()> tell_;  // that it has taken something
+    bool readsOn_ = false;        // after that
+    Timer settling_;
     X11Session::WindowEvents rootEvents_;  // while an answer is awaited
     Subscription answerHandler_;
 };

@@ -19,6 +19,7 @@ namespace plume {
 namespace {
 
 constexpr double LongestHandOver = 0.5;  // seconds
+constexpr double LongestReading = 1.0;
 
 // Text in whatever encoding a program gave it.
 std::string utf8FromText(std::string_view bytes, std::string_view target) {
@@ -60,8 +61,12 @@ X11Pasteboard::~X11Pasteboard() = default;
 void X11Pasteboard::connectOwners() {
     for (X11SelectionOwner* const owner : {clipboard_.get(), primary_.get()}) {
         owner->readingCounts = [this](xcb_window_t requestor) { return isInFront(session_, requestor); };
-        owner->wasRead = [this](xcb_window_t requestor) {
-            if (target_.isOf(requestor)) target_.wasTaken();
+        owner->isGiven = [this](xcb_window_t requestor) {
+            if (target_.isOf(requestor)) target_.isGiven();
+        };
+        owner->wasRead = [this](xcb_window_t requestor, std::function<void()> tell) {
+            if (!target_.isOf(requestor)) return tell();
+            target_.wasTaken(std::move(tell));
         };
         owner->contentInstead = [this](xcb_window_t requestor, xcb_timestamp_t time) {
             return lateContent_ && target_.isLate(requestor, time) ? lateContent_ : nullptr;
@@ -135,7 +140,9 @@ std::optional<std::string> X11Pasteboard::data(std::string_view type) const {
 std::int64_t X11Pasteboard::declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) {
     session_.collect();
     keepForTarget();
+    const bool followsExpansion = content_ && content_->isExpansion();
     content_ = std::make_shared<X11PasteboardContent>(session_.connection(), *this, types, owner, forms_);
+    if (followsExpansion) hintForAMoment();
     declaredCount_ = 0;
     if (types.empty() && !lateContent_) {
         clipboard_->release();
@@ -147,6 +154,14 @@ std::int64_t X11Pasteboard::declareTypes(const std::vector<std::string>& types, 
     if (lateContent_) target_.contentWasReplaced(clipboard_->ownedSince());
     offerPrimary();
     return declaredCount_;
+}
+
+// A clipboard manager that has read half of an expansion goes on with what is there now. It knows the targets from
+// before, and is not to keep what it gets.
+void X11Pasteboard::hintForAMoment() {
+    content_->setHints(true);
+    const auto end = [content = content_] { content->setHints(content->isExpansion()); };
+    hintsEnd_ = session_.runLoop().performAfterDelay(LongestReading, end);
 }
 
 // The content that was pasted and not taken, when something else takes its place.

@@ -68,6 +68,7 @@ class X11Pasteboard final : public Pasteboard {
     void offerPrimary();
     std::shared_ptr<X11PasteboardContent> selectedText();
     void connectOwners();
+    void hintForAMoment();
     void keepForTarget();
 
     X11Session& session_;
@@ -82,6 +83,7 @@ class X11Pasteboard final : public Pasteboard {
     const std::unique_ptr<X11SelectionReader> primaryReader_;
     std::unique_ptr<X11SelectionOwner> clipboard_;
     std::unique_ptr<X11SelectionOwner> primary_;
+    Timer hintsEnd_;
     X11PasteTarget target_;
     X11TargetsQuestions questions_;
     std::shared_ptr<X11PasteboardContent> content_;         // what was declared last

@@ -42,7 +42,8 @@ X11PasteboardContent::X11PasteboardContent(XcbConnection& connection, Pasteboard
       types_(std::move(types)),
       owner_(owner),
       forms_(forms),
-      isExpansion_(owner != nullptr && isOfPasteboardTypes(types_)) {}
+      isExpansion_(owner != nullptr && isOfPasteboardTypes(types_)),
+      hints_(isExpansion_) {}
 
 bool X11PasteboardContent::declares(std::string_view type) const {
     return std::find(types_.begin(), types_.end(), type) != types_.end();
@@ -104,8 +105,8 @@ std::string_view X11PasteboardContent::typeBehind(std::string_view target) const
 }
 
 X11PasteboardContent::Bytes X11PasteboardContent::bytesFor(std::string_view target) {
-    const std::string_view hint = isExpansion_ ? historyHint(target) : std::string_view();
-    if (!hint.empty()) return std::make_shared<const std::string>(hint);
+    const std::string_view hint = historyHint(target);
+    if (!hint.empty() && !declares(target)) return std::make_shared<const std::string>(hint);
     Bytes bytes = redeemed(typeBehind(target));
     if (!bytes || declares(target) || target != SelectionTarget::Latin1String) return bytes;
     return std::make_shared<const std::string>(latin1FromUtf8(*bytes));
@@ -114,7 +115,8 @@ X11PasteboardContent::Bytes X11PasteboardContent::bytesFor(std::string_view targ
 std::optional<X11SelectionValue> X11PasteboardContent::value(xcb_atom_t target) {
     const std::string name = connection_.atomName(target);
     const auto names = targetNames();
-    if (std::find(names.begin(), names.end(), name) == names.end()) return std::nullopt;
+    const bool isHint = hints_ && !historyHint(name).empty();
+    if (!isHint && std::find(names.begin(), names.end(), name) == names.end()) return std::nullopt;
     Bytes bytes = bytesFor(name);
     if (!bytes) return std::nullopt;
     const auto form = declares(name) ? forms_.find(name) : forms_.end();

@@ -34,6 +34,9 @@ class X11PasteboardContent final : public X11SelectionContent {
     void set(std::string bytes, std::string_view type);
     // Promised for a paste, as nothing that comes from another program is: such content has the program's names, too.
     bool isExpansion() const { return isExpansion_; }
+    // Whether it hints, to those who ask, that clipboard managers are to keep nothing. An expansion does, and says so
+    // in its targets.
+    void setHints(bool hints) { hints_ = hints; }
     // Asks for everything that is still only promised.
     void redeemAll();
 
@@ -56,6 +59,7 @@ class X11PasteboardContent final : public X11SelectionContent {
     PasteboardOwner* const owner_;
     const X11ValueForms& forms_;
     const bool isExpansion_;
+    bool hints_;
     std::map<std::string, Bytes, std::less<>> data_;
 };
 

@@ -122,14 +122,21 @@ bool X11SelectionOwner::give(const Content& content, xcb_window_t requestor, xcb
     if (!value) return false;
     std::function<void()> taken;
     if (readingCounts && readingCounts(requestor)) {
-        // Content that has been replaced since was taken by somebody, but it is no longer what its owner offers.
-        taken = [this, weak = std::weak_ptr(content), requestor, target] {
-            if (wasRead) wasRead(requestor);
-            if (const auto still = weak.lock()) still->wasTaken(target);
-        };
+        if (isGiven) isGiven(requestor);
+        taken = [this, content = std::weak_ptr(content), requestor, target] { noteRead(content, requestor, target); };
     }
     transfers_.send(requestor, property, std::move(*value), std::move(taken));
     return true;
+}
+
+void X11SelectionOwner::noteRead(const std::weak_ptr<X11SelectionContent>& content, xcb_window_t requestor,
+                                 xcb_atom_t target) {
+    // Content that has been replaced since was taken by somebody, but it is no longer what its owner offers.
+    const auto tell = [content, target] {
+        if (const auto still = content.lock()) still->wasTaken(target);
+    };
+    if (wasRead) return wasRead(requestor, tell);
+    tell();
 }
 
 // The property holds pairs of target and property; where a target cannot be had its property becomes none.

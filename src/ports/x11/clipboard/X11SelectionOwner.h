@@ -40,8 +40,10 @@ class X11SelectionOwner {
 
     // Whether reading by this window counts; asked when its request comes.
     std::function<bool(xcb_window_t)> readingCounts;
-    // This window has read something to its end, and that counts. May be empty.
-    std::function<void(xcb_window_t)> wasRead;
+    // This window is given something, or has read it to its end, and that counts. Whoever hears of the end calls
+    // `tell`, which tells the content, at once or later. Either may be empty.
+    std::function<void(xcb_window_t)> isGiven;
+    std::function<void(xcb_window_t, std::function<void()> tell)> wasRead;
     // Other content than what is offered, for those who still are to have it; null for all others. May be empty.
     std::function<std::shared_ptr<X11SelectionContent>(xcb_window_t requestor, xcb_timestamp_t time)> contentInstead;
     // This window has asked what is on offer, and the answer was sent. May be empty.
@@ -68,6 +70,7 @@ class X11SelectionOwner {
     void answer(const xcb_selection_request_event_t& request);
     void sendNotify(const xcb_selection_request_event_t& request, xcb_atom_t property);
     bool give(const Content& content, xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property);
+    void noteRead(const std::weak_ptr<X11SelectionContent>& content, xcb_window_t requestor, xcb_atom_t target);
     bool giveMultiple(const Content& content, xcb_window_t requestor, xcb_atom_t property);
     X11SelectionValue targetsOf(X11SelectionContent& content) const;
 
