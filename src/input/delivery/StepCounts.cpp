@@ -40,8 +40,10 @@ void forEachCluster(std::u16string_view text, Visit visit) {
 struct Cluster {
     explicit Cluster(std::u16string_view text) {
         for (std::size_t i = 0; i < text.size();) {
-            UChar32 c = 0;
-            U16_NEXT(text.data(), i, text.size(), c);
+            const std::size_t start = i;
+            U16_FWD_1(text, i, text.size());
+            const bool isPair = i - start == 2;
+            const UChar32 c = isPair ? U16_GET_SUPPLEMENTARY(text[start], text[start + 1]) : UChar32{text[start]};
             if (characters++ == 0) {
                 first = c;
             } else {
