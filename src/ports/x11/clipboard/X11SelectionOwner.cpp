@@ -130,7 +130,7 @@ bool X11SelectionOwner::give(const Content& content, xcb_window_t requestor, xcb
 }
 
 void X11SelectionOwner::noteRead(const std::weak_ptr<X11SelectionContent>& content, xcb_window_t requestor,
-                                 xcb_atom_t target) {
+                                 xcb_atom_t target) const {
     // Content that has been replaced since was taken by somebody, but it is no longer what its owner offers.
     const auto tell = [content, target] {
         if (const auto still = content.lock()) still->wasTaken(target);

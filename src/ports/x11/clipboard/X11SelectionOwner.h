@@ -70,7 +70,7 @@ class X11SelectionOwner {
     void answer(const xcb_selection_request_event_t& request);
     void sendNotify(const xcb_selection_request_event_t& request, xcb_atom_t property);
     bool give(const Content& content, xcb_window_t requestor, xcb_atom_t target, xcb_atom_t property);
-    void noteRead(const std::weak_ptr<X11SelectionContent>& content, xcb_window_t requestor, xcb_atom_t target);
+    void noteRead(const std::weak_ptr<X11SelectionContent>& content, xcb_window_t requestor, xcb_atom_t target) const;
     bool giveMultiple(const Content& content, xcb_window_t requestor, xcb_atom_t property);
     X11SelectionValue targetsOf(X11SelectionContent& content) const;
 
