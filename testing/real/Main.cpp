@@ -1,7 +1,7 @@
 // Types into real programs of a desktop, with Plume beside them, and prints what came of it as a table; ends with 0
 // only when all of it is as expected.
 //   plume_real_programs [--pictures FOLDER] [--program NAME] [--place NAME] [--story NAME] [--times N]
-//                       [--without-accessibility] [--list]
+//                       [--rows JSON] [--without-accessibility] [--list]
 #include <exception>
 #include <iomanip>
 #include <iostream>
@@ -20,6 +20,7 @@ namespace {
 struct Arguments {
     Choice choice;
     std::string pictures = "real-programs";
+    std::string rows = "{}";  // of applications, as a user adds them
     bool withAccessibility = true;
     bool onlyLists = false;
 };
@@ -27,6 +28,7 @@ struct Arguments {
 std::optional<Arguments> parse(const std::vector<std::string>& words) {
     Arguments arguments;
     const std::map<std::string, std::string*> values = {{"--pictures", &arguments.pictures},
+                                                        {"--rows", &arguments.rows},
                                                         {"--program", &arguments.choice.program},
                                                         {"--place", &arguments.choice.place},
                                                         {"--story", &arguments.choice.story}};
@@ -71,7 +73,7 @@ int run(const Arguments& arguments) {
     using rig::PlumeProgram;
     rig::DesktopRig rig;
     const PlumeProgram plume(
-        rig, library(), settings(),
+        rig, library(), settings(arguments.rows),
         arguments.withAccessibility ? PlumeProgram::Accessibility::Found : PlumeProgram::Accessibility::Missing);
     int right = 0;
     int wrong = 0;
@@ -99,7 +101,7 @@ int main(int argc, char** argv) {
         const auto arguments = parse({argv + 1, argv + argc});
         if (!arguments) {
             std::cerr << "usage: plume_real_programs [--pictures FOLDER] [--program NAME] [--place NAME] "
-                         "[--story NAME] [--times N] [--without-accessibility] [--list]\n";
+                         "[--story NAME] [--times N] [--rows JSON] [--without-accessibility] [--list]\n";
             return 2;
         }
         if (!arguments->onlyLists) return run(*arguments);

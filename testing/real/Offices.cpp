@@ -13,8 +13,7 @@ constexpr const char* Settings = R"(<?xml version="1.0" encoding="UTF-8"?>
 <item oor:path="/org.openoffice.Office.Common/Misc"><prop oor:name="ShowTipOfTheDay" oor:op="fuse"><value>false</value></prop></item>
 <item oor:path="/org.openoffice.Office.Common/Misc"><prop oor:name="FirstRun" oor:op="fuse"><value>false</value></prop></item>
 <item oor:path="/org.openoffice.Setup/Product"><prop oor:name="ooSetupLastVersion" oor:op="fuse"><value>7.4</value></prop></item>
-<item oor:path="/org.openoffice.Office.Impress/Misc/Start"><prop oor:name="EnableSdremote" oor:op="fuse"><value>false</value></prop></item>
-<item oor:path="/org.openoffice.Office.Impress/Misc"><prop oor:name="StartWithTemplate" oor:op="fuse"><value>false</value></prop></item>
+<item oor:path="/org.openoffice.Office.Impress/Misc/NewDoc"><prop oor:name="AutoPilot" oor:op="fuse"><value>false</value></prop></item>
 </oor:items>
 )";
 
@@ -29,39 +28,47 @@ RealProgram office(const std::string& part, const std::string& backEnd, Place pl
             {"SAL_USE_VCLPLUGIN=" + backEnd}};
 }
 
-// These programs run keys that erase behind what is typed after them: nothing tells when they have.
-void awaitErasing(rig::DesktopRig& rig) {
-    rig.keyboard().sync();
-    rig::waitUntil([] { return false; }, rig::Milliseconds(150));
+// They do what keys say that erase or move behind what is typed after them.
+constexpr rig::Milliseconds Settling{200};
+
+void pause(rig::Milliseconds time) {
+    rig::waitUntil([] { return false; }, time);
 }
 
-void eraseAll(rig::DesktopRig& rig) {
-    rig.keyboard().chord({Key::LeftControl}, U'a');
-    rig.keyboard().tap(Key::Backspace);
-    awaitErasing(rig);
+void press(rig::DesktopRig& rig, Key key) {
+    rig.keyboard().tap(key);
+    rig.keyboard().sync();
 }
 
 Place document() {
-    return {.offers = {Needs::Lines}, .clear = eraseAll};
+    return {.offers = {Needs::Lines}, .settling = Settling};
 }
 
 Place cell() {
     const auto edit = [](rig::DesktopRig& rig) {
-        rig.keyboard().tap(Key::Escape);
-        rig.keyboard().tap(Key::Delete);
-        rig.keyboard().tap(static_cast<Key>(68));  // F2
-        awaitErasing(rig);
+        press(rig, Key::Escape);
+        press(rig, Key::Delete);
+        press(rig, Key::F2);
     };
-    return {.clear = edit};
+    return {.settling = Settling, .clear = edit};
 }
 
+// The title of the slide, entered anew each time. While it is not, select all means the frames, and they would go.
 Place slide() {
     const auto edit = [](rig::DesktopRig& rig) {
-        rig.keyboard().tap(Key::Tab);
-        rig.keyboard().tap(static_cast<Key>(68));  // F2
-        awaitErasing(rig);
+        for (const Key key : {Key::Escape, Key::Escape, Key::Tab, Key::F2}) {
+            press(rig, key);
+            pause(Settling);
+        }
+        rig.keyboard().chord({Key::LeftControl}, U'a');
+        pause(Settling);
+        press(rig, Key::Backspace);
     };
-    return {.offers = {Needs::Lines}, .enter = edit, .clear = eraseAll};
+    const auto start = [](rig::DesktopRig&) {
+        constexpr rig::Milliseconds Starting{3'000};
+        pause(Starting);
+    };
+    return {.offers = {Needs::Lines}, .settling = Settling, .enter = start, .clear = edit};
 }
 
 }  // namespace

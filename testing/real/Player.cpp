@@ -138,6 +138,7 @@ bool Player::isChosen(const Place& place, const Story& story) const {
 
 void Player::enter(const Place& place) {
     if (place.enter) place.enter(rig_);
+    settle(place);
     reader_ = makeReader(place.reading, rig_, window_, folder_ / "text");
     awaitReady(place);
 }
@@ -154,14 +155,24 @@ void Player::awaitReady(const Place& place) {
 }
 
 void Player::clear(const Place& place) {
-    if (place.clear) return place.clear(rig_);
-    if (place.reading == Reading::Lines) return rig_.keyboard().chord({Key::LeftControl}, U'u');
-    rig_.keyboard().chord({Key::LeftControl}, U'a');
-    rig_.keyboard().tap(Key::Backspace);
-    rig_.keyboard().sync();
+    if (place.clear) {
+        place.clear(rig_);
+    } else if (place.reading == Reading::Lines) {
+        rig_.keyboard().chord({Key::LeftControl}, U'u');
+    } else {
+        rig_.keyboard().chord({Key::LeftControl}, U'a');
+        settle(place);
+        rig_.keyboard().tap(Key::Backspace);
+        rig_.keyboard().sync();
+    }
+    settle(place);
 }
 
-void Player::type(const Story& story) {
+void Player::settle(const Place& place) {
+    rig::waitUntil([] { return false; }, place.settling);
+}
+
+void Player::type(const Place& place, const Story& story) {
     std::string pending;
     const auto flush = [&] {
         if (story.typing == Typing::RollingOver) {
@@ -178,6 +189,8 @@ void Player::type(const Story& story) {
         }
         flush();
         rig_.keyboard().tap(Key::Left);
+        rig_.keyboard().sync();
+        settle(place);
     }
     flush();
 }
@@ -190,9 +203,9 @@ Outcome Player::playStory(const Place& place, const Story& story) {
     if (place.reading == Reading::Title || place.reading == Reading::File) awaitText("");
     const auto start = std::chrono::steady_clock::now();
     if (story.then == Then::ReadClipboard) {
-        outcome.got = playClipboard(story);
+        outcome.got = playClipboard(place, story);
     } else {
-        type(story);
+        type(place, story);
         if (story.then == Then::Undo) rig_.keyboard().chord({Key::LeftControl, Key::LeftAlt}, U'z');
         outcome.got = awaitText(outcome.expected);
     }
@@ -212,12 +225,12 @@ std::string Player::awaitText(const std::string& expected) {
     return text;
 }
 
-std::string Player::playClipboard(const Story& story) {
+std::string Player::playClipboard(const Place& place, const Story& story) {
     const std::string display = rig_.server().display();
     const rig::SelectionData data{"UTF8_STRING", 8, CopiedBefore};
     const rig::ForeignOwner owner(display, {{"UTF8_STRING", data}, {"STRING", data}});
     CopyWatch watch(display);
-    type(story);
+    type(place, story);
     if (!watch.awaitOwner(TextBound, [&](xcb_window_t window) { return window != owner.window(); })) {
         return "nothing was pasted";
     }

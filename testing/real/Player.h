@@ -51,10 +51,11 @@ class Player {
     void enter(const Place& place);
     void awaitReady(const Place& place);
     void clear(const Place& place);
+    static void settle(const Place& place);
     Outcome playStory(const Place& place, const Story& story);
-    void type(const Story& story);
+    void type(const Place& place, const Story& story);
     std::string awaitText(const std::string& expected);
-    std::string playClipboard(const Story& story);
+    std::string playClipboard(const Place& place, const Story& story);
     void finish(Outcome& outcome);
     bool isChosen(const Place& place, const Story& story) const;
 

@@ -24,6 +24,8 @@ struct Place {
     std::string name = {};  // empty for a program with one place
     Reading reading = Reading::Copying;
     std::vector<Needs> offers = {};
+    // What the program needs before it has done what a key says that types nothing. It tells nobody.
+    rig::Milliseconds settling{0};
     // Gives it the focus. Empty: it has it.
     std::function<void(rig::DesktopRig&)> enter = {};
     // Makes it ready for the next story. Empty: select all and erase.

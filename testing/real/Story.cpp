@@ -62,10 +62,9 @@ std::string library() {
 ])json";
 }
 
-std::string settings() {
+std::string settings(const std::string& rows) {
     // The undo key is Control+Alt+Z.
-    constexpr const char* Settings = R"({ "PlayFeedbackSound": false, "UndoHotKey": 25769803782 })";
-    return Settings;
+    return R"({ "PlayFeedbackSound": false, "UndoHotKey": 25769803782, "CustomApplicationSettings": )" + rows + "}";
 }
 
 }  // namespace plume::real

@@ -30,9 +30,9 @@ constexpr char LeftKey = '\x02';
 // Played from the first to the last.
 const std::vector<Story>& stories();
 
-// The library that they are typed with, and the settings, as files.
+// The library that they are typed with, and the settings, as files. The rows are the user's own, of applications.
 std::string library();
-std::string settings();
+std::string settings(const std::string& rows);
 
 // What is on the clipboard while a story is played that looks after it.
 extern const std::string CopiedBefore;

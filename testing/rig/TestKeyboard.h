@@ -21,6 +21,7 @@ enum class Key {
     LeftShift = 50,
     LeftAlt = 64,
     CapsLock = 66,
+    F2 = 68,
     AltGr = 108,
     Home = 110,
     Up = 111,

@@ -71,8 +71,8 @@ struct ContextInputSetting {
     std::optional<Keystrokes> pasteKeys = {};
     std::optional<Keystrokes> copyKeys = {};
     bool pastesPrimary = false;  // those keys paste what is selected, not what was copied
-    // What has to pass behind Backspace, arrows and other keys before text may follow, in seconds: for programs that
-    // do what keys say later than they insert text.
+    // What has to pass behind Backspace, arrows and other keys before typed text may follow, in seconds: for programs
+    // that do what keys say later than they insert text. A paste may follow at once.
     double afterErasingDelay = 0;
     // The program proposes the rest of a word as selected text, which the first Backspace would remove alone.
     bool overtypesCompletion = false;

@@ -22,7 +22,7 @@ bool isKey(const PLOutput::Fragment& fragment) {
     return std::holds_alternative<KeyFragment>(fragment);
 }
 
-// Text would overtake the keys at the end of the batch.
+// Typed text would overtake the keys at the end of the batch. A paste is a key, too, and does not.
 bool hasToSettle(const OutputBatch& batch, const ContextInputSetting& setting) {
     if (setting.afterErasingDelay <= 0 || batch.steps.empty()) return false;
     const Kind last = batch.steps.back().kind;
@@ -37,7 +37,10 @@ class BatchTaker {
     OutputBatch take() {
         if (!takeBackspaces()) return std::move(batch_);
         // Exactly a whole batch of backspaces ends an output: what programs have come to expect.
-        if (budget_ == 0 && !hasToSettle(batch_, setting_)) return std::move(batch_);
+        if (budget_ == 0) {
+            if (hasToSettle(batch_, setting_)) pauseFor(setting_.afterErasingDelay);
+            return std::move(batch_);
+        }
         const bool goesOn = takeFragments();
         output_.fragments.erase(output_.fragments.begin(), output_.fragments.begin() + taken_);
         if (goesOn) takeLeftArrows();
@@ -58,7 +61,7 @@ class BatchTaker {
     bool takeFragments() {
         while (static_cast<std::size_t>(taken_) < output_.fragments.size()) {
             PLOutput::Fragment& fragment = output_.fragments[static_cast<std::size_t>(taken_)];
-            if (!isKey(fragment) && hasToSettle(batch_, setting_)) return pauseFor(setting_.afterErasingDelay);
+            if (isTyped(fragment) && hasToSettle(batch_, setting_)) return pauseFor(setting_.afterErasingDelay);
             const bool goesOn = isKey(fragment) ? takeKey(fragment) : takeText(fragment);
             if (!goesOn) return false;
             if (budget_ == 0) return pauseFor(BatchPause);
@@ -110,6 +113,8 @@ class BatchTaker {
     bool isPasted(const PLOutput::Fragment& fragment) const {
         return std::holds_alternative<AttributedString>(fragment) || setting_.has(InputFlag::UseClipboard);
     }
+
+    bool isTyped(const PLOutput::Fragment& fragment) const { return !isKey(fragment) && !isPasted(fragment); }
 
     bool nextIsPasted() const {
         const auto next = static_cast<std::size_t>(taken_);

@@ -95,6 +95,7 @@ const BatchCase Cases[] = {
      0.03},
     {"at the end, too", 20, {key(1, 0.01)}, 0, {"B20 +0.03", "K1 +0.03", "."}, false, {}, 0, 0, 0.03},
     {"nothing has to", 0, {Text}, 0, {"T1 ."}, true, {}, 0, 0, 0.03},
+    {"nothing before a paste", 3, {Text}, 1, {"B3 P1 L1 +0.03", "."}, false, UseClipboard, 0, 0, 0.03},
 };
 
 TEST(OutputBatch, TakesAnOutputApart) {
