@@ -143,6 +143,8 @@ class AutoText {
     void verticalArrowPressed(ZDKeyEventArgs& event);
     Route returnPressed(ZDKeyEventArgs& event);
     Route spacePressed(const ZDKeyEventArgs& event);
+    Route tabPressed();
+    Route functionKeyPressed(KeyCode key);
 
     // The modifier set that picks entries; nothing when the setting names none.
     std::optional<KeyModifiers> selectorModifiers() const;

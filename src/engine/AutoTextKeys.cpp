@@ -1,4 +1,6 @@
 // What the engine does at each key: the way it takes by its code, the digits that pick from a list, and the buffer.
+#include <algorithm>
+#include <array>
 #include <utility>
 
 #include "Foundation/Strings.h"
@@ -10,6 +12,16 @@ namespace {
 
 bool isSingleUnit(const std::optional<std::u16string>& text) {
     return text && text->size() == 1;
+}
+
+// F1 to F20, in the order of their codes.
+constexpr std::array FunctionKeys = {
+    KeyCode::F17, KeyCode::F18, KeyCode::F19, KeyCode::F20, KeyCode::F5,  KeyCode::F6,  KeyCode::F7,
+    KeyCode::F3,  KeyCode::F8,  KeyCode::F9,  KeyCode::F11, KeyCode::F13, KeyCode::F16, KeyCode::F14,
+    KeyCode::F10, KeyCode::F12, KeyCode::F15, KeyCode::F4,  KeyCode::F2,  KeyCode::F1};
+
+bool isFunctionKey(KeyCode key) {
+    return std::ranges::binary_search(FunctionKeys, key);
 }
 
 bool isDigit(char16_t unit) {
@@ -50,6 +62,8 @@ AutoText::Route AutoText::routeByKeyCode(ZDKeyEventArgs& event) {
         case KeyCode::PageDown:
         case KeyCode::Left:
         case KeyCode::Right:
+        case KeyCode::Help:
+        case KeyCode::Menu:
             clear();
             return Route::Done;
         case KeyCode::Down:
@@ -59,8 +73,10 @@ AutoText::Route AutoText::routeByKeyCode(ZDKeyEventArgs& event) {
         case KeyCode::ForwardDelete:
             // What was typed before the caret still stands there.
             return Route::Done;
+        case KeyCode::Tab:
+            return tabPressed();
         default:
-            return Route::Character;
+            return functionKeyPressed(event.key);
     }
 }
 
@@ -103,6 +119,20 @@ AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
     if (dependencies_.inputService.keyModifier() != KeyModifier::Shift) return Route::Character;
     // Shift is the way to write an abbreviation out: the text is kept, nothing is looked for.
     if (event.s) letters_ += *event.s;
+    return Route::Done;
+}
+
+AutoText::Route AutoText::tabPressed() {
+    if (!dependencies_.inputService.keyModifier().contains(KeyModifier::Shift)) return Route::Character;
+    // Back to another field: what is typed there does not follow what was typed here.
+    clear();
+    return Route::Done;
+}
+
+AutoText::Route AutoText::functionKeyPressed(KeyCode key) {
+    if (!isFunctionKey(key)) return Route::Character;
+    // What it does in the program is unknown; it may have moved the caret.
+    clear();
     return Route::Done;
 }
 

@@ -209,7 +209,8 @@ const std::vector<Act>& acts() {
         {"two units", [](auto& desk) { desk.desktop.typeCharacter(u"\U0001F600"); }, nothing},
         {"click", [](auto& desk) { desk.clickAt(0, 0); }, empty},
         {"shortcut", key(KeyCode::S, Command), empty},
-        {"key without text", key(KeyCode::F1), nothing},
+        {"function key", key(KeyCode::F1), empty},
+        {"key without text", key(KeyCode::VolumeUp), nothing},
         {"switch", [](auto& desk) { desk.engine.setEnabled(true); }, empty},
     };
     return all;

@@ -14,7 +14,7 @@ namespace {
 
 // Control characters that stand for keys (Escape, arrows) are no text; Return, Enter and Tab are.
 bool isText(char16_t unit) {
-    return unit == u'\t' || unit == u'\n' || unit == u'\r' || unit == u'\x03' || (unit >= u' ' && unit != u'\x7F');
+    return unit == u'\t' || unit == u'\n' || unit == u'\r' || (unit >= u' ' && unit != u'\x7F');
 }
 
 std::int64_t signedOf(std::size_t number) {
@@ -113,8 +113,7 @@ void SimulatedApplication::performCommand(KeyCode keyCode) {
 void SimulatedApplication::insertProduced(std::u16string_view produced) {
     if (produced.empty() || !std::all_of(produced.begin(), produced.end(), isText)) return;
     std::u16string text(produced);
-    std::replace_if(
-        text.begin(), text.end(), [](char16_t unit) { return unit == u'\r' || unit == u'\x03'; }, u'\n');
+    std::replace(text.begin(), text.end(), u'\r', u'\n');
     field_.insert(text);
 }
 

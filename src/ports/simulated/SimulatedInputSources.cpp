@@ -71,7 +71,7 @@ constexpr auto Keys = std::to_array<Key>({
     {KeyCode::KeypadMultiply, u'*'},
     {KeyCode::KeypadPlus, u'+'},
     {KeyCode::KeypadDivide, u'/'},
-    {KeyCode::KeypadEnter, u'\x03'},
+    {KeyCode::KeypadEnter, u'\r'},
     {KeyCode::KeypadMinus, u'-'},
     {KeyCode::KeypadEqual, u'='},
     {KeyCode::Keypad0, u'0'},
