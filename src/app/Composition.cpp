@@ -86,17 +86,26 @@ void Composition::makeParts() {
         .suggest = environment_.suggest,
     });
 
-    hotKeys_ = std::make_unique<HotKeyDispatch>(
-        *inputService_, HotKeyDispatch::Actions{[this] {
-                                                    engine_->setEnabled(!engine_->enabled());
-                                                    if (environment_.enabledChanged)
-                                                        environment_.enabledChanged(engine_->enabled());
-                                                    ports_.sounds.playOrBeep("Pop");
-                                                },
-                                                [this] { engine_->suggestAbbreviations(); },
-                                                [this] { engine_->quickSearch(); }, [this] { engine_->clear(); },
-                                                [this](bool withTrigger) { return engine_->undo(withTrigger); },
-                                                [this] { engine_->expandAtHotkey(); }});
+    hotKeys_ = std::make_unique<HotKeyDispatch>(*inputService_, hotKeyActions());
+}
+
+// What would show a window that is not there is left out: the keys are for the programs then.
+HotKeyDispatch::Actions Composition::hotKeyActions() {
+    HotKeyDispatch::Actions actions{.switchEnabled =
+                                        [this] {
+                                            engine_->setEnabled(!engine_->enabled());
+                                            if (environment_.enabledChanged)
+                                                environment_.enabledChanged(engine_->enabled());
+                                            ports_.sounds.playOrBeep("Pop");
+                                        },
+                                    .clear = [this] { engine_->clear(); },
+                                    .undo = [this](bool withTrigger) { return engine_->undo(withTrigger); },
+                                    .expand = [this] { engine_->expandAtHotkey(); }};
+    if (environment_.makeSuggestionController) {
+        actions.suggestAbbreviations = [this] { engine_->suggestAbbreviations(); };
+    }
+    if (environment_.makeQuickSearchController) actions.quickSearch = [this] { engine_->quickSearch(); };
+    return actions;
 }
 
 Composition::~Composition() {
@@ -121,6 +130,9 @@ void Composition::loadPreferences() {
 void Composition::start() {
     if (const Result<void> registered = hotKeys_->registerHotKeys(environment_.settings); !registered) {
         environment_.report(registered.error().message);
+    }
+    for (const std::string_view name : hotKeys_->hotKeysWithoutAction(environment_.settings)) {
+        environment_.log("What the hot key " + std::string(name) + " is for is not there yet: its keys pass.");
     }
     inputService_->enableEvents();
 }

@@ -84,6 +84,7 @@ class Composition {
 
   private:
     void makeParts();
+    HotKeyDispatch::Actions hotKeyActions();
 
     const Ports ports_;
     const Environment environment_;

@@ -9,6 +9,8 @@ namespace {
 // The hot key for quick search that the system recognises by itself.
 constexpr std::string_view SystemQuickSearchSetting = "QuickSearchHotKey";
 constexpr SystemHotKeys::Id SystemQuickSearchId = 1;
+// The one whose hot key no setting holds.
+constexpr std::string_view ClearCommand = "";
 
 }  // namespace
 
@@ -34,9 +36,32 @@ std::optional<GeneralHotKey> HotKeyDispatch::hotKeyIn(const UserDefaults& settin
     return hotKey.isValid() ? std::optional(hotKey) : std::nullopt;
 }
 
-HotKeyDispatch::HotKeyDispatch(MacInputService& inputService, Actions actions)
-    : inputService_(inputService), actions_(std::move(actions)) {
+HotKeyDispatch::HotKeyDispatch(MacInputService& inputService, const Actions& actions) : inputService_(inputService) {
+    addCommands(actions);
     hotKeysPressed_ = inputService_.hotKeysPressed.addObserver(this, &HotKeyDispatch::onMacInputServiceHotKeysPressed);
+}
+
+void HotKeyDispatch::addCommands(const Actions& actions) {
+    using Swallows = std::optional<bool>;
+    const auto add = [this](std::string_view setting, const std::function<void()>& action, Swallows swallows = true) {
+        if (!action) return commands_.push_back({setting, {}});
+        commands_.push_back({setting, [action, swallows]() -> Swallows {
+                                 action();
+                                 return swallows;
+                             }});
+    };
+    add("switchHotKey", actions.switchEnabled);
+    add("makeSnippetFromClipboardHotKey", actions.makeSnippetFromClipboard);
+    add("makeSnippetFromSelectionHotKey", actions.makeSnippetFromSelection);
+    add("suggestAbbreviationsHotKey", actions.suggestAbbreviations);
+    add("quickSearchHotKey", actions.quickSearch);
+    add("openMainWindowHotKey", actions.openMainWindow);
+    add("OpenLastUsedSnippetHotKey", actions.openLastUsedSnippet);
+    add(ClearCommand, actions.clear, std::nullopt);
+    commands_.push_back({"UndoHotKey", [undo = actions.undo] { return undo(true); }});
+    commands_.push_back({"UndoAltHotKey", [undo = actions.undo] { return undo(false); }});
+    add("ExpandHotKey", actions.expand);
+    add(SystemQuickSearchSetting, actions.quickSearch);
 }
 
 HotKeyDispatch::~HotKeyDispatch() {
@@ -48,24 +73,28 @@ HotKeyDispatch::~HotKeyDispatch() {
 Result<void> HotKeyDispatch::registerHotKeys(const UserDefaults& settings) {
     for (const auto& [command, hotKey] : hotKeys_) inputService_.unregisterHotKey(hotKey);
     hotKeys_.clear();
-    const auto add = [&](Command command, const std::optional<GeneralHotKey>& hotKey) {
-        if (hotKey) hotKeys_.emplace_back(command, *hotKey);
-    };
-    add(Command::Switch, hotKeyIn(settings, "switchHotKey"));
-    add(Command::SuggestAbbreviations, hotKeyIn(settings, "suggestAbbreviationsHotKey"));
-    add(Command::QuickSearch, hotKeyIn(settings, "quickSearchHotKey"));
-    // Command alone, so that a shortcut that was begun and given up leaves nothing half typed behind.
-    add(Command::Clear, GeneralHotKey{KeyModifier::Command, KeyCode::None});
-    add(Command::Undo, hotKeyIn(settings, "UndoHotKey"));
-    add(Command::UndoAlt, hotKeyIn(settings, "UndoAltHotKey"));
-    add(Command::Expand, hotKeyIn(settings, "ExpandHotKey"));
-    for (const auto& [command, hotKey] : hotKeys_) inputService_.registerHotKey(hotKey);
+    for (const Command& command : commands_) {
+        if (!command.perform || command.setting == SystemQuickSearchSetting) continue;
+        // Command alone clears, so that a shortcut that was begun and given up leaves nothing half typed behind.
+        const auto hotKey = command.setting == ClearCommand
+                                ? std::optional(GeneralHotKey{KeyModifier::Command, KeyCode::None})
+                                : hotKeyIn(settings, command.setting);
+        if (!hotKey) continue;
+        hotKeys_.emplace_back(&command, *hotKey);
+        inputService_.registerHotKey(*hotKey);
+    }
+    const auto& quickSearch = commands_.back().perform;
+    const auto system = quickSearch ? hotKeyIn(settings, SystemQuickSearchSetting) : std::nullopt;
+    return inputService_.registerSystemHotKey(SystemQuickSearchId, system.value_or(GeneralHotKey{}),
+                                              [quickSearch] { quickSearch(); });
+}
 
-    const GeneralHotKey system = hotKeyIn(settings, SystemQuickSearchSetting).value_or(GeneralHotKey{});
-    return inputService_.registerSystemHotKey(SystemQuickSearchId, system, [this] {
-        inputService_.ignoreNextHotKey();
-        perform(Command::QuickSearch);
-    });
+std::vector<std::string_view> HotKeyDispatch::hotKeysWithoutAction(const UserDefaults& settings) const {
+    std::vector<std::string_view> names;
+    for (const Command& command : commands_) {
+        if (!command.perform && hotKeyIn(settings, command.setting)) names.push_back(command.setting);
+    }
+    return names;
 }
 
 void HotKeyDispatch::onMacInputServiceHotKeysPressed(ZDHotKeysPressedEventArgs& event) {
@@ -73,33 +102,8 @@ void HotKeyDispatch::onMacInputServiceHotKeysPressed(ZDHotKeysPressedEventArgs& 
     const auto hotKeys = hotKeys_;
     for (const auto& [command, hotKey] : hotKeys) {
         if (std::find(event.hotKeys.begin(), event.hotKeys.end(), hotKey) == event.hotKeys.end()) continue;
-        if (const std::optional<bool> swallows = perform(command)) event.cancel = *swallows;
+        if (const std::optional<bool> swallows = command->perform()) event.cancel = *swallows;
     }
-}
-
-std::optional<bool> HotKeyDispatch::perform(Command command) {
-    switch (command) {
-        case Command::Switch:
-            actions_.switchEnabled();
-            return true;
-        case Command::SuggestAbbreviations:
-            actions_.suggestAbbreviations();
-            return true;
-        case Command::QuickSearch:
-            actions_.quickSearch();
-            return true;
-        case Command::Clear:
-            actions_.clear();
-            return std::nullopt;
-        case Command::Undo:
-            return actions_.undo(true);
-        case Command::UndoAlt:
-            return actions_.undo(false);
-        case Command::Expand:
-            actions_.expand();
-            return true;
-    }
-    return std::nullopt;
 }
 
 }  // namespace plume

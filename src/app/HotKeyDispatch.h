@@ -18,11 +18,15 @@ namespace plume {
 
 class HotKeyDispatch {
   public:
-    // What the hot keys do. Those that answer say whether the key is swallowed.
+    // What the hot keys do. Those that answer say whether the key is swallowed. The key of an empty one passes.
     struct Actions {
         std::function<void()> switchEnabled;
-        std::function<void()> suggestAbbreviations;
-        std::function<void()> quickSearch;
+        std::function<void()> makeSnippetFromClipboard = {};
+        std::function<void()> makeSnippetFromSelection = {};
+        std::function<void()> suggestAbbreviations = {};
+        std::function<void()> quickSearch = {};
+        std::function<void()> openMainWindow = {};
+        std::function<void()> openLastUsedSnippet = {};
         std::function<void()> clear;
         std::function<bool(bool withTrigger)> undo;
         std::function<void()> expand;
@@ -34,7 +38,7 @@ class HotKeyDispatch {
     static std::optional<GeneralHotKey> hotKeyIn(const UserDefaults& settings, std::string_view name);
 
     // Listens from here to its end. The service is not owned and outlives it.
-    HotKeyDispatch(MacInputService& inputService, Actions actions);
+    HotKeyDispatch(MacInputService& inputService, const Actions& actions);
     ~HotKeyDispatch();
     HotKeyDispatch(const HotKeyDispatch&) = delete;
     HotKeyDispatch& operator=(const HotKeyDispatch&) = delete;
@@ -42,18 +46,22 @@ class HotKeyDispatch {
     // Registers the hot keys of these settings in place of the previous ones. What the system refuses is an error that
     // says why; the others are registered all the same.
     Result<void> registerHotKeys(const UserDefaults& settings);
+    // The settings that hold a hot key for which there is nothing to do here.
+    std::vector<std::string_view> hotKeysWithoutAction(const UserDefaults& settings) const;
 
   private:
-    enum class Command { Switch, SuggestAbbreviations, QuickSearch, Clear, Undo, UndoAlt, Expand };
+    // The setting of a hot key, and what it does: whether the key is swallowed; nothing leaves that as it is.
+    struct Command {
+        std::string_view setting;
+        std::function<std::optional<bool>()> perform;
+    };
 
+    void addCommands(const Actions& actions);
     void onMacInputServiceHotKeysPressed(ZDHotKeysPressedEventArgs& event);
-    // Whether the key is swallowed; nothing when the command leaves that as it is.
-    std::optional<bool> perform(Command command);
-
     MacInputService& inputService_;
     Subscription hotKeysPressed_;
-    const Actions actions_;
-    std::vector<std::pair<Command, GeneralHotKey>> hotKeys_;
+    std::vector<Command> commands_;  // in the order in which they take effect
+    std::vector<std::pair<const Command*, GeneralHotKey>> hotKeys_;
 };
 
 }  // namespace plume

@@ -15,10 +15,10 @@ bool isSingleUnit(const std::optional<std::u16string>& text) {
 }
 
 // F1 to F20, in the order of their codes.
-constexpr std::array FunctionKeys = {
-    KeyCode::F17, KeyCode::F18, KeyCode::F19, KeyCode::F20, KeyCode::F5,  KeyCode::F6,  KeyCode::F7,
-    KeyCode::F3,  KeyCode::F8,  KeyCode::F9,  KeyCode::F11, KeyCode::F13, KeyCode::F16, KeyCode::F14,
-    KeyCode::F10, KeyCode::F12, KeyCode::F15, KeyCode::F4,  KeyCode::F2,  KeyCode::F1};
+constexpr std::array FunctionKeys = {KeyCode::F17, KeyCode::F18, KeyCode::F19, KeyCode::F20, KeyCode::F5,
+                                     KeyCode::F6,  KeyCode::F7,  KeyCode::F3,  KeyCode::F8,  KeyCode::F9,
+                                     KeyCode::F11, KeyCode::F13, KeyCode::F16, KeyCode::F14, KeyCode::F10,
+                                     KeyCode::F12, KeyCode::F15, KeyCode::F4,  KeyCode::F2,  KeyCode::F1};
 
 bool isFunctionKey(KeyCode key) {
     return std::ranges::binary_search(FunctionKeys, key);

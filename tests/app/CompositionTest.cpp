@@ -35,15 +35,18 @@ class WindowlessProgram : public testing::Test {
 
     SimulatedDesktop desktop_;
     PosixProcessLauncher launcher_;
-    std::shared_ptr<const UserDefaults> settings_ = SettingsFile::registeredDefaults();
+    // Control+J, for a window that there is not.
+    std::shared_ptr<const UserDefaults> settings_ =
+        SettingsFile::read(R"({"suggestAbbreviationsHotKey": 8589934630})", "settings").value();
     std::vector<std::string> told_;
+    std::vector<std::string> logged_;
     std::shared_ptr<SnippetGroup> group_ = SnippetGroup::make();
-    Composition program_{
-        {desktop_.keyboardTap(), desktop_.mouseTap(), desktop_.poster(), desktop_.pasteboard(),
-         desktop_.processManager(), desktop_.inputSources(), desktop_.accessibility(), desktop_.secureInput(),
-         desktop_.systemHotKeys(), desktop_.sounds(), desktop_.notices(), launcher_, desktop_.runLoop(),
-         desktop_.runLoop()},
-        {*settings_, [this](const std::string& message) { told_.push_back(message); }, [](const std::string&) {}}};
+    Composition program_{{desktop_.keyboardTap(), desktop_.mouseTap(), desktop_.poster(), desktop_.pasteboard(),
+                          desktop_.processManager(), desktop_.inputSources(), desktop_.accessibility(),
+                          desktop_.secureInput(), desktop_.systemHotKeys(), desktop_.sounds(), desktop_.notices(),
+                          launcher_, desktop_.runLoop(), desktop_.runLoop()},
+                         {*settings_, [this](const std::string& message) { told_.push_back(message); },
+                          [this](const std::string& line) { logged_.push_back(line); }}};
 };
 
 }  // namespace
@@ -60,6 +63,12 @@ TEST_F(WindowlessProgram, LeavesDigitsAndReturnAloneWhenSeveralMatch) {
     EXPECT_EQ(typed(u"sig"), u"sig");
     EXPECT_EQ(typed(u"1\n"), u"sig1\n");
     EXPECT_THAT(told_, ElementsAre(HasSubstr("\"sig\"")));
+}
+
+TEST_F(WindowlessProgram, LeavesAHotKeyWithNothingToDoToThePrograms) {
+    desktop_.pressAndRelease(KeyCode::J, KeyModifier::Control);
+    EXPECT_EQ(desktop_.front()->events().size(), 4U);
+    EXPECT_THAT(logged_, ElementsAre(HasSubstr("suggestAbbreviationsHotKey")));
 }
 
 }  // namespace plume

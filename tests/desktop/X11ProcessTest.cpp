@@ -267,11 +267,9 @@ class X11HotKeyTest : public X11ProcessTest {
 
     std::unique_ptr<X11SystemHotKeys> make(SessionThread& thread) {
         return thread.run([&] {
-            return std::make_unique<X11SystemHotKeys>(
-                thread.session(), [](KeyCode keyCode) -> std::optional<xcb_keycode_t> {
-                    if (numberOf(keyCode) > 0x7F) return std::nullopt;
-                    return static_cast<xcb_keycode_t>(rig_->keyboard().keycodeOf(numberOf(keyCode)));
-                });
+            keyboards_.push_back(valueOrThrow(XkbKeyboard::open(thread.session().connection())));
+            keyboards_.back()->listenTo(thread.session());
+            return std::make_unique<X11SystemHotKeys>(thread.session(), *keyboards_.back());
         });
     }
     std::function<void()> counting(char name) {
@@ -287,6 +285,7 @@ class X11HotKeyTest : public X11ProcessTest {
         return heard_;
     }
 
+    std::vector<std::unique_ptr<XkbKeyboard>> keyboards_;
     std::mutex mutex_;
     std::condition_variable changed_;
     std::string heard_;
@@ -295,8 +294,7 @@ class X11HotKeyTest : public X11ProcessTest {
 TEST_F(X11HotKeyTest, CapsLockDoesNotMatterAndAHeldKeyCountsOnce) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     auto hotKeys = make(*thread_);
-    ASSERT_TRUE(
-        thread_->run([&] { return hotKeys->registerHotKey(1, KeyCode{'h'}, ControlShift, counting('h')).ok(); }));
+    ASSERT_TRUE(thread_->run([&] { return hotKeys->registerHotKey(1, KeyCode::H, ControlShift, counting('h')).ok(); }));
     Subscription presses = thread_->run(
         [&] { return thread_->session().addHandler(XCB_KEY_PRESS, [&](const auto&) { counting('.')(); }); });
     TestKeyboard& keyboard = rig_->keyboard();
@@ -315,6 +313,23 @@ TEST_F(X11HotKeyTest, CapsLockDoesNotMatterAndAHeldKeyCountsOnce) {
     });
 }
 
+TEST_F(X11HotKeyTest, FollowsTheLayout) {
+    auto hotKeys = make(*thread_);
+    const auto take = [&] { return hotKeys->registerHotKey(1, KeyCode::Escape, ControlShift, counting('e')).ok(); };
+    ASSERT_TRUE(thread_->run(take));
+    const auto setOption = [](const std::string& option) {
+        const auto program = rig_->session().start({"setxkbmap", "-option", option}, "x11-xkb-utils");
+        EXPECT_EQ(program->waitForExit(Milliseconds(10'000)), 0);
+    };
+    setOption("caps:swapescape");
+    rig_->client().await("the hot key has moved with Escape", Milliseconds(10'000), [&] {
+        rig_->keyboard().chord({Key::LeftControl, Key::LeftShift}, Key::CapsLock);
+        return !awaitHeard(0).empty();
+    });
+    setOption("");
+    thread_->run([&] { hotKeys.reset(); });
+}
+
 TEST_F(X11HotKeyTest, ACombinationThatIsTakenIsRefused) {
     SessionThread other(rig_->server().display());
     auto theirs = make(other);
@@ -325,15 +340,18 @@ TEST_F(X11HotKeyTest, ACombinationThatIsTakenIsRefused) {
             return result.ok() ? std::string() : result.error().message;
         });
     };
-    EXPECT_EQ(take(other, *theirs, 1, KeyCode{'k'}), "");
-    EXPECT_THAT(take(*thread_, *ours, 1, KeyCode{'k'}), testing::HasSubstr("Another program"));
-    EXPECT_EQ(take(*thread_, *ours, 1, KeyCode{'l'}), "");
-    EXPECT_THAT(take(*thread_, *ours, 2, KeyCode{'l'}), testing::HasSubstr("Another hot key"));
+    EXPECT_EQ(take(other, *theirs, 1, KeyCode::K), "");
+    EXPECT_THAT(take(*thread_, *ours, 1, KeyCode::K), testing::HasSubstr("Another program"));
+    EXPECT_EQ(take(*thread_, *ours, 1, KeyCode::L), "");
+    EXPECT_THAT(take(*thread_, *ours, 2, KeyCode::L), testing::HasSubstr("Another hot key"));
     EXPECT_THAT(take(*thread_, *ours, 3, KeyCode::None), testing::HasSubstr("no key"));
-    EXPECT_EQ(take(*thread_, *ours, 1, KeyCode{'l'}), "") << "in place of what was there";
-    other.run([&] { theirs.reset(); });
+    EXPECT_EQ(take(*thread_, *ours, 1, KeyCode::L), "") << "in place of what was there";
+    other.run([&] {
+        theirs.reset();
+        keyboards_.front().reset();
+    });
     rig_->client().await("the other's letting go", Milliseconds(10'000),
-                         [&] { return take(*thread_, *ours, 4, KeyCode{'k'}).empty(); });
+                         [&] { return take(*thread_, *ours, 4, KeyCode::K).empty(); });
     thread_->run([&] { ours.reset(); });
 }
 

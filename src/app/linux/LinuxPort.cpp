@@ -62,11 +62,7 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
     mouseTap_ = std::make_unique<X11MouseTap>(*session_);
     processManager_ = std::make_unique<X11ProcessManager>(*session_, DesktopFiles::ofEnvironment());
     inputSources_ = std::make_unique<X11InputSources>(*keyboard_);
-    systemHotKeys_ =
-        std::make_unique<X11SystemHotKeys>(*session_, [this](KeyCode keyCode) -> std::optional<xcb_keycode_t> {
-            const xcb_keycode_t keycode = keyboard_->keymap()->keycodeOf(keyCode);
-            return keycode != 0 ? std::optional(keycode) : std::nullopt;
-        });
+    systemHotKeys_ = std::make_unique<X11SystemHotKeys>(*session_, *keyboard_);
     keyboardTap_->setFocusIsPassword(
         [this] { return accessibility_.focusIsPasswordForKey() || hiddenPrompts_.isWaitingForKey(); });
     return {};

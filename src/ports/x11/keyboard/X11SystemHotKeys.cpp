@@ -1,5 +1,7 @@
 #include "ports/x11/keyboard/X11SystemHotKeys.h"
 
+#include <xkbcommon/xkbcommon-keysyms.h>
+
 #include <algorithm>
 #include <string>
 #include <utility>
@@ -10,7 +12,7 @@ namespace plume {
 
 namespace {
 
-constexpr xcb_keysym_t NumLockSymbol = 0xFF7F;
+constexpr xcb_keysym_t LockSymbols[] = {XKB_KEY_Num_Lock, XKB_KEY_Scroll_Lock};
 constexpr std::uint16_t MatteringModifiers =
     XCB_MOD_MASK_SHIFT | XCB_MOD_MASK_CONTROL | XCB_MOD_MASK_1 | XCB_MOD_MASK_4;
 
@@ -40,24 +42,36 @@ std::vector<xcb_keycode_t> keyCodesOf(xcb_connection_t* server, xcb_keysym_t wan
     return keyCodes;
 }
 
-// The modifier that Num Lock sets: the server has no fixed one.
-std::uint16_t numLockModifier(xcb_connection_t* server) {
-    const auto keyCodes = keyCodesOf(server, NumLockSymbol);
+// The modifiers that this lock key sets: the server has no fixed ones.
+std::uint16_t lockModifiers(xcb_connection_t* server, xcb_keysym_t lock) {
+    const auto keyCodes = keyCodesOf(server, lock);
     const XcbOwned<xcb_get_modifier_mapping_reply_t> reply(
         xcb_get_modifier_mapping_reply(server, xcb_get_modifier_mapping(server), nullptr));
     if (!reply) return 0;
+    unsigned modifiers = 0;
     const auto* const keys = xcb_get_modifier_mapping_keycodes(reply.get());
     for (int i = 0; i < 8 * reply->keycodes_per_modifier; ++i) {
-        const bool isNumLock = keys[i] != 0 && std::find(keyCodes.begin(), keyCodes.end(), keys[i]) != keyCodes.end();
-        if (isNumLock) return static_cast<std::uint16_t>(1 << i / reply->keycodes_per_modifier);
+        const bool isLock = keys[i] != 0 && std::find(keyCodes.begin(), keyCodes.end(), keys[i]) != keyCodes.end();
+        if (isLock) modifiers |= 1U << (i / reply->keycodes_per_modifier);
     }
-    return 0;
+    return static_cast<std::uint16_t>(modifiers & ~unsigned{MatteringModifiers});
+}
+
+// Caps Lock, Num Lock and Scroll Lock are modifiers to a grab, but not to the user: every combination of them.
+std::vector<std::uint16_t> lockVariants(xcb_connection_t* server) {
+    unsigned locks = XCB_MOD_MASK_LOCK;
+    for (const xcb_keysym_t symbol : LockSymbols) locks |= lockModifiers(server, symbol);
+    std::vector<std::uint16_t> variants;
+    for (unsigned variant = 0; variant <= locks; ++variant) {
+        if ((variant & ~locks) == 0) variants.push_back(static_cast<std::uint16_t>(variant));
+    }
+    return variants;
 }
 
 }  // namespace
 
-X11SystemHotKeys::X11SystemHotKeys(X11Session& session, KeyCodeOf keyCodeOf)
-    : session_(session), keyCodeOf_(std::move(keyCodeOf)), numLock_(numLockModifier(session.get())) {
+X11SystemHotKeys::X11SystemHotKeys(X11Session& session, XkbKeyboard& keyboard)
+    : session_(session), keyboard_(keyboard), lockVariants_(lockVariants(session.get())) {
     pressHandler_ = session_.addHandler(XCB_KEY_PRESS, [this](const xcb_generic_event_t& event) {
         pressed(reinterpret_cast<const xcb_key_press_event_t&>(event));
     });
@@ -65,6 +79,7 @@ X11SystemHotKeys::X11SystemHotKeys(X11Session& session, KeyCodeOf keyCodeOf)
         const auto& release = reinterpret_cast<const xcb_key_release_event_t&>(event);
         if (release.detail == heldKeyCode_) heldKeyCode_ = 0;
     });
+    keyboardChanged_ = keyboard.changedEvent.addObserver(this, &X11SystemHotKeys::keyboardChanged);
     tellRepeatsApart();
 }
 
@@ -85,21 +100,24 @@ void X11SystemHotKeys::tellRepeatsApart() const {
     const XcbOwned<xcb_xkb_per_client_flags_reply_t> flags(xcb_xkb_per_client_flags_reply(server, cookie, nullptr));
 }
 
-std::vector<std::uint16_t> X11SystemHotKeys::lockVariants() const {
-    std::vector<std::uint16_t> variants = {0, XCB_MOD_MASK_LOCK};
-    if (numLock_ == 0) return variants;
-    variants.push_back(numLock_);
-    variants.push_back(static_cast<std::uint16_t>(numLock_ | XCB_MOD_MASK_LOCK));
-    return variants;
+void X11SystemHotKeys::keyboardChanged(const XkbKeyboard::Change& change) {
+    if (change != XkbKeyboard::Change::Keymap) return;
+    for (const auto& [id, hotKey] : hotKeys_) ungrab(hotKey);
+    lockVariants_ = lockVariants(session_.get());
+    for (auto& [id, hotKey] : hotKeys_) {
+        hotKey.keyCode = keyboard_.keymap()->keycodeOf(hotKey.key);
+        if (hotKey.keyCode != 0) grab(hotKey);
+    }
+    session_.flush();
 }
 
 Result<void> X11SystemHotKeys::registerHotKey(Id id, KeyCode keyCode, KeyModifiers modifiers,
                                               std::function<void()> handler) {
     unregisterHotKey(id);
-    const auto xKeyCode = keyCodeOf_(keyCode);
-    if (!xKeyCode)
+    const xcb_keycode_t xKeyCode = keyboard_.keymap()->keycodeOf(keyCode);
+    if (xKeyCode == 0)
         return Error{"The keyboard has no key with code " + std::to_string(numberOf(keyCode)) + " for the hot key."};
-    HotKey hotKey{*xKeyCode, xModifiersOf(modifiers), std::move(handler)};
+    HotKey hotKey{keyCode, xKeyCode, xModifiersOf(modifiers), std::move(handler)};
     if (isRegistered(hotKey)) return Error{"Another hot key of Plume's has this combination already."};
     if (!grab(hotKey)) return Error{"Another program has this combination as its hot key already: choose another."};
     hotKeys_.emplace(id, std::move(hotKey));
@@ -120,10 +138,9 @@ bool X11SystemHotKeys::isRegistered(const HotKey& hotKey) const {
     });
 }
 
-// Caps Lock and Num Lock are modifiers to a grab, but not to the user: one grab for each of their states.
 bool X11SystemHotKeys::grab(const HotKey& hotKey) const {
     std::vector<xcb_void_cookie_t> cookies;
-    for (const std::uint16_t locks : lockVariants()) {
+    for (const std::uint16_t locks : lockVariants_) {
         const auto mask = static_cast<std::uint16_t>(hotKey.modifiers | locks);
         cookies.push_back(xcb_grab_key_checked(session_.get(), 0, session_.connection().root(), mask, hotKey.keyCode,
                                                XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC));
@@ -139,7 +156,8 @@ bool X11SystemHotKeys::grab(const HotKey& hotKey) const {
 }
 
 void X11SystemHotKeys::ungrab(const HotKey& hotKey) const {
-    for (const std::uint16_t locks : lockVariants()) {
+    if (hotKey.keyCode == 0) return;  // which would be any key
+    for (const std::uint16_t locks : lockVariants_) {
         const auto mask = static_cast<std::uint16_t>(hotKey.modifiers | locks);
         xcb_ungrab_key(session_.get(), hotKey.keyCode, session_.connection().root(), mask);
     }
