@@ -9,6 +9,8 @@ namespace {
 
 constexpr std::size_t TimeoutsToGiveUp = 3;
 constexpr double TimeoutPeriod = 60;  // seconds
+// Until the tap is tried again after it was given up, in seconds.
+constexpr double GivenUpPeriod = 60;
 
 }  // namespace
 
@@ -50,6 +52,7 @@ void MacInputService::enableEventsInternal() {
     eventTapThread_ = std::this_thread::get_id();
     isLastProcessReceivedKeyEventNull_ = true;
     timeouts_.clear();
+    nextTry_.cancel();
     if (!evenTapCreated()) {
         const auto created = around_.keyboardTap.create(*this, resolver_.listenAtAnnotatedSession);
         if (!created) {
@@ -76,6 +79,7 @@ void MacInputService::disableEvents() {
 
 void MacInputService::disableEventsInternal() {
     active_ = false;
+    nextTry_.cancel();
     if (evenTapCreated()) {
         around_.keyboardTap.remove();
         around_.mainLoop.perform([this] { secureInputWatch_.stop(); });
@@ -96,6 +100,8 @@ void MacInputService::setListenMouseDownEvents(bool listen) {
 void MacInputService::tapDisabledByTimeout() {
     around_.log("Event tap was disabled by timeout");
     delivery_.abandon();
+    // Nobody knows what was typed meanwhile.
+    typingInterrupted();
     // What becomes of the modifiers meanwhile is no hot key.
     if (!hotKeys_.keyModifier().isEmpty()) hotKeys_.ignoreNextHotKey();
     const double now = around_.tapLoop.now();
@@ -103,7 +109,9 @@ void MacInputService::tapDisabledByTimeout() {
     timeouts_.push_back(now);
     if (timeouts_.size() < TimeoutsToGiveUp) return around_.keyboardTap.enable();
 
-    around_.log("The keyboard is no longer listened to: the event tap was disabled three times within a minute");
+    around_.log("The keyboard is not listened to for a minute: the event tap was disabled three times within one");
+    timeouts_.clear();
+    nextTry_ = around_.tapLoop.performAfterDelay(GivenUpPeriod, [this] { around_.keyboardTap.enable(); });
     around_.mainLoop.perform([this] {
         KeyboardTapGivenUp givenUp;
         keyboardTapGivenUpEvent.raise(givenUp);

@@ -40,7 +40,7 @@ class MacInputService;
 // The keyboard went to another program, or a shortcut may have changed the text.
 struct InputContextChange {};
 
-// The tap was lost three times within a minute and stays off.
+// The tap was lost three times within a minute; it is tried again after another one.
 struct KeyboardTapGivenUp {};
 
 class MacInputService final : private KeyboardTapListener {
@@ -168,7 +168,7 @@ class MacInputService final : private KeyboardTapListener {
     bool keyboardEvent(const TapEvent& event) override;
     void tapDisabledByTimeout() override;
     void tapDisabledByUserInput() override;
-    void keysWithheld() override;
+    void typingInterrupted() override;
 
     void onTapThread(std::function<void()> call);
     void enableEventsInternal();
@@ -202,8 +202,10 @@ class MacInputService final : private KeyboardTapListener {
     std::optional<std::u16string> lastKeyString_;
     KeyCode canceledKeyCode_ = KeyCode::None;  // its key down was swallowed, its key up will be
     ProcessSerialNumber lastProcessReceivedKeyEvent_;
+    std::uint32_t lastWindowReceivedKeyEvent_ = 0;
     bool isLastProcessReceivedKeyEventNull_ = true;
     std::deque<double> timeouts_;  // when the tap was lost, within the last minute
+    Timer nextTry_;                // after the tap was given up
 };
 
 }  // namespace plume

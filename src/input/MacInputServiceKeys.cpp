@@ -28,8 +28,7 @@ void MacInputService::mouseDown(Point location) {
     mouseDownEvent.raise(click);
 }
 
-// What is typed afterwards does not follow what was typed before.
-void MacInputService::keysWithheld() {
+void MacInputService::typingInterrupted() {
     if (active_) raiseInputContextChanged();
 }
 
@@ -42,9 +41,12 @@ void MacInputService::forgetLastKey() {
 // The keyboard's new owner is noticed at its first key.
 void MacInputService::followFrontProcess() {
     const ProcessSerialNumber front = around_.processManager.frontProcess().value_or(ProcessSerialNumber{});
-    const bool changed = !isLastProcessReceivedKeyEventNull_ && front != lastProcessReceivedKeyEvent_;
+    const std::uint32_t window = around_.processManager.frontWindow();
+    const bool changed = !isLastProcessReceivedKeyEventNull_ &&
+                         (front != lastProcessReceivedKeyEvent_ || window != lastWindowReceivedKeyEvent_);
     isLastProcessReceivedKeyEventNull_ = false;
     lastProcessReceivedKeyEvent_ = front;
+    lastWindowReceivedKeyEvent_ = window;
     if (changed) raiseInputContextChanged();
 }
 

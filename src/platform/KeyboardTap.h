@@ -34,8 +34,9 @@ class KeyboardTapListener {
     virtual bool keyboardEvent(const TapEvent& event) = 0;
     virtual void tapDisabledByTimeout() = 0;
     virtual void tapDisabledByUserInput() = 0;
-    // From here on keys go by that nobody is told of, into a password or to a program that holds the keyboard.
-    virtual void keysWithheld() {}
+    // What is typed from here on does not continue what was typed before: keys go by that nobody is told of (into a
+    // password, to a program that holds the keyboard, from a program that types), or the focus is elsewhere.
+    virtual void typingInterrupted() {}
 };
 
 class KeyboardTap {

@@ -38,6 +38,8 @@ class ProcessManager {
     virtual ProcessSerialNumber currentProcess() const = 0;
     // The process that has the keyboard, or nothing.
     virtual std::optional<ProcessSerialNumber> frontProcess() const = 0;
+    // Which of its windows has the keyboard: another number, another window; 0 when the port does not tell.
+    virtual std::uint32_t frontWindow() const { return 0; }
     // Nothing when the process is gone or is no application.
     virtual std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const = 0;
     // Asks for the process to be brought to the front; a port may take a moment to do it.

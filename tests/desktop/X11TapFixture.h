@@ -58,7 +58,7 @@ class Listener final : public KeyboardTapListener {
         if (tapToEnable) tapToEnable->enable();
     }
     void tapDisabledByUserInput() override { ADD_FAILURE() << "nobody did that"; }
-    void keysWithheld() override { ++withheld; }
+    void typingInterrupted() override { ++withheld; }
 
     std::vector<Heard> heard;
     std::function<bool(const TapEvent&)> decide;

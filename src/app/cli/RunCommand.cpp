@@ -142,7 +142,7 @@ class Run {
     void keyboardLost(KeyboardTapGivenUp& /*event*/) {
         voice_.say(
             "Listening to the keyboard was ended three times within a minute, because Plume did not answer in "
-            "time. It stays off until Plume is started again.");
+            "time. It is tried again in a minute.");
     }
 
     LinuxPort& port_;

@@ -90,10 +90,11 @@ void LinuxPort::followFocus() {
             hiddenPrompts_.userTypes();
         }
     });
-    mouseTap_->clicked = [this] {
+    // Where clicks cannot be heard, the tap says so when it is created.
+    static_cast<void>(mouseTap_->setClicked([this] {
         keyboardTap_->userClicked();
         focusMayHaveMoved();
-    };
+    }));
     processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
     tapLoop_.perform([this] { tellFrontProcess(); });
 }

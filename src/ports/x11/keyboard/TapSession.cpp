@@ -195,7 +195,7 @@ bool TapSession::mayTell() {
 bool TapSession::tellsKey(const KeyDecoder::Key& key) {
     if (key.silent) return false;
     const bool withholdsNow = !mayTell();
-    if (withholdsNow && !std::exchange(withholding_, true)) dependencies_.listener.keysWithheld();
+    if (withholdsNow && !std::exchange(withholding_, true)) dependencies_.listener.typingInterrupted();
     if (!withholdsNow) withholding_ = false;
     return !withholdsNow && !ended_;
 }

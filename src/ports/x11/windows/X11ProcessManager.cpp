@@ -135,6 +135,11 @@ std::optional<ProcessSerialNumber> X11ProcessManager::frontProcess() const {
     return frontProcess_;
 }
 
+std::uint32_t X11ProcessManager::frontWindow() const {
+    frontProcess();
+    return front_.window() != XCB_WINDOW_NONE ? front_.window() : focus_.window();
+}
+
 void X11ProcessManager::lookUp() {
     ++lookUps_;
     // First: what changes from now on makes the answer outdated, also while it is being found.

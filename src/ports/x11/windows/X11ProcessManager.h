@@ -29,6 +29,7 @@ class X11ProcessManager final : public ProcessManager {
 
     ProcessSerialNumber currentProcess() const override;
     std::optional<ProcessSerialNumber> frontProcess() const override;
+    std::uint32_t frontWindow() const override;
     std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
     void bringToFront(ProcessSerialNumber process) override;
     // X does not tell who reads the keyboard's events: always empty.
