@@ -12,7 +12,8 @@ void KeyboardPort::putTogether(const std::string& display) {
     keyboard_->listenTo(thread_.session());
     connection_ = valueOrThrow(TapConnection::open(display, *keyboard_));
     if (options_.watchdog) {
-        watchdog_ = std::make_unique<Watchdog>(loop(), display);
+        watchdog_ = std::make_unique<Watchdog>(loop(), display,
+                                               Watchdog::Shared{.tapProgress = connection_->progress().descriptor()});
         valueOrThrow(watchdog_->start());
         watchdog_->setTapWindow(connection_->window());
         connection_->setReopenedListener([this](xcb_window_t window) { watchdog_->setTapWindow(window); });

@@ -15,6 +15,7 @@
 #include "ports/x11/keyboard/XcbXkb.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/FocusCounter.h"
+#include "testing/rig/KeyWitness.h"
 #include "testing/rig/XcbReply.h"
 #include "tests/desktop/X11TapFixture.h"
 
@@ -115,6 +116,17 @@ TEST_F(X11TapTest, TellsEachModifierByItsKey) {
         EXPECT_THAT(takeHeard(2), testing::ElementsAre(Heard{Type::FlagsChanged, each.keyCode, each.flags, u""},
                                                        Heard{Type::FlagsChanged, each.keyCode, {}, u""}));
     }
+}
+
+TEST_F(X11TapTest, WhatIsSwallowedDoesNotLookLikeAModifierAlone) {
+    KeyWitness programs(rig_->server().display());
+    createTap();
+    setDecision([](const TapEvent& event) { return event.type != Type::KeyUp && event.flags.isEmpty(); });
+    rig_->keyboard().tap(Key::LeftSuper);
+    programs.awaitPress(static_cast<int>(Key::LeftControl), Bound);
+    setDecision([](const TapEvent& event) { return event.type == Type::KeyDown; });
+    rig_->keyboard().chord({Key::LeftAlt}, U'k');
+    programs.awaitPress(static_cast<int>(Key::LeftControl), Bound);
 }
 
 TEST_F(X11TapTest, HeldKeysRepeat) {
@@ -322,6 +334,7 @@ class Device {
                                      client_.atom("Device Enabled"), XCB_ATOM_INTEGER, 1, value.data());
         client_.focusedWindow();
     }
+    std::uint16_t id() const { return now().id; }
     // It hangs on no master as long as somebody has taken it.
     bool isTaken() const { return now().type == XCB_INPUT_DEVICE_TYPE_FLOATING_SLAVE; }
 
@@ -357,11 +370,33 @@ TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThat
     EXPECT_THAT(heard, testing::ElementsAre(Heard{Type::KeyDown, KeyCode::B, {}, u"b"},
                                             Heard{Type::KeyUp, KeyCode::B, {}, u"b"}));
 
+    // Each has a layout of its own, and keeps it.
+    const auto layout = [&](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), "setxkbmap");
+        EXPECT_EQ(rig.session().start(arguments, "x11-xkb-utils")->waitForExit(Bound), 0);
+    };
+    layout({"-device", std::to_string(second.id()), "de"});
+    std::string expected = "b";
+    const auto typeOnBoth = [&] {
+        for (int i = 0; i < 2; ++i) {
+            rig.keyboard().type("y");
+            EXPECT_EQ(target->awaitText(expected += 'y'), expected);
+            for (const bool down : {true, false}) keys.sendKey(29, down);
+            EXPECT_EQ(target->awaitText(expected += 'z'), expected);
+        }
+    };
+    typeOnBoth();
+    EXPECT_THAT(tap.run([&] { return listener.heard.back(); }), (Heard{Type::KeyUp, KeyCode::Y, {}, u"z"}));
+    tap.run([&] { tap.tap->remove(); });
+    typeOnBoth();
+    ASSERT_TRUE(tap.run([&] { return tap.tap->create(listener, false); }).ok());
+    typeOnBoth();
+
     keys.sendKey(50, true);  // Shift
     keys.sync();
     second.set(false);
     rig.keyboard().type("c");
-    EXPECT_EQ(target->awaitText("bc"), "bc");
+    EXPECT_EQ(target->awaitText(expected + "c"), expected + "c");
 }
 
 }  // namespace

@@ -156,6 +156,23 @@ TEST_F(X11WatchdogTest, AStoppedProgramLosesTheKeyboardAndTakesItAgainWhenContin
     expectEnded();
 }
 
+TEST_F(X11WatchdogTest, KeysTypedWhileItDoesNotAnswerArriveOnce) {
+    const std::string text = "Never lost, in this order: 1234567890.";
+    const auto expectOnce = [&](const std::string& typed) {
+        EXPECT_EQ(target_->awaitText(typed), typed);
+        kill(program_->pid(), SIGCONT);
+        EXPECT_TRUE(waitUntil([&] { return timesIn(contentOf(report_), "disabled") > 0; }));
+        EXPECT_EQ(target_->text(), typed);
+        awaitSwallowing();
+    };
+    rig_->keyboard().type("x");
+    EXPECT_EQ(target_->awaitText("x"), "x");
+    stopProgram();
+    rig_->keyboard().type(text);
+    expectOnce("x" + text);
+    expectEnded();
+}
+
 TEST_F(X11WatchdogTest, AHangingListenerLosesTheKeyboardAndTakesItAgain) {
     for (int i = 1; i <= tries(); ++i) {
         rig_->keyboard().press(Key::LeftShift);

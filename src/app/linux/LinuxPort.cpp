@@ -49,7 +49,8 @@ Result<void> LinuxPort::begin(const std::string& display) {
 Result<void> LinuxPort::openKeyboard(const std::string& display) {
     if (auto opened = keep(XkbKeyboard::open(session_->connection()), keyboard_); !opened) return opened;
     if (auto opened = keep(TapConnection::open(display, *keyboard_), tapConnection_); !opened) return opened;
-    watchdog_ = std::make_unique<Watchdog>(tapLoop_, display, std::string(), clipboardCopy_.descriptor());
+    watchdog_ = std::make_unique<Watchdog>(
+        tapLoop_, display, Watchdog::Shared{clipboardCopy_.descriptor(), tapConnection_->progress().descriptor()});
     keyboardTap_ = std::make_unique<X11KeyboardTap>(tapLoop_, *tapConnection_, *keyboard_);
     poster_ = std::make_unique<X11EventPoster>(tapLoop_, *tapConnection_, *keyboard_, *keyboardTap_);
     return {};

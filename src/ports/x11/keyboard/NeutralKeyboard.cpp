@@ -1,17 +1,13 @@
 #include "ports/x11/keyboard/NeutralKeyboard.h"
 
-#include <algorithm>
-
 #include "ports/x11/keyboard/XcbXkb.h"
 
 namespace plume {
 
 namespace {
 
-// By convention; the server knows these only by number.
-constexpr std::uint8_t AltModifier = XCB_MOD_MASK_1;
+// By convention; the server knows it only by number.
 constexpr std::uint8_t NumLockModifier = XCB_MOD_MASK_2;
-constexpr std::uint8_t SuperModifier = XCB_MOD_MASK_4;
 
 }  // namespace
 
@@ -26,7 +22,7 @@ NeutralKeyboard::NeutralKeyboard(TapConnection& connection, const XkbKeymap& key
 NeutralKeyboard::~NeutralKeyboard() {
     if (lockedModifiers_ != 0) lock(lockedModifiers_, 0);
     for (const xcb_keycode_t keycode : heldModifiers_) connection_.sendKey(keycode, true);
-    keepMenusClosed();
+    connection_.keepMenusClosed();
 }
 
 void NeutralKeyboard::releaseKeys() {
@@ -39,7 +35,7 @@ void NeutralKeyboard::releaseKeys() {
         keys.push_back(keycode);
         if (keymap_.modifiersOf(keycode) != 0 && connection_.userKeys[i]) heldModifiers_.push_back(keycode);
     }
-    keepMenusClosed();
+    connection_.keepMenusClosed();
     for (const xcb_keycode_t keycode : keys) connection_.sendKey(keycode, false);
 }
 
@@ -57,18 +53,6 @@ void NeutralKeyboard::readState() {
 void NeutralKeyboard::lock(std::uint8_t modifiers, std::uint8_t spentLatches) {
     xcb_xkb_latch_lock_state(connection_.connection().get(), XCB_XKB_ID_USE_CORE_KBD, lockedModifiers_, modifiers, 0, 0,
                              spentLatches, 0, 0);
-}
-
-// Alt or Super pressed and released with nothing in between opens a menu or an overview: a Control in between keeps
-// them shut, and does nothing by itself.
-void NeutralKeyboard::keepMenusClosed() {
-    const bool opens = std::ranges::any_of(heldModifiers_, [this](xcb_keycode_t keycode) {
-        return (keymap_.modifiersOf(keycode) & (AltModifier | SuperModifier)) != 0;
-    });
-    const xcb_keycode_t control = keymap_.keyOfModifier(XCB_MOD_MASK_CONTROL);
-    if (!opens || control == 0 || connection_.keysDown()[control]) return;
-    connection_.sendKey(control, true);
-    connection_.sendKey(control, false);
 }
 
 }  // namespace plume

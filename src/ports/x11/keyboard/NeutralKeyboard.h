@@ -31,7 +31,6 @@ class NeutralKeyboard {
     void releaseKeys();
     void readState();
     void lock(std::uint8_t modifiers, std::uint8_t spentLatches);
-    void keepMenusClosed();
 
     TapConnection& connection_;
     const XkbKeymap& keymap_;

@@ -89,6 +89,7 @@ Result<void> TapConnection::reopen() {
     connection_ = std::move(connection).value();
     keysDown_.reset();
     userKeys.reset();
+    progress_.begin();
     if (auto begun = begin(); !begun) return begun;
     keysDown_ = keysDownOn(*connection_, testKeyboard_);
     releaseAll();
@@ -111,6 +112,17 @@ std::uint8_t TapConnection::modifiersDown() const {
             static_cast<std::uint8_t>(modifiers | keyboard_.keymap()->modifiersOf(static_cast<xcb_keycode_t>(i)));
     }
     return modifiers;
+}
+
+void TapConnection::keepMenusClosed() {
+    // By convention; the server knows these only by number.
+    constexpr std::uint8_t Alt = XCB_MOD_MASK_1;
+    constexpr std::uint8_t Super = XCB_MOD_MASK_4;
+    const std::uint8_t down = modifiersDown();
+    const xcb_keycode_t control = keyboard_.keymap()->keyOfModifier(XCB_MOD_MASK_CONTROL);
+    if ((down & (Alt | Super)) == 0 || (down & XCB_MOD_MASK_CONTROL) != 0 || control == 0) return;
+    sendKey(control, true);
+    sendKey(control, false);
 }
 
 void TapConnection::releaseAll() {

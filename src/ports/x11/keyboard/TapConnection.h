@@ -15,6 +15,7 @@
 
 #include "Foundation/Result.h"
 #include "ports/x11/XcbConnection.h"
+#include "ports/x11/keyboard/TapProgress.h"
 #include "ports/x11/keyboard/XkbKeyboard.h"
 
 namespace plume {
@@ -53,6 +54,12 @@ class TapConnection {
     const KeycodeSet& keysDown() const { return keysDown_; }
     std::uint8_t modifiersDown() const;
     void releaseAll();
+    // Alt or Super pressed and released with nothing in between opens a menu or an overview. While one of them is down,
+    // this keeps them shut by pressing and releasing Control, which does nothing by itself.
+    void keepMenusClosed();
+
+    // How far the tap has come; nothing is handled at the start and after reopen().
+    TapProgress& progress() { return progress_; }
 
     // The keys that the user holds on the keyboards the tap has; filled by the tap while it hears them.
     KeycodeSet userKeys;
@@ -71,6 +78,7 @@ class TapConnection {
     std::uint16_t masterKeyboard_ = 0;
     std::uint16_t testKeyboard_ = 0;
     KeycodeSet keysDown_;
+    TapProgress progress_;
     std::function<void(xcb_window_t)> reopened_;
 };
 

@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <utility>
 
-#include "ports/x11/keyboard/KeymapCopy.h"
 #include "ports/x11/keyboard/X11KeyCodes.h"
 
 namespace plume {
@@ -20,23 +19,30 @@ KeyCode modifierKeyOf(EventFlags flags) {
     return KeyCode::Command;
 }
 
+bool isRepeat(const xcb_input_key_press_event_t& key) {
+    return (key.flags & XCB_INPUT_KEY_EVENT_FLAGS_KEY_REPEAT) != 0;
+}
+
 }  // namespace
 
 TapSession::TapSession(Dependencies dependencies)
     : dependencies_(std::move(dependencies)),
       keyboards_(dependencies_.connection),
+      keymaps_(dependencies_.connection, dependencies_.keyboard),
       grabCheck_(std::make_unique<KeyboardGrabCheck>(dependencies_.connection)) {}
 
 Result<void> TapSession::begin() {
     TapConnection& connection = dependencies_.connection;
-    if (!copyKeymapAtStart()) {
+    const auto typedOn = typedOnLast();
+    if (typedOn && !keymaps_.use(*typedOn)) {
         return Error{"The X server of display \"" + connection.connection().displayName() +
                      "\" refuses to give the keyboard's layout to its XTEST keyboard; without that, keys that Plume "
                      "passes on would come out wrong. Does setxkbmap with your layout help?"};
     }
     if (auto grabbed = keyboards_.grab(); !grabbed) return grabbed;
+    for (const std::uint16_t device : keyboards_.grabbed()) keymaps_.add(device);
     connection.userKeys = keyboards_.keysDown();
-    decoder_.setKeymap(dependencies_.keyboard.keymap(), connection.userKeys, dependencies_.keyboard.locks());
+    decoder_.setKeymap(keymaps_.current(), connection.userKeys, dependencies_.keyboard.locks());
     selectHierarchyEvents();
     grabCheck_->ask(dependencies_.loop.now());
     connection.connection().sync();
@@ -44,11 +50,11 @@ Result<void> TapSession::begin() {
     return {};
 }
 
-bool TapSession::copyKeymapAtStart() const {
+// The keyboard that was typed on last, where the server still knows it.
+std::optional<std::uint16_t> TapSession::typedOnLast() const {
     const TapConnection& connection = dependencies_.connection;
     const auto keyboards = HardwareKeyboards::list(connection);
-    if (keyboards.empty()) return true;
-    // The one that was typed on last, where the server still knows it.
+    if (keyboards.empty()) return std::nullopt;
     std::uint16_t typedOn = keyboards.front().id;
     for (const InputDevice& device : inputDevices(connection.connection())) {
         if (device.id != connection.masterKeyboard()) continue;
@@ -56,8 +62,14 @@ bool TapSession::copyKeymapAtStart() const {
             typedOn = device.keySource;
         }
     }
-    const std::array to{connection.testKeyboard()};
-    return copyKeymap(connection.connection().displayName(), typedOn, to);
+    return typedOn;
+}
+
+void TapSession::typeOn(std::uint16_t device) {
+    const auto before = keymaps_.current();
+    keymaps_.use(device);
+    if (keymaps_.current() == before) return;
+    decoder_.setKeymap(keymaps_.current(), dependencies_.connection.userKeys, dependencies_.keyboard.locks());
 }
 
 void TapSession::selectHierarchyEvents() const {
@@ -91,7 +103,7 @@ void TapSession::end() {
 
 void TapSession::passOnUnheard() {
     TapConnection& connection = dependencies_.connection;
-    if (waiting_) connection.sendKey(waiting_->keycode, waiting_->down);
+    if (waiting_) send(*waiting_);
     while (const auto event = nextEvent()) {
         const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(*event);
         if (!isKey(*event)) continue;
@@ -144,15 +156,26 @@ bool TapSession::isForWindowManager(const xcb_generic_event_t& event) const {
 }
 
 void TapSession::handle(const xcb_generic_event_t& event) {
-    const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(event);
     if (isInput(event, XCB_INPUT_HIERARCHY)) {
         handleHierarchy(reinterpret_cast<const xcb_input_hierarchy_event_t&>(event));
     }
-    if (!isKey(event)) return;
+    keymaps_.hear(event);
+    // What came before the connection was ended has been passed on by whoever did that.
+    TapProgress& progress = dependencies_.connection.progress();
+    if (!isKey(event) || progress.isTakenOver()) return;
+    const auto& key = reinterpret_cast<const xcb_input_key_press_event_t&>(event);
+    if (isRepeat(key)) return handleKey(key);
+    const KeyMoment moment = moments_.next(key.time);
+    handleKey(key);
+    progress.setHandled(moment);
+}
+
+void TapSession::handleKey(const xcb_input_key_press_event_t& key) {
     const auto keycode = static_cast<xcb_keycode_t>(key.detail);
     if (key.event_type == XCB_INPUT_KEY_PRESS) {
         devices_[keycode] = key.deviceid;
-        press(keycode, (key.flags & XCB_INPUT_KEY_EVENT_FLAGS_KEY_REPEAT) != 0);
+        if (!keymaps_.isInUse(key.deviceid)) typeOn(key.deviceid);
+        press(keycode, isRepeat(key));
     } else {
         release(keycode);
     }
@@ -175,9 +198,12 @@ void TapSession::handleHierarchy(const xcb_input_hierarchy_event_t& event) {
     for (int i = 0; i < xcb_input_hierarchy_infos_length(&event); ++i) {
         if ((infos[i].flags & Went) == 0) continue;
         keyboards_.forget(infos[i].deviceid);
+        keymaps_.remove(infos[i].deviceid);
         releaseKeysOf(infos[i].deviceid);
     }
-    if ((event.flags & Came) != 0) keyboards_.grabNew();
+    if ((event.flags & Came) == 0) return;
+    keyboards_.grabNew();
+    for (const std::uint16_t device : keyboards_.grabbed()) keymaps_.add(device);
 }
 
 void TapSession::releaseKeysOf(std::uint16_t device) {
@@ -213,6 +239,7 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
         if (!ended_) swallow = tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyDown);
     }
     if (ended_) return;
+    swallowed_ = swallow;
     if (swallow) {
         decoder_.undoLocks();
         // A repeat of a key that was passed on: let go of it, or it would go on repeating.
@@ -226,15 +253,16 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
 void TapSession::release(xcb_keycode_t keycode) {
     const KeyDecoder::Key key = decoder_.release(keycode);
     dependencies_.connection.userKeys.reset(keycode);
+    bool isHotKey = false;
     if (told_[keycode]) {
         told_.reset(keycode);
-        tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyUp);
+        isHotKey = tell(key, key.modifier ? TapEvent::Type::FlagsChanged : TapEvent::Type::KeyUp) && key.modifier;
         if (ended_) return;
     }
     // Swallowed, or let go of meanwhile: no program has it down. What went down before the tap came has to come up.
     const bool isUp = seen_[keycode] && !dependencies_.connection.keysDown()[keycode];
     seen_.reset(keycode);
-    if (!isUp) inject({keycode, false});
+    if (!isUp) inject({keycode, false, isHotKey || (key.modifier && swallowed_)});
 }
 
 void TapSession::tellMissedModifiers(EventFlags flags) {
@@ -256,6 +284,11 @@ void TapSession::inject(Injection injection) {
         waiting_ = injection;
         return;
     }
+    send(injection);
+}
+
+void TapSession::send(Injection injection) {
+    if (injection.keepsMenusClosed) dependencies_.connection.keepMenusClosed();
     dependencies_.connection.sendKey(injection.keycode, injection.down);
 }
 
@@ -291,10 +324,8 @@ void TapSession::release() {
 void TapSession::keyboardChanged(XkbKeyboard::Change change) {
     if (change == XkbKeyboard::Change::Locks) decoder_.adopt(dependencies_.keyboard.locks());
     if (change != XkbKeyboard::Change::Keymap) return;
-    // The server gave the new layout to every keyboard but those that are grabbed.
-    const TapConnection& connection = dependencies_.connection;
-    copyKeymap(connection.connection().displayName(), connection.testKeyboard(), keyboards_.grabbed());
-    decoder_.setKeymap(dependencies_.keyboard.keymap(), connection.userKeys, dependencies_.keyboard.locks());
+    keymaps_.coreChanged();
+    decoder_.setKeymap(keymaps_.current(), dependencies_.connection.userKeys, dependencies_.keyboard.locks());
 }
 
 }  // namespace plume

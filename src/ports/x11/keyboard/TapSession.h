@@ -17,6 +17,7 @@
 
 #include "platform/KeyboardTap.h"
 #include "ports/posix/PollRunLoop.h"
+#include "ports/x11/keyboard/DeviceKeymaps.h"
 #include "ports/x11/keyboard/HardwareKeyboards.h"
 #include "ports/x11/keyboard/KeyDecoder.h"
 #include "ports/x11/keyboard/KeyboardGrabCheck.h"
@@ -33,7 +34,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     struct Dependencies {
         PollRunLoop& loop;
         TapConnection& connection;
-        const XkbKeyboard& keyboard;
+        XkbKeyboard& keyboard;
         KeyboardTapListener& listener;
         const std::function<bool()>& focusIsPassword;  // may be empty
         const UserTyped& userTyped;                    // may be empty
@@ -62,9 +63,11 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     struct Injection {
         xcb_keycode_t keycode;
         bool down;
+        bool keepsMenusClosed = false;  // what the listener swallowed would otherwise look like this key alone
     };
 
-    bool copyKeymapAtStart() const;
+    std::optional<std::uint16_t> typedOnLast() const;
+    void typeOn(std::uint16_t device);
     void selectHierarchyEvents() const;
     void addSource();
     void passOnUnheard();
@@ -75,6 +78,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;
     bool isKey(const xcb_generic_event_t& event) const;
     void handle(const xcb_generic_event_t& event);
+    void handleKey(const xcb_input_key_press_event_t& key);
     void askForGrabs();
     void handleHierarchy(const xcb_input_hierarchy_event_t& event);
     void press(xcb_keycode_t keycode, bool repeated);
@@ -85,9 +89,11 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void tellMissedModifiers(EventFlags flags);
     bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
     void inject(Injection injection);
+    void send(Injection injection);
 
     Dependencies dependencies_;
     HardwareKeyboards keyboards_;
+    DeviceKeymaps keymaps_;
     KeyDecoder decoder_;
     std::unique_ptr<KeyboardGrabCheck> grabCheck_;
     int descriptor_ = -1;
@@ -97,6 +103,9 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     KeycodeSet told_;                           // those of them that the listener was told of
     std::array<std::uint16_t, 256> devices_{};  // that a key went down on
     bool withholding_ = false;                  // the latest key went by untold
+    bool swallowed_ = false;                    // the latest key that went down was swallowed
+
+    KeyMoments moments_;
 
     bool held_ = false;
     std::optional<Injection> waiting_;

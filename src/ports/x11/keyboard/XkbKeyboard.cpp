@@ -55,7 +55,7 @@ bool XkbKeyboard::begin() {
     context_.reset(xkb_context_new(XKB_CONTEXT_NO_FLAGS));
     if (device_ < 0 || !context_) return false;
     selectEvents();
-    keymap_ = readKeymap();
+    keymap_ = keymapOf(device_);
     if (!keymap_) return false;
     readState();
     readLayoutName();
@@ -86,9 +86,9 @@ KeycodeSet XkbKeyboard::foreignKeycodes(xkb_keymap* keymap) const {
     return foreign;
 }
 
-std::shared_ptr<const XkbKeymap> XkbKeyboard::readKeymap() const {
+std::shared_ptr<const XkbKeymap> XkbKeyboard::keymapOf(std::int32_t device) const {
     XkbOwned<xkb_keymap> keymap(
-        xkb_x11_keymap_new_from_device(context_.get(), connection_.get(), device_, XKB_KEYMAP_COMPILE_NO_FLAGS));
+        xkb_x11_keymap_new_from_device(context_.get(), connection_.get(), device, XKB_KEYMAP_COMPILE_NO_FLAGS));
     if (!keymap) return nullptr;
     const KeycodeSet foreign = foreignKeycodes(keymap.get());
     return std::make_shared<const XkbKeymap>(std::move(keymap), foreign);
@@ -147,18 +147,18 @@ void XkbKeyboard::handleEvent(const xcb_generic_event_t& event) {
         case XCB_XKB_MAP_NOTIFY: {
             const auto& change = reinterpret_cast<const xcb_xkb_map_notify_event_t&>(event);
             const bool own = isOwnChange(change.firstKeySym, change.nKeySyms);
-            if (!own && !happenedBefore(event, lastRead_)) keymapChanged();
+            if (!own && !happenedBefore(event, lastRead_)) readAgain();
             break;
         }
         default:
-            if (!happenedBefore(event, lastRead_)) keymapChanged();
+            if (!happenedBefore(event, lastRead_)) readAgain();
     }
 }
 
-void XkbKeyboard::keymapChanged() {
+void XkbKeyboard::readAgain() {
     // One change is told several times; all that came before this reading is in it.
     lastRead_ = xcb_no_operation(connection_.get()).sequence;
-    auto keymap = readKeymap();
+    auto keymap = keymapOf(device_);
     if (!keymap || keymap->fingerprint() == keymap_->fingerprint()) return;
     keymap_ = std::move(keymap);
     readState();

@@ -53,6 +53,11 @@ class XkbKeyboard {
     // layout itself, or empty.
     const std::string& layoutName() const { return layoutName_; }
 
+    // The layout of a single keyboard, nothing when it has none. Waits for the server.
+    std::shared_ptr<const XkbKeymap> keymapOf(std::int32_t device) const;
+    // Reads the layout now, before the server's events of its change are handled.
+    void readAgain();
+
     // Raised after the change.
     ZDEvent<const Change> changedEvent;
 
@@ -70,12 +75,10 @@ class XkbKeyboard {
 
     bool begin();
     void selectEvents() const;
-    std::shared_ptr<const XkbKeymap> readKeymap() const;
     KeycodeSet foreignKeycodes(xkb_keymap* keymap) const;
     void readState();
     void readLayoutName();
     void handleEvent(const xcb_generic_event_t& event);
-    void keymapChanged();
     void stateChanged(const xcb_generic_event_t& event);
     bool isOwnChange(xcb_keycode_t first, std::uint8_t count);
 

@@ -32,14 +32,25 @@ std::string programBesideThisOne() {
 }
 
 // How the child differs from Plume: its socket, a group of its own, so that what a terminal sends to Plume's group does
-// not end it first, no signal blocked or ignored, no other descriptor but the clipboard's.
-int spawn(const std::string& program, const std::string& display, int socket, int clipboard, pid_t& process) {
+// not end it first, no signal blocked or ignored, no other descriptor but
+// those that are shared.
+int spawn(const std::string& program, const std::string& display, int socket, Watchdog::Shared shared, pid_t& process) {
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
     posix_spawn_file_actions_adddup2(&actions, socket, WatchdogSocket);
     posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
-    if (clipboard >= 0) posix_spawn_file_actions_adddup2(&actions, clipboard, WatchdogClipboard);
-    posix_spawn_file_actions_addclosefrom_np(&actions, clipboard >= 0 ? WatchdogClipboard + 1 : WatchdogClipboard);
+    // A copy that lies where the other cannot be put over it.
+    const FileDescriptor progress(fcntl(shared.tapProgress, F_DUPFD_CLOEXEC, WatchdogTapProgress + 1));
+    const std::pair<int, int> inherited[] = {{shared.clipboard, WatchdogClipboard},
+                                             {progress.get(), WatchdogTapProgress}};
+    for (const auto& [from, to] : inherited) {
+        if (from >= 0) {
+            posix_spawn_file_actions_adddup2(&actions, from, to);
+        } else {
+            posix_spawn_file_actions_addclose(&actions, to);
+        }
+    }
+    posix_spawn_file_actions_addclosefrom_np(&actions, WatchdogTapProgress + 1);
     posix_spawnattr_t attributes;
     posix_spawnattr_init(&attributes);
     sigset_t signals;
@@ -60,11 +71,8 @@ int spawn(const std::string& program, const std::string& display, int socket, in
 
 }  // namespace
 
-Watchdog::Watchdog(PollRunLoop& loop, std::string display, std::string program, int clipboard)
-    : loop_(loop),
-      display_(std::move(display)),
-      program_(program.empty() ? programBesideThisOne() : std::move(program)),
-      clipboard_(clipboard) {}
+Watchdog::Watchdog(PollRunLoop& loop, std::string display, Shared shared)
+    : loop_(loop), display_(std::move(display)), program_(programBesideThisOne()), shared_(shared) {}
 
 Watchdog::~Watchdog() {
     source_.end();
@@ -82,7 +90,7 @@ Result<void> Watchdog::start() {
     starts_.push_back(loop_.now());
     // It finds the window waiting, should Plume be stopped before it gets any further.
     sendWatchdogMessage(mine.get(), {WatchdogMessage::Type::TapWindow, tapWindow_});
-    const int code = spawn(program_, display_, theirs.get(), clipboard_, process_);
+    const int code = spawn(program_, display_, theirs.get(), shared_, process_);
     if (code != 0) {
         process_ = 0;
         return Error{"the watchdog " + program_ + " cannot be started: " + std::generic_category().message(code)};

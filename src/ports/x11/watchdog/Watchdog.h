@@ -1,12 +1,13 @@
 // Plume's side of the watchdog: a process of its own that frees the keyboard when Plume no longer can.
 //
 // While Plume has a keyboard tap, every key goes through the tap thread; were that thread stopped, hung or looping,
-// the user's keyboard would have no effect. The watchdog hears on a connection of its own that a key went down (not
-// which one it was, and it keeps nothing), and then asks the tap thread four times a second whether it is alive,
-// until ten seconds of that are over and the next key starts it anew: while nobody types, nothing wakes up. When an
-// answer does not come within 0.6 s, or when Plume ends with the keyboard held, the watchdog has the X server end
-// the tap's connection, which gives the keyboard back to the programs, and releases the keys that the tap left
-// pressed. A tap that finds its connection gone takes the keyboard again when it is alive.
+// the user's keyboard would have no effect. The watchdog hears on a connection of its own that a key went down, and
+// then asks the tap thread four times a second whether it is alive, until ten seconds of that are over and the next key
+// starts it anew: while nobody types, nothing wakes up. When an answer does not come within 0.6 s, or when Plume ends
+// with the keyboard held, the watchdog has the X server end the tap's connection, which gives the keyboard back to the
+// programs, passes on the keys that the tap has not handled, and releases those that the tap left pressed. It keeps
+// keys no longer than until it sees that the tap has handled them. A tap that finds its connection gone takes the
+// keyboard again when it is alive.
 //
 // The answer comes from a source of the tap thread's run loop, so that a thread that does not get there does not
 // answer. The process ends by itself as soon as Plume has ended, in whatever way; it leaves a ClipboardKeeper behind
@@ -28,9 +29,15 @@ namespace plume {
 
 class Watchdog {
   public:
-    // The loop outlives the watchdog. An empty display means $DISPLAY, an empty program the one called plume-watchdog
-    // beside this program. `clipboard` is the descriptor of the SharedClipboardCopy that it inherits, -1 for none.
-    Watchdog(PollRunLoop& loop, std::string display, std::string program = {}, int clipboard = -1);
+    // The descriptors of what Plume shares with the process, -1 for none.
+    struct Shared {
+        int clipboard = -1;    // the SharedClipboardCopy
+        int tapProgress = -1;  // the TapProgress; without it no keys are passed on
+    };
+
+    // The loop outlives the watchdog. An empty display means $DISPLAY. The program is called plume-watchdog and lies
+    // beside this program.
+    Watchdog(PollRunLoop& loop, std::string display, Shared shared);
     // Ends the process, which frees the keyboard if there still is a tap.
     ~Watchdog();
     Watchdog(const Watchdog&) = delete;
@@ -58,7 +65,7 @@ class Watchdog {
     PollRunLoop& loop_;
     const std::string display_;
     const std::string program_;
-    const int clipboard_;
+    const Shared shared_;
     FileDescriptor socket_;
     pid_t process_ = 0;
     std::uint32_t tapWindow_ = 0;

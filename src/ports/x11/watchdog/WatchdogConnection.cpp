@@ -3,11 +3,31 @@
 #include <xcb/xinput.h>
 #include <xcb/xtest.h>
 
+#include <algorithm>
+#include <chrono>
 #include <utility>
 
-#include "ports/x11/keyboard/InputDevices.h"
-
 namespace plume {
+
+namespace {
+
+constexpr std::uint32_t KeyEvents = XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS | XCB_INPUT_XI_EVENT_MASK_RAW_KEY_RELEASE;
+// More is not typed before Plume is given up. A key that is older, in seconds, was not held by the tap.
+constexpr std::size_t MostKeys = 512;
+constexpr double LongestMemory = 4;
+
+double monotonicTime() {
+    return std::chrono::duration<double>(std::chrono::steady_clock::now().time_since_epoch()).count();
+}
+
+// A keyboard that people type on, whoever has it.
+bool isHardware(const InputDevice& device) {
+    const bool slave =
+        device.type == XCB_INPUT_DEVICE_TYPE_SLAVE_KEYBOARD || device.type == XCB_INPUT_DEVICE_TYPE_FLOATING_SLAVE;
+    return slave && device.keySource != 0 && !device.isTestKeyboard();
+}
+
+}  // namespace
 
 Result<std::unique_ptr<WatchdogConnection>> WatchdogConnection::open(const std::string& display) {
     auto opened = XcbConnection::open(display);
@@ -27,30 +47,91 @@ Result<std::unique_ptr<WatchdogConnection>> WatchdogConnection::open(const std::
 }
 
 void WatchdogConnection::listen(bool on) {
-    struct {
-        xcb_input_event_mask_t header;
-        std::uint32_t events;
-    } const mask{{XCB_INPUT_DEVICE_ALL, 1}, on ? std::uint32_t{XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS} : 0U};
-    xcb_input_xi_select_events(connection_->get(), connection_->root(), 1, &mask.header);
+    listening_ = on;
+    keys_.clear();
+    select(XCB_INPUT_DEVICE_ALL, on ? std::uint32_t{XCB_INPUT_XI_EVENT_MASK_HIERARCHY} : 0U);
+    selectKeys(on ? KeyEvents : 0U);
     connection_->sync();
 }
 
-bool WatchdogConnection::takeKey() {
-    bool heard = false;
-    while (const auto event = connection_->pollEvent()) {
-        const auto& generic = reinterpret_cast<const xcb_ge_generic_event_t&>(*event);
-        heard = heard || ((generic.response_type & 0x7F) == XCB_GE_GENERIC && generic.extension == inputOpcode_ &&
-                          generic.event_type == XCB_INPUT_RAW_KEY_PRESS);
+// Each keyboard by itself: what the tap presses is not to be told.
+void WatchdogConnection::selectKeys(std::uint32_t events) {
+    for (const InputDevice& device : inputDevices(*connection_)) {
+        if (isHardware(device)) select(device.id, events);
     }
-    return heard;
 }
 
-void WatchdogConnection::freeKeyboard(xcb_window_t window) {
-    xcb_kill_client(connection_->get(), window);
+void WatchdogConnection::select(std::uint16_t device, std::uint32_t events) {
+    struct {
+        xcb_input_event_mask_t header;
+        std::uint32_t events;
+    } const mask{{device, 1}, events};
+    xcb_input_xi_select_events(connection_->get(), connection_->root(), 1, &mask.header);
+}
+
+bool WatchdogConnection::takeKeys(const TapProgress& progress) {
+    bool wentDown = false;
+    while (const auto event = connection_->pollEvent()) {
+        const auto& raw = reinterpret_cast<const xcb_input_raw_key_press_event_t&>(*event);
+        if ((raw.response_type & 0x7F) != XCB_GE_GENERIC || raw.extension != inputOpcode_ || !listening_) continue;
+        if (raw.event_type == XCB_INPUT_HIERARCHY) {
+            selectKeys(KeyEvents);
+            connection_->flush();
+            continue;
+        }
+        const bool down = raw.event_type == XCB_INPUT_RAW_KEY_PRESS;
+        wentDown = wentDown || down;
+        remember({moments_.next(raw.time), monotonicTime(), event->full_sequence, raw.deviceid,
+                  static_cast<std::uint8_t>(raw.detail), down});
+    }
+    while (!keys_.empty() && progress.hasHandled(keys_.front().moment)) keys_.pop_front();
+    return wentDown;
+}
+
+void WatchdogConnection::remember(const Key& key) {
+    while (!keys_.empty() && (keys_.size() >= MostKeys || key.heardAt - keys_.front().heardAt > LongestMemory)) {
+        keys_.pop_front();
+    }
+    keys_.push_back(key);
+}
+
+void WatchdogConnection::freeKeyboard(xcb_window_t window, TapProgress& progress) {
+    const std::vector<std::uint16_t> devices = heldKeyboards();
+    progress.takeOver();
+    const unsigned freed = xcb_kill_client(connection_->get(), window).sequence;
+    connection_->sync();
+    passOn(devices, freed, progress);
     for (const InputDevice& device : inputDevices(*connection_)) {
         if (device.isTestKeyboard()) releaseKeysOf(device.id);
     }
     connection_->sync();
+}
+
+// What came after the tap's connection was ended went to the programs by itself, and so did the keys of keyboards that
+// the tap did not have, or still have another owner.
+void WatchdogConnection::passOn(const std::vector<std::uint16_t>& devices, unsigned freed,
+                                const TapProgress& progress) {
+    takeKeys(progress);
+    const std::vector<std::uint16_t> stillHeld = heldKeyboards();
+    const double now = monotonicTime();
+    for (const Key& key : keys_) {
+        const bool wasHeld = std::ranges::find(devices, key.device) != devices.end() &&
+                             std::ranges::find(stillHeld, key.device) == stillHeld.end();
+        const bool before = static_cast<std::int32_t>(key.sequence - freed) < 0;
+        if (!wasHeld || !before || now - key.heardAt > LongestMemory) continue;
+        xcb_test_fake_input(connection_->get(), key.down ? XCB_KEY_PRESS : XCB_KEY_RELEASE, key.keycode,
+                            XCB_CURRENT_TIME, connection_->root(), 0, 0, 0);
+    }
+    keys_.clear();
+}
+
+// A keyboard that somebody has taken hangs on no master.
+std::vector<std::uint16_t> WatchdogConnection::heldKeyboards() const {
+    std::vector<std::uint16_t> held;
+    for (const InputDevice& device : inputDevices(*connection_)) {
+        if (device.type == XCB_INPUT_DEVICE_TYPE_FLOATING_SLAVE) held.push_back(device.id);
+    }
+    return held;
 }
 
 void WatchdogConnection::releaseKeysOf(std::uint16_t device) {

@@ -3,9 +3,13 @@
 
 #include <xcb/xcb.h>
 
+#include <deque>
 #include <memory>
+#include <vector>
 
 #include "ports/x11/XcbConnection.h"
+#include "ports/x11/keyboard/InputDevices.h"
+#include "ports/x11/keyboard/TapProgress.h"
 
 namespace plume {
 
@@ -17,24 +21,42 @@ class WatchdogConnection {
     int descriptor() const { return connection_->descriptor(); }
     bool isBroken() const { return connection_->isBroken(); }
 
-    // From the return of this on, every key that goes down, on any keyboard and whoever holds it, is heard or no longer
-    // heard. Waits for the server.
+    // From the return of this on, every key of every keyboard, whoever holds it, is heard or no longer heard. Waits for
+    // the server.
     void listen(bool on);
-    // Whether a key went down since the last call. Which one it was is not looked at.
-    bool takeKey();
+    // Whether a key went down since the last call. Those that the tap has not handled are remembered.
+    bool takeKeys(const TapProgress& progress);
 
-    // Ends the connection that made the window, if there still is one, and releases every key that is pressed on the
-    // keyboard through which programs press keys: pressed by the tap, they would repeat for ever.
-    void freeKeyboard(xcb_window_t window);
+    // Ends the connection that made the window, if there still is one. Types the keys that it has held without handling
+    // them, and releases every key that is pressed on the keyboard through which programs press keys: pressed by the
+    // tap, they would repeat for ever.
+    void freeKeyboard(xcb_window_t window, TapProgress& progress);
 
   private:
+    struct Key {
+        KeyMoment moment;
+        double heardAt = 0;     // seconds
+        unsigned sequence = 0;  // the last of our requests before it
+        std::uint16_t device = 0;
+        std::uint8_t keycode = 0;
+        bool down = false;
+    };
+
     WatchdogConnection(std::unique_ptr<XcbConnection> connection, std::uint8_t inputOpcode)
         : connection_(std::move(connection)), inputOpcode_(inputOpcode) {}
 
+    void select(std::uint16_t device, std::uint32_t events);
+    void selectKeys(std::uint32_t events);
+    void remember(const Key& key);
+    void passOn(const std::vector<std::uint16_t>& devices, unsigned freed, const TapProgress& progress);
+    std::vector<std::uint16_t> heldKeyboards() const;
     void releaseKeysOf(std::uint16_t device);
 
     std::unique_ptr<XcbConnection> connection_;
     const std::uint8_t inputOpcode_;
+    bool listening_ = false;
+    std::deque<Key> keys_;  // not yet handled, as far as is known
+    KeyMoments moments_;
 };
 
 }  // namespace plume

@@ -23,6 +23,8 @@ struct WatchdogMessage {
 inline constexpr int WatchdogSocket = STDIN_FILENO;
 // Where it finds the memory of the SharedClipboardCopy, if there is one.
 inline constexpr int WatchdogClipboard = STDERR_FILENO + 1;
+// And that of the TapProgress.
+inline constexpr int WatchdogTapProgress = WatchdogClipboard + 1;
 
 enum class WatchdogSilence { NothingYet, Ended };
 

@@ -26,7 +26,7 @@ class WatchdogSchedule {
     // Somebody has the keyboard, or nobody, from now on.
     void watch(bool on);
 
-    // A key went down. True: now that Plume is being asked regularly, keys need not be listened to.
+    // A key went down. True: now that Plume is being asked regularly, keys need not wake anybody.
     bool keyHeard(double now);
     void answered(std::uint32_t question);
 

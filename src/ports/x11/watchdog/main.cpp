@@ -1,7 +1,7 @@
 // The watchdog: frees the keyboard when Plume, which started it, hangs or has ended. See ports/x11/watchdog/Watchdog.h.
 //
-// plume-watchdog <display>, with one end of Plume's pair of sockets as standard input, and the memory of the
-// SharedClipboardCopy as descriptor 3.
+// plume-watchdog <display>, with one end of Plume's pair of sockets as standard input, the memory of the
+// SharedClipboardCopy as descriptor 3 and that of the TapProgress as descriptor 4.
 
 #include <poll.h>
 
@@ -27,20 +27,21 @@ double now() {
 
 class WatchdogProcess {
   public:
-    explicit WatchdogProcess(WatchdogConnection& connection) : connection_(connection) {}
+    WatchdogProcess(WatchdogConnection& connection, TapProgress& progress)
+        : connection_(connection), progress_(progress) {}
 
     // Until Plume ends, or the display does.
     void run() {
         // What has arrived is looked at before anybody is given up: it may be the watchdog that was late.
         while (takeMessages() && !connection_.isBroken()) {
             takeSteps();
-            if (connection_.takeKey() && schedule_.keyHeard(now())) {
-                connection_.listen(false);
+            if (connection_.takeKeys(progress_) && schedule_.keyHeard(now())) {
+                keysWake_ = false;
             } else {
                 wait();
             }
         }
-        if (tapWindow_ != XCB_WINDOW_NONE) connection_.freeKeyboard(tapWindow_);
+        if (tapWindow_ != XCB_WINDOW_NONE) connection_.freeKeyboard(tapWindow_, progress_);
     }
 
   private:
@@ -55,7 +56,8 @@ class WatchdogProcess {
             if (message.type == WatchdogMessage::Type::Answer) schedule_.answered(message.value);
             if (message.type != WatchdogMessage::Type::TapWindow) continue;
             tapWindow_ = message.value;
-            connection_.listen(false);
+            connection_.listen(tapWindow_ != XCB_WINDOW_NONE);
+            keysWake_ = false;
             schedule_.watch(tapWindow_ != XCB_WINDOW_NONE);
         }
     }
@@ -66,13 +68,13 @@ class WatchdogProcess {
                 case WatchdogSchedule::Step::Wait:
                     return;
                 case WatchdogSchedule::Step::ListenAndAsk:
-                    connection_.listen(true);
+                    keysWake_ = true;
                     [[fallthrough]];
                 case WatchdogSchedule::Step::Ask:
                     sendWatchdogMessage(WatchdogSocket, {WatchdogMessage::Type::Ping, schedule_.question()});
                     break;
                 case WatchdogSchedule::Step::GiveUp:
-                    connection_.freeKeyboard(std::exchange(tapWindow_, XCB_WINDOW_NONE));
+                    connection_.freeKeyboard(std::exchange(tapWindow_, XCB_WINDOW_NONE), progress_);
                     connection_.listen(false);
                     break;
             }
@@ -83,11 +85,14 @@ class WatchdogProcess {
         pollfd entries[] = {{WatchdogSocket, POLLIN, 0}, {connection_.descriptor(), POLLIN, 0}};
         const double seconds = schedule_.nextMoment() - now();
         const int bound = std::isinf(seconds) ? -1 : static_cast<int>(std::ceil(std::max(seconds, 0.0) * 1000));
-        poll(entries, std::size(entries), bound);
+        poll(entries, keysWake_ ? std::size(entries) : 1, bound);
     }
 
     WatchdogConnection& connection_;
+    TapProgress& progress_;
     WatchdogSchedule schedule_;
+    // While Plume is being asked anyway, keys wait to be looked at.
+    bool keysWake_ = false;
     xcb_window_t tapWindow_ = XCB_WINDOW_NONE;
 };
 
@@ -102,7 +107,8 @@ int main(int count, char** arguments) {
         static_cast<void>(std::fprintf(stderr, "plume-watchdog: %s\n", connection.error().message.c_str()));
         return 1;
     }
-    plume::WatchdogProcess(*connection.value()).run();
+    plume::TapProgress progress(plume::WatchdogTapProgress);
+    plume::WatchdogProcess(*connection.value(), progress).run();
     connection.value().reset();
     plume::startClipboardKeeper(display, plume::WatchdogClipboard);
     return 0;
