@@ -1,6 +1,7 @@
 // The keyboard tap of X11 between a keyboard and real programs.
 
 #include <xcb/xinput.h>
+#include <xcb/xtest.h>
 
 #include <algorithm>
 #include <atomic>
@@ -129,6 +130,23 @@ TEST_F(X11TapTest, WhatIsSwallowedDoesNotLookLikeAModifierAlone) {
     programs.awaitPress(static_cast<int>(Key::LeftControl), Bound);
 }
 
+TEST_F(X11TapTest, TellsWhenAnotherProgramTypes) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    rig_->keyboard().type("ab");
+    EXPECT_EQ(target->awaitText("ab"), "ab");
+    takeHeard(4);
+    EXPECT_EQ(tap_->run([this] { return listener_.withheld; }), 0) << "what passes is no other program's";
+    for (const bool down : {true, false}) {
+        xcb_test_fake_input(rig_->client().connection(), down ? XCB_KEY_PRESS : XCB_KEY_RELEASE, 54, XCB_CURRENT_TIME,
+                            XCB_NONE, 0, 0, 0);
+    }
+    rig_->client().focusedWindow();
+    EXPECT_EQ(target->awaitText("abc"), "abc");
+    await("it is told", [this] { return tap_->run([this] { return listener_.withheld == 1; }); });
+    EXPECT_EQ(heard(), std::vector<Heard>{});
+}
+
 TEST_F(X11TapTest, HeldKeysRepeat) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     createTap();
@@ -142,6 +160,7 @@ TEST_F(X11TapTest, HeldKeysRepeat) {
     const auto all = heard();
     EXPECT_GE(std::ranges::count(all, Heard{Type::KeyDown, KeyCode::A, {}, u"a"}), 3);
     EXPECT_EQ(std::ranges::count(all, Heard{Type::KeyUp, KeyCode::A, {}, u"a"}), 1);
+    EXPECT_EQ(tap_->run([this] { return listener_.withheld; }), 0) << "what repeats is no other program's";
 }
 
 TEST_F(X11TapTest, AKeyWhoseRepeatIsSwallowedStopsRepeating) {

@@ -89,6 +89,7 @@ Result<void> TapConnection::reopen() {
     connection_ = std::move(connection).value();
     keysDown_.reset();
     userKeys.reset();
+    ownPresses_.reset();
     progress_.begin();
     if (auto begun = begin(); !begun) return begun;
     keysDown_ = keysDownOn(*connection_, testKeyboard_);
@@ -99,9 +100,17 @@ Result<void> TapConnection::reopen() {
 }
 
 void TapConnection::sendKey(xcb_keycode_t keycode, bool down) {
-    xcb_test_fake_input(connection_->get(), down ? XCB_KEY_PRESS : XCB_KEY_RELEASE, keycode, XCB_CURRENT_TIME, XCB_NONE,
-                        0, 0, 0);
+    const auto cookie = xcb_test_fake_input(connection_->get(), down ? XCB_KEY_PRESS : XCB_KEY_RELEASE, keycode,
+                                            XCB_CURRENT_TIME, XCB_NONE, 0, 0, 0);
+    ownPresses_[cookie.sequence % ownPresses_.size()] = down;
     keysDown_[keycode] = down;
+}
+
+bool TapConnection::isOwnPress(unsigned sequence) {
+    auto pressed = ownPresses_[sequence % ownPresses_.size()];
+    const bool own = pressed;
+    pressed = false;
+    return own;
 }
 
 std::uint8_t TapConnection::modifiersDown() const {

@@ -8,6 +8,7 @@
 
 #include <xcb/xcb.h>
 
+#include <bitset>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -49,6 +50,9 @@ class TapConnection {
     // Presses or releases a key on the XTEST keyboard. Sent with the next flush(), or when xcb's buffer is full.
     void sendKey(xcb_keycode_t keycode, bool down);
     void flush() const { connection_->flush(); }
+    // Whether sendKey() caused this press on the XTEST keyboard, which was told when our request with this number was
+    // the latest; to be asked of each press once.
+    bool isOwnPress(unsigned sequence);
     // What is down on the XTEST keyboard once everything sent has been dealt with, and the real modifiers that it
     // holds.
     const KeycodeSet& keysDown() const { return keysDown_; }
@@ -78,6 +82,7 @@ class TapConnection {
     std::uint16_t masterKeyboard_ = 0;
     std::uint16_t testKeyboard_ = 0;
     KeycodeSet keysDown_;
+    std::bitset<65536> ownPresses_;  // the numbers, as far as they matter, of the requests that press a key
     TapProgress progress_;
     std::function<void(xcb_window_t)> reopened_;
 };

@@ -43,7 +43,8 @@ Result<void> TapSession::begin() {
     for (const std::uint16_t device : keyboards_.grabbed()) keymaps_.add(device);
     connection.userKeys = keyboards_.keysDown();
     decoder_.setKeymap(keymaps_.current(), connection.userKeys, dependencies_.keyboard.locks());
-    selectHierarchyEvents();
+    selectEvents(XCB_INPUT_DEVICE_ALL, XCB_INPUT_XI_EVENT_MASK_HIERARCHY);
+    selectEvents(connection.testKeyboard(), XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS);
     grabCheck_->ask(dependencies_.loop.now());
     connection.connection().sync();
     addSource();
@@ -72,11 +73,11 @@ void TapSession::typeOn(std::uint16_t device) {
     decoder_.setKeymap(keymaps_.current(), dependencies_.connection.userKeys, dependencies_.keyboard.locks());
 }
 
-void TapSession::selectHierarchyEvents() const {
+void TapSession::selectEvents(std::uint16_t device, std::uint32_t events) const {
     struct {
         xcb_input_event_mask_t header;
         std::uint32_t events;
-    } const mask{{XCB_INPUT_DEVICE_ALL, 1}, XCB_INPUT_XI_EVENT_MASK_HIERARCHY};
+    } const mask{{device, 1}, events};
     XcbConnection& connection = dependencies_.connection.connection();
     xcb_input_xi_select_events(connection.get(), connection.root(), 1, &mask.header);
 }
@@ -93,6 +94,7 @@ void TapSession::end() {
     nextDrain_.cancel();
     TapConnection& connection = dependencies_.connection;
     keyboards_.ungrab();
+    selectEvents(connection.testKeyboard(), 0);
     grabCheck_.reset();
     connection.connection().sync();
     passOnUnheard();
@@ -160,6 +162,10 @@ void TapSession::handle(const xcb_generic_event_t& event) {
         handleHierarchy(reinterpret_cast<const xcb_input_hierarchy_event_t&>(event));
     }
     keymaps_.hear(event);
+    // Another program types: that cannot be swallowed, and it does not go on where the user was.
+    if (isInput(event, XCB_INPUT_RAW_KEY_PRESS) && !dependencies_.connection.isOwnPress(event.full_sequence)) {
+        return dependencies_.listener.typingInterrupted();
+    }
     // What came before the connection was ended has been passed on by whoever did that.
     TapProgress& progress = dependencies_.connection.progress();
     if (!isKey(event) || progress.isTakenOver()) return;
