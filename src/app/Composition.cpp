@@ -134,7 +134,19 @@ void Composition::start() {
     for (const std::string_view name : hotKeys_->hotKeysWithoutAction(environment_.settings)) {
         environment_.log("What the hot key " + std::string(name) + " is for is not there yet: its keys pass.");
     }
+    checkConflicts();
     inputService_->enableEvents();
+}
+
+// Two programs that answer the same abbreviation, or take the keyboard, are in each other's way.
+void Composition::checkConflicts() {
+    const auto orNothing = [](const std::optional<std::u16string>& text) { return toUtf8(text.value_or(u"")); };
+    for (const RunningApplication& other : inputService_->tappingProcesses()) {
+        environment_.log("Another program takes keys and may conflict with Plume: processIdentifier " +
+                         std::to_string(other.processIdentifier) + ", localizedName " + orNothing(other.localizedName) +
+                         ", bundleIdentifier " + orNothing(other.bundleIdentifier) + ", executableURL " +
+                         orNothing(other.executableURL));
+    }
 }
 
 void Composition::stop() {

@@ -85,6 +85,7 @@ class Composition {
   private:
     void makeParts();
     HotKeyDispatch::Actions hotKeyActions();
+    void checkConflicts();
 
     const Ports ports_;
     const Environment environment_;

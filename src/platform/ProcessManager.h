@@ -44,7 +44,7 @@ class ProcessManager {
     virtual std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const = 0;
     // Asks for the process to be brought to the front; a port may take a moment to do it.
     virtual void bringToFront(ProcessSerialNumber process) = 0;
-    // Who else listens to the keyboard, as far as the system tells; at most 10.
+    // Who else listens to the keyboard, as far as the system tells; at most 10. May take milliseconds: not for a key.
     virtual std::vector<EventTapInformation> eventTaps() const = 0;
 };
 

@@ -8,6 +8,7 @@
 
 #include "Foundation/Strings.h"
 #include "app/linux/LinuxPort.h"
+#include "ports/dbus/SystemSleep.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 #include "testing/rig/NoticeBoard.h"
@@ -190,6 +191,29 @@ class X11Desk final : public ContractDesk {
 };
 
 const ContractPort<ContractDesk> Desk{"X11", [] { return std::make_unique<X11Desk>(); }};
+
+TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {
+    setenv("DBUS_SYSTEM_BUS_ADDRESS", sessionBusAddress().c_str(), 1);
+    const BusConnection manager = openBus(sessionBusAddress());
+    dbus_bus_request_name(manager.get(), "org.freedesktop.login1", 0, nullptr);
+    PollRunLoop loop;
+    std::optional<bool> told;
+    const SystemSleep sleep(loop, [&](bool sleeps) { told = sleeps; });
+    for (const bool sleeps : {true, false}) {
+        const dbus_bool_t word = sleeps ? TRUE : FALSE;
+        const Deadline deadline(Bound);
+        do {  // until somebody listens
+            const BusMessage signal(dbus_message_new_signal("/org/freedesktop/login1", "org.freedesktop.login1.Manager",
+                                                            "PrepareForSleep"));
+            dbus_message_append_args(signal.get(), DBUS_TYPE_BOOLEAN, &word, DBUS_TYPE_INVALID);
+            dbus_connection_send(manager.get(), signal.get(), nullptr);
+            dbus_connection_flush(manager.get());
+            const Timer look = loop.performAfterDelay(Step, [&loop] { loop.stop(); });
+            loop.run();
+        } while (told != sleeps && !deadline.passed());
+        EXPECT_EQ(told, sleeps);
+    }
+}
 
 }  // namespace
 

@@ -9,6 +9,7 @@
 #include <fstream>
 #include <mutex>
 
+#include "Foundation/Strings.h"
 #include "ports/x11/keyboard/X11SecureInput.h"
 #include "ports/x11/keyboard/X11SystemHotKeys.h"
 #include "ports/x11/windows/DesktopFiles.h"
@@ -143,6 +144,21 @@ TEST_F(X11ProcessTest, NamesTheProgramInFrontAndForgetsItWhenItEnds) {
     const auto ended = numbers.front();
     targets.erase(targets.begin());
     rig_->client().await("its end", Milliseconds(10'000), [&] { return !application(ended); });
+}
+
+TEST_F(X11ProcessTest, NamesProgramsThatAreKnownToTakeKeys) {
+    const fs::path tool = rig_->directory() / "autokey-headless";  // longer than the system tells
+    fs::copy_file("/bin/sleep", tool);
+    const auto program = rig_->session().start({tool.string(), "60"}, "coreutils");
+    std::vector<EventTapInformation> taps;
+    rig_->client().await("it runs", Milliseconds(10'000), [&] {
+        taps = thread_->run([&] { return processes_->eventTaps(); });
+        return !taps.empty();
+    });
+    ASSERT_EQ(taps.size(), 1U);
+    EXPECT_TRUE(taps.front().isActiveFilter);
+    EXPECT_EQ(taps.front().tappingProcess.processIdentifier, program->pid());
+    EXPECT_EQ(taps.front().tappingProcess.executableURL, fromUtf8(tool.string()));
 }
 
 TEST_F(X11ProcessTest, TypingMakesNobodyLookAgain) {

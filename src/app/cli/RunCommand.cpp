@@ -99,6 +99,11 @@ class Run {
                 keyboardGivenUp_ = service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost);
             });
             composition.start();
+            // What happens to the keyboard during a sleep, nobody hears.
+            port_.setSleepListener([this, &composition](bool sleeps) {
+                port_.tapLoop().perform([&composition] { composition.engine().clear(); });
+                sleeps ? composition.stop() : composition.inputService().enableEvents();
+            });
             // After the start, which waits in the loop, too.
             port_.tapLoop().perform([this, &service] { tellWhetherStarted(service); });
             port_.tapLoop().run();

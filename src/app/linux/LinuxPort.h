@@ -16,6 +16,7 @@
 #include "app/Composition.h"
 #include "ports/atspi/AtspiAccessibility.h"
 #include "ports/dbus/DesktopNotices.h"
+#include "ports/dbus/SystemSleep.h"
 #include "ports/posix/CanberraSounds.h"
 #include "ports/posix/HiddenPrompts.h"
 #include "ports/posix/PollRunLoop.h"
@@ -54,6 +55,10 @@ class LinuxPort {
 
     // Told, on the main thread, what a desktop without notices cannot show. Before the loops run.
     void setCannotShowNotice(DesktopNotices::CannotShow cannotShow) { notices_.setCannotShow(std::move(cannotShow)); }
+    // Told, on the main thread, when the machine goes to sleep and when it has woken up.
+    void setSleepListener(SystemSleep::Listener listener) {
+        sleep_ = std::make_unique<SystemSleep>(mainLoop_, std::move(listener));
+    }
     // Called once, on the tap thread, when the X server is gone.
     void setServerGone(std::function<void()> listener) { session_->serverGone = std::move(listener); }
     // Last of all, on the tap thread, when its loop has ended: what Plume offers on the clipboard stays there.
@@ -74,6 +79,7 @@ class LinuxPort {
     PosixProcessLauncher processLauncher_;
     CanberraSounds sounds_;
     DesktopNotices notices_{mainLoop_};
+    std::unique_ptr<SystemSleep> sleep_;
     AtspiAccessibility accessibility_;
     HiddenPrompts hiddenPrompts_;
     SharedClipboardCopy clipboardCopy_;

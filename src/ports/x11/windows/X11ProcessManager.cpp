@@ -14,6 +14,7 @@
 #include <utility>
 
 #include "Foundation/Strings.h"
+#include "ports/x11/windows/KeyTools.h"
 
 namespace plume {
 
@@ -261,6 +262,12 @@ std::optional<RunningApplication> X11ProcessManager::runningApplication(ProcessS
         return std::nullopt;
     }
     return known->second.description;
+}
+
+std::vector<EventTapInformation> X11ProcessManager::eventTaps() const {
+    std::vector<EventTapInformation> taps;
+    for (RunningApplication& tool : runningKeyTools()) taps.push_back({true, std::move(tool)});
+    return taps;
 }
 
 void X11ProcessManager::bringToFront(ProcessSerialNumber process) {

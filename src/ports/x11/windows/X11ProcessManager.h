@@ -32,8 +32,8 @@ class X11ProcessManager final : public ProcessManager {
     std::uint32_t frontWindow() const override;
     std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
     void bringToFront(ProcessSerialNumber process) override;
-    // X does not tell who reads the keyboard's events: always empty.
-    std::vector<EventTapInformation> eventTaps() const override { return {}; }
+    // X does not tell who takes keys: those programs that are known to do it.
+    std::vector<EventTapInformation> eventTaps() const override;
 
     // How often something had to be asked of the server since the start: for tests and measurements.
     int lookUps() const { return lookUps_; }
