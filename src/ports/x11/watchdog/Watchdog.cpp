@@ -32,8 +32,7 @@ std::string programBesideThisOne() {
 }
 
 // How the child differs from Plume: its socket, a group of its own, so that what a terminal sends to Plume's group does
-// not end it first, no signal blocked or ignored, no other descriptor but
-// those that are shared.
+// not end it first, no signal blocked or ignored, no other descriptors but those that are shared.
 int spawn(const std::string& program, const std::string& display, int socket, Watchdog::Shared shared, pid_t& process) {
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
