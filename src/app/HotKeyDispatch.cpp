@@ -10,7 +10,7 @@ namespace {
 constexpr std::string_view SystemQuickSearchSetting = "QuickSearchHotKey";
 constexpr SystemHotKeys::Id SystemQuickSearchId = 1;
 // The one whose hot key no setting holds.
-constexpr std::string_view ClearCommand = "";
+constexpr std::string_view ClearCommand{};
 
 }  // namespace
 

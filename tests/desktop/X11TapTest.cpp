@@ -201,6 +201,9 @@ TEST_F(X11TapTest, KeysThatAreKeptWaitingFollowAClickOrAKeyWithAlt) {
     for (const bool click : {true, false}) {
         target->clear();
         rig_->keyboard().type("xy");
+        await("keys are held", [&] {
+            return std::ranges::count(heard(), Heard{Type::KeyDown, KeyCode::X, {}, u"x"}) == (click ? 1 : 2);
+        });
         tap_->run([this] { tap_->tap->keepHolding(); });
         const auto start = std::chrono::steady_clock::now();
         rig_->keyboard().type("z");
