@@ -102,6 +102,10 @@ class X11PasteboardTest : public testing::Test {
         });
     }
 
+    // Lives until the loop has ended: what was taken may be told behind a test's last line.
+    NotingOwner& makeOwner(NotingOwner::Contents contents) {
+        return *owners_.emplace_back(std::make_unique<NotingOwner>(std::move(contents)));
+    }
     std::int64_t declare(const std::vector<std::string>& types, PasteboardOwner* owner) {
         return thread_->run([&] { return pasteboard_->declareTypes(types, owner); });
     }
@@ -150,6 +154,7 @@ class X11PasteboardTest : public testing::Test {
 
     static inline std::unique_ptr<DesktopRig> rig_;
     bool pasted_ = false;  // the tap thread's
+    std::vector<std::unique_ptr<NotingOwner>> owners_;
     std::unique_ptr<SessionThread> thread_;
     std::unique_ptr<X11Pasteboard> pasteboard_;
 };
@@ -224,7 +229,7 @@ TEST_F(X11PasteboardTest, RequestorsThatStopOrDieHarmNobody) {
 }
 
 TEST_F(X11PasteboardTest, RichContentIsOfferedAsHtmlAndPlainTextToo) {
-    NotingOwner owner(
+    NotingOwner& owner = makeOwner(
         NotingOwner::Contents{{RTFD, "rtfd"}, {RTF, "{\\rtf1 rich}"}, {HTML, "<b>rich</b>"}, {String, "rich"}});
     declare({RTFD, RTF}, &owner);
     EXPECT_THAT(types(), ElementsAre(RTFD, RTF));
@@ -237,7 +242,7 @@ TEST_F(X11PasteboardTest, RichContentIsOfferedAsHtmlAndPlainTextToo) {
 }
 
 TEST_F(X11PasteboardTest, ClipboardManagersAreToldToForgetExpansionsAlone) {
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
     SelectionRequestor manager(display());
     declare({String}, &owner);
     EXPECT_EQ(manager.request("CLIPBOARD", "x-kde-passwordManagerHint")->bytes, "secret");
@@ -255,7 +260,7 @@ TEST_F(X11PasteboardTest, ClipboardManagersAreToldToForgetExpansionsAlone) {
 // ---- Who has taken it ----
 
 TEST_F(X11PasteboardTest, OnlyWhatTheProgramInFrontHasReadWasTaken) {
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {HTML, "<i>expansion</i>"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}, {HTML, "<i>expansion</i>"}});
     SelectionRequestor front(display());
     front.comeToFront(rig_->client());
     SelectionRequestor manager(display());
@@ -273,7 +278,7 @@ TEST_F(X11PasteboardTest, OnlyWhatTheProgramInFrontHasReadWasTaken) {
 
 TEST_F(X11PasteboardTest, LongContentWasTakenWithItsLastPiece) {
     const std::string text(5'000'000, 'x');
-    NotingOwner owner(NotingOwner::Contents{{String, text}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, text}});
     SelectionRequestor front(display());
     front.comeToFront(rig_->client());
     declare({String}, &owner);
@@ -284,7 +289,7 @@ TEST_F(X11PasteboardTest, LongContentWasTakenWithItsLastPiece) {
 }
 
 TEST_F(X11PasteboardTest, WhatIsLeftLyingWasTakenAndSoWasWhatGivesWayToAnotherAnswer) {
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}});
     SelectionRequestor front(display());
     front.comeToFront(rig_->client());
     declare({String}, &owner);
@@ -298,7 +303,7 @@ TEST_F(X11PasteboardTest, WhatIsLeftLyingWasTakenAndSoWasWhatGivesWayToAnotherAn
 // ---- Pasting ----
 
 TEST_F(X11PasteboardTest, PastesWhenAProgramThatAsksForTheTargetsHasThem) {
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}});
     SelectionRequestor front(display());
     front.comeToFront(rig_->client());
     declare({String}, &owner);
@@ -315,7 +320,7 @@ TEST_F(X11PasteboardTest, PastesWhenAProgramThatAsksForTheTargetsHasThem) {
 }
 
 TEST_F(X11PasteboardTest, APasteThatWasNotTakenIsStillForItsProgramAlone) {
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
     SelectionRequestor front(display());
     front.comeToFront(rig_->client());
     SelectionRequestor manager(display());
@@ -415,7 +420,7 @@ TEST_F(X11PasteboardTest, TerminalsFindTheExpansionInPrimaryAndThenWhatWasSelect
     ForeignOwner::Options primary;
     primary.selection = "PRIMARY";
     const ForeignOwner selected(display(), {{"UTF8_STRING", utf8("selected")}}, primary);
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
     SelectionRequestor program(display());
     for (int round = 0; round < 2; ++round) {
         declare({String}, &owner);
@@ -431,7 +436,7 @@ TEST_F(X11PasteboardTest, TerminalsFindTheExpansionInPrimaryAndThenWhatWasSelect
 
 TEST_F(X11PasteboardTest, PrimaryIsLeftAloneAfterANewSelectionAndEmptyWhenItWas) {
     thread_->run([&] { pasteboard_->setPastesPrimary(true); });
-    NotingOwner owner(NotingOwner::Contents{{String, "expansion"}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}});
     SelectionRequestor program(display());
     declare({String}, &owner);
     EXPECT_EQ(program.request("PRIMARY", "UTF8_STRING"), utf8("expansion"));
