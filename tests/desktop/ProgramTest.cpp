@@ -97,12 +97,12 @@ TEST_P(ProgramInPasswordField, DoesNotListen) {
 
 TEST_F(Program, DoesNotListenToWhatAPromptInATerminalHides) {
     const auto home = rig_->directory() / "home";
-    const xcb_window_t before = rig_->client().focusedWindow();
+    const xcb_window_t before = rig_->client().activeWindow();
     const auto terminal = rig_->session().start(
         {"xterm", "-e", "sh", "-c",
          "cd; read a; stty -echo; >hidden; read b; stty echo; >shown; read c; echo \"$a|$b|$c\" >all; mv all read"},
         "xterm");
-    ASSERT_TRUE(waitUntil([&] { return rig_->client().focusedWindow() != before; }, Bound));
+    ASSERT_TRUE(waitUntil([&] { return rig_->client().activeWindow() != before; }, Bound));
     for (const char* next : {"hidden", "shown", "read"}) {
         rig_->keyboard().type(";sig");
         rig_->keyboard().tap(Key::Return);
