@@ -58,7 +58,8 @@ std::string textOf(std::string_view html) {
 std::u16string visible(std::u16string_view text) {
     std::u16string kept;
     for (const char16_t c : text) {
-        if (c > u' ' && c != u'\x2028' && c != u'\x2029' && c != u'\xfffc' && c != u'\xfffd' && !U16_IS_SURROGATE(c)) {
+        if (c > u' ' && c != u'\xa0' && c != u'\x2028' && c != u'\x2029' && c != u'\xfffc' && c != u'\xfffd' &&
+            !U16_IS_SURROGATE(c)) {
             kept += c;
         }
     }
