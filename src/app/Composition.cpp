@@ -142,10 +142,9 @@ void Composition::start() {
 void Composition::checkConflicts() {
     const auto orNothing = [](const std::optional<std::u16string>& text) { return toUtf8(text.value_or(u"")); };
     for (const RunningApplication& other : inputService_->tappingProcesses()) {
-        environment_.log("Another program takes keys and may conflict with Plume: processIdentifier " +
-                         std::to_string(other.processIdentifier) + ", localizedName " + orNothing(other.localizedName) +
-                         ", bundleIdentifier " + orNothing(other.bundleIdentifier) + ", executableURL " +
-                         orNothing(other.executableURL));
+        environment_.log("processIdentifier " + std::to_string(other.processIdentifier) + ", localizedName " +
+                         orNothing(other.localizedName) + ", bundleIdentifier " + orNothing(other.bundleIdentifier) +
+                         ", executableURL " + orNothing(other.executableURL));
     }
 }
 

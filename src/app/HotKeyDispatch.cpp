@@ -83,7 +83,7 @@ Result<void> HotKeyDispatch::registerHotKeys(const UserDefaults& settings) {
         hotKeys_.emplace_back(&command, *hotKey);
         inputService_.registerHotKey(*hotKey);
     }
-    const auto& quickSearch = commands_.back().perform;
+    const auto& quickSearch = std::ranges::find(commands_, SystemQuickSearchSetting, &Command::setting)->perform;
     const auto system = quickSearch ? hotKeyIn(settings, SystemQuickSearchSetting) : std::nullopt;
     return inputService_.registerSystemHotKey(SystemQuickSearchId, system.value_or(GeneralHotKey{}),
                                               [quickSearch] { quickSearch(); });

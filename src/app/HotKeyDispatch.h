@@ -58,6 +58,7 @@ class HotKeyDispatch {
 
     void addCommands(const Actions& actions);
     void onMacInputServiceHotKeysPressed(ZDHotKeysPressedEventArgs& event);
+
     MacInputService& inputService_;
     Subscription hotKeysPressed_;
     std::vector<Command> commands_;  // in the order in which they take effect

@@ -19,6 +19,7 @@ constexpr std::array FunctionKeys = {KeyCode::F17, KeyCode::F18, KeyCode::F19, K
                                      KeyCode::F6,  KeyCode::F7,  KeyCode::F3,  KeyCode::F8,  KeyCode::F9,
                                      KeyCode::F11, KeyCode::F13, KeyCode::F16, KeyCode::F14, KeyCode::F10,
                                      KeyCode::F12, KeyCode::F15, KeyCode::F4,  KeyCode::F2,  KeyCode::F1};
+static_assert(std::ranges::is_sorted(FunctionKeys));
 
 bool isFunctionKey(KeyCode key) {
     return std::ranges::binary_search(FunctionKeys, key);

@@ -54,10 +54,18 @@ constexpr auto KeyNames = std::to_array<Named<KeyCode>>({
     {"Tab", KeyCode::Tab},
 });
 
-InputFlag flag(const JsonNode& node) {
+constexpr auto ErasedNames = std::to_array<Named<ErasedAtOnce>>({
+    {"character", ErasedAtOnce::Character},
+    {"emojiPart", ErasedAtOnce::EmojiPart},
+    {"emoji", ErasedAtOnce::Emoji},
+    {"letter", ErasedAtOnce::Letter},
+});
+
+template <typename Names>
+auto oneOf(const Names& names, const JsonNode& node) {
     const std::string name = toUtf8(node.string());
     std::string expected = "expected one of";
-    for (const Named<InputFlag>& named : FlagNames) {
+    for (const auto& named : names) {
         if (named.name == name) return named.value;
         expected += " " + std::string(named.name);
     }
@@ -66,7 +74,7 @@ InputFlag flag(const JsonNode& node) {
 
 InputFlags flags(const JsonNode& node) {
     InputFlags all;
-    for (const JsonNode& element : node.elements()) all |= flag(element);
+    for (const JsonNode& element : node.elements()) all |= oneOf(FlagNames, element);
     return all;
 }
 
@@ -112,15 +120,6 @@ Keystrokes keystrokes(const JsonNode& node) {
     return keys;
 }
 
-ErasedAtOnce erasedAtOnce(const JsonNode& node) {
-    const std::u16string name = node.string();
-    if (name == u"character") return ErasedAtOnce::Character;
-    if (name == u"emojiPart") return ErasedAtOnce::EmojiPart;
-    if (name == u"emoji") return ErasedAtOnce::Emoji;
-    if (name == u"letter") return ErasedAtOnce::Letter;
-    node.fail("expected one of character emojiPart emoji letter");
-}
-
 const ContextInputSetting& family(const JsonNode& node, const ApplicationFamilies& families) {
     const auto found = families.find(toUtf8(node.string()));
     if (found != families.end()) return found->second;
@@ -157,7 +156,7 @@ ContextInputSetting readApplicationRow(const JsonNode& node, const ContextInputS
     set("afterErasingDelay", setting.afterErasingDelay, delay);
     set("overtypesCompletion", setting.overtypesCompletion, isSo);
     set("typesBeyondBmp", setting.typesBeyondBmp, isSo);
-    set("erasesAtOnce", setting.erasesAtOnce, erasedAtOnce);
+    set("erasesAtOnce", setting.erasesAtOnce, [](const JsonNode& value) { return oneOf(ErasedNames, value); });
     set("longestTyped", setting.longestTyped, length);
     set("blockLength", setting.blockLength, length);
     return setting;

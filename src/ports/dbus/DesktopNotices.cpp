@@ -3,10 +3,10 @@
 #include <algorithm>
 #include <cstdint>
 #include <map>
-#include <mutex>
 #include <utility>
 #include <vector>
 
+#include "ports/dbus/MainLoopLink.h"
 #include "ports/dbus/ServiceBus.h"
 
 namespace plume {
@@ -35,7 +35,7 @@ std::string withoutMarkup(const std::string& text) {
 // On the thread, but for what says otherwise.
 class NoticeSession {
   public:
-    explicit NoticeSession(RunLoop& mainLoop) : bus_(loop_), mainLoop_(&mainLoop) {
+    explicit NoticeSession(RunLoop& mainLoop) : bus_(loop_), mainLoop_(mainLoop) {
         bus_.heard = [this](DBusMessage& signal) { hear(signal); };
         bus_.lost = [this] { shown_.clear(); };
     }
@@ -43,8 +43,7 @@ class NoticeSession {
     void run() { loop_.run(); }
     // From any thread.
     void end() {
-        const std::scoped_lock lock(mutex_);
-        mainLoop_ = nullptr;
+        mainLoop_.cut();
         loop_.stop();
     }
     // From any thread.
@@ -107,26 +106,20 @@ class NoticeSession {
         } else if (dbus_message_is_signal(&signal, Service.interface, "ActionInvoked") != 0) {
             const std::string name = values.string().value_or("");
             for (std::size_t i = 0; i < shown->second.size(); ++i) {
-                if (name == std::to_string(i)) onMainThread(std::move(shown->second[i].pressed));
+                if (name == std::to_string(i)) mainLoop_.perform(std::move(shown->second[i].pressed));
             }
             shown_.erase(shown);
         }
     }
 
     void giveUp(const Notice& notice) {
-        if (cannotShow) onMainThread([tell = cannotShow, body = notice.body] { tell(body); });
-    }
-
-    void onMainThread(RunLoop::Call call) {
-        const std::scoped_lock lock(mutex_);
-        if (mainLoop_ != nullptr) mainLoop_->perform(std::move(call));
+        if (cannotShow) mainLoop_.perform([tell = cannotShow, body = notice.body] { tell(body); });
     }
 
     PollRunLoop loop_;
     ServiceBus bus_;
     std::map<std::uint32_t, std::vector<Notice::Button>> shown_;  // those with buttons, by the service's numbers
-    std::mutex mutex_;
-    RunLoop* mainLoop_;  // guarded by mutex_
+    MainLoopLink mainLoop_;
 };
 
 DesktopNotices::DesktopNotices(RunLoop& mainLoop) : thread_(std::make_shared<NoticeSession>(mainLoop)) {}

@@ -1,10 +1,10 @@
 #include "ports/dbus/SystemSleep.h"
 
 #include <cstdlib>
-#include <mutex>
 #include <string>
 #include <utility>
 
+#include "ports/dbus/MainLoopLink.h"
 #include "ports/dbus/ServiceBus.h"
 
 namespace plume {
@@ -25,7 +25,7 @@ std::string systemBusAddress() {
 class SleepSession {
   public:
     SleepSession(RunLoop& mainLoop, SystemSleep::Listener listener)
-        : bus_(loop_), listener_(std::move(listener)), mainLoop_(&mainLoop) {
+        : bus_(loop_), listener_(std::move(listener)), mainLoop_(mainLoop) {
         bus_.heard = [this](DBusMessage& signal) { hear(signal); };
     }
 
@@ -38,8 +38,7 @@ class SleepSession {
     }
     // From any thread.
     void end() {
-        const std::scoped_lock lock(mutex_);
-        mainLoop_ = nullptr;
+        mainLoop_.cut();
         loop_.stop();
     }
 
@@ -47,15 +46,13 @@ class SleepSession {
     void hear(DBusMessage& signal) {
         if (dbus_message_is_signal(&signal, Interface, Signal) == 0) return;
         const auto sleeps = BusReader(&signal).boolean();
-        const std::scoped_lock lock(mutex_);
-        if (sleeps && mainLoop_ != nullptr) mainLoop_->perform([tell = listener_, asleep = *sleeps] { tell(asleep); });
+        if (sleeps) mainLoop_.perform([tell = listener_, asleep = *sleeps] { tell(asleep); });
     }
 
     PollRunLoop loop_;
     ServiceBus bus_;
     const SystemSleep::Listener listener_;
-    std::mutex mutex_;
-    RunLoop* mainLoop_;  // guarded by mutex_
+    MainLoopLink mainLoop_;
 };
 
 SystemSleep::SystemSleep(RunLoop& mainLoop, Listener listener)

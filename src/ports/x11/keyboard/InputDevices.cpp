@@ -33,6 +33,14 @@ std::vector<InputDevice> inputDevices(const XcbConnection& connection) {
     return devices;
 }
 
+void selectDeviceEvents(const XcbConnection& connection, std::uint16_t device, std::uint32_t events) {
+    struct {
+        xcb_input_event_mask_t header;
+        std::uint32_t events;
+    } const mask{{device, 1}, events};
+    xcb_input_xi_select_events(connection.get(), connection.root(), 1, &mask.header);
+}
+
 KeycodeSet keysDownOn(const XcbConnection& connection, std::uint16_t device) {
     KeycodeSet down;
     const auto cookie = xcb_input_query_device_state(connection.get(), static_cast<std::uint8_t>(device));

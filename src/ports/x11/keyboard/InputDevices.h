@@ -26,6 +26,9 @@ struct InputDevice {
 // Waits for the server; empty when it does not answer.
 std::vector<InputDevice> inputDevices(const XcbConnection& connection);
 
+// From now on these events of the device (XCB_INPUT_XI_EVENT_MASK_…), and no others, are told to the connection.
+void selectDeviceEvents(const XcbConnection& connection, std::uint16_t device, std::uint32_t events);
+
 // What is down on a device. Waits for the server.
 KeycodeSet keysDownOn(const XcbConnection& connection, std::uint16_t device);
 

@@ -74,12 +74,7 @@ void TapSession::typeOn(std::uint16_t device) {
 }
 
 void TapSession::selectEvents(std::uint16_t device, std::uint32_t events) const {
-    struct {
-        xcb_input_event_mask_t header;
-        std::uint32_t events;
-    } const mask{{device, 1}, events};
-    XcbConnection& connection = dependencies_.connection.connection();
-    xcb_input_xi_select_events(connection.get(), connection.root(), 1, &mask.header);
+    selectDeviceEvents(dependencies_.connection.connection(), device, events);
 }
 
 void TapSession::addSource() {

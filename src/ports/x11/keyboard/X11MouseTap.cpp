@@ -4,6 +4,8 @@
 
 #include <utility>
 
+#include "ports/x11/keyboard/InputDevices.h"
+
 namespace plume {
 
 namespace {
@@ -60,11 +62,7 @@ void X11MouseTap::remove() {
 }
 
 void X11MouseTap::select(std::uint32_t events) const {
-    struct {
-        xcb_input_event_mask_t header;
-        std::uint32_t events;
-    } const mask{{XCB_INPUT_DEVICE_ALL_MASTER, 1}, events};
-    xcb_input_xi_select_events(session_.get(), session_.connection().root(), 1, &mask.header);
+    selectDeviceEvents(session_.connection(), XCB_INPUT_DEVICE_ALL_MASTER, events);
     session_.connection().flush();
 }
 

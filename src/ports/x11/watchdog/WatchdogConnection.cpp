@@ -4,7 +4,6 @@
 #include <xcb/xtest.h>
 
 #include <algorithm>
-#include <chrono>
 #include <utility>
 
 namespace plume {
@@ -15,10 +14,6 @@ constexpr std::uint32_t KeyEvents = XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS | XCB_
 // More is not typed before Plume is given up. A key that is older, in seconds, was not held by the tap.
 constexpr std::size_t MostKeys = 512;
 constexpr double LongestMemory = 4;
-
-double monotonicTime() {
-    return std::chrono::duration<double>(std::chrono::steady_clock::now().time_since_epoch()).count();
-}
 
 // A keyboard that people type on, whoever has it.
 bool isHardware(const InputDevice& device) {
@@ -49,7 +44,7 @@ Result<std::unique_ptr<WatchdogConnection>> WatchdogConnection::open(const std::
 void WatchdogConnection::listen(bool on) {
     listening_ = on;
     keys_.clear();
-    select(XCB_INPUT_DEVICE_ALL, on ? std::uint32_t{XCB_INPUT_XI_EVENT_MASK_HIERARCHY} : 0U);
+    selectDeviceEvents(*connection_, XCB_INPUT_DEVICE_ALL, on ? std::uint32_t{XCB_INPUT_XI_EVENT_MASK_HIERARCHY} : 0U);
     selectKeys(on ? KeyEvents : 0U);
     connection_->sync();
 }
@@ -57,19 +52,11 @@ void WatchdogConnection::listen(bool on) {
 // Each keyboard by itself: what the tap presses is not to be told.
 void WatchdogConnection::selectKeys(std::uint32_t events) {
     for (const InputDevice& device : inputDevices(*connection_)) {
-        if (isHardware(device)) select(device.id, events);
+        if (isHardware(device)) selectDeviceEvents(*connection_, device.id, events);
     }
 }
 
-void WatchdogConnection::select(std::uint16_t device, std::uint32_t events) {
-    struct {
-        xcb_input_event_mask_t header;
-        std::uint32_t events;
-    } const mask{{device, 1}, events};
-    xcb_input_xi_select_events(connection_->get(), connection_->root(), 1, &mask.header);
-}
-
-bool WatchdogConnection::takeKeys(const TapProgress& progress) {
+bool WatchdogConnection::takeKeys(const TapProgress& progress, double now) {
     bool wentDown = false;
     while (const auto event = connection_->pollEvent()) {
         const auto& raw = reinterpret_cast<const xcb_input_raw_key_press_event_t&>(*event);
@@ -81,7 +68,7 @@ bool WatchdogConnection::takeKeys(const TapProgress& progress) {
         }
         const bool down = raw.event_type == XCB_INPUT_RAW_KEY_PRESS;
         wentDown = wentDown || down;
-        remember({moments_.next(raw.time), monotonicTime(), event->full_sequence, raw.deviceid,
+        remember({moments_.next(raw.time), now, event->full_sequence, raw.deviceid,
                   static_cast<std::uint8_t>(raw.detail), down});
     }
     while (!keys_.empty() && progress.hasHandled(keys_.front().moment)) keys_.pop_front();
@@ -95,12 +82,12 @@ void WatchdogConnection::remember(const Key& key) {
     keys_.push_back(key);
 }
 
-void WatchdogConnection::freeKeyboard(xcb_window_t window, TapProgress& progress) {
+void WatchdogConnection::freeKeyboard(xcb_window_t window, TapProgress& progress, double now) {
     const std::vector<std::uint16_t> devices = heldKeyboards();
     progress.takeOver();
     const unsigned freed = xcb_kill_client(connection_->get(), window).sequence;
     connection_->sync();
-    passOn(devices, freed, progress);
+    passOn(devices, freed, progress, now);
     for (const InputDevice& device : inputDevices(*connection_)) {
         if (device.isTestKeyboard()) releaseKeysOf(device.id);
     }
@@ -109,11 +96,10 @@ void WatchdogConnection::freeKeyboard(xcb_window_t window, TapProgress& progress
 
 // What came after the tap's connection was ended went to the programs by itself, and so did the keys of keyboards that
 // the tap did not have, or still have another owner.
-void WatchdogConnection::passOn(const std::vector<std::uint16_t>& devices, unsigned freed,
-                                const TapProgress& progress) {
-    takeKeys(progress);
+void WatchdogConnection::passOn(const std::vector<std::uint16_t>& devices, unsigned freed, const TapProgress& progress,
+                                double now) {
+    takeKeys(progress, now);
     const std::vector<std::uint16_t> stillHeld = heldKeyboards();
-    const double now = monotonicTime();
     for (const Key& key : keys_) {
         const bool wasHeld = std::ranges::find(devices, key.device) != devices.end() &&
                              std::ranges::find(stillHeld, key.device) == stillHeld.end();

@@ -24,13 +24,14 @@ class WatchdogConnection {
     // From the return of this on, every key of every keyboard, whoever holds it, is heard or no longer heard. Waits for
     // the server.
     void listen(bool on);
-    // Whether a key went down since the last call. Those that the tap has not handled are remembered.
-    bool takeKeys(const TapProgress& progress);
+    // Whether a key went down since the last call. Those that the tap has not handled are remembered. `now`, here and
+    // below, is in seconds of a clock that only goes forward.
+    bool takeKeys(const TapProgress& progress, double now);
 
     // Ends the connection that made the window, if there still is one. Types the keys that it has held without handling
     // them, and releases every key that is pressed on the keyboard through which programs press keys: pressed by the
     // tap, they would repeat for ever.
-    void freeKeyboard(xcb_window_t window, TapProgress& progress);
+    void freeKeyboard(xcb_window_t window, TapProgress& progress, double now);
 
   private:
     struct Key {
@@ -45,10 +46,9 @@ class WatchdogConnection {
     WatchdogConnection(std::unique_ptr<XcbConnection> connection, std::uint8_t inputOpcode)
         : connection_(std::move(connection)), inputOpcode_(inputOpcode) {}
 
-    void select(std::uint16_t device, std::uint32_t events);
     void selectKeys(std::uint32_t events);
     void remember(const Key& key);
-    void passOn(const std::vector<std::uint16_t>& devices, unsigned freed, const TapProgress& progress);
+    void passOn(const std::vector<std::uint16_t>& devices, unsigned freed, const TapProgress& progress, double now);
     std::vector<std::uint16_t> heldKeyboards() const;
     void releaseKeysOf(std::uint16_t device);
 

@@ -35,13 +35,13 @@ class WatchdogProcess {
         // What has arrived is looked at before anybody is given up: it may be the watchdog that was late.
         while (takeMessages() && !connection_.isBroken()) {
             takeSteps();
-            if (connection_.takeKeys(progress_) && schedule_.keyHeard(now())) {
+            if (connection_.takeKeys(progress_, now()) && schedule_.keyHeard(now())) {
                 keysWake_ = false;
             } else {
                 wait();
             }
         }
-        if (tapWindow_ != XCB_WINDOW_NONE) connection_.freeKeyboard(tapWindow_, progress_);
+        if (tapWindow_ != XCB_WINDOW_NONE) connection_.freeKeyboard(tapWindow_, progress_, now());
     }
 
   private:
@@ -74,7 +74,7 @@ class WatchdogProcess {
                     sendWatchdogMessage(WatchdogSocket, {WatchdogMessage::Type::Ping, schedule_.question()});
                     break;
                 case WatchdogSchedule::Step::GiveUp:
-                    connection_.freeKeyboard(std::exchange(tapWindow_, XCB_WINDOW_NONE), progress_);
+                    connection_.freeKeyboard(std::exchange(tapWindow_, XCB_WINDOW_NONE), progress_, now());
                     connection_.listen(false);
                     break;
             }
