@@ -25,9 +25,10 @@ AutoText::AutoText(Dependencies dependencies)
       snippetAdaptToAbbreviationCaseOption_(
           dependencies_.userDefaults.integerForKey("SnippetAdaptToAbbreviationCaseOption")),
       correction_(dependencies_.inputService, dependencies_.accessibility),
-      sender_({dependencies_.inputService, dependencies_.snippetParser, dependencies_.scriptRunner,
-               dependencies_.sounds, dependencies_.makeFieldsEditor, dependencies_.report},
-              [this](const SnippetSender::Sent& sent) { follow(sent); }) {
+      sender_(
+          {dependencies_.inputService, dependencies_.snippetParser, dependencies_.scriptRunner, dependencies_.sounds,
+           dependencies_.accessibility, letters_, dependencies_.makeFieldsEditor, dependencies_.report},
+          [this](const SnippetSender::Sent& sent) { follow(sent); }) {
     letters_.reserve(UsualBufferLength);
     MacInputService& service = dependencies_.inputService;
     subscriptions_ = {
@@ -62,7 +63,7 @@ void AutoText::setSnippetSelectorKeyModifier(std::int64_t modifier) {
 }
 
 void AutoText::clear() {
-    letters_.clear();
+    letters_.reset();
     if (snippetSuggestionWindowVisible()) hideSnippetSuggestion();
     if (snippetQuickSearchWindowVisible()) snippetQuickSearchController_->close();
 }
@@ -81,7 +82,7 @@ void AutoText::onSystemInputServiceMouseDown(ZDMouseEventArgs& event) {
 
 void AutoText::expandAtHotkey() {
     if (dependencies_.inputService.isSameProcess() || snippetQuickSearchWindowVisible()) return;
-    std::vector<Match> matches = findSnippetsInLetters(letters_, 0, letters_);
+    std::vector<Match> matches = findSnippetsInLetters(letters(), 0, letters());
     if (matches.size() == 1) {
         hideSnippetSuggestion();
         sendSnippet(matches[0].first, matches[0].second, SnippetTrigger::HotKey);
@@ -129,7 +130,7 @@ bool AutoText::undo(bool withTrigger) {
 }
 
 void AutoText::follow(const SnippetSender::Sent& sent) {
-    if (sent.letters) letters_ = *sent.letters;
+    if (sent.letters) letters_.reset(*sent.letters);
     undoInfo_ = sent.undo;
 }
 

@@ -22,6 +22,7 @@
 #include "engine/SnippetMatcher.h"
 #include "engine/SnippetSender.h"
 #include "engine/SuggestionController.h"
+#include "engine/TypedLetters.h"
 #include "input/MacInputService.h"
 #include "platform/Accessibility.h"
 #include "platform/InputSources.h"
@@ -75,7 +76,7 @@ class AutoText {
     // Empties the buffer and closes the lists that are open.
     void clear();
     // What was typed since the last reset.
-    const std::u16string& letters() const { return letters_; }
+    const std::u16string& letters() const { return letters_.text(); }
     // The library, in user order.
     const Groups& snippetGroups() const { return snippetGroups_; }
     // How content is adapted to the case in which its abbreviation was typed.
@@ -168,7 +169,7 @@ class AutoText {
     SnippetMatcher matcher_;
     std::array<Subscription, 4> subscriptions_;
     Groups snippetGroups_;
-    std::u16string letters_;
+    TypedLetters letters_;
     std::optional<UndoInformation> undoInfo_;
     bool enabled_ = false;
     bool selectingSnippet_ = false;

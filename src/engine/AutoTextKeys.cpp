@@ -82,9 +82,9 @@ AutoText::Route AutoText::routeByKeyCode(ZDKeyEventArgs& event) {
 }
 
 void AutoText::deleteLastLetter() {
-    if (letters_.empty()) return;
-    letters_.pop_back();
-    refreshSnippetSuggestionController();
+    const bool wasEmpty = letters().empty();
+    letters_.eraseLast();
+    if (!wasEmpty) refreshSnippetSuggestionController();
 }
 
 void AutoText::escapePressed(ZDKeyEventArgs& event) {
@@ -119,7 +119,7 @@ AutoText::Route AutoText::returnPressed(ZDKeyEventArgs& event) {
 AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
     if (dependencies_.inputService.keyModifier() != KeyModifier::Shift) return Route::Character;
     // Shift is the way to write an abbreviation out: the text is kept, nothing is looked for.
-    if (event.s) letters_ += *event.s;
+    if (event.s) letters_.append(*event.s);
     return Route::Done;
 }
 
@@ -179,15 +179,15 @@ void AutoText::onSystemInputServiceUnregisteredHotKeyPressed(ZDUnregisteredHotKe
 }
 
 void AutoText::processNormalKeyDown(ZDKeyEventArgs& event) {
-    const std::size_t lengthBefore = letters_.size();
-    letters_ += *event.s;
-    const std::u16string_view withKey = letters_;
+    const std::size_t lengthBefore = letters().size();
+    letters_.append(*event.s);
+    const std::u16string_view withKey = letters();
     std::vector<Match> matches = findSnippetsInLetters(withKey, event.s->front(), withKey.substr(0, lengthBefore));
 
     if (matches.empty()) {
         keyCompletedNothing(event);
     } else if (matches.size() == 1) {
-        letters_.resize(lengthBefore);
+        letters_.shrink(lengthBefore);
         sendTypedMatch(matches.front(), event);
     } else {
         offerMatches(std::move(matches));
@@ -199,7 +199,7 @@ void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
     event.cancel = sendSnippet(match.first, match.second, SnippetTrigger::Typed);
     // The kept delimiter stands behind the expansion, in the text as in the buffer.
     const std::shared_ptr<SnippetGroup> group = match.first->parentGroup();
-    if (group && group->expandTrigger() == ExpandTrigger::DelimiterKept) letters_ += *event.s;
+    if (group && group->expandTrigger() == ExpandTrigger::DelimiterKept) letters_.append(*event.s);
 }
 
 void AutoText::offerMatches(std::vector<Match> matches) {
@@ -215,7 +215,7 @@ void AutoText::offerMatches(std::vector<Match> matches) {
 }
 
 void AutoText::keyCompletedNothing(ZDKeyEventArgs& event) {
-    const auto correction = correction_.autoCorrect(letters_, *event.s, lastKeyDestination());
+    const auto correction = correction_.autoCorrect(letters(), *event.s, lastKeyDestination());
     if (correction) sendCorrection(*correction, event);
     if (selectingSnippet_) {
         hideSnippetSuggestion();
@@ -225,10 +225,10 @@ void AutoText::keyCompletedNothing(ZDKeyEventArgs& event) {
 }
 
 void AutoText::sendCorrection(const AutoCorrection::Correction& correction, ZDKeyEventArgs& event) {
-    std::u16string letters = letters_;
+    std::u16string corrected = letters();
     event.cancel = sendSnippet(correction.snippet, correction.typed, SnippetTrigger::Typed);
-    if (letters.size() >= 2) letters.replace(letters.size() - 2, 1, correction.corrected);
-    letters_ = letters;
+    if (corrected.size() >= 2) corrected.replace(corrected.size() - 2, 1, correction.corrected);
+    letters_.reset(corrected);
 }
 
 }  // namespace plume

@@ -16,8 +16,8 @@ void AutoText::suggestAbbreviations() {
 
 void AutoText::refreshSuggestions() {
     suggestions_.clear();
-    if (letters_.empty() || !dependencies_.suggest) return;
-    suggestions_ = dependencies_.suggest(letters_, filteredGroupsByApplication());
+    if (letters().empty() || !dependencies_.suggest) return;
+    suggestions_ = dependencies_.suggest(letters(), filteredGroupsByApplication());
 }
 
 void AutoText::showSnippetSuggestion() {

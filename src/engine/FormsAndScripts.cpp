@@ -5,6 +5,7 @@
 #include "content/FieldMerging.h"
 #include "content/NestedScripts.h"
 #include "engine/SnippetSender.h"
+#include "input/AXUtils.h"
 
 namespace plume {
 
@@ -13,6 +14,8 @@ namespace {
 constexpr double FormDelay = 0.1;  // seconds
 // A person does not notice that a key comes later by this.
 constexpr double LongestKeysHold = 0.3;  // seconds
+// More than this is not erased to be typed again: the user would see it go.
+constexpr std::size_t LongestMove = 100;
 // Whatever sound announces expansions, a form is announced by this one.
 constexpr const char* FormSound = "Pop";
 
@@ -49,11 +52,11 @@ void SnippetSender::fieldsEditorDidClose(const Expansion& content) {
     mergeFields(*content);
     processScripts(*content);
     const bool runsScripts = !content->scripts.empty() || content->originalSnippet->isScript();
-    const KeysHold hold = runsScripts ? holdKeysForScripts() : nullptr;
+    const Waiting waiting{runsScripts ? holdKeysForScripts() : nullptr};
     if (content->scripts.empty()) {
-        sendContent(content, SnippetTrigger::Digit, hold);
+        sendContent(content, SnippetTrigger::Digit, waiting);
     } else {
-        executeScripts(content, hold);
+        executeScripts(content, waiting);
     }
 }
 
@@ -63,37 +66,58 @@ SnippetSender::KeysHold SnippetSender::holdKeysForScripts() {
     return dependencies_.inputService.holdUserKeys(LongestKeysHold);
 }
 
-void SnippetSender::executeScripts(const Expansion& content, const KeysHold& hold) {
+// Output belongs where the abbreviation stood, and the user may have typed on: that is erased and comes again behind
+// the output, where the program confirms that nothing else stands between. `suffix` counts as typed and is still to
+// come.
+std::u16string SnippetSender::movedBehindOutput(const Waiting& waiting, std::u16string_view suffix,
+                                                PLOutput& output) const {
+    if (!waiting.erased) return {};
+    std::u16string_view typed = dependencies_.letters.typedSince(*waiting.erased).value_or(u"");
+    if (!typed.starts_with(suffix)) return {};
+    typed.remove_prefix(suffix.size());
+    if (typed.empty() || typed.size() > LongestMove) return {};
+    const auto before =
+        AXUtils::getTextBeforeCaretWithMaxLength(dependencies_.accessibility, static_cast<std::int64_t>(typed.size()));
+    if (before != typed || AXUtils::getSelectedTextRange(dependencies_.accessibility).length != 0) return {};
+    output.erasedText = typed;
+    output.backspaceCount = typed.size();
+    return std::u16string(typed);
+}
+
+void SnippetSender::executeScripts(const Expansion& content, const Waiting& waiting) {
     performInBackground(
         [&runner = dependencies_.scriptRunner, content] {
             for (const auto& script : content->scripts) script->execute(runner);
             mergeScriptResults(*content);
         },
-        [this, content, hold] { sendContent(content, SnippetTrigger::ScriptResult, hold); });
+        [this, content, waiting] { sendContent(content, SnippetTrigger::ScriptResult, waiting); });
 }
 
-void SnippetSender::runScriptSnippet(const Expansion& content, const KeysHold& hold) {
+void SnippetSender::runScriptSnippet(const Expansion& content, const Waiting& waiting) {
     lastUsedSnippet_ = content->originalSnippet;
     const auto script = std::make_shared<PLScript>();
     script->script = content->string();
     script->isAppleScript = content->originalSnippet->contentType() == ContentType::AppleScript;
     script->suffix = content->suffix;
     performInBackground([&runner = dependencies_.scriptRunner, script] { script->execute(runner); },
-                        [this, script, hold] { onScriptExecuted(*script); });
+                        [this, script, waiting] { onScriptExecuted(*script, waiting); });
 }
 
-void SnippetSender::onScriptExecuted(const PLScript& script) {
+void SnippetSender::onScriptExecuted(const PLScript& script, const Waiting& waiting) {
     const std::u16string suffix = script.suffix.value_or(u"");
     const bool isSilent = !script.result || script.result->empty();
     if (isSilent && suffix.empty()) return;
     const auto output = std::make_shared<PLOutput>();
     output->trigger = SnippetTrigger::ScriptResult;
+    const std::u16string moved = movedBehindOutput(waiting, suffix, *output);
     // The delimiter that was typed behind the abbreviation is the user's own.
-    output->snippetExpandedContent = std::make_shared<SnippetExpandedContent>(isSilent ? suffix : *script.result);
+    output->snippetExpandedContent =
+        std::make_shared<SnippetExpandedContent>((isSilent ? suffix : *script.result) + moved);
     dependencies_.inputService.sendOutput(output);
     if (!isSilent) playFeedback(feedbackSound_);
-    // What was typed while the script ran stands in front of its output, and the kept delimiter behind it.
-    sentLater_({.letters = script.suffix});
+    // What was typed while the script ran stands in front of its output, unless it could be moved, and the kept
+    // delimiter behind it.
+    sentLater_({.letters = suffix + moved});
 }
 
 void SnippetSender::performInBackground(std::function<void()> work, std::function<void()> finish) {

@@ -108,15 +108,15 @@ std::optional<SnippetSender::Sent> SnippetSender::send(const Request& request) {
 
     // The abbreviation goes at once, the content comes when the form is filled in or the script has run.
     output->cancelTrigger = true;
-    const KeysHold hold = needsForm ? nullptr : holdKeysForScripts();
+    const Waiting waiting{needsForm ? nullptr : holdKeysForScripts(), dependencies_.letters.resets()};
     dependencies_.inputService.sendOutput(output);
     content->suffix = keptDelimiter(request);
     if (needsForm) {
         showFieldsEditor(content);
     } else if (content->scripts.empty()) {
-        runScriptSnippet(content, hold);
+        runScriptSnippet(content, waiting);
     } else {
-        executeScripts(content, hold);
+        executeScripts(content, waiting);
     }
     return Sent{.swallowsKey = output->cancelTrigger};
 }
@@ -135,13 +135,14 @@ SnippetSender::Sent SnippetSender::sendAtOnce(const Request& request, const Expa
     return sent;
 }
 
-void SnippetSender::sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const KeysHold& hold) {
+void SnippetSender::sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const Waiting& waiting) {
     if (content->originalSnippet->isScript()) {
-        runScriptSnippet(content, hold);
+        runScriptSnippet(content, waiting);
         return sentLater_({});
     }
     const auto output = std::make_shared<PLOutput>();
     output->trigger = snippetTrigger;
+    content->suffix += movedBehindOutput(waiting, content->suffix, *output);
     sentLater_(sendText(content, output));
 }
 

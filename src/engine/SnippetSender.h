@@ -20,7 +20,9 @@
 #include "content/scripts/ScriptRunner.h"
 #include "engine/BackgroundTasks.h"
 #include "engine/FieldsEditor.h"
+#include "engine/TypedLetters.h"
 #include "input/MacInputService.h"
+#include "platform/Accessibility.h"
 #include "platform/Sounds.h"
 
 namespace plume {
@@ -41,6 +43,8 @@ class SnippetSender final : private FieldsEditor::Target {
         SnippetParser& snippetParser;
         ScriptRunner& scriptRunner;
         Sounds& sounds;
+        const Accessibility& accessibility;
+        const TypedLetters& letters;
         FieldsEditor::Factory makeFieldsEditor;  // empty: what needs a form is refused
         // Tells the user that something cannot work, in one sentence. Never empty.
         std::function<void(const std::string&)> report;
@@ -97,6 +101,12 @@ class SnippetSender final : private FieldsEditor::Target {
     using Output = std::shared_ptr<PLOutput>;
     // Shared by what runs for one snippet, which may be one script after the other; null where no key waits.
     using KeysHold = std::shared_ptr<UserKeysHold>;
+    // What is known of the text while scripts run.
+    struct Waiting {
+        KeysHold hold;
+        // When the abbreviation was erased, by TypedLetters::resets; nothing where a form was open meanwhile.
+        std::optional<std::uint64_t> erased = {};
+    };
     struct OpenForm {
         std::unique_ptr<FieldsEditor> editor;  // null until it is time to make it
         Timer next;                            // makes the form, shows it, or lets it go
@@ -106,7 +116,7 @@ class SnippetSender final : private FieldsEditor::Target {
     Sent sendAtOnce(const Request& request, const Expansion& content, const Output& output);
     Sent sendText(const Expansion& content, const Output& output);
     // What a form or scripts have completed.
-    void sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const KeysHold& hold);
+    void sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const Waiting& waiting);
 
     void showFieldsEditor(const Expansion& content);
     void makeForm(OpenForm& form, const Expansion& content);
@@ -116,9 +126,10 @@ class SnippetSender final : private FieldsEditor::Target {
 
     // The user's keys wait for a script that is soon done, and follow behind what it gives.
     KeysHold holdKeysForScripts();
-    void executeScripts(const Expansion& content, const KeysHold& hold);
-    void runScriptSnippet(const Expansion& content, const KeysHold& hold);
-    void onScriptExecuted(const PLScript& script);
+    void executeScripts(const Expansion& content, const Waiting& waiting);
+    void runScriptSnippet(const Expansion& content, const Waiting& waiting);
+    void onScriptExecuted(const PLScript& script, const Waiting& waiting);
+    std::u16string movedBehindOutput(const Waiting& waiting, std::u16string_view suffix, PLOutput& output) const;
     void performInBackground(std::function<void()> work, std::function<void()> finish);
 
     void playFeedback(const std::string& name) const;

@@ -80,6 +80,7 @@ struct Scenario {
     std::map<std::u16string, std::shared_ptr<const ContextInputSetting>> applicationSettings;
     std::optional<Date> now;     // nothing: the real time
     bool keepsKeysBack = false;  // the keyboard can, while Plume sends
+    bool tellsItsText = true;    // applications do, to accessibility
     double scriptTime = 0;       // seconds that a script takes on the scenario's clock
     std::string timeZone;        // empty: the system's
     std::string locale;          // empty: the user's

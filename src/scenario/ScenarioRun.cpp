@@ -31,6 +31,7 @@ ScenarioRun::ScenarioRun(const Scenario& scenario)
     }
     desktop_.inputSources().setIdentifier(scenario_.inputSource);
     desktop_.keyboard().setCanHold(scenario_.keepsKeysBack);
+    if (!scenario_.tellsItsText) desktop_.accessibility().setFrontApplicationSource({});
     if (scenario_.clipboard) desktop_.pasteboard().copyFromProgram(*scenario_.clipboard);
     activate(scenario_.application);
     desktop_.front()->setText(scenario_.text);
