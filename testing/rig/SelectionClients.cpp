@@ -159,6 +159,24 @@ void SelectionRequestor::comeToFront(XClient& client) {
     client.activate(window_);
 }
 
+void SelectionRequestor::own(const std::string& selection) {
+    const xcb_atom_t ping = connection_->atom("_NET_WM_PING");
+    xcb_change_property(connection_->get(), XCB_PROP_MODE_REPLACE, window_, connection_->atom("WM_PROTOCOLS"),
+                        XCB_ATOM_ATOM, 32, 1, &ping);
+    xcb_set_selection_owner(connection_->get(), window_, connection_->atom(selection), XCB_CURRENT_TIME);
+    connection_->sync();
+}
+
+void SelectionRequestor::answerPing() {
+    while (!ping_) next("a ping");
+    ping_->window = connection_->root();
+    xcb_send_event(connection_->get(), 0, ping_->window,
+                   XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY | XCB_EVENT_MASK_SUBSTRUCTURE_REDIRECT,
+                   reinterpret_cast<const char*>(&*ping_));
+    ping_.reset();
+    connection_->sync();
+}
+
 void SelectionRequestor::next(const std::string& what) {
     const Deadline deadline(AnswerBound);
     while (true) {
@@ -172,6 +190,10 @@ void SelectionRequestor::next(const std::string& what) {
         const int type = event->response_type & 0x7F;
         if (type == XCB_SELECTION_NOTIFY) {
             answer_ = reinterpret_cast<const xcb_selection_notify_event_t&>(*event).property;
+            return;
+        }
+        if (type == XCB_CLIENT_MESSAGE) {
+            ping_ = reinterpret_cast<const xcb_client_message_event_t&>(*event);
             return;
         }
         if (type != XCB_PROPERTY_NOTIFY) continue;

@@ -86,6 +86,11 @@ class SelectionRequestor {
     // Shows its window and gives it the keyboard focus.
     void comeToFront(XClient& client);
 
+    // Takes a selection, gives nothing to those who ask for it, and says that it answers pings.
+    void own(const std::string& selection);
+    // Waits for a ping, and answers it. Throws RigError when none comes.
+    void answerPing();
+
     // What the owner gives; nothing when it refuses. Throws RigError when it does not answer.
     std::optional<SelectionData> request(const std::string& selection, const std::string& target);
     // The same, but what was given stays in its place, as some programs leave it.
@@ -116,6 +121,7 @@ class SelectionRequestor {
     xcb_window_t window_ = XCB_WINDOW_NONE;
     std::map<xcb_atom_t, int> newValues_;
     std::optional<xcb_atom_t> answer_;
+    std::optional<xcb_client_message_event_t> ping_;
     int pieces_ = 0;
     xcb_timestamp_t requestTime_ = XCB_CURRENT_TIME;
 };

@@ -319,6 +319,24 @@ TEST_F(X11PasteboardTest, PastesWhenAProgramThatAsksForTheTargetsHasThem) {
     awaitPaste();
 }
 
+TEST_F(X11PasteboardTest, PastesWhenAProgramThatHadTheClipboardKnowsThatItHasNot) {
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}});
+    SelectionRequestor front(display());
+    front.comeToFront(rig_->client());
+    declare({String}, &owner);
+    startsPaste();
+    awaitPaste();
+    for (const bool asks : {false, true}) {
+        const std::int64_t before = changeCount();
+        front.own("CLIPBOARD");
+        awaitChangeAfter(before);
+        declare({String}, &owner);
+        EXPECT_FALSE(startsPaste());
+        asks ? static_cast<void>(front.targets("CLIPBOARD")) : front.answerPing();
+        awaitPaste();
+    }
+}
+
 TEST_F(X11PasteboardTest, APasteThatWasNotTakenIsStillForItsProgramAlone) {
     NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}, {"UTF8_STRING", "given back"}});
     SelectionRequestor front(display());

@@ -13,6 +13,7 @@
 
 #include "ports/x11/X11Session.h"
 #include "ports/x11/clipboard/X11FrontPrograms.h"
+#include "ports/x11/clipboard/X11Ping.h"
 
 namespace plume {
 
@@ -45,25 +46,21 @@ class X11PasteTarget {
     bool isLate(xcb_window_t requestor, xcb_timestamp_t time);
 
   private:
-    bool ping();
-    bool understandsPing() const;
+    bool ask();
     void settle();
-    void noteAnswer(const xcb_generic_event_t& event);
+    void noteAnswer(bool isLatest);
     bool hasAnswered() const;
 
     X11Session& session_;
     X11FrontWindows windows_;
     xcb_timestamp_t replaced_ = 0;
-    bool asked_ = false;
     std::optional<double> answered_;   // when
     std::optional<double> firstLate_;  // when it first asked after the content was replaced
-    Timer ping_;
-    xcb_timestamp_t pinged_ = 0;  // the latest ping, by its time
+    X11Ping ping_;
+    Timer asking_;
     std::function<void()> tell_;  // that it has taken something
     bool readsOn_ = false;        // after that
     Timer settling_;
-    X11Session::WindowEvents rootEvents_;  // while an answer is awaited
-    Subscription answerHandler_;
 };
 
 }  // namespace plume

@@ -53,6 +53,7 @@ X11Pasteboard::X11Pasteboard(X11Session& session)
         std::make_unique<X11SelectionOwner>(session, *transfers_, "CLIPBOARD", [this](bool ours) { noteChange(ours); });
     primary_ = std::make_unique<X11SelectionOwner>(session, *transfers_, "PRIMARY",
                                                    [this](bool) { primaryReader_->ownerChanged(); });
+    questions_.ownerChanged(clipboard_->owner());
     connectOwners();
 }
 
@@ -82,7 +83,7 @@ void X11Pasteboard::noteChange(bool ours) {
     if (!ours) lateContent_.reset();
     if (!ours && ownershipLost) ownershipLost();
     reader_->ownerChanged();
-    questions_.ownerChanged();
+    questions_.ownerChanged(clipboard_->owner());
 }
 
 void X11Pasteboard::offer(const std::vector<SharedClipboardCopy::Entry>& entries) {

@@ -59,6 +59,8 @@ class X11SelectionOwner {
     xcb_timestamp_t ownedSince() const { return ownedSince_; }
     // Any owner at all.
     bool hasOwner() const { return owner_ != XCB_WINDOW_NONE; }
+    // None without one.
+    xcb_window_t owner() const { return owner_; }
     // What is or was offered last.
     const std::shared_ptr<X11SelectionContent>& content() const { return content_; }
 

@@ -15,7 +15,11 @@ constexpr std::size_t MostClients = 64;
 
 }  // namespace
 
-void X11TargetsQuestions::ownerChanged() {
+X11TargetsQuestions::X11TargetsQuestions(X11Session& session)
+    : session_(session), ping_(session, [this](bool) { proceed(); }) {}
+
+void X11TargetsQuestions::ownerChanged(xcb_window_t owner) {
+    former_ = std::exchange(owner_, clientOf(session_, owner));
     answered_.clear();
     changed_ = session_.runLoop().now();
     hasPasted_ = false;
@@ -27,27 +31,37 @@ void X11TargetsQuestions::wasAnswered(xcb_window_t requestor) {
     const bool isForTheChange = session_.runLoop().now() - changed_ <= LongestForThoseWhoAsk;
     if (hasPasted_ || !isForTheChange) return;
     if (asks_.size() >= MostClients) asks_.clear();
-    asks_[client] = true;
+    if (client != former_) asks_[client] = true;
     // The answer has to be in front of the keystroke, which goes another way.
     if (paste_ && client == awaited_) waiting_ = session_.runLoop().performAfterDelay(0, [this] { proceed(); });
 }
 
 void X11TargetsQuestions::whenAnswered(std::function<void()> paste) {
     paste_ = std::move(paste);
-    awaited_ = clientOf(session_, windowsInFront(session_).focus);
-    const auto known = asks_.find(awaited_);
-    if (answered_.contains(awaited_) || (known != asks_.end() && !known->second)) return proceed();
-    const double longest = known == asks_.end() ? LongestForStrangers : LongestForThoseWhoAsk;
+    const X11FrontWindows front = windowsInFront(session_);
+    awaited_ = clientOf(session_, front.focus);
+    const double longest = answered_.contains(awaited_) ? 0 : longestWait(front.active);
+    if (longest == 0) return proceed();
     waiting_ = session_.runLoop().performAfterDelay(longest, [this] { giveUp(); });
 }
 
+// In seconds.
+double X11TargetsQuestions::longestWait(xcb_window_t active) {
+    const bool hadClipboard = awaited_ == former_ && clientOf(session_, active) == former_;
+    if (hadClipboard && ping_.send(active)) return LongestForThoseWhoAsk;
+    const auto known = asks_.find(awaited_);
+    if (known == asks_.end()) return LongestForStrangers;
+    return known->second ? LongestForThoseWhoAsk : 0;
+}
+
 void X11TargetsQuestions::giveUp() {
-    asks_[awaited_] = false;
+    if (!ping_.wasSent()) asks_[awaited_] = false;
     proceed();
 }
 
 void X11TargetsQuestions::proceed() {
     waiting_.cancel();
+    ping_.end();
     hasPasted_ = true;
     session_.connection().sync();
     if (const auto paste = std::exchange(paste_, nullptr)) paste();
