@@ -111,10 +111,18 @@ void MacInputService::tapDisabledByTimeout() {
 
     around_.log("The keyboard is not listened to for a minute: the event tap was disabled three times within one");
     timeouts_.clear();
-    nextTry_ = around_.tapLoop.performAfterDelay(GivenUpPeriod, [this] { around_.keyboardTap.enable(); });
+    nextTry_ = around_.tapLoop.performAfterDelay(GivenUpPeriod, [this] { tryTapAgain(); });
     around_.mainLoop.perform([this] {
         KeyboardTapGivenUp givenUp;
         keyboardTapGivenUpEvent.raise(givenUp);
+    });
+}
+
+void MacInputService::tryTapAgain() {
+    onTapThread([this] {
+        if (!nextTry_) return;
+        nextTry_.cancel();
+        around_.keyboardTap.enable();
     });
 }
 

@@ -40,7 +40,7 @@ class MacInputService;
 // The keyboard went to another program, or a shortcut may have changed the text.
 struct InputContextChange {};
 
-// The tap was lost three times within a minute; it is tried again after another one.
+// The tap was lost three times within a minute; it is tried again after another one, or when somebody asks for it.
 struct KeyboardTapGivenUp {};
 
 class MacInputService final : private KeyboardTapListener {
@@ -85,6 +85,8 @@ class MacInputService final : private KeyboardTapListener {
     // created is logged, and nothing is heard.
     void enableEvents();
     void disableEvents();
+    // From any thread: the tap that was given up is tried again now. Nothing where none was.
+    void tryTapAgain();
     // Whether the keyboard tap exists.
     bool evenTapCreated() const { return around_.keyboardTap.exists(); }
     // From any thread: whether a keyboard tap could be created at all, and what is in the way.
@@ -205,7 +207,7 @@ class MacInputService final : private KeyboardTapListener {
     std::uint32_t lastWindowReceivedKeyEvent_ = 0;
     bool isLastProcessReceivedKeyEventNull_ = true;
     std::deque<double> timeouts_;  // when the tap was lost, within the last minute
-    Timer nextTry_;                // after the tap was given up
+    Timer nextTry_;                // set while the tap is given up
 };
 
 }  // namespace plume

@@ -96,6 +96,13 @@ std::optional<int> ChildProcess::waitForExit(Milliseconds bound) {
     return status_;
 }
 
+void ChildProcess::stop() {
+    kill(pid_, SIGSTOP);
+    siginfo_t stopped{};
+    while (waitid(P_PID, static_cast<id_t>(pid_), &stopped, WSTOPPED | WEXITED | WNOWAIT) < 0 && errno == EINTR) {
+    }
+}
+
 void ChildProcess::end() {
     if (status_) return;
     kill(-pid_, SIGTERM);

@@ -41,6 +41,9 @@ class ChildProcess {
     // The exit status (128 + signal when a signal ended it), or nothing when it still runs after `bound`.
     std::optional<int> waitForExit(Milliseconds bound);
 
+    // As by SIGSTOP. When this returns, no thread of the program runs any more; SIGCONT lets it go on.
+    void stop();
+
     // Asks the whole group to end, and kills what is still there after two seconds.
     void end();
 

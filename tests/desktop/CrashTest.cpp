@@ -110,7 +110,7 @@ TEST_F(Crash, StoppedForFiveSeconds) {
     startExpansionWithShift(*target);
     EXPECT_TRUE(waitUntil([&] { return target->text().starts_with("naïve"); }, Bound));
     const Deadline stopped(Milliseconds(5'000));
-    ASSERT_EQ(kill(plumePid(), SIGSTOP), 0);  // with more of the text to come, which must not come later
+    plume_->process().stop();  // with more of the text to come, which must not come later
     EXPECT_TRUE(isKeyboardUsable(Freed));
     rig_->keyboard().releaseAll();
     expectKeyboardAtRest(*target);

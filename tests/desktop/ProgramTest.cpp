@@ -31,6 +31,8 @@ constexpr const char* Library = R"json([
       { "abbreviation": "late", "contentType": 3, "content": "sleep 0.6; echo late" },
       { "abbreviation": "mark", "contentType": 3, "content": "echo mark >> \"$HOME/marks\"" },
       { "abbreviation": "in", "content": "[【snippet:;run】]" },
+      { "abbreviation": "who", "content": "Jo" },
+      { "abbreviation": "who", "content": "Ada" },
       { "abbreviation": "ask", "content": "Dear 【field:Name】" } ] },
   { "name": "Words", "expandTrigger": 1, "items": [
       { "abbreviation": "btw", "caseSensitivity": 2, "content": "by the way" } ] }
@@ -146,11 +148,38 @@ TEST_F(Program, AsksOnceWhetherProgramsMayTellAboutPasswordFields) {
     EXPECT_FALSE(waitUntil(isAsked, Milliseconds(700)));
 }
 
-TEST_F(Program, SaysThatASnippetNeedsAFormAndErasesNothing) {
+TEST_F(Program, OffersToListenAgainWhenTheKeyboardWasLostTooOften) {
+    plume_.reset();
+    rig_->session().join();
+    NoticeBoard board;
+    start(Library);
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    rig_->keyboard().type("x ;ask");
-    EXPECT_EQ(target->awaitText("x ;ask"), "x ;ask");
-    EXPECT_TRUE(waitUntil([&] { return log().find("form") != std::string::npos; })) << log();
+    const auto expands = [&] {
+        target->clear();
+        rig_->keyboard().type(" ;sig");
+        return target->awaitText(" Kind regards, Jo", Milliseconds(500)) == " Kind regards, Jo";
+    };
+    for (int times = 0; times < 3; ++times) {
+        ASSERT_TRUE(waitUntil(expands, Bound)) << log();
+        plume_->process().stop();
+        rig_->keyboard().type("x");
+        EXPECT_EQ(target->awaitText(" Kind regards, Jox"), " Kind regards, Jox");
+        ASSERT_EQ(kill(plume_->process().pid(), SIGCONT), 0);
+    }
+    const char* title = "Plume does not listen";
+    ASSERT_TRUE(waitUntil([&] { return board.body(title).has_value(); }, Bound)) << log();
+    EXPECT_FALSE(expands());
+    board.press(title, "Listen now");
+    EXPECT_TRUE(waitUntil(expands, Bound)) << log();
+}
+
+TEST_F(Program, SaysThatASnippetNeedsAFormOrAChoiceAndErasesNothing) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    rig_->keyboard().type("x ;ask ;who");
+    EXPECT_EQ(target->awaitText("x ;ask ;who"), "x ;ask ;who");
+    for (const char* reason : {"there is no form here", "there is no list here"}) {
+        EXPECT_TRUE(waitUntil([&] { return log().find(reason) != std::string::npos; })) << log();
+    }
 }
 
 TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {

@@ -215,6 +215,25 @@ TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {
     }
 }
 
+// As the server tells of a screen that is turned.
+TEST(LinuxPortTest, FollowsTheHeightOfTheScreen) {
+    X11Desk desk;
+    XClient& client = DesktopEnvironment::desktop->rig.client();
+    const xcb_screen_t& screen = client.screen();
+    EXPECT_EQ(desk.accessibility().mainScreenHeight(), screen.height_in_pixels);
+    for (const std::uint16_t height : {std::uint16_t{2'000}, screen.height_in_pixels}) {
+        xcb_configure_notify_event_t resized{};
+        resized.response_type = XCB_CONFIGURE_NOTIFY;
+        resized.event = resized.window = screen.root;
+        resized.width = screen.width_in_pixels;
+        resized.height = height;
+        xcb_send_event(client.connection(), 0, screen.root, XCB_EVENT_MASK_STRUCTURE_NOTIFY,
+                       reinterpret_cast<const char*>(&resized));
+        xcb_flush(client.connection());
+        EXPECT_TRUE(desk.runUntil([&] { return desk.accessibility().mainScreenHeight() == height; }));
+    }
+}
+
 }  // namespace
 
 }  // namespace plume::rig

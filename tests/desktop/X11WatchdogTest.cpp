@@ -104,19 +104,6 @@ class X11WatchdogTest : public testing::Test {
             << testing::PrintToString(rig_->client().keysDown());
     }
 
-    // When this returns, no thread of the program runs any more.
-    void stopProgram() {
-        const auto tasks = "/proc/" + std::to_string(program_->pid()) + "/task";
-        kill(program_->pid(), SIGSTOP);
-        ASSERT_TRUE(waitUntil([&] {
-            for (const auto& task : std::filesystem::directory_iterator(tasks)) {
-                const std::string state = contentOf(task.path() / "stat");
-                if (state.find(") T ") == std::string::npos) return false;
-            }
-            return true;
-        }));
-    }
-
     void holdX() {
         rig_->keyboard().press(rig_->keyboard().keycodeOf(U'x'));
         rig_->keyboard().sync();
@@ -146,7 +133,7 @@ class X11WatchdogTest : public testing::Test {
 TEST_F(X11WatchdogTest, AStoppedProgramLosesTheKeyboardAndTakesItAgainWhenContinued) {
     for (int i = 1; i <= tries(); ++i) {
         holdX();
-        stopProgram();
+        program_->stop();
         rig_->keyboard().releaseAll();
         EXPECT_LT(typeUntilFreed(), bound());
         expectNoKeyDown();
@@ -167,7 +154,7 @@ TEST_F(X11WatchdogTest, KeysTypedWhileItDoesNotAnswerArriveOnce) {
     };
     rig_->keyboard().type("x");
     EXPECT_EQ(target_->awaitText("x"), "x");
-    stopProgram();
+    program_->stop();
     rig_->keyboard().type(text);
     expectOnce("x" + text);
     expectEnded();
@@ -217,7 +204,7 @@ TEST_F(X11WatchdogTest, AWatchdogThatIsKilledIsReplaced) {
     }));
     watchdog_ = successor;
     rig_->keyboard().type("x");
-    stopProgram();
+    program_->stop();
     EXPECT_LT(typeUntilFreed(), bound() + 0.5);  // it may just be starting
     kill(program_->pid(), SIGCONT);
     expectRecovered(1);

@@ -227,7 +227,13 @@ TEST_F(MacInputServiceTest, TakesTheTapAgainTwiceAMinute) {
     EXPECT_THAT(heard(), ElementsAre("context", "given up"));
     desk.loop.advance(1);
     EXPECT_EQ(desk.tap.enabled, 4) << "after a minute";
-    EXPECT_EQ(desk.log.size(), 5U);
+    desk.service.tryTapAgain();
+    EXPECT_EQ(desk.tap.enabled, 4) << "nobody gave it up";
+    for (int i = 0; i < 3; ++i) desk.tap.listener->tapDisabledByTimeout();
+    desk.service.tryTapAgain();
+    desk.loop.advance(61);
+    EXPECT_EQ(desk.tap.enabled, 7) << "once, when asked for";
+    EXPECT_EQ(desk.log.size(), 9U);
     EXPECT_EQ(desk.log.front(), "Event tap was disabled by timeout");
     desk.log.clear();
     desk.tap.listener->tapDisabledByUserInput();

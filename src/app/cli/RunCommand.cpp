@@ -96,6 +96,7 @@ class Run {
             composition.loadPreferences();
             MacInputService& service = composition.inputService();
             port_.mainLoop().perform([this, &service] {
+                service_ = &service;
                 keyboardGivenUp_ = service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost);
             });
             composition.start();
@@ -145,9 +146,11 @@ class Run {
     }
 
     void keyboardLost(KeyboardTapGivenUp& /*event*/) {
-        voice_.say(
-            "Listening to the keyboard was ended three times within a minute, because Plume did not answer in "
-            "time. It is tried again in a minute.");
+        const auto listenAgain = [this] { port_.tapLoop().perform([this] { service_->tryTapAgain(); }); };
+        port_.ports().notices.show({"Plume does not listen",
+                                    "Listening to the keyboard was ended three times within a minute, because Plume "
+                                    "did not answer in time. It is tried again in a minute.",
+                                    {{"Listen now", listenAgain}}});
     }
 
     LinuxPort& port_;
@@ -156,7 +159,8 @@ class Run {
     std::ostream& output_;
     Voice& voice_;
     std::atomic<int> status_ = ExitStatus::Success;
-    Subscription keyboardGivenUp_;  // of the main thread, like the event
+    MacInputService* service_ = nullptr;  // of the tap thread, as long as its loop runs
+    Subscription keyboardGivenUp_;        // of the main thread, like the event
 };
 
 }  // namespace

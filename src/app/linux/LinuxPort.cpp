@@ -73,7 +73,7 @@ void LinuxPort::connectParts() {
     keyboard_->listenTo(*session_);
     pasteboard_->setSharedCopy(&clipboardCopy_);
     followFocus();
-    accessibility_.setMainScreenHeight(session_->connection().screen().height_in_pixels);
+    followScreen();
 
     // Whoever waits on the tap thread tells the watchdog that this is no hang.
     session_->heartbeat = [this] { watchdog_->beat(); };
@@ -98,6 +98,18 @@ void LinuxPort::followFocus() {
     }));
     processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
     tapLoop_.perform([this] { tellFrontProcess(); });
+}
+
+// People turn their screens and plug others in while Plume runs.
+void LinuxPort::followScreen() {
+    const XcbConnection& connection = session_->connection();
+    accessibility_.setMainScreenHeight(connection.screen().height_in_pixels);
+    rootEvents_ = session_->listen(connection.root(), XCB_EVENT_MASK_STRUCTURE_NOTIFY);
+    screenResized_ =
+        session_->addObserver(XCB_CONFIGURE_NOTIFY, [this, root = connection.root()](const xcb_generic_event_t& event) {
+            const auto& configured = reinterpret_cast<const xcb_configure_notify_event_t&>(event);
+            if (configured.window == root) accessibility_.setMainScreenHeight(configured.height);
+        });
 }
 
 void LinuxPort::tellFrontProcess() {

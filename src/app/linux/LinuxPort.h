@@ -71,6 +71,7 @@ class LinuxPort {
     Result<void> openDesktop(const std::string& display);
     void connectParts();
     void followFocus();
+    void followScreen();
     void tellFrontProcess();
     void focusMayHaveMoved();
 
@@ -84,6 +85,8 @@ class LinuxPort {
     HiddenPrompts hiddenPrompts_;
     SharedClipboardCopy clipboardCopy_;
     std::unique_ptr<X11Session> session_;
+    X11Session::WindowEvents rootEvents_;
+    Subscription screenResized_;
     std::unique_ptr<XkbKeyboard> keyboard_;
     std::unique_ptr<Watchdog> watchdog_;
     std::unique_ptr<TapConnection> tapConnection_;
