@@ -9,7 +9,7 @@ cd "$(dirname "$0")/.."
 
 REAL_PROGRAMS=(gedit gnome-text-editor mousepad kate kwrite geany featherpad l3afpad emacs-gtk vim-gtk3 tk
     openjdk-17-jdk-headless openjdk-17-jre gnome-terminal konsole xfce4-terminal qterminal xterm libreoffice-writer
-    libreoffice-calc libreoffice-impress libreoffice-gtk3 libreoffice-kf5 firefox-esr chromium)
+    libreoffice-calc libreoffice-impress libreoffice-gtk3 libreoffice-kf5 firefox-esr chromium copyq)
 
 need_packages "${BUILD_PACKAGES[@]}" "${DESKTOP_PACKAGES[@]}" "${REAL_PROGRAMS[@]}"
 build run -DPLUME_DEMO=ON

@@ -10,6 +10,7 @@
 #include <string>
 #include <vector>
 
+#include "testing/real/ClipboardHistory.h"
 #include "testing/real/Player.h"
 #include "testing/rig/PlumeProgram.h"
 
@@ -78,14 +79,20 @@ int run(const Arguments& arguments) {
     int right = 0;
     int wrong = 0;
     int programs = 0;
-    Player player(rig, arguments.pictures, arguments.choice, [&](const Outcome& outcome) {
+    const auto tell = [&](const Outcome& outcome) {
         ++(outcome.isRight ? right : wrong);
         print(outcome);
-    });
+    };
+    Player player(rig, arguments.pictures, arguments.choice, tell);
     for (const RealProgram& program : realPrograms()) {
         if (!arguments.choice.program.empty() && arguments.choice.program != program.name) continue;
         ++programs;
         player.play(program);
+    }
+    // Last: it stands by from then on.
+    if (arguments.choice.program.empty() || arguments.choice.program == ClipboardManager) {
+        ++programs;
+        tell(playHistory(rig, arguments.choice.times));
     }
     std::cout << '\n' << right + wrong << " checks in " << programs << " programs: " << wrong << " wrong\n";
     return wrong == 0 ? 0 : 1;
@@ -106,6 +113,7 @@ int main(int argc, char** argv) {
         }
         if (!arguments->onlyLists) return run(*arguments);
         for (const RealProgram& program : realPrograms()) std::cout << program.name << '\n';
+        std::cout << ClipboardManager << '\n';
         return 0;
     } catch (const std::exception& problem) {
         std::cerr << "real programs: " << problem.what() << '\n';

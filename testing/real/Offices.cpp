@@ -1,5 +1,6 @@
 #include "testing/real/RealProgram.h"
 #include "testing/rig/Deadline.h"
+#include "testing/rig/SelectionClients.h"
 
 namespace plume::real {
 
@@ -28,8 +29,11 @@ RealProgram office(const std::string& part, const std::string& backEnd, Place pl
             {"SAL_USE_VCLPLUGIN=" + backEnd}};
 }
 
-// They do what keys say that erase or move behind what is typed after them.
+// They do much of what keys say behind what is typed after it, and tell nobody when.
 constexpr rig::Milliseconds Settling{200};
+constexpr rig::Milliseconds Starting{3'000};
+constexpr rig::Milliseconds CutBound{2'000};
+constexpr rig::Milliseconds ClearBound{20'000};
 
 void pause(rig::Milliseconds time) {
     rig::waitUntil([] { return false; }, time);
@@ -38,37 +42,54 @@ void pause(rig::Milliseconds time) {
 void press(rig::DesktopRig& rig, Key key) {
     rig.keyboard().tap(key);
     rig.keyboard().sync();
+    pause(Settling);
+}
+
+// All that there is, and a letter at the caret.
+std::string cutAll(rig::DesktopRig& rig, const std::string& letter) {
+    rig::SelectionRequestor requestor(rig.server().display());
+    rig.client().emptySelection("CLIPBOARD");
+    rig.keyboard().type(letter);
+    rig.keyboard().chord({Key::LeftControl}, U'a');
+    pause(Settling);
+    rig.keyboard().chord({Key::LeftControl}, U'x');
+    std::string text;
+    rig::waitUntil(
+        [&] {
+            const auto cut = requestor.request("CLIPBOARD", "UTF8_STRING");
+            text = cut ? cut->bytes : "";
+            return !text.empty();
+        },
+        CutBound);
+    return text;
+}
+
+// Everything that was to be done before is done, and nothing is left, when a single letter is all that can be cut.
+void empty(rig::DesktopRig& rig) {
+    const std::string letter = "Q";
+    rig::waitUntil([&] { return cutAll(rig, letter) == letter; }, ClearBound);
 }
 
 Place document() {
-    return {.offers = {Needs::Lines}, .settling = Settling};
+    return {.offers = {Needs::Lines}, .settling = Settling, .clear = empty};
 }
 
 Place cell() {
     const auto edit = [](rig::DesktopRig& rig) {
-        press(rig, Key::Escape);
-        press(rig, Key::Delete);
-        press(rig, Key::F2);
+        for (const Key key : {Key::Escape, Key::Delete, Key::F2}) press(rig, key);
+        empty(rig);
     };
     return {.settling = Settling, .clear = edit};
 }
 
-// The title of the slide, entered anew each time. While it is not, select all means the frames, and they would go.
+// The text of the slide; the title moves the caret to its start when several lines are pasted. Outside of it, select
+// all would mean the frames, and they would go.
 Place slide() {
     const auto edit = [](rig::DesktopRig& rig) {
-        for (const Key key : {Key::Escape, Key::Escape, Key::Tab, Key::F2}) {
-            press(rig, key);
-            pause(Settling);
-        }
-        rig.keyboard().chord({Key::LeftControl}, U'a');
-        pause(Settling);
-        press(rig, Key::Backspace);
-    };
-    const auto start = [](rig::DesktopRig&) {
-        constexpr rig::Milliseconds Starting{3'000};
         pause(Starting);
+        for (const Key key : {Key::Escape, Key::Escape, Key::Tab, Key::Tab, Key::F2}) press(rig, key);
     };
-    return {.offers = {Needs::Lines}, .settling = Settling, .enter = start, .clear = edit};
+    return {.offers = {Needs::Lines}, .settling = Settling, .enter = edit, .clear = empty};
 }
 
 }  // namespace
