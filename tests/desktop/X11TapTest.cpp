@@ -58,6 +58,22 @@ INSTANTIATE_TEST_SUITE_P(All, X11TapTargetTest,
                          testing::Values(TargetKind::GtkTextView, TargetKind::QtTextEdit, TargetKind::Xterm),
                          [](const auto& tested) { return nameOf(tested.param); });
 
+// A window manager that is told of another layout in the middle of a shortcut gives the shortcut up.
+TEST_F(X11TapTest, HasTheLayoutToldBeforeTheFirstKey) {
+    rig_->keyboard().type("x");
+    createTap();
+    const std::unique_ptr<xcb_connection_t, decltype(&xcb_disconnect)> program(
+        xcb_connect(rig_->server().display().c_str(), nullptr), &xcb_disconnect);
+    const int key = rig_->keyboard().keycodeOf(U'x');
+    rig_->keyboard().press(key);
+    await("the key is down for programs", [&] { return std::ranges::count(keysDown(), key) == 1; });
+    rig_->keyboard().release(key);
+    own(xcb_get_input_focus_reply(program.get(), xcb_get_input_focus(program.get()), nullptr));
+    while (const auto event = own(xcb_poll_for_queued_event(program.get()))) {
+        EXPECT_NE(event->response_type, XCB_MAPPING_NOTIFY);
+    }
+}
+
 TEST_F(X11TapTest, TellsWhatKeysProduceAndWhichModifiersAreHeld) {
     struct Case {
         int keycode;

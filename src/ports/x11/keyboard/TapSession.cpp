@@ -45,6 +45,7 @@ Result<void> TapSession::begin() {
     decoder_.setKeymap(keymaps_.current(), connection.userKeys, dependencies_.keyboard.locks());
     selectEvents(XCB_INPUT_DEVICE_ALL, XCB_INPUT_XI_EVENT_MASK_HIERARCHY);
     selectEvents(connection.testKeyboard(), XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS);
+    becomeTypedOn();
     grabCheck_->ask(dependencies_.loop.now());
     connection.connection().sync();
     addSource();
@@ -64,6 +65,16 @@ std::optional<std::uint16_t> TapSession::typedOnLast() const {
         }
     }
     return typedOn;
+}
+
+// At the first key of another keyboard the server gives all programs its layout. Window managers bind their keys anew
+// then, and do nothing on them meanwhile, for a second and more: that is to be over when the user's first key passes.
+void TapSession::becomeTypedOn() const {
+    TapConnection& connection = dependencies_.connection;
+    const auto& withoutSymbols = keymaps_.current()->spareKeycodes();
+    if (withoutSymbols.empty()) return;
+    connection.sendKey(withoutSymbols.back(), true);
+    connection.sendKey(withoutSymbols.back(), false);
 }
 
 void TapSession::typeOn(std::uint16_t device) {

@@ -67,6 +67,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     };
 
     std::optional<std::uint16_t> typedOnLast() const;
+    void becomeTypedOn() const;
     void typeOn(std::uint16_t device);
     void selectEvents(std::uint16_t device, std::uint32_t events) const;
     void addSource();
