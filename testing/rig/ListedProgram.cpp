@@ -100,8 +100,9 @@ std::vector<std::string> ListedProgram::childrenOf(const std::string& path) cons
 
 std::uint32_t ListedProgram::stateOf(const std::string& path) const {
     if (path == WindowPath) return hidesParts_ ? 0 : bit(AtspiState::Active);
-    if (path == pathOf(focused_)) return bit(AtspiState::Showing) | bit(AtspiState::Focused);
-    return bit(AtspiState::Showing);
+    const bool isField = path == TextPath || path == PasswordPath;
+    return bit(AtspiState::Showing) | (isField ? bit(AtspiState::Editable) : 0) |
+           (path == pathOf(focused_) ? bit(AtspiState::Focused) : 0);
 }
 
 void ListedProgram::answer(DBusMessage* call) {

@@ -205,6 +205,50 @@ TEST_F(AccessibilityFocusTest, ADeepProgramIsListenedToWhileItIsInFront) {
     EXPECT_TRUE(waitUntil([&] { return client.registeredEvents() == 0; }));
 }
 
+TEST_F(AccessibilityFocusTest, AKeyBehindATabWaitsForWhereTheFocusGoes) {
+    ListedProgram program(address(), 60);
+    accessibility_->setFrontProcess(getpid());
+    bool isPassword = false;
+    for (int i = 0; i < 4 && !isPassword; ++i) {  // a busy machine may take longer than the bound
+        ASSERT_TRUE(awaitTyping([&] {
+            program.focus(ListedProgram::Field::Text);
+            return accessibility_->focusedProcess() == getpid() && !accessibility_->focusIsPassword();
+        }));
+        accessibility_->userMovesFocus(FocusMover::Tab);
+        program.focus(ListedProgram::Field::Password);
+        isPassword = accessibility_->focusIsPasswordForKey();
+    }
+    EXPECT_TRUE(isPassword);
+}
+
+TEST_F(AccessibilityFocusTest, NoKeyWaitsForAProgramThatTellsNothing) {
+    const auto terminal = rig_->startTarget(TargetKind::Xterm);
+    accessibility_->setFrontProcess(terminal->pid());
+    accessibility_->focusIsPasswordForKey();
+    auto quickest = steady_clock::duration::max();
+    for (int i = 0; i < 4; ++i) {
+        accessibility_->userMovesFocus(FocusMover::Tab);
+        const auto begin = steady_clock::now();
+        EXPECT_FALSE(accessibility_->focusIsPasswordForKey());
+        quickest = std::min(quickest, steady_clock::now() - begin);
+    }
+    EXPECT_LE(quickest, std::chrono::milliseconds(5));
+}
+
+TEST_F(AccessibilityFocusTest, AFocusThatMovesWithoutTheUserIsNoticed) {
+    ListedProgram program(address(), 60);
+    accessibility_->setFrontProcess(getpid());
+    EXPECT_TRUE(awaitTyping([&] {  // what an earlier test expected is over within a second
+        program.focus(ListedProgram::Field::Text);
+        program.focus(ListedProgram::Field::Password);
+        return accessibility_->takeOwnMove();
+    }));
+    accessibility_->userMovesFocus(FocusMover::Tab);
+    program.focus(ListedProgram::Field::Text);
+    EXPECT_TRUE(waitUntil([] { return !accessibility_->focusIsPassword(); }));
+    EXPECT_FALSE(accessibility_->takeOwnMove());
+}
+
 TEST_F(AccessibilityFocusTest, AProgramThatHidesItsPartsIsAskedForThem) {
     ListedProgram program(address(), 3);
     program.hideParts();

@@ -282,7 +282,10 @@ TEST_F(X11TapTest, PassesKeysUnheardWhileSomebodyHoldsTheKeyboard) {
 TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     std::atomic<bool> password = true;
-    tap_->run([&] { tap_->tap->setFocusIsPassword([&] { return password.load(); }); });
+    std::atomic<bool> moved = false;
+    tap_->run([&] {
+        tap_->tap->setFocusQuestions({[&] { return password.load(); }, [&] { return moved.exchange(false); }});
+    });
     createTap();
     rig_->keyboard().type("Se");
     rig_->keyboard().press(Key::LeftShift);
@@ -298,6 +301,10 @@ TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     EXPECT_EQ(all.at(0), (Heard{Type::FlagsChanged, KeyCode::Shift, EventFlag::Shift, u""}))
         << "what was missed is made up for";
     EXPECT_EQ(all.at(1), (Heard{Type::KeyDown, KeyCode::A, EventFlag::Shift, u"A"}));
+    moved = true;
+    tapKey(38);
+    takeHeard(2);
+    EXPECT_EQ(tap_->run([this] { return listener_.withheld; }), 2) << "what was typed before was for another field";
 }
 
 TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEndedAndMakesUpForWhatItMissed) {

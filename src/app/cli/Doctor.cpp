@@ -207,7 +207,8 @@ class Examination {
         std::string names;
         for (const std::string& name : silent) names += (names.empty() ? "" : ", ") + name;
         warn("password fields",
-             "Plume hears what is typed into those of programs that do not tell about them: " + names);
+             "Plume hears what is typed into those of programs that do not tell about them: " + names +
+                 ". Chromium and what is built on it tell only if accessibility was on when they were started.");
     }
 
     // Their engines work inside the programs, behind the keys.

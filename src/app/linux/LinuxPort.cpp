@@ -23,11 +23,21 @@ Result<void> keep(Result<std::unique_ptr<Part>> result, std::unique_ptr<Part>& p
     return {};
 }
 
-// Keys by which people leave a field or set something off, by themselves or with a modifier.
-bool movesFocus(KeyCode keyCode, EventFlags flags) {
-    constexpr std::array Keys = {KeyCode::Tab, KeyCode::Return, KeyCode::KeypadEnter, KeyCode::Escape};
-    constexpr EventFlags Shortcuts = EventFlag::Control | EventFlag::Option | EventFlag::Command;
-    return flags.containsAny(Shortcuts) || std::ranges::find(Keys, keyCode) != Keys.end();
+bool isShortcut(EventFlags flags) {
+    return flags.containsAny(EventFlag::Control | EventFlag::Option | EventFlag::Command);
+}
+
+// Keys by which people leave a field.
+std::optional<FocusMover> moverOf(KeyCode keyCode, EventFlags flags) {
+    if (isShortcut(flags)) return std::nullopt;
+    if (keyCode == KeyCode::Tab) return FocusMover::Tab;
+    const bool isReturn = keyCode == KeyCode::Return || keyCode == KeyCode::KeypadEnter;
+    return isReturn ? std::optional(FocusMover::Return) : std::nullopt;
+}
+
+// Keys that may set something off which takes the focus.
+bool maySetOff(KeyCode keyCode, EventFlags flags) {
+    return isShortcut(flags) || keyCode == KeyCode::Escape;
 }
 
 }  // namespace
@@ -64,8 +74,9 @@ Result<void> LinuxPort::openDesktop(const std::string& display) {
     processManager_ = std::make_unique<X11ProcessManager>(*session_, DesktopFiles::ofEnvironment());
     inputSources_ = std::make_unique<X11InputSources>(*keyboard_);
     systemHotKeys_ = std::make_unique<X11SystemHotKeys>(*session_, *keyboard_);
-    keyboardTap_->setFocusIsPassword(
-        [this] { return accessibility_.focusIsPasswordForKey() || hiddenPrompts_.isWaitingForKey(); });
+    keyboardTap_->setFocusQuestions(
+        {.isPassword = [this] { return accessibility_.focusIsPasswordForKey() || hiddenPrompts_.isWaitingForKey(); },
+         .movedByItself = [this] { return accessibility_.takeOwnMove(); }});
     return {};
 }
 
@@ -84,7 +95,9 @@ void LinuxPort::connectParts() {
 // Programs are asked for their focus when it may have moved.
 void LinuxPort::followFocus() {
     keyboardTap_->setUserTyped([this](KeyCode keyCode, EventFlags flags) {
-        if (movesFocus(keyCode, flags)) {
+        if (const auto mover = moverOf(keyCode, flags)) {
+            userMovesFocus(*mover);
+        } else if (maySetOff(keyCode, flags)) {
             focusMayHaveMoved();
         } else {
             accessibility_.userTypes();
@@ -94,7 +107,7 @@ void LinuxPort::followFocus() {
     // Where clicks cannot be heard, the tap says so when it is created.
     static_cast<void>(mouseTap_->setClicked([this] {
         keyboardTap_->userClicked();
-        focusMayHaveMoved();
+        userMovesFocus(FocusMover::Click);
     }));
     processManager_->frontMayHaveChanged = [this] { tapLoop_.perform([this] { tellFrontProcess(); }); };
     tapLoop_.perform([this] { tellFrontProcess(); });
@@ -118,6 +131,11 @@ void LinuxPort::tellFrontProcess() {
     accessibility_.setFrontProcess(process);
     hiddenPrompts_.setFrontProcess(process);
     focusMayHaveMoved();
+}
+
+void LinuxPort::userMovesFocus(FocusMover mover) {
+    accessibility_.userMovesFocus(mover);
+    hiddenPrompts_.promptMayHaveCome();
 }
 
 void LinuxPort::focusMayHaveMoved() {

@@ -74,6 +74,7 @@ class LinuxPort {
     void followScreen();
     void tellFrontProcess();
     void focusMayHaveMoved();
+    void userMovesFocus(FocusMover mover);
 
     PollRunLoop mainLoop_;
     PollRunLoop tapLoop_;

@@ -52,8 +52,16 @@ bool AtspiAccessibility::focusIsPassword() const {
 }
 
 bool AtspiAccessibility::focusIsPasswordForKey() {
-    thread_->tracker().awaitFirstLook();
+    thread_->tracker().awaitAnswers();
     return focusIsPassword();
+}
+
+void AtspiAccessibility::userMovesFocus(FocusMover mover) {
+    thread_->tracker().userMovesFocus(mover);
+}
+
+bool AtspiAccessibility::takeOwnMove() {
+    return thread_->tracker().takeOwnMove();
 }
 
 pid_t AtspiAccessibility::focusedProcess() const {

@@ -34,6 +34,9 @@ enum class AccessibilityStatus {
 // In English: what is the matter and what to do about it.
 std::string_view sentenceOf(AccessibilityStatus status);
 
+// What a user did that may move the focus.
+enum class FocusMover { Tab, Return, Click };
+
 class AtspiAccessibility final : public Accessibility {
   public:
     // Returns at once; until the accessibility bus is found everything answers nothing.
@@ -57,14 +60,21 @@ class AtspiAccessibility final : public Accessibility {
     void setFrontProcess(pid_t process);
     // After a click, a Tab, or a change of windows: looks for the focus a few times within a second.
     void focusMayHaveMoved();
-    // At every key: looks for the focus when it was not looked for lately. Costs a look at the clock otherwise.
+    // At every key: looks for the focus when it was not looked for lately, and once more when nobody types any longer.
+    // Costs a look at the clock otherwise.
     void userTypes();
 
     // Whether a password is typed into what has the focus. From any thread, never waits.
     bool focusIsPassword() const;
     // The same, for a key that is typed now: the first one in a program that has just come to the front waits until the
-    // program was asked, 50 ms at most. On the tap thread.
+    // program was asked, 50 ms at most, and one behind userMovesFocus() until 50 ms after it. On the tap thread.
     bool focusIsPasswordForKey();
+    // After a Tab, a Return or a click of the user, which the program in front gets now: as focusMayHaveMoved(), and
+    // the next key waits for where the focus went, if that program tells of its focus at all. On the tap thread.
+    void userMovesFocus(FocusMover mover);
+    // Whether the program in front has moved the focus by itself, from one field of a line to another, since this was
+    // asked last. On the tap thread.
+    bool takeOwnMove();
     // The process that has the focus, by the bus's account; 0 when it is not known. From any thread, never waits.
     pid_t focusedProcess() const;
     // From any thread, never waits.

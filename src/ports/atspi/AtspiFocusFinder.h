@@ -63,6 +63,7 @@ class AtspiFocusListener {
     // To that program instead of another one. `address` is the bus's.
     void listenTo(const std::string& program, const std::string& address);
     void stop();
+    bool isListening() const { return !program_.empty(); }
 
   private:
     bool begin(const std::string& program, const std::string& address);

@@ -13,6 +13,7 @@
 #include <string>
 #include <utility>
 
+#include "ports/atspi/AtspiAccessibility.h"
 #include "ports/atspi/AtspiFocusFinder.h"
 #include "ports/posix/OwedAnswer.h"
 
@@ -21,6 +22,8 @@ namespace plume {
 // What is known of the focus.
 class AtspiFocus {
   public:
+    // What a part is to somebody who types.
+    enum class Kind { Unknown, Line, Lines, Password };
     // A program for as long as it is in front: what was found for an earlier one no longer holds.
     struct Front {
         pid_t process = 0;  // 0: not known
@@ -36,27 +39,39 @@ class AtspiFocus {
         return part_;
     }
     bool isKnown() const { return isKnown_; }
-    bool isPassword() const { return isPassword_; }
+    bool isPassword() const { return kind_ == Kind::Password; }
+    bool isLines() const { return kind_ == Kind::Lines; }
     pid_t process() const { return process_; }
+    // Whether it went from one field of a line to another since this was asked last, while nobody expected it to move.
+    bool takeOwnMove() { return movedByItself_.load(std::memory_order_relaxed) && movedByItself_.exchange(false); }
 
     // Whether that is another one. Its focus is not known at first.
     bool setFront(pid_t process) {
         const std::scoped_lock lock(mutex_);
         if (front_.process == process) return false;
         front_ = {process, front_.turn + 1};
-        change({}, false, 0);
+        lastLine_ = {};
+        movedByItself_ = false;
+        change({}, Kind::Unknown, 0);
         return true;
     }
-    void set(const Front& front, AtspiPart part, bool isPassword, pid_t process) {
+    void set(const Front& front, AtspiPart part, Kind kind, pid_t process, bool wasExpected) {
         const std::scoped_lock lock(mutex_);
-        if (front.turn == front_.turn) change(std::move(part), isPassword, process);
+        if (front.turn != front_.turn) return;
+        const bool isLine = kind == Kind::Line || kind == Kind::Password;
+        if (isLine && lastLine_ && lastLine_ != part && !wasExpected) movedByItself_ = true;
+        lastLine_ = isLine ? part : AtspiPart();
+        change(std::move(part), kind, process);
     }
-    void forget(const Front& front) { set(front, {}, false, 0); }
+    void forget(const Front& front) {
+        const std::scoped_lock lock(mutex_);
+        if (front.turn == front_.turn) change({}, Kind::Unknown, 0);
+    }
 
   private:
-    void change(AtspiPart part, bool isPassword, pid_t process) {
+    void change(AtspiPart part, Kind kind, pid_t process) {
         isKnown_ = static_cast<bool>(part);
-        isPassword_ = isPassword;
+        kind_ = kind;
         process_ = process;
         part_ = std::move(part);
     }
@@ -64,8 +79,10 @@ class AtspiFocus {
     mutable std::mutex mutex_;  // held to copy two strings, never longer
     Front front_;
     AtspiPart part_;
+    AtspiPart lastLine_;  // what had the focus last, if it is a field of one line
     std::atomic<bool> isKnown_ = false;
-    std::atomic<bool> isPassword_ = false;
+    std::atomic<Kind> kind_ = Kind::Unknown;
+    std::atomic<bool> movedByItself_ = false;
     std::atomic<pid_t> process_ = 0;
 };
 
@@ -86,8 +103,11 @@ class AtspiFocusTracker {
     void userTypes();
 
     // ---- On the tap thread ----
-    // Waits for the first look at a program that has come to the front, 50 ms at most and once a program.
-    void awaitFirstLook();
+    bool takeOwnMove() { return focus_.takeOwnMove(); }
+    void userMovesFocus(FocusMover mover);
+    // Waits for the first look at a program that has come to the front, 50 ms at most and once a program; and for where
+    // the focus went, until 50 ms after the user moved it.
+    void awaitAnswers();
 
     // ---- On the accessibility thread ----
     // What has the focus now, or a moment ago.
@@ -98,8 +118,12 @@ class AtspiFocusTracker {
 
     void lookSeveralTimes();
     void lookAfter(std::size_t step);
+    void lookAfterTyping();
     void look();
     void lookAt(const AtspiFocus::Front& front);
+    void heardFocus(const AtspiPart& part);
+    void expectMove();
+    bool isMoveExpected() const;
     void search(const AtspiFocus::Front& front);
     void becomeFocused(const AtspiFocus::Front& front, const AtspiPart& part, pid_t process);
     void listenWhereItHelps(const AtspiFocus::Front& front, const AtspiFocusFinder::Found& found);
@@ -117,7 +141,12 @@ class AtspiFocusTracker {
     Clock::time_point lookedAt_{};
     std::size_t misses_ = 0;  // looks in a row that found nothing, without those of a series
     Timer nextOfSeries_;      // of looks after a move; none after the last one
+    Timer afterTyping_;
     OwedAnswer firstLook_;
+    OwedAnswer moved_;  // where the focus went when the user moved it
+    std::atomic<Clock::rep> movedAt_ = 0;
+    std::atomic<Clock::rep> expectedUntil_ = 0;
+    std::atomic<bool> programTells_ = false;  // the one in front, of its focus
     // From when on a key makes for a look.
     std::atomic<Clock::rep> nextLook_ = 0;
 };

@@ -227,14 +227,24 @@ void TapSession::releaseKeysOf(std::uint16_t device) {
 
 bool TapSession::mayTell() {
     if (grabCheck_->isGrabbed(dependencies_.loop.now())) return false;
-    return !dependencies_.focusIsPassword || !dependencies_.focusIsPassword();
+    return !dependencies_.focus.isPassword || !dependencies_.focus.isPassword();
+}
+
+// After an output, its keys may have moved the focus.
+bool TapSession::isInAnotherField() {
+    constexpr double Settling = 1;
+    const auto& moved = dependencies_.focus.movedByItself;
+    return moved && moved() && dependencies_.loop.now() - releasedAt_ > Settling;
 }
 
 bool TapSession::tellsKey(const KeyDecoder::Key& key) {
     if (key.silent) return false;
     const bool withholdsNow = !mayTell();
     if (withholdsNow && !std::exchange(withholding_, true)) dependencies_.listener.typingInterrupted();
-    if (!withholdsNow) withholding_ = false;
+    if (!withholdsNow) {
+        withholding_ = false;
+        if (isInAnotherField()) dependencies_.listener.typingInterrupted();
+    }
     return !withholdsNow && !ended_;
 }
 
@@ -259,7 +269,7 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     } else if (!repeated || !down[keycode]) {
         inject({keycode, true});
     }
-    if (dependencies_.userTyped) dependencies_.userTyped(key.keyCode, key.flags);
+    if (dependencies_.userTyped && !swallow) dependencies_.userTyped(key.keyCode, key.flags);
 }
 
 void TapSession::release(xcb_keycode_t keycode) {
@@ -325,6 +335,7 @@ void TapSession::userClicked() {
 void TapSession::release() {
     if (ended_ || !std::exchange(held_, false)) return;
     readsAhead_ = false;
+    releasedAt_ = dependencies_.loop.now();
     holdLimit_.cancel();
     dependencies_.loop.setSourcePaused(descriptor_, false);
     if (waiting_) inject(*std::exchange(waiting_, {}));

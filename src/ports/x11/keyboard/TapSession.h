@@ -26,8 +26,14 @@
 
 namespace plume {
 
-// A key that the user pressed, by its virtual key code and with the flags of the modifiers held.
+// A key that the user pressed and that passes, by its virtual key code and with the flags of the modifiers held.
 using UserTyped = std::function<void(KeyCode keyCode, EventFlags flags)>;
+
+// What is asked at every key before it is told; either may be empty.
+struct FocusQuestions {
+    std::function<bool()> isPassword;     // what has the focus takes a password
+    std::function<bool()> movedByItself;  // since this was asked last
+};
 
 class TapSession : public std::enable_shared_from_this<TapSession> {
   public:
@@ -36,10 +42,10 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         TapConnection& connection;
         XkbKeyboard& keyboard;
         KeyboardTapListener& listener;
-        const std::function<bool()>& focusIsPassword;  // may be empty
-        const UserTyped& userTyped;                    // may be empty
-        std::function<void()> lost;                    // the connection is gone
-        EventFlags& toldFlags;                         // the modifiers that the listener takes to be held
+        const FocusQuestions& focus;
+        const UserTyped& userTyped;  // may be empty
+        std::function<void()> lost;  // the connection is gone
+        EventFlags& toldFlags;       // the modifiers that the listener takes to be held
     };
 
     explicit TapSession(Dependencies dependencies);
@@ -86,6 +92,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void release(xcb_keycode_t keycode);
     void releaseKeysOf(std::uint16_t device);
     bool mayTell();
+    bool isInAnotherField();
     bool tellsKey(const KeyDecoder::Key& key);
     void tellMissedModifiers(EventFlags flags);
     bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
@@ -111,6 +118,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     bool held_ = false;
     std::optional<Injection> waiting_;
     Timer holdLimit_;
+    double releasedAt_ = 0;
     bool readsAhead_ = false;                              // held for long: keys are looked at, and wait here
     std::deque<XcbOwned<xcb_generic_event_t>> readAhead_;  // in front of what is unread
 

@@ -19,8 +19,8 @@ X11KeyboardTap::~X11KeyboardTap() {
     remove();
 }
 
-void X11KeyboardTap::setFocusIsPassword(std::function<bool()> focusIsPassword) {
-    focusIsPassword_ = std::move(focusIsPassword);
+void X11KeyboardTap::setFocusQuestions(FocusQuestions questions) {
+    focus_ = std::move(questions);
 }
 
 void X11KeyboardTap::setUserTyped(UserTyped userTyped) {
@@ -43,7 +43,7 @@ Result<void> X11KeyboardTap::begin() {
                                                                          .connection = connection_,
                                                                          .keyboard = keyboard_,
                                                                          .listener = *listener_,
-                                                                         .focusIsPassword = focusIsPassword_,
+                                                                         .focus = focus_,
                                                                          .userTyped = userTyped_,
                                                                          .lost = [this] { lost(); },
                                                                          .toldFlags = toldFlags_});

@@ -25,10 +25,10 @@ class X11KeyboardTap final : public KeyboardTap {
     X11KeyboardTap(const X11KeyboardTap&) = delete;
     X11KeyboardTap& operator=(const X11KeyboardTap&) = delete;
 
-    // Whether what has the focus now takes a password; asked for every key, so it must be quick. Then, and while
-    // another program holds the keyboard, keys pass unheard.
-    void setFocusIsPassword(std::function<bool()> focusIsPassword);
-    // Told of every press, also of those that pass unheard; it must be quick, too.
+    // Asked for every key, so they must be quick. In a password, and while another program holds the keyboard, keys
+    // pass unheard; where the focus has moved by itself, what was typed before is no part of an abbreviation any more.
+    void setFocusQuestions(FocusQuestions questions);
+    // Told of every press that passes, also of those that pass unheard; it must be quick, too.
     void setUserTyped(UserTyped userTyped);
 
     Result<void> create(KeyboardTapListener& listener, bool annotatedSession) override;
@@ -56,7 +56,7 @@ class X11KeyboardTap final : public KeyboardTap {
     TapConnection& connection_;
     XkbKeyboard& keyboard_;
     const std::string display_;
-    std::function<bool()> focusIsPassword_;
+    FocusQuestions focus_;
     UserTyped userTyped_;
     KeyboardTapListener* listener_ = nullptr;
     EventFlags toldFlags_;                 // the modifiers that the listener takes to be held, across sessions
