@@ -17,6 +17,10 @@ function show() {
     const text = field.value === undefined ? field.innerText : field.value;
     document.title = '[' + text.replace(/[%\[\]\n]/g, encodeURIComponent) + ']';
 }
+document.addEventListener('keydown', event => {
+    const field = {F2: 'rich', Insert: 'password'}[event.key];
+    if (field) document.getElementById(field).focus();
+});
 for (const event of ['input', 'focusin']) document.addEventListener(event, show);
 </script>
 )";
@@ -27,13 +31,24 @@ user_pref("browser.aboutwelcome.enabled", false);
 user_pref("browser.shell.checkDefaultBrowser", false);
 user_pref("browser.startup.homepage_override.mstone", "ignore");
 user_pref("datareporting.policy.dataSubmissionEnabled", false);
-user_pref("network.dns.localDomains", "btw.example");
+user_pref("dom.security.https_first", false);
+user_pref("network.dns.localDomains", "btwexample.test");
 user_pref("toolkit.telemetry.reportingpolicy.firstRun", false);
 )";
 
-void pressTab(rig::DesktopRig& rig) {
-    rig.keyboard().tap(Key::Tab);
+// The page's keys for its fields.
+void enterRichField(rig::DesktopRig& rig) {
+    rig.keyboard().tap(Key::F2);
     rig.keyboard().sync();
+}
+
+void enterPasswordField(rig::DesktopRig& rig) {
+    rig.keyboard().tap(Key::Insert);
+    rig.keyboard().sync();
+}
+
+void openTab(rig::DesktopRig& rig) {
+    rig.keyboard().chord({Key::LeftControl}, U't');
 }
 
 void enterAddressBar(rig::DesktopRig& rig) {
@@ -41,10 +56,15 @@ void enterAddressBar(rig::DesktopRig& rig) {
 }
 
 std::vector<Place> places() {
-    return {{.name = "text area", .reading = Reading::Title, .offers = {Needs::Lines}},
-            {.name = "rich field", .reading = Reading::Title, .offers = {Needs::Lines}, .enter = pressTab},
-            {.name = "password field", .reading = Reading::Title, .offers = {Needs::Password}, .enter = pressTab},
-            {.name = "address bar", .enter = enterAddressBar}};
+    return {
+        {.name = "text area", .offers = {Needs::Lines}},
+        {.name = "rich field", .offers = {Needs::Lines}, .enter = enterRichField},
+        {.name = "password field", .reading = Reading::Title, .offers = {Needs::Password}, .enter = enterPasswordField},
+        {.name = "address bar", .enter = enterAddressBar},
+        {.name = "address bar, proposing",
+         .offers = {Needs::Proposals},
+         .enter = openTab,
+         .visited = "http://btwexample.test:{port}/"}};
 }
 
 }  // namespace
@@ -56,15 +76,19 @@ std::vector<RealProgram> browsers() {
          "irefox",
          {"firefox-esr", "--no-remote", "--profile", "{}/profile", "file://{}/page.html"},
          places(),
-         {{"page.html", Page}, {"profile/user.js", FirefoxSettings}}},
+         {{"page.html", Page}, {"index.html", "<title>visited</title>"}, {"profile/user.js", FirefoxSettings}},
+         {},
+         true},
         {"Chromium",
          "chromium",
          "hromium",
          {"chromium", "--no-sandbox", "--no-first-run", "--no-default-browser-check", "--password-store=basic",
           "--disable-gpu", "--test-type", "--user-data-dir={}/profile",
-          "--host-resolver-rules=MAP btw.example 127.0.0.1", "file://{}/page.html"},
+          "--host-resolver-rules=MAP btwexample.test 127.0.0.1", "file://{}/page.html"},
          places(),
-         {{"page.html", Page}}},
+         {{"page.html", Page}, {"index.html", "<title>visited</title>"}},
+         {},
+         true},
     };
 }
 

@@ -18,13 +18,13 @@ constexpr const char* Settings = R"(<?xml version="1.0" encoding="UTF-8"?>
 </oor:items>
 )";
 
-RealProgram office(const std::string& part, const std::string& backEnd, Place place) {
+RealProgram office(const std::string& part, const std::string& backEnd, std::vector<Place> places) {
     return {part + " (" + backEnd + ")",
             "libreoffice-core",
             "libreoffice",
             {"soffice", "--norestore", "--nologo", "-env:UserInstallation=file://{}/profile",
              "--" + std::string(1, static_cast<char>(part[0] + ('a' - 'A'))) + part.substr(1)},
-            {std::move(place)},
+            std::move(places),
             {{"profile/user/registrymodifications.xcu", Settings}},
             {"SAL_USE_VCLPLUGIN=" + backEnd}};
 }
@@ -82,6 +82,19 @@ Place cell() {
     return {.settling = Settling, .clear = edit};
 }
 
+// Not edited yet: what is typed replaces it, and the rest of the cell above it is proposed.
+Place cellBelow() {
+    const auto fillAbove = [](rig::DesktopRig& rig) {
+        press(rig, Key::Escape);
+        rig.keyboard().chord({Key::LeftControl}, Key::Home);
+        pause(Settling);
+        rig.keyboard().type("btwenty");
+        press(rig, Key::Return);
+        press(rig, Key::Delete);
+    };
+    return {.name = "cell, proposing", .offers = {Needs::Proposals}, .settling = Settling, .clear = fillAbove};
+}
+
 // The text of the slide; the title moves the caret to its start when several lines are pasted. Outside of it, select
 // all would mean the frames, and they would go.
 Place slide() {
@@ -97,9 +110,9 @@ Place slide() {
 std::vector<RealProgram> offices() {
     std::vector<RealProgram> programs;
     for (const std::string backEnd : {"gtk3", "kf5"}) {
-        programs.push_back(office("Writer", backEnd, document()));
-        programs.push_back(office("Calc", backEnd, cell()));
-        programs.push_back(office("Impress", backEnd, slide()));
+        programs.push_back(office("Writer", backEnd, {document()}));
+        programs.push_back(office("Calc", backEnd, {cell(), cellBelow()}));
+        programs.push_back(office("Impress", backEnd, {slide()}));
     }
     return programs;
 }

@@ -22,6 +22,10 @@ constexpr Milliseconds TextBound{3'000};
 constexpr Milliseconds CharacterBound{10};  // for each of a long text
 constexpr Milliseconds ClipboardBound{2'000};
 constexpr Milliseconds AskAgain{20};
+constexpr Milliseconds VisitBound{10'000};
+constexpr Milliseconds Proposing{500};
+constexpr Milliseconds BetweenKeys{150};
+constexpr Milliseconds BetweenFields{400};
 
 // As the package system has noted it.
 std::string versionOf(const std::string& package) {
@@ -39,11 +43,6 @@ void replaceAll(std::string& text, const std::string& from, const std::string& t
     for (auto at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size())) {
         text.replace(at, from.size(), to);
     }
-}
-
-std::string filled(std::string text, const std::filesystem::path& folder) {
-    replaceAll(text, "{}", folder);
-    return text;
 }
 
 // Ends of lines and spaces as they were typed: pages show a space at an end as one that does not break.
@@ -76,25 +75,44 @@ void Player::play(const RealProgram& program) {
         process = start(program);
         window_ = awaitWindow(program, *process);
         rig_.client().activate(window_);
+        if (program.isServed && !awaitTitle("[", ReadyBound)) throw rig::RigError("shows no page");
         for (const Place& place : program.places) playPlace(place);
     } catch (const rig::RigError& problem) {
         Outcome outcome{program.name, version_, "", "start", "", problem.what()};
         finish(outcome);
     }
     reader_.reset();
+    server_.reset();
 }
 
 std::unique_ptr<rig::ChildProcess> Player::start(const RealProgram& program) {
     folder_ = rig_.directory() / fileNameOf(program.name);
     std::filesystem::create_directories(folder_);
+    if (program.isServed) serve();
     for (const auto& [name, content] : program.files) {
         std::filesystem::create_directories((folder_ / name).parent_path());
-        std::ofstream(folder_ / name) << filled(content, folder_);
+        std::ofstream(folder_ / name) << filled(content);
     }
     std::vector<std::string> command{"env"};
-    for (const auto& line : program.environment) command.push_back(filled(line, folder_));
-    for (const auto& argument : program.command) command.push_back(filled(argument, folder_));
+    for (const auto& line : program.environment) command.push_back(filled(line));
+    for (const auto& argument : program.command) command.push_back(filled(argument));
     return rig_.session().start(command, program.package);
+}
+
+void Player::serve() {
+    server_ = rig_.session().start(
+        {"python3", "-u", "-m", "http.server", "--bind", "127.0.0.1", "--directory", folder_, "0"}, "python3");
+    const std::string word = " port ";
+    const auto saysPort = [&] { return server_->logTail().find(word) != std::string::npos; };
+    if (!rig::waitUntil(saysPort, ReadyBound)) throw rig::RigError("nothing is served: " + server_->logTail());
+    const std::string said = server_->logTail();
+    port_ = std::to_string(std::stoi(said.substr(said.find(word) + word.size())));
+}
+
+std::string Player::filled(std::string text) const {
+    replaceAll(text, "{}", folder_);
+    replaceAll(text, "{port}", port_);
+    return text;
 }
 
 xcb_window_t Player::awaitWindow(const RealProgram& program, rig::ChildProcess& process) {
@@ -132,7 +150,9 @@ void Player::playPlace(const Place& place) {
 bool Player::isChosen(const Place& place, const Story& story) const {
     if (!choice_.place.empty() && choice_.place != place.name) return false;
     if (!choice_.story.empty() && choice_.story != story.name) return false;
-    if (contains(place.offers, Needs::Password)) return story.needs == Needs::Password;
+    for (const Needs need : {Needs::Password, Needs::Proposals}) {
+        if (contains(place.offers, need)) return story.needs == need;
+    }
     return story.needs == Needs::Nothing || contains(place.offers, story.needs);
 }
 
@@ -141,6 +161,51 @@ void Player::enter(const Place& place) {
     settle(place);
     reader_ = makeReader(place.reading, rig_, window_, folder_ / "text");
     awaitReady(place);
+    if (contains(place.offers, Needs::Proposals)) awaitProposal(place);
+}
+
+// In an address bar. Firefox gives up a page that has not come when somebody types another address.
+void Player::visit(const Place& place) {
+    const std::string address = filled(place.visited);
+    const rig::Deadline deadline(ReadyBound);
+    while (!deadline.passed()) {
+        place.enter(rig_);
+        rig::waitUntil([] { return false; }, Proposing);
+        rig_.keyboard().type(address);
+        rig_.keyboard().tap(Key::Return);
+        rig_.keyboard().sync();
+        if (awaitTitle("visited", VisitBound)) return keepBookmark();
+    }
+    throw rig::RigError("does not go to " + address);
+}
+
+// Firefox proposes what is often visited, and what is a bookmark.
+void Player::keepBookmark() {
+    rig_.keyboard().chord({Key::LeftControl}, U'd');
+    rig::waitUntil([] { return false; }, 2 * Proposing);
+    rig_.keyboard().tap(Key::Return);
+    rig_.keyboard().sync();
+}
+
+bool Player::awaitTitle(const std::string& start, Milliseconds bound) {
+    return rig::waitUntil([&] { return rig_.client().property(window_, "_NET_WM_NAME").starts_with(start); }, bound);
+}
+
+// Without one, what is played there would show nothing.
+void Player::awaitProposal(const Place& place) {
+    if (!place.visited.empty()) visit(place);
+    const rig::Deadline deadline(ReadyBound);
+    const std::string begun = "btw";
+    while (!deadline.passed()) {
+        if (place.enter) place.enter(rig_);
+        rig::waitUntil([] { return false; }, Proposing);
+        clear(place);
+        rig_.keyboard().type(begun);
+        rig::waitUntil([] { return false; }, Proposing);
+        const std::string text = reader_->read();
+        if (text.starts_with(begun + 'e') || text.starts_with("http://" + begun)) return;
+    }
+    throw rig::RigError("proposes nothing " + place.name + ", has " + reader_->read());
 }
 
 // A window that has the focus may not take keys yet: it does once one of them has become text.
@@ -183,14 +248,22 @@ void Player::type(const Place& place, const Story& story) {
         pending.clear();
     };
     for (const char c : story.typed) {
-        if (c != LeftKey) {
+        if (c != LeftKey && c != FieldBefore) {
             pending += c;
+            if (story.typing != Typing::Slowly) continue;
+            flush();
+            rig::waitUntil([] { return false; }, BetweenKeys);
             continue;
         }
         flush();
-        rig_.keyboard().tap(Key::Left);
-        rig_.keyboard().sync();
-        settle(place);
+        if (c == LeftKey) {
+            rig_.keyboard().tap(Key::Left);
+            rig_.keyboard().sync();
+            settle(place);
+        } else {
+            rig_.keyboard().chord({Key::LeftShift}, Key::Tab);
+            rig::waitUntil([] { return false; }, BetweenFields);
+        }
     }
     flush();
 }

@@ -46,10 +46,16 @@ class Player {
 
   private:
     std::unique_ptr<rig::ChildProcess> start(const RealProgram& program);
+    void serve();
+    std::string filled(std::string text) const;
     xcb_window_t awaitWindow(const RealProgram& program, rig::ChildProcess& process);
     void playPlace(const Place& place);
     void enter(const Place& place);
     void awaitReady(const Place& place);
+    bool awaitTitle(const std::string& start, rig::Milliseconds bound);
+    void visit(const Place& place);
+    void keepBookmark();
+    void awaitProposal(const Place& place);
     void clear(const Place& place);
     static void settle(const Place& place);
     Outcome playStory(const Place& place, const Story& story);
@@ -66,6 +72,8 @@ class Player {
     const RealProgram* program_ = nullptr;  // the one that is played in
     std::string version_;
     std::filesystem::path folder_;
+    std::unique_ptr<rig::ChildProcess> server_;
+    std::string port_;  // the server's
     xcb_window_t window_ = XCB_WINDOW_NONE;
     std::unique_ptr<TextReader> reader_;
 };

@@ -32,6 +32,8 @@ struct Place {
     std::function<void(rig::DesktopRig&)> clear = {};
     // What a program makes of a story by rules of its own, by the story's name.
     std::map<std::string, std::string> expected = {};
+    // An address that is gone to before anything is played, and proposed from then on.
+    std::string visited = {};
 };
 
 struct RealProgram {
@@ -42,6 +44,8 @@ struct RealProgram {
     std::vector<Place> places;
     std::map<std::string, std::string> files = {};  // for that folder, by name
     rig::Environment environment = {};              // "NAME=value"
+    // Its folder is served on this machine, by HTTP: {port} in the command and in what is visited is where.
+    bool isServed = false;
 };
 
 const std::vector<RealProgram>& realPrograms();

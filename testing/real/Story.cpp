@@ -35,7 +35,11 @@ std::vector<Story> makeStories() {
         {"clipboard", "So ;rich and on", CopiedBefore, Needs::Nothing, Typing::AtOnce, Then::ReadClipboard},
         {"undo", "So btw ", "So btw ", Needs::Nothing, Typing::AtOnce, Then::Undo},
         {"password", "So ;ww btw ", "So ;ww btw ", Needs::Password},
+        {"password, behind a Tab", std::string(1, FieldBefore) + "\t;ww btw ", ";ww btw ", Needs::Password},
         {"proposals", "btw and on", "by the way and on", Needs::Proposals},
+        {"proposals, overlapping", "btw and on", "by the way and on", Needs::Proposals, Typing::RollingOver},
+        {"proposals, typed slowly", "btw and on", "by the way and on", Needs::Proposals, Typing::Slowly},
+        {"proposals, undo", "btw ", "btw ", Needs::Proposals, Typing::Slowly, Then::Undo},
     };
 }
 
@@ -64,7 +68,9 @@ std::string library() {
 
 std::string settings(const std::string& rows) {
     // The undo key is Control+Alt+Z.
-    return R"({ "PlayFeedbackSound": false, "UndoHotKey": 25769803782, "CustomApplicationSettings": )" + rows + "}";
+    return R"({ "PlayFeedbackSound": false, "LetProgramsTellPasswordFields": true, "UndoHotKey": 25769803782,
+  "CustomApplicationSettings": )" +
+           rows + "}";
 }
 
 }  // namespace plume::real

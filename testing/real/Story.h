@@ -9,7 +9,7 @@ namespace plume::real {
 enum class Needs { Nothing, Lines, Indentation, Password, Proposals };
 
 // How it is typed.
-enum class Typing { AtOnce, RollingOver };
+enum class Typing { AtOnce, RollingOver, Slowly };
 
 // What is done once it is typed, before the text is read.
 enum class Then { Read, Undo, ReadClipboard };
@@ -24,13 +24,15 @@ struct Story {
     Then then = Then::Read;
 };
 
-// In a story's typed text: the Left key.
+// In a story's typed text: the Left key, and the way to the field before this one, where the user stays a while.
 constexpr char LeftKey = '\x02';
+constexpr char FieldBefore = '\x03';
 
 // Played from the first to the last.
 const std::vector<Story>& stories();
 
-// The library that they are typed with, and the settings, as files. The rows are the user's own, of applications.
+// The library that they are typed with, and the settings, as files: programs are asked to tell of their password
+// fields, and the rows are the user's own, of applications.
 std::string library();
 std::string settings(const std::string& rows);
 
