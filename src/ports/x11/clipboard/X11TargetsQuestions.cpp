@@ -11,6 +11,7 @@ namespace {
 // Seconds.
 constexpr double LongestForStrangers = 0.03;
 constexpr double LongestForThoseWhoAsk = 0.2;
+constexpr double LongestForFormerOwners = 1.0;  // one that is busy would paste what it had
 constexpr std::size_t MostClients = 64;
 
 }  // namespace
@@ -48,7 +49,7 @@ void X11TargetsQuestions::whenAnswered(std::function<void()> paste) {
 // In seconds.
 double X11TargetsQuestions::longestWait(xcb_window_t active) {
     const bool hadClipboard = awaited_ == former_ && clientOf(session_, active) == former_;
-    if (hadClipboard && ping_.send(active)) return LongestForThoseWhoAsk;
+    if (hadClipboard && ping_.send(active)) return LongestForFormerOwners;
     const auto known = asks_.find(awaited_);
     if (known == asks_.end()) return LongestForStrangers;
     return known->second ? LongestForThoseWhoAsk : 0;

@@ -30,7 +30,7 @@ class X11TargetsQuestions {
     // A window asked, and the answer is on its way.
     void wasAnswered(xcb_window_t requestor);
     // Calls `paste` when the program in front knows what it wants to know: now, or from the run loop, at most 0.2 s
-    // later. A call that still waits is dropped.
+    // later, or one second if it had the clipboard. A call that still waits is dropped.
     void whenAnswered(std::function<void()> paste);
 
   private:
