@@ -1,7 +1,7 @@
 #include "testing/real/ClipboardHistory.h"
 
-#include <algorithm>
 #include <memory>
+#include <utility>
 #include <vector>
 
 #include "testing/rig/Deadline.h"
@@ -19,6 +19,7 @@ constexpr Milliseconds ManagerBound{20'000};
 constexpr Milliseconds GivenBackBound{5'000};
 // The manager reads what it sees a while later, and tells nobody when it has.
 constexpr Milliseconds Noticing{1'500};
+constexpr Milliseconds Answering{30};
 constexpr Milliseconds Gap{100};  // from a copy to the paste: none, one, two and so on
 constexpr int Gaps = 10;
 
@@ -42,10 +43,22 @@ void awaitManager(rig::DesktopRig& rig) {
 void awaitClipboard(rig::DesktopRig& rig, const std::string& text) {
     rig::SelectionRequestor requestor(rig.server().display());
     const auto isBack = [&] {
+        requestor.targets("CLIPBOARD");
         const auto got = requestor.request("CLIPBOARD", "UTF8_STRING");
         return got && got->bytes == text;
     };
     if (!rig::waitUntil(isBack, GivenBackBound)) throw rig::RigError("\"" + text + "\" does not come back");
+}
+
+// A program that takes its time, with content in several forms: the manager reads one after the other.
+std::unique_ptr<rig::ForeignOwner> copy(rig::DesktopRig& rig, const std::string& text) {
+    rig::SelectionOffer offer;
+    for (const char* form : {"text/html", "UTF8_STRING", "text/plain;charset=utf-8", "text/plain", "STRING"}) {
+        offer.push_back({form, {form, 8, text}});
+    }
+    rig::ForeignOwner::Options options;
+    options.beforeAnswer = [](const std::string&) { pause(Answering); };
+    return std::make_unique<rig::ForeignOwner>(rig.server().display(), std::move(offer), std::move(options));
 }
 
 }  // namespace
@@ -58,8 +71,7 @@ Outcome playHistory(rig::DesktopRig& rig, int rounds) {
     std::unique_ptr<rig::ForeignOwner> owner;
     for (int round = 0; round < rounds * Gaps; ++round) {
         const std::string text = "copied " + std::to_string(round);
-        owner = std::make_unique<rig::ForeignOwner>(rig.server().display(),
-                                                    rig::SelectionOffer{{"UTF8_STRING", {"UTF8_STRING", 8, text}}});
+        owner = copy(rig, text);
         pause(Gap * (round % Gaps));
         target->clear();
         rig.keyboard().type(";rich and on");

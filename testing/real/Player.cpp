@@ -311,6 +311,7 @@ std::string Player::playClipboard(const Place& place, const Story& story) {
     std::string text;
     rig::waitUntil(
         [&] {
+            requestor.targets("CLIPBOARD");
             const auto got = requestor.request("CLIPBOARD", "UTF8_STRING");
             text = got ? got->bytes : "";
             return text == CopiedBefore;

@@ -57,7 +57,10 @@ class ClipboardInTarget : public RobustnessInTarget {
     // What a program that is not in front finds on the clipboard, once it is the user's again.
     static void expectOnClipboard(const SelectionOffer& offer) {
         SelectionRequestor reader(rig_->server().display());
-        const auto textIsBack = [&] { return reader.request("CLIPBOARD", "UTF8_STRING") == offer.front().second; };
+        const auto textIsBack = [&] {
+            reader.targets("CLIPBOARD");
+            return reader.request("CLIPBOARD", "UTF8_STRING") == offer.front().second;
+        };
         EXPECT_TRUE(waitUntil(textIsBack, Milliseconds(10'000))) << log();
         for (const auto& [target, data] : offer) {
             const auto read = reader.request("CLIPBOARD", target);

@@ -147,8 +147,11 @@ class X11Desk final : public ContractDesk {
     }
     // On a thread of its own: Plume may have to answer.
     std::optional<std::u16string> readElsewhere() override {
-        auto answer = std::async(std::launch::async,
-                                 [this] { return SelectionRequestor(display()).request("CLIPBOARD", "UTF8_STRING"); });
+        auto answer = std::async(std::launch::async, [this] {
+            SelectionRequestor reader(display());
+            reader.targets("CLIPBOARD");
+            return reader.request("CLIPBOARD", "UTF8_STRING");
+        });
         runUntil([&] { return answer.wait_for(std::chrono::seconds(0)) == std::future_status::ready; });
         const auto data = answer.get();
         return data ? std::optional(fromUtf8(data->bytes)) : std::nullopt;

@@ -257,6 +257,24 @@ TEST_F(X11PasteboardTest, ClipboardManagersAreToldToForgetExpansionsAlone) {
     EXPECT_THAT(manager.targets("CLIPBOARD"), Not(Contains("x-kde-passwordManagerHint")));
 }
 
+TEST_F(X11PasteboardTest, AClipboardManagerInTheMiddleOfWhatWasCopiedGoesOnWithThat) {
+    SharedClipboardCopy copy;
+    const auto user = copyElsewhere({{"UTF8_STRING", utf8("copied")}});
+    NotingOwner& owner = makeOwner(NotingOwner::Contents{{String, "expansion"}});
+    SelectionRequestor manager(display());
+    thread_->run([&] { pasteboard_->setSharedCopy(&copy); });
+    for (const std::string& type : types()) data(type);
+    declare({String}, &owner);
+    EXPECT_EQ(manager.request("CLIPBOARD", "UTF8_STRING"), utf8("copied"));
+    manager.targets("CLIPBOARD");
+    EXPECT_EQ(manager.request("CLIPBOARD", "UTF8_STRING"), utf8("expansion"));
+    EXPECT_EQ(manager.request("CLIPBOARD", "application/x-copyq-hidden")->bytes, "1");
+    declare({String}, &owner);
+    EXPECT_THAT(manager.targets("CLIPBOARD"), Not(Contains("application/x-copyq-hidden")));
+    EXPECT_EQ(manager.request("CLIPBOARD", "UTF8_STRING"), utf8("copied")) << "it was met before";
+    thread_->run([&] { pasteboard_->setSharedCopy(nullptr); });
+}
+
 // ---- Who has taken it ----
 
 TEST_F(X11PasteboardTest, OnlyWhatTheProgramInFrontHasReadWasTaken) {

@@ -20,6 +20,7 @@ namespace {
 
 constexpr double LongestHandOver = 0.5;  // seconds
 constexpr double LongestReading = 1.0;
+constexpr std::size_t MostManagers = 16;
 
 // Text in whatever encoding a program gave it.
 std::string utf8FromText(std::string_view bytes, std::string_view target) {
@@ -69,8 +70,9 @@ void X11Pasteboard::connectOwners() {
             if (!target_.isOf(requestor)) return tell();
             target_.wasTaken(std::move(tell));
         };
-        owner->contentInstead = [this](xcb_window_t requestor, xcb_timestamp_t time) {
-            return lateContent_ && target_.isLate(requestor, time) ? lateContent_ : nullptr;
+        owner->contentInstead = [this, owner](xcb_window_t requestor, xcb_atom_t target, xcb_timestamp_t time) {
+            if (lateContent_ && target_.isLate(requestor, time)) return lateContent_;
+            return owner == clipboard_.get() ? contentBeforeFor(requestor, target) : nullptr;
         };
     }
     clipboard_->toldTargets = [this](xcb_window_t requestor) { questions_.wasAnswered(requestor); };
@@ -94,6 +96,38 @@ void X11Pasteboard::offer(const std::vector<SharedClipboardCopy::Entry>& entries
     }
     declareTypes(types, nullptr);
     for (const auto& entry : entries) setData(entry.bytes, entry.type);
+}
+
+// A clipboard manager that is in the middle of what the user copied goes on with that, and one that was met before sees
+// no expansion at all. Whoever pastes is in front, or has asked what is on offer.
+std::shared_ptr<X11PasteboardContent> X11Pasteboard::contentBeforeFor(xcb_window_t requestor, xcb_atom_t target) {
+    const bool isExpansion = content_ && content_->isExpansion();
+    if (!isExpansion || !sharedCopy_ || isInFront(session_, requestor)) return {};
+    const xcb_window_t client = clientOf(session_, requestor);
+    if (managers_.size() >= MostManagers) managers_.clear();
+    if (X11PasteboardContent::isHint(session_.connection().atomName(target))) {
+        managers_.try_emplace(client, changeCount_);
+    }
+    const auto manager = managers_.find(client);
+    // One that has just been met goes on with what it has half of.
+    const bool isMet = manager != managers_.end() && manager->second != changeCount_;
+    const bool asksForTargets = target == session_.connection().atom("TARGETS");
+    const bool mayPaste = asksForTargets || questions_.isAnswered(requestor);
+    return mayPaste && !isMet ? nullptr : contentBefore();
+}
+
+// What the user had there; null when it is not known.
+std::shared_ptr<X11PasteboardContent> X11Pasteboard::contentBefore() {
+    if (contentBefore_) return contentBefore_;
+    std::vector<std::string> types;
+    const auto entries = SharedClipboardCopy::read(sharedCopy_->descriptor());
+    types.reserve(entries.size());
+    for (const auto& entry : entries) types.push_back(entry.type);
+    if (types.empty()) return {};
+    contentBefore_ =
+        std::make_shared<X11PasteboardContent>(session_.connection(), *this, std::move(types), nullptr, forms_);
+    for (const auto& entry : entries) contentBefore_->set(entry.bytes, entry.type);
+    return contentBefore_;
 }
 
 bool X11Pasteboard::isHeld() const {
@@ -141,6 +175,7 @@ std::optional<std::string> X11Pasteboard::data(std::string_view type) const {
 std::int64_t X11Pasteboard::declareTypes(const std::vector<std::string>& types, PasteboardOwner* owner) {
     session_.collect();
     keepForTarget();
+    contentBefore_.reset();
     const bool followsExpansion = content_ && content_->isExpansion();
     content_ = std::make_shared<X11PasteboardContent>(session_.connection(), *this, types, owner, forms_);
     if (followsExpansion) hintForAMoment();

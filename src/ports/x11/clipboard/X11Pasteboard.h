@@ -10,6 +10,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <map>
 #include <memory>
 #include <string>
 #include <vector>
@@ -70,6 +71,8 @@ class X11Pasteboard final : public Pasteboard {
     void connectOwners();
     void hintForAMoment();
     void keepForTarget();
+    std::shared_ptr<X11PasteboardContent> contentBeforeFor(xcb_window_t requestor, xcb_atom_t target);
+    std::shared_ptr<X11PasteboardContent> contentBefore();
 
     X11Session& session_;
     SharedClipboardCopy* sharedCopy_ = nullptr;
@@ -86,8 +89,11 @@ class X11Pasteboard final : public Pasteboard {
     Timer hintsEnd_;
     X11PasteTarget target_;
     X11TargetsQuestions questions_;
-    std::shared_ptr<X11PasteboardContent> content_;         // what was declared last
-    std::shared_ptr<X11PasteboardContent> lateContent_;     // what the target of the last paste is still to have
+    std::shared_ptr<X11PasteboardContent> content_;      // what was declared last
+    std::shared_ptr<X11PasteboardContent> lateContent_;  // what the target of the last paste is still to have
+    // Clients that have asked for a hint, and at which change of the clipboard they first did.
+    std::map<xcb_window_t, std::int64_t> managers_;
+    std::shared_ptr<X11PasteboardContent> contentBefore_;   // what the user had there, once somebody has asked for it
     std::shared_ptr<X11PasteboardContent> selectedBefore_;  // what PRIMARY held before an expansion was offered there
 };
 

@@ -45,6 +45,10 @@ X11PasteboardContent::X11PasteboardContent(XcbConnection& connection, Pasteboard
       isExpansion_(owner != nullptr && isOfPasteboardTypes(types_)),
       hints_(isExpansion_) {}
 
+bool X11PasteboardContent::isHint(std::string_view target) {
+    return !historyHint(target).empty();
+}
+
 bool X11PasteboardContent::declares(std::string_view type) const {
     return std::find(types_.begin(), types_.end(), type) != types_.end();
 }
@@ -115,8 +119,8 @@ X11PasteboardContent::Bytes X11PasteboardContent::bytesFor(std::string_view targ
 std::optional<X11SelectionValue> X11PasteboardContent::value(xcb_atom_t target) {
     const std::string name = connection_.atomName(target);
     const auto names = targetNames();
-    const bool isHint = hints_ && !historyHint(name).empty();
-    if (!isHint && std::find(names.begin(), names.end(), name) == names.end()) return std::nullopt;
+    const bool hints = hints_ && isHint(name);
+    if (!hints && std::find(names.begin(), names.end(), name) == names.end()) return std::nullopt;
     Bytes bytes = bytesFor(name);
     if (!bytes) return std::nullopt;
     const auto form = declares(name) ? forms_.find(name) : forms_.end();
@@ -126,7 +130,7 @@ std::optional<X11SelectionValue> X11PasteboardContent::value(xcb_atom_t target) 
 
 void X11PasteboardContent::wasTaken(xcb_atom_t target) {
     const std::string name = connection_.atomName(target);
-    if (owner_ && historyHint(name).empty()) owner_->dataWasTaken(typeBehind(name));
+    if (owner_ && !isHint(name)) owner_->dataWasTaken(typeBehind(name));
 }
 
 }  // namespace plume

@@ -37,6 +37,8 @@ class X11PasteboardContent final : public X11SelectionContent {
     // Whether it hints, to those who ask, that clipboard managers are to keep nothing. An expansion does, and says so
     // in its targets.
     void setHints(bool hints) { hints_ = hints; }
+    // Whether that is what the target of this name is for.
+    static bool isHint(std::string_view target);
     // Asks for everything that is still only promised.
     void redeemAll();
 

@@ -83,7 +83,8 @@ void X11SelectionOwner::answer(const xcb_selection_request_event_t& request) {
     const bool isMultiple = request.target == session_.connection().atom("MULTIPLE");
     bool given = false;
     if (isOwner() && content_) {
-        const Content instead = contentInstead ? contentInstead(request.requestor, request.time) : nullptr;
+        const Content instead =
+            contentInstead ? contentInstead(request.requestor, request.target, request.time) : nullptr;
         const Content content = instead ? instead : content_;
         given = isMultiple ? giveMultiple(content, request.requestor, request.property)
                            : give(content, request.requestor, request.target, property);

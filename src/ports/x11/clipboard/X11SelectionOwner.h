@@ -45,7 +45,8 @@ class X11SelectionOwner {
     std::function<void(xcb_window_t)> isGiven;
     std::function<void(xcb_window_t, std::function<void()> tell)> wasRead;
     // Other content than what is offered, for those who still are to have it; null for all others. May be empty.
-    std::function<std::shared_ptr<X11SelectionContent>(xcb_window_t requestor, xcb_timestamp_t time)> contentInstead;
+    std::function<std::shared_ptr<X11SelectionContent>(xcb_window_t requestor, xcb_atom_t target, xcb_timestamp_t time)>
+        contentInstead;
     // This window has asked what is on offer, and the answer was sent. May be empty.
     std::function<void(xcb_window_t)> toldTargets;
 

@@ -2,8 +2,6 @@
 
 #include <utility>
 
-#include "ports/x11/clipboard/X11FrontPrograms.h"
-
 namespace plume {
 
 namespace {

@@ -14,6 +14,7 @@
 #include <set>
 
 #include "ports/x11/X11Session.h"
+#include "ports/x11/clipboard/X11FrontPrograms.h"
 #include "ports/x11/clipboard/X11Ping.h"
 
 namespace plume {
@@ -29,6 +30,8 @@ class X11TargetsQuestions {
     void ownerChanged(xcb_window_t owner);
     // A window asked, and the answer is on its way.
     void wasAnswered(xcb_window_t requestor);
+    // Whether its program asked since the owner changed.
+    bool isAnswered(xcb_window_t requestor) const { return answered_.contains(clientOf(session_, requestor)); }
     // Calls `paste` when the program in front knows what it wants to know: now, or from the run loop, at most 0.2 s
     // later, or one second if it had the clipboard. A call that still waits is dropped.
     void whenAnswered(std::function<void()> paste);
