@@ -1,4 +1,5 @@
 #include "testing/real/RealProgram.h"
+#include "testing/rig/Deadline.h"
 
 namespace plume::real {
 
@@ -47,12 +48,16 @@ void enterPasswordField(rig::DesktopRig& rig) {
     rig.keyboard().sync();
 }
 
-void openTab(rig::DesktopRig& rig) {
-    rig.keyboard().chord({Key::LeftControl}, U't');
-}
-
 void enterAddressBar(rig::DesktopRig& rig) {
     rig.keyboard().chord({Key::LeftControl}, U'l');
+}
+
+// Chromium's may have the focus in its page.
+void openTab(rig::DesktopRig& rig) {
+    constexpr rig::Milliseconds Opening{500};
+    rig.keyboard().chord({Key::LeftControl}, U't');
+    rig::waitUntil([] { return false; }, Opening);
+    enterAddressBar(rig);
 }
 
 std::vector<Place> places() {
