@@ -7,7 +7,7 @@ namespace {
 
 using rig::Key;
 
-// Shows in its title what stands in the field that has the focus.
+// Shows in its title what stands in the field that has the focus, and whether that takes a password.
 constexpr const char* Page = R"(<!doctype html><meta charset="utf-8"><title>[]</title>
 <textarea id="area" rows="6" cols="100" autofocus></textarea>
 <div id="rich" contenteditable style="border: 1px solid; min-height: 6em"></div>
@@ -16,7 +16,8 @@ constexpr const char* Page = R"(<!doctype html><meta charset="utf-8"><title>[]</
 function show() {
     const field = document.activeElement;
     const text = field.value === undefined ? field.innerText : field.value;
-    document.title = '[' + text.replace(/[%\[\]\n]/g, encodeURIComponent) + ']';
+    const mark = field.type === 'password' ? '*' : '';
+    document.title = mark + '[' + text.replace(/[%\[\]\n]/g, encodeURIComponent) + ']';
 }
 document.addEventListener('keydown', event => {
     const field = {F2: 'rich', Insert: 'password'}[event.key];

@@ -10,8 +10,10 @@
 #include <string>
 #include <vector>
 
+#include "ports/atspi/AtspiSession.h"
 #include "testing/real/ClipboardHistory.h"
 #include "testing/real/Player.h"
+#include "testing/rig/Deadline.h"
 #include "testing/rig/PlumeProgram.h"
 
 namespace plume::real {
@@ -70,12 +72,21 @@ void print(const Outcome& outcome) {
     std::cout.flush();
 }
 
+// Chromium and Firefox look once, when they start, whether they are to tell of their fields.
+void awaitAccessibility(rig::DesktopRig& rig) {
+    constexpr rig::Milliseconds Bound{10'000};
+    rig.session().join();
+    const auto isOn = [] { return findAccessibilityBus().status == AccessibilityStatus::Working; };
+    if (!rig::waitUntil(isOn, Bound)) throw rig::RigError("accessibility was not switched on");
+}
+
 int run(const Arguments& arguments) {
     using rig::PlumeProgram;
     rig::DesktopRig rig;
     const PlumeProgram plume(
         rig, library(), settings(arguments.rows),
         arguments.withAccessibility ? PlumeProgram::Accessibility::Found : PlumeProgram::Accessibility::Missing);
+    if (arguments.withAccessibility) awaitAccessibility(rig);
     int right = 0;
     int wrong = 0;
     int programs = 0;

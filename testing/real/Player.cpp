@@ -23,6 +23,7 @@ constexpr Milliseconds CharacterBound{10};  // for each of a long text
 constexpr Milliseconds ClipboardBound{2'000};
 constexpr Milliseconds AskAgain{20};
 constexpr Milliseconds VisitBound{10'000};
+constexpr Milliseconds EntryBound{1'000};
 constexpr Milliseconds Proposing{500};
 constexpr Milliseconds BetweenKeys{150};
 constexpr Milliseconds BetweenFields{400};
@@ -158,10 +159,20 @@ bool Player::isChosen(const Place& place, const Story& story) const {
 
 void Player::enter(const Place& place) {
     if (place.enter) place.enter(rig_);
+    if (contains(place.offers, Needs::Password)) awaitPasswordField(place);
     settle(place);
     reader_ = makeReader(place.reading, rig_, window_, folder_ / "text");
     awaitReady(place);
     if (contains(place.offers, Needs::Proposals)) awaitProposal(place);
+}
+
+// A page that is still coming does not follow its keys.
+void Player::awaitPasswordField(const Place& place) {
+    const rig::Deadline deadline(ReadyBound);
+    while (!awaitTitle("*[", EntryBound)) {
+        if (deadline.passed()) throw rig::RigError("does not go to its password field");
+        place.enter(rig_);
+    }
 }
 
 // In an address bar. Firefox gives up a page that has not come when somebody types another address.

@@ -53,6 +53,7 @@ class Player {
     void enter(const Place& place);
     void awaitReady(const Place& place);
     bool awaitTitle(const std::string& start, rig::Milliseconds bound);
+    void awaitPasswordField(const Place& place);
     void visit(const Place& place);
     void keepBookmark();
     void awaitProposal(const Place& place);
