@@ -40,6 +40,12 @@ RealProgram emacs() {
     return {"Emacs", "emacs-gtk", "Emacs", {"emacs", "-Q", "--load", "{}/start.el"}, {place}, {{"start.el", Start}}};
 }
 
+// It puts what it has pasted on the clipboard itself: then that is no longer Plume's to give back.
+RealProgram copyingPastes(RealProgram program) {
+    program.places[0].expected["clipboard"] = "bold and plain";
+    return program;
+}
+
 RealProgram gvim() {
     constexpr const char* Start = R"(
 set nocompatible encoding=utf-8 autoindent noswapfile guioptions=c noeol nofixeol belloff=all
@@ -66,7 +72,7 @@ std::vector<RealProgram> editors() {
         indenting(editor("kwrite", "kwrite", {"kwrite", "{}/text.txt"})),
         indenting(editor("geany", "eany", {"geany", "--no-session", "--new-instance", "{}/text.txt"})),
         indenting(editor("featherpad", "eather", {"featherpad", "--standalone", "{}/text.txt"})),
-        editor("l3afpad", "3afpad", {"l3afpad", "{}/text.txt"}),
+        copyingPastes(editor("l3afpad", "3afpad", {"l3afpad", "{}/text.txt"})),
         emacs(),
         gvim(),
     };

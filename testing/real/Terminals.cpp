@@ -23,13 +23,21 @@ RealProgram terminal(const std::string& name, const std::string& package, const 
             {{"start", Start}, {"text", ""}}};
 }
 
+// It would ask in a window, and wait there, whether several lines are to be pasted.
+RealProgram trustingPastes(RealProgram program) {
+    program.environment = {"XDG_CONFIG_HOME={}/config"};
+    program.files.emplace("config/xfce4/terminal/terminalrc", "[Configuration]\nMiscShowUnsafePasteDialog=FALSE\n");
+    return program;
+}
+
 }  // namespace
 
 std::vector<RealProgram> terminals() {
     return {
         terminal("gnome-terminal", "gnome-terminal", "erminal", {"gnome-terminal", "--wait", "--"}),
         terminal("konsole", "konsole", "konsole", {"konsole", "--separate", "-e"}),
-        terminal("xfce4-terminal", "xfce4-terminal", "fce4", {"xfce4-terminal", "--disable-server", "-x"}),
+        trustingPastes(
+            terminal("xfce4-terminal", "xfce4-terminal", "fce4", {"xfce4-terminal", "--disable-server", "-x"})),
         terminal("qterminal", "qterminal", "qterminal", {"qterminal", "-e"}),
         terminal("xterm", "xterm", "XTerm", {"xterm", "-e"}),
     };
