@@ -11,6 +11,7 @@
 #include "ports/dbus/SystemSleep.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
+#include "testing/rig/FakeIbus.h"
 #include "testing/rig/NoticeBoard.h"
 #include "testing/rig/SelectionClients.h"
 #include "testing/rig/XcbReply.h"
@@ -194,6 +195,29 @@ class X11Desk final : public ContractDesk {
 };
 
 const ContractPort<ContractDesk> Desk{"X11", [] { return std::make_unique<X11Desk>(); }};
+
+TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
+    Desktop& desktop = *DesktopEnvironment::desktop;
+    const auto& identifier = desktop.port->ports().inputSources.currentInputSourceIdentifier();
+    const auto becomes = [&](const std::u16string& expected) {
+        const Deadline deadline(Bound);
+        while (identifier != expected && !deadline.passed()) {
+            const Timer look = desktop.port->tapLoop().performAfterDelay(Step, [&] { desktop.port->tapLoop().stop(); });
+            desktop.port->tapLoop().run();
+        }
+        return identifier == expected;
+    };
+    ASSERT_EQ(identifier, u"us");
+    for (const bool comesBack : {false, true}) {
+        FakeIbus ibus(desktop.rig, "libpinyin");
+        EXPECT_TRUE(becomes(u"ibus:libpinyin")) << comesBack;
+        ibus.setEngine("xkb:de::ger");
+        EXPECT_TRUE(becomes(u"us"));
+        ibus.setEngine("anthy");
+        EXPECT_TRUE(becomes(u"ibus:anthy"));
+    }
+    EXPECT_TRUE(becomes(u"us")) << "IBus has gone";
+}
 
 TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {
     setenv("DBUS_SYSTEM_BUS_ADDRESS", sessionBusAddress().c_str(), 1);

@@ -85,6 +85,9 @@ void LinuxPort::connectParts() {
     pasteboard_->setSharedCopy(&clipboardCopy_);
     followFocus();
     followScreen();
+    inputMethod_ =
+        std::make_unique<InputMethodWatch>(session_->connection().displayName(), tapLoop_,
+                                           [this](const std::string& engine) { inputSources_->setEngine(engine); });
 
     // Whoever waits on the tap thread tells the watchdog that this is no hang.
     session_->heartbeat = [this] { watchdog_->beat(); };

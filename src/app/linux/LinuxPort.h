@@ -16,6 +16,7 @@
 #include "app/Composition.h"
 #include "ports/atspi/AtspiAccessibility.h"
 #include "ports/dbus/DesktopNotices.h"
+#include "ports/dbus/InputMethodWatch.h"
 #include "ports/dbus/SystemSleep.h"
 #include "ports/posix/CanberraSounds.h"
 #include "ports/posix/HiddenPrompts.h"
@@ -99,6 +100,7 @@ class LinuxPort {
     std::unique_ptr<X11InputSources> inputSources_;
     std::unique_ptr<X11SecureInput> secureInput_;
     std::unique_ptr<X11SystemHotKeys> systemHotKeys_;
+    std::unique_ptr<InputMethodWatch> inputMethod_;
 };
 
 }  // namespace plume

@@ -26,7 +26,7 @@ struct AtspiPart {
 // Belongs to the accessibility thread.
 class AtspiBus {
   public:
-    // May wait for the bus for as long as libdbus does.
+    // Waits for the bus for some seconds at most.
     bool connect(const std::string& address);
     void disconnect() { connection_.reset(); }
     // False once a call has met a bus that is gone.

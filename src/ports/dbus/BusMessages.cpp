@@ -10,6 +10,8 @@ namespace plume {
 
 namespace {
 
+constexpr int LongestWelcome = 5'000;  // milliseconds
+
 void append(DBusMessageIter& iterator, const std::string& value) {
     // libdbus ends the program that hands it what is no UTF-8.
     const bool isValid = dbus_validate_utf8(value.c_str(), nullptr) != 0;
@@ -63,7 +65,12 @@ BusConnection openBus(const std::string& address) {
     BusConnection connection(dbus_connection_open_private(address.c_str(), nullptr));
     if (!connection) return nullptr;
     dbus_connection_set_exit_on_disconnect(connection.get(), FALSE);
-    if (dbus_bus_register(connection.get(), nullptr) == 0) return nullptr;
+    // What libdbus has for this waits for 25 seconds.
+    const BusMessage hello = newCall({DBUS_SERVICE_DBUS, DBUS_PATH_DBUS, DBUS_INTERFACE_DBUS}, "Hello");
+    const BusAnswer welcome(
+        BusMessage(dbus_connection_send_with_reply_and_block(connection.get(), hello.get(), LongestWelcome, nullptr)));
+    const auto name = welcome.values().string();
+    if (!name || dbus_bus_set_unique_name(connection.get(), name->c_str()) == 0) return nullptr;
     return connection;
 }
 

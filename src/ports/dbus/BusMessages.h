@@ -30,8 +30,8 @@ struct ConnectionClose {
 };
 using BusConnection = std::unique_ptr<DBusConnection, ConnectionClose>;
 
-// A connection of its own to a bus; none when there is no bus, or it does not accept it. May wait for as long as
-// libdbus does. It never ends the program when the bus goes.
+// A connection of its own to a bus; none when there is no bus, or it does not accept it. Waits for five seconds at
+// most. It never ends the program when the bus goes.
 BusConnection openBus(const std::string& address);
 
 // Where the session's bus is; empty when there is none. Not libdbus's own search for it, which would start a bus where

@@ -26,7 +26,7 @@ class ServiceBus {
     // The bus is gone.
     std::function<void()> lost;
 
-    // Instead of an earlier connection. May wait for the bus for as long as libdbus does.
+    // Instead of an earlier connection. Waits for the bus for five seconds at most.
     bool connect(const std::string& address);
     // Calls that wait for an answer are forgotten.
     void disconnect();

@@ -14,13 +14,24 @@ X11InputSources::X11InputSources(XkbKeyboard& keyboard) : keyboard_(keyboard) {
 void X11InputSources::changed(const XkbKeyboard::Change& change) {
     if (change == XkbKeyboard::Change::Locks) return;
     readIdentifier();
+    tell();
+}
+
+void X11InputSources::setEngine(const std::string& identifier) {
+    engine_ = identifier;
+    readIdentifier();
+    tell();
+}
+
+void X11InputSources::tell() const {
     // Called by a copy: it may set another.
     if (const auto listener = listener_) listener();
 }
 
 void X11InputSources::readIdentifier() {
     identifier_.reset();
-    if (!keyboard_.layoutName().empty()) identifier_ = fromUtf8(keyboard_.layoutName());
+    const std::string& name = engine_.empty() ? keyboard_.layoutName() : engine_;
+    if (!name.empty()) identifier_ = fromUtf8(name);
 }
 
 std::optional<std::u16string> X11InputSources::translateKey(KeyCode keyCode, EventFlags flags) const {

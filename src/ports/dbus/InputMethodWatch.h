@@ -1,0 +1,31 @@
+// Follows the input method of the desktop (IBus): which engine of it turns keys into text.
+//
+// Heard on a thread of its own, which waits for the input method to come, and to come back. Without a session's bus, or
+// without an input method, nothing is ever told.
+#pragma once
+
+#include <functional>
+#include <string>
+
+#include "platform/RunLoop.h"
+#include "ports/dbus/BusThread.h"
+
+namespace plume {
+
+class InputMethodSession;
+
+class InputMethodWatch {
+  public:
+    // Told on the loop's thread, at every change: the engine, such as "ibus:libpinyin"; empty when there is none, or
+    // one that only stands for a keyboard layout.
+    using EngineListener = std::function<void(const std::string& identifier)>;
+
+    // Of this display, such as ":0". The loop outlives it.
+    InputMethodWatch(const std::string& display, RunLoop& loop, EngineListener engineChanged);
+    ~InputMethodWatch();
+
+  private:
+    BusThread<InputMethodSession> thread_;
+};
+
+}  // namespace plume

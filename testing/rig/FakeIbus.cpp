@@ -1,0 +1,106 @@
+#include "testing/rig/FakeIbus.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <utility>
+
+#include "testing/rig/Deadline.h"
+#include "testing/rig/RigError.h"
+
+namespace plume::rig {
+
+namespace {
+
+constexpr const char* Name = "org.freedesktop.IBus";
+constexpr const char* Path = "/org/freedesktop/IBus";
+
+void own(const BusConnection& connection) {
+    const bool owned = connection && dbus_bus_request_name(connection.get(), Name, 0, nullptr) ==
+                                         DBUS_REQUEST_NAME_REPLY_PRIMARY_OWNER;
+    if (!owned) throw RigError("a bus takes no input method");
+}
+
+void appendText(DBusMessageIter& iterator, const std::string& text) {
+    const char* const value = text.c_str();
+    dbus_message_iter_append_basic(&iterator, DBUS_TYPE_STRING, static_cast<const void*>(&value));
+}
+
+// As IBus sends an object: its class, no attachments, and a text.
+void appendObject(DBusMessageIter& iterator, const std::string& name, const std::string& text) {
+    DBusMessageIter variant;
+    DBusMessageIter fields;
+    DBusMessageIter attachments;
+    dbus_message_iter_open_container(&iterator, DBUS_TYPE_VARIANT, "(sa{sv}s)", &variant);
+    dbus_message_iter_open_container(&variant, DBUS_TYPE_STRUCT, nullptr, &fields);
+    appendText(fields, name);
+    dbus_message_iter_open_container(&fields, DBUS_TYPE_ARRAY, "{sv}", &attachments);
+    dbus_message_iter_close_container(&fields, &attachments);
+    appendText(fields, text);
+    dbus_message_iter_close_container(&variant, &fields);
+    dbus_message_iter_close_container(&iterator, &variant);
+}
+
+}  // namespace
+
+FakeIbus::FakeIbus(DesktopRig& rig, std::string engine) : engine_(std::move(engine)) {
+    const std::string address = "unix:path=" + (rig.directory() / "ibus").string();
+    bus_ = rig.session().start(
+        {"dbus-daemon", "--session", "--nofork", "--nopidfile", "--nosyslog", "--address=" + address}, "dbus-daemon");
+    waitUntil([&] { return (service_ = openBus(address)) != nullptr || !bus_->isRunning(); });
+    own(service_);
+    sayWhere(rig.server().display(), address);
+    session_ = openBus(sessionBusAddress());
+    own(session_);
+    thread_ = std::thread([this] { serve(); });
+}
+
+FakeIbus::~FakeIbus() {
+    ended_ = true;
+    thread_.join();
+}
+
+void FakeIbus::sayWhere(const std::string& display, const std::string& address) {
+    const std::unique_ptr<char, void (*)(void*)> machine(dbus_get_local_machine_id(), dbus_free);
+    const std::filesystem::path folder = std::filesystem::path(std::getenv("XDG_CONFIG_HOME")) / "ibus" / "bus";
+    std::filesystem::create_directories(folder);
+    std::ofstream(folder / (std::string(machine.get()) + "-unix-" + display.substr(1)))
+        << "# where\nIBUS_ADDRESS=" << address << "\nIBUS_DAEMON_PID=1\n";
+}
+
+void FakeIbus::setEngine(const std::string& name) {
+    const BusMessage signal(dbus_message_new_signal(Path, Name, "GlobalEngineChanged"));
+    DBusMessageIter iterator;
+    dbus_message_iter_init_append(signal.get(), &iterator);
+    appendText(iterator, name);
+    const std::scoped_lock lock(mutex_);
+    engine_ = name;
+    dbus_connection_send(service_.get(), signal.get(), nullptr);
+}
+
+void FakeIbus::serve() {
+    constexpr int TurnMilliseconds = 5;
+    while (!ended_ && dbus_connection_read_write(service_.get(), TurnMilliseconds) != 0) {
+        while (const BusMessage message{dbus_connection_pop_message(service_.get())}) {
+            if (dbus_message_get_type(message.get()) == DBUS_MESSAGE_TYPE_METHOD_CALL) answer(message.get());
+        }
+    }
+}
+
+void FakeIbus::answer(DBusMessage* call) {
+    const std::scoped_lock lock(mutex_);
+    dbus_connection_send(service_.get(), engineIn(call).get(), nullptr);
+}
+
+BusMessage FakeIbus::engineIn(DBusMessage* call) {
+    BusMessage reply(dbus_message_new_method_return(call));
+    DBusMessageIter iterator;
+    DBusMessageIter variant;
+    dbus_message_iter_init_append(reply.get(), &iterator);
+    dbus_message_iter_open_container(&iterator, DBUS_TYPE_VARIANT, "v", &variant);
+    appendObject(variant, "IBusEngineDesc", engine_);
+    dbus_message_iter_close_container(&iterator, &variant);
+    return reply;
+}
+
+}  // namespace plume::rig
