@@ -20,11 +20,14 @@ RealProgram indenting(RealProgram program) {
     return program;
 }
 
+// It is emptied by a command of its own: where Backspace finds nothing, Emacs may forget what is typed behind it.
 RealProgram emacs() {
     constexpr const char* Start = R"((progn
   (setq make-backup-files nil auto-save-default nil inhibit-startup-screen t ring-bell-function 'ignore)
   (switch-to-buffer "story")
   (text-mode)
+  (put 'erase-buffer 'disabled nil)
+  (global-set-key [f2] 'erase-buffer)
   (electric-indent-local-mode 1)
   (setq-local indent-line-function 'indent-relative)
   (run-with-idle-timer 0.02 t
@@ -32,9 +35,7 @@ RealProgram emacs() {
 )";
     Place place{.reading = Reading::File, .offers = {Needs::Lines}};
     place.clear = [](rig::DesktopRig& rig) {
-        rig.keyboard().chord({Key::LeftControl}, U'x');
-        rig.keyboard().type("h");
-        rig.keyboard().tap(Key::Delete);
+        rig.keyboard().tap(Key::F2);
         rig.keyboard().sync();
     };
     return {"Emacs", "emacs-gtk", "Emacs", {"emacs", "-Q", "--load", "{}/start.el"}, {place}, {{"start.el", Start}}};
