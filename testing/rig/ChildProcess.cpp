@@ -18,6 +18,7 @@ namespace {
 
 std::vector<char*> pointersOf(const std::vector<std::string>& strings) {
     std::vector<char*> pointers;
+    pointers.reserve(strings.size() + 1);
     for (const auto& string : strings) pointers.push_back(const_cast<char*>(string.c_str()));
     pointers.push_back(nullptr);
     return pointers;
@@ -96,7 +97,7 @@ std::optional<int> ChildProcess::waitForExit(Milliseconds bound) {
     return status_;
 }
 
-void ChildProcess::stop() {
+void ChildProcess::stop() const {
     kill(pid_, SIGSTOP);
     siginfo_t stopped{};
     while (waitid(P_PID, static_cast<id_t>(pid_), &stopped, WSTOPPED | WEXITED | WNOWAIT) < 0 && errno == EINTR) {

@@ -42,7 +42,7 @@ class ChildProcess {
     std::optional<int> waitForExit(Milliseconds bound);
 
     // As by SIGSTOP. When this returns, no thread of the program runs any more; SIGCONT lets it go on.
-    void stop();
+    void stop() const;
 
     // Asks the whole group to end, and kills what is still there after two seconds.
     void end();

@@ -50,10 +50,10 @@ struct Desktop {
 
 class DesktopEnvironment final : public testing::Environment {
   public:
-    void SetUp() override { desktop = std::make_unique<Desktop>(); }
-    void TearDown() override { desktop.reset(); }
+    void SetUp() override { desktop_ = std::make_unique<Desktop>(); }
+    void TearDown() override { desktop_.reset(); }
 
-    static inline std::unique_ptr<Desktop> desktop;
+    static inline std::unique_ptr<Desktop> desktop_;
 };
 
 const testing::Environment* const TheEnvironment = testing::AddGlobalTestEnvironment(new DesktopEnvironment);
@@ -189,7 +189,7 @@ class X11Desk final : public ContractDesk {
         return application && application->processIdentifier == desktop_.first->pid();
     }
 
-    Desktop& desktop_ = *DesktopEnvironment::desktop;
+    Desktop& desktop_ = *DesktopEnvironment::desktop_;
     const Composition::Ports ports_ = desktop_.port->ports();
     std::unique_ptr<ForeignOwner> elsewhere_;
 };
@@ -197,7 +197,7 @@ class X11Desk final : public ContractDesk {
 const ContractPort<ContractDesk> Desk{"X11", [] { return std::make_unique<X11Desk>(); }};
 
 TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
-    Desktop& desktop = *DesktopEnvironment::desktop;
+    Desktop& desktop = *DesktopEnvironment::desktop_;
     const auto& identifier = desktop.port->ports().inputSources.currentInputSourceIdentifier();
     const auto becomes = [&](const std::u16string& expected) {
         const Deadline deadline(Bound);
@@ -245,7 +245,7 @@ TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {
 // As the server tells of a screen that is turned.
 TEST(LinuxPortTest, FollowsTheHeightOfTheScreen) {
     X11Desk desk;
-    XClient& client = DesktopEnvironment::desktop->rig.client();
+    XClient& client = DesktopEnvironment::desktop_->rig.client();
     const xcb_screen_t& screen = client.screen();
     EXPECT_EQ(desk.accessibility().mainScreenHeight(), screen.height_in_pixels);
     for (const std::uint16_t height : {std::uint16_t{2'000}, screen.height_in_pixels}) {
