@@ -175,11 +175,15 @@ TEST_F(Program, OffersToListenAgainWhenTheKeyboardWasLostTooOften) {
 
 TEST_F(Program, SaysThatASnippetNeedsAFormOrAChoiceAndErasesNothing) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    rig_->keyboard().type("x ;ask ;who");
-    EXPECT_EQ(target->awaitText("x ;ask ;who"), "x ;ask ;who");
-    for (const char* reason : {"there is no form here", "there is no list here"}) {
-        EXPECT_TRUE(waitUntil([&] { return log().find(reason) != std::string::npos; })) << log();
-    }
+    const auto isSaid = [&] {  // Plume may not know yet that another program has come to the front
+        target->clear();
+        rig_->keyboard().type("x ;ask ;who");
+        EXPECT_EQ(target->awaitText("x ;ask ;who"), "x ;ask ;who");
+        const std::string said = log();
+        return said.find("there is no form here") != std::string::npos &&
+               said.find("there is no list here") != std::string::npos;
+    };
+    EXPECT_TRUE(waitUntil(isSaid, Bound)) << log();
 }
 
 TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {

@@ -411,6 +411,8 @@ TEST(X11TapHotplugTest, TakesKeyboardsThatComeAndReleasesWhatWentDownOnThoseThat
     InputTestSocket keys(rig.server().secondKeyboardSocket());
     for (const bool down : {true, false}) keys.sendKey(56, down);
     EXPECT_EQ(target->awaitText("b"), "b");
+    rig.client().await("its release is heard", Bound,
+                       [&] { return tap.run([&] { return listener.heard.size(); }) >= 2; });
     const auto heard = tap.run([&] { return listener.heard; });
     EXPECT_THAT(heard, testing::ElementsAre(Heard{Type::KeyDown, KeyCode::B, {}, u"b"},
                                             Heard{Type::KeyUp, KeyCode::B, {}, u"b"}));
