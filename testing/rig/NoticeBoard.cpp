@@ -2,8 +2,6 @@
 
 #include <utility>
 
-#include "testing/rig/RigError.h"
-
 namespace plume::rig {
 
 namespace {
@@ -13,18 +11,8 @@ constexpr const char* Path = "/org/freedesktop/Notifications";
 
 }  // namespace
 
-NoticeBoard::NoticeBoard() : connection_(openBus(sessionBusAddress())) {
-    if (!connection_ ||
-        dbus_bus_request_name(connection_.get(), Interface, 0, nullptr) != DBUS_REQUEST_NAME_REPLY_PRIMARY_OWNER) {
-        throw RigError("the session's bus takes no service for notices");
-    }
-    thread_ = std::thread([this] { serve(); });
-}
-
-NoticeBoard::~NoticeBoard() {
-    ended_ = true;
-    thread_.join();
-}
+NoticeBoard::NoticeBoard()
+    : service_(sessionBusAddress(), Interface, [this](DBusMessage* call) { return answer(call); }) {}
 
 std::optional<std::string> NoticeBoard::body(const std::string& title) const {
     const std::scoped_lock lock(mutex_);
@@ -40,21 +28,12 @@ void NoticeBoard::press(const std::string& title, const std::string& label) {
     const char* name = shown->second.buttons.at(label).c_str();
     dbus_message_append_args(signal.get(), DBUS_TYPE_UINT32, &shown->second.number, DBUS_TYPE_STRING, &name,
                              DBUS_TYPE_INVALID);
-    send(signal);
+    service_.send(signal);
     shown_.erase(shown);
 }
 
-void NoticeBoard::serve() {
-    constexpr int TurnMilliseconds = 5;
-    while (!ended_ && dbus_connection_read_write(connection_.get(), TurnMilliseconds) != 0) {
-        while (const BusMessage message{dbus_connection_pop_message(connection_.get())}) {
-            if (dbus_message_get_type(message.get()) == DBUS_MESSAGE_TYPE_METHOD_CALL) answer(message.get());
-        }
-    }
-}
-
-void NoticeBoard::answer(DBusMessage* call) {
-    const BusMessage reply(dbus_message_new_method_return(call));
+BusMessage NoticeBoard::answer(DBusMessage* call) {
+    BusMessage reply(dbus_message_new_method_return(call));
     if (std::string(dbus_message_get_member(call)) == "Notify") {
         const std::uint32_t number = keep(call);
         dbus_message_append_args(reply.get(), DBUS_TYPE_UINT32, &number, DBUS_TYPE_INVALID);
@@ -64,7 +43,7 @@ void NoticeBoard::answer(DBusMessage* call) {
         dbus_message_append_args(reply.get(), DBUS_TYPE_ARRAY, DBUS_TYPE_STRING, static_cast<void*>(&list), 3,
                                  DBUS_TYPE_INVALID);
     }
-    send(reply);
+    return reply;
 }
 
 std::uint32_t NoticeBoard::keep(DBusMessage* call) {

@@ -1,13 +1,11 @@
 #pragma once
 
-#include <atomic>
 #include <cstdint>
 #include <map>
 #include <mutex>
 #include <string>
-#include <thread>
 
-#include "ports/dbus/BusMessages.h"
+#include "testing/rig/BusService.h"
 
 namespace plume::rig {
 
@@ -16,9 +14,6 @@ class NoticeBoard {
   public:
     // On the session's bus of this process; throws RigError.
     NoticeBoard();
-    ~NoticeBoard();
-    NoticeBoard(const NoticeBoard&) = delete;
-    NoticeBoard& operator=(const NoticeBoard&) = delete;
 
     // What the notice with that title says; nothing when none is shown.
     std::optional<std::string> body(const std::string& title) const;
@@ -32,17 +27,13 @@ class NoticeBoard {
         std::map<std::string, std::string> buttons;  // names by labels
     };
 
-    void serve();
-    void answer(DBusMessage* call);
+    BusMessage answer(DBusMessage* call);
     std::uint32_t keep(DBusMessage* call);
-    void send(const BusMessage& message) { dbus_connection_send(connection_.get(), message.get(), nullptr); }
 
-    BusConnection connection_;
     mutable std::mutex mutex_;
     std::map<std::string, Shown> shown_;  // by their titles; guarded by mutex_
     std::uint32_t last_ = 0;
-    std::atomic<bool> ended_ = false;
-    std::thread thread_;
+    BusService service_;
 };
 
 }  // namespace plume::rig

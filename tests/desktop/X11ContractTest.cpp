@@ -11,6 +11,7 @@
 #include "ports/dbus/SystemSleep.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
+#include "testing/rig/FakeFcitx.h"
 #include "testing/rig/FakeIbus.h"
 #include "testing/rig/NoticeBoard.h"
 #include "testing/rig/SelectionClients.h"
@@ -217,6 +218,19 @@ TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
         EXPECT_TRUE(becomes(u"ibus:anthy"));
     }
     EXPECT_TRUE(becomes(u"us")) << "IBus has gone";
+    for (const bool comesBack : {false, true}) {
+        FakeFcitx fcitx("pinyin");
+        EXPECT_TRUE(becomes(u"fcitx:pinyin")) << comesBack;
+        fcitx.setEngine("keyboard-de");
+        EXPECT_TRUE(becomes(u"us"));
+        fcitx.setEngine("hangul");
+        EXPECT_TRUE(becomes(u"fcitx:hangul"));
+        fcitx.loseFocus();
+        EXPECT_TRUE(becomes(u"us"));
+        fcitx.setEngine("hangul");
+        EXPECT_TRUE(becomes(u"fcitx:hangul"));
+    }
+    EXPECT_TRUE(becomes(u"us")) << "Fcitx has gone";
 }
 
 TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {

@@ -1,4 +1,4 @@
-// Follows the input method of the desktop (IBus): which engine of it turns keys into text.
+// Follows the input method of the desktop (IBus or Fcitx): which engine of it turns keys into text.
 //
 // Heard on a thread of its own, which waits for the input method to come, and to come back. Without a session's bus, or
 // without an input method, nothing is ever told.
@@ -16,8 +16,8 @@ class InputMethodSession;
 
 class InputMethodWatch {
   public:
-    // Told on the loop's thread, at every change: the engine, such as "ibus:libpinyin"; empty when there is none, or
-    // one that only stands for a keyboard layout.
+    // Told on the loop's thread, at every change: the engine, such as "ibus:libpinyin" or "fcitx:pinyin"; empty when
+    // there is none, or one that only stands for a keyboard layout.
     using EngineListener = std::function<void(const std::string& identifier)>;
 
     // Of this display, such as ":0". The loop outlives it.

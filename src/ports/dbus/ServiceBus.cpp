@@ -1,5 +1,6 @@
 #include "ports/dbus/ServiceBus.h"
 
+#include <string_view>
 #include <utility>
 
 namespace plume {
@@ -58,6 +59,11 @@ void ServiceBus::drain() {
 }
 
 void ServiceBus::take(DBusMessage& message) {
+    const char* const destination = dbus_message_get_destination(&message);
+    if (destination != nullptr && std::string_view(destination) != dbus_bus_get_unique_name(connection_.get())) {
+        if (overheard) overheard(message);
+        return;
+    }
     switch (dbus_message_get_type(&message)) {
         case DBUS_MESSAGE_TYPE_METHOD_RETURN:
             return answer(dbus_message_get_reply_serial(&message), BusAnswer(BusMessage(dbus_message_ref(&message))));

@@ -23,6 +23,8 @@ class ServiceBus {
 
     // Every signal that was listened for. It may call anything here.
     std::function<void(DBusMessage& signal)> heard;
+    // Whatever was listened for and goes to somebody else; a bus that does not send such things to others never will.
+    std::function<void(DBusMessage& message)> overheard;
     // The bus is gone.
     std::function<void()> lost;
 

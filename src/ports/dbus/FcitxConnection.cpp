@@ -1,0 +1,64 @@
+#include "ports/dbus/FcitxConnection.h"
+
+namespace plume {
+
+namespace {
+
+constexpr BusAddress Controller{FcitxConnection::Service, "/controller", "org.fcitx.Fcitx.Controller1"};
+constexpr BusAddress Monitoring{DBUS_SERVICE_DBUS, DBUS_PATH_DBUS, "org.freedesktop.DBus.Monitoring"};
+
+const std::vector<std::string>& rules() {
+    static const std::vector<std::string> all = {
+        "type='signal',interface='org.fcitx.Fcitx.InputContext1',member='CurrentIM'",
+        "type='method_call',interface='org.fcitx.Fcitx.InputContext1',member='FocusOut'"};
+    return all;
+}
+
+}  // namespace
+
+FcitxConnection::FcitxConnection(PollRunLoop& loop, ServiceBus& session) : session_(session), monitor_(loop) {
+    monitor_.overheard = [this](DBusMessage& message) { overhear(message); };
+    monitor_.lost = [this] { setEngine({}); };
+}
+
+void FcitxConnection::connect(const std::string& address) {
+    focus_.clear();
+    if (!monitor_.connect(address)) return setEngine({});
+    monitor_.call(newCall(Monitoring, "BecomeMonitor", {rules(), std::uint32_t{0}}), [this](const BusAnswer& answer) {
+        // What was true once is worth nothing when changes are not heard.
+        if (answer) return askForEngine();
+        disconnect();
+    });
+}
+
+void FcitxConnection::disconnect() {
+    monitor_.disconnect();
+    setEngine({});
+}
+
+void FcitxConnection::askForEngine() {
+    session_.call(newCall(Controller, "CurrentInputMethod"), [this](const BusAnswer& answer) {
+        if (monitor_.isConnected() && focus_.empty()) setEngine(answer.values().string().value_or(""));
+    });
+}
+
+void FcitxConnection::overhear(DBusMessage& message) {
+    const char* const path = dbus_message_get_path(&message);
+    if (path == nullptr) return;
+    if (dbus_message_has_member(&message, "CurrentIM") != 0) {
+        focus_ = path;
+        BusReader values(&message);
+        values.string();  // for people to read
+        setEngine(values.string().value_or(""));
+    } else if (focus_ == path) {
+        setEngine({});
+    }
+}
+
+void FcitxConnection::setEngine(const std::string& name) const {
+    // Engines of this kind leave the keys alone.
+    const bool isLayout = name.starts_with("keyboard-");
+    engineChanged(isLayout ? std::string() : name);
+}
+
+}  // namespace plume
