@@ -112,8 +112,9 @@ KeyDestination AutoText::lastKeyDestination() const {
 bool AutoText::sendSnippet(const std::shared_ptr<Snippet>& snippet, const std::optional<std::u16string>& abbreviation,
                            SnippetTriggers snippetTrigger) {
     clear();
-    const auto sent = sender_.send({snippet, abbreviation, snippetTrigger, snippetGroups_,
-                                    snippetAdaptToAbbreviationCaseOption_, dependencies_.inputService.lastKeyString()});
+    const auto sent =
+        sender_.send({snippet, abbreviation, snippetTrigger, snippetGroups_, snippetAdaptToAbbreviationCaseOption_,
+                      dependencies_.inputService.lastKeyString(), dependencies_.inputService.lastKeyIsDelivered()});
     if (!sent) return false;
     follow(*sent);
     return sent->swallowsKey;

@@ -152,6 +152,7 @@ class AutoText {
     void processSelectorKey(ZDKeyEventArgs& event);
     bool processSnippetSelectorHotKey(char16_t digit);
 
+    void processDelivered(ZDKeyEventArgs& event);
     void processNormalKeyDown(ZDKeyEventArgs& event);
     void sendTypedMatch(const Match& match, ZDKeyEventArgs& event);
     void offerMatches(std::vector<Match> matches);

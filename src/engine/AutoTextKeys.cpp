@@ -35,6 +35,7 @@ void AutoText::onSystemInputServiceKeyDown(ZDKeyEventArgs& event) {
     if (!enabled_) return;
     undoInfo_.reset();
     if (dependencies_.inputService.isSameProcess()) return;
+    if (event.delivered) return processDelivered(event);
     if (snippetQuickSearchWindowVisible()) {
         if (isSingleUnit(event.s)) processSelectorKey(event);
         return;
@@ -42,6 +43,18 @@ void AutoText::onSystemInputServiceKeyDown(ZDKeyEventArgs& event) {
     if (routeByKeyCode(event) == Route::Done || !isSingleUnit(event.s)) return;
     processSelectorKey(event);
     if (!event.cancel) processNormalKeyDown(event);
+}
+
+// From an input method: a text, or a key that it passed on.
+void AutoText::processDelivered(ZDKeyEventArgs& event) {
+    if (event.key == KeyCode::Delete) return deleteLastLetter();
+    // What the key does is unknown; it may have moved the caret.
+    if (!event.s || event.s->empty()) return clear();
+    const std::u16string text = *std::exchange(event.s, std::u16string(1, event.c));
+    letters_.append(std::u16string_view(text).substr(0, text.size() - 1));
+    // What would be erased is not in front of the caret yet.
+    if (event.composing) return letters_.append(*event.s);
+    processNormalKeyDown(event);
 }
 
 AutoText::Route AutoText::routeByKeyCode(ZDKeyEventArgs& event) {
@@ -215,8 +228,11 @@ void AutoText::offerMatches(std::vector<Match> matches) {
 }
 
 void AutoText::keyCompletedNothing(ZDKeyEventArgs& event) {
-    const auto correction = correction_.autoCorrect(letters(), *event.s, lastKeyDestination());
-    if (correction) sendCorrection(*correction, event);
+    // Engines that compose have capitals of their own.
+    if (!event.delivered) {
+        const auto correction = correction_.autoCorrect(letters(), *event.s, lastKeyDestination());
+        if (correction) sendCorrection(*correction, event);
+    }
     if (selectingSnippet_) {
         hideSnippetSuggestion();
     } else {

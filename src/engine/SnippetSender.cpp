@@ -27,12 +27,14 @@ ExpandTrigger expandTriggerOf(const Snippet& snippet) {
 std::u16string textToErase(const Request& request) {
     std::u16string typed = request.abbreviation.value_or(u"");
     if (!request.abbreviation) return typed;
+    const bool triggerStands = request.keyIsDelivered && request.snippetTrigger == SnippetTrigger::Typed;
     const ExpandTrigger expandTrigger = expandTriggerOf(*request.snippet);
     if (expandTrigger == ExpandTrigger::Immediately) {
         // The last key of the abbreviation is being swallowed: the application never got it.
-        if (request.snippetTrigger == SnippetTrigger::Typed && !typed.empty()) typed.pop_back();
+        if (request.snippetTrigger == SnippetTrigger::Typed && !triggerStands && !typed.empty()) typed.pop_back();
         return typed;
     }
+    if (triggerStands) typed += request.keyString.value_or(u"");
     // The delimiter went through when the list of matches opened.
     const bool delimiterStands =
         request.snippetTrigger.contains(SnippetTrigger::FromSeveralMatches) && expandTrigger != ExpandTrigger::HotKey;
@@ -100,7 +102,8 @@ std::optional<SnippetSender::Sent> SnippetSender::send(const Request& request) {
     output->trigger = request.snippetTrigger;
     output->erasedText = textToErase(request);
     output->backspaceCount = output->erasedText->size();
-    output->cancelTrigger = expandTriggerOf(snippet) != ExpandTrigger::DelimiterKept || content->hasCaretOrFields();
+    output->cancelTrigger = request.keyIsDelivered || expandTriggerOf(snippet) != ExpandTrigger::DelimiterKept ||
+                            content->hasCaretOrFields();
 
     const bool needsForm = !content->fields().empty();
     if (!needsForm) processScripts(*content);

@@ -59,6 +59,7 @@ class SnippetSender final : private FieldsEditor::Target {
         const SnippetParser::Groups& groups;  // the library, for snippets nested in this one
         std::int64_t adaptToCaseOption;       // how content is adapted to the case in which its abbreviation was typed
         std::optional<std::u16string> keyString;  // what the key that triggered it produces
+        bool keyIsDelivered = false;              // and the program has that already
     };
 
     // What has been sent, and what it makes of the engine's state.

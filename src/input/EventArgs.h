@@ -18,6 +18,10 @@ struct ZDKeyEventArgs : ZDCancelEventArgs {
     KeyCode key = KeyCode::None;
     char16_t c = 0;                   // first unit of `s`; 0 when there is none
     std::optional<std::u16string> s;  // what the key produces
+    // The program has it already: a text, which may be a long one, or a key without one. It cannot be swallowed.
+    bool delivered = false;
+    // More text is being composed behind what was delivered.
+    bool composing = false;
 };
 
 struct ZDMouseEventArgs : ZDCancelEventArgs {

@@ -150,6 +150,8 @@ class MacInputService final : private KeyboardTapListener {
     std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const;
     // What the last key produced; nothing when it produced nothing.
     const std::optional<std::u16string>& lastKeyString() const { return lastKeyString_; }
+    // The program has got it, and did so before anybody was asked.
+    bool lastKeyIsDelivered() const { return lastKeyDelivered_; }
 
     // The application in front when its setting was last resolved, and resolving it anew; the setting is never null.
     const std::optional<std::u16string>& contextBundleIdentifier() const;
@@ -179,7 +181,8 @@ class MacInputService final : private KeyboardTapListener {
 
     void mouseDown(Point location);
     void forgetLastKey();
-    bool keyDown(ZDKeyEventArgs& key, bool isCommand);
+    void keyDelivered(const TapEvent& event);
+    bool keyDown(ZDKeyEventArgs& key, const TapEvent& event);
     bool keyUp(const ZDKeyEventArgs& key);
     bool unregisteredHotKey(const ZDKeyEventArgs& key);
     void followFrontProcess();
@@ -202,6 +205,7 @@ class MacInputService final : private KeyboardTapListener {
     bool listenMouseDownEvents_ = false;
     std::optional<KeyCode> lastKeyCode_;
     std::optional<std::u16string> lastKeyString_;
+    bool lastKeyDelivered_ = false;
     KeyCode canceledKeyCode_ = KeyCode::None;  // its key down was swallowed, its key up will be
     ProcessSerialNumber lastProcessReceivedKeyEvent_;
     std::uint32_t lastWindowReceivedKeyEvent_ = 0;

@@ -12,11 +12,31 @@ bool MacInputService::keyboardEvent(const TapEvent& event) {
     secureInputWatch_.keysArrive();
     followFrontProcess();
 
+    lastKeyDelivered_ = event.delivered;
+    if (event.delivered) {
+        keyDelivered(event);
+        return false;
+    }
+
     ZDKeyEventArgs key;
     readKey(event, key);
     lastKeyString_ = key.s;
     lastKeyCode_ = key.key;
-    return event.type == TapEvent::Type::KeyUp ? keyUp(key) : keyDown(key, event.command);
+    return event.type == TapEvent::Type::KeyUp ? keyUp(key) : keyDown(key, event);
+}
+
+void MacInputService::keyDelivered(const TapEvent& event) {
+    ZDKeyEventArgs key;
+    key.key = event.keyCode;
+    key.delivered = true;
+    key.composing = event.composing;
+    if (!event.string.empty()) {
+        key.s.emplace(event.string);
+        // What comes behind an expansion is what came last.
+        key.c = event.string.back();
+        lastKeyString_.emplace(1, key.c);
+    }
+    keyDownEvent.raise(key);
 }
 
 void MacInputService::mouseDown(Point location) {
@@ -59,7 +79,7 @@ void MacInputService::readKey(const TapEvent& event, ZDKeyEventArgs& key) const 
     key.key = event.keyCode;
     if (!event.string.empty()) {
         key.s.emplace(event.string);
-    } else if (!event.composing) {
+    } else if (!event.composing && !event.undecided) {
         key.s = stringForKeyCode(event.keyCode, event.flags);
     }
     if (key.s && !key.s->empty()) {
@@ -80,20 +100,22 @@ bool MacInputService::keyUp(const ZDKeyEventArgs& key) {
     return false;
 }
 
-bool MacInputService::keyDown(ZDKeyEventArgs& key, bool isCommand) {
+bool MacInputService::keyDown(ZDKeyEventArgs& key, const TapEvent& event) {
     bool swallow = hotKeys_.keyDown(key.key);
     if (!swallow) {
         const KeyModifiers held = keyModifier();
-        const bool isShortcut = isCommand || held.containsAny(KeyModifier::Control | KeyModifier::Command);
+        const bool isShortcut = event.command || held.containsAny(KeyModifier::Control | KeyModifier::Command);
         const bool deletesWord = held.contains(KeyModifier::Option) && key.c == u'\b';
         if (isShortcut || deletesWord) {
             swallow = unregisteredHotKey(key);
         } else {
+            // It is no key of the program's yet, but what can be undone until the next key no longer can.
+            if (event.undecided) key.key = KeyCode::None;
             keyDownEvent.raise(key);
             swallow = key.cancel;
         }
     }
-    if (swallow) canceledKeyCode_ = key.key;
+    if (swallow) canceledKeyCode_ = event.keyCode;
     return swallow;
 }
 

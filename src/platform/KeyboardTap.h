@@ -20,11 +20,16 @@ struct TapEvent {
     Type type = Type::KeyDown;
     KeyCode keyCode = KeyCode::None;
     EventFlags flags = {};       // the modifiers held; for FlagsChanged: from now on
-    std::u16string_view string;  // what the key produces, at most 10 units; valid during the call
+    std::u16string_view string;  // what the key produces, at most 10 units, or what is delivered; valid during the call
     // Part of a sequence of keys that has produced nothing yet: what the key would produce by itself does not count.
     bool composing = false;
     // With the modifiers held, programs take the key for a command, whatever it produces.
     bool command = false;
+    // An input method gets the key first; what becomes of it is told later, as what is delivered.
+    bool undecided = false;
+    // The program has it already, and it cannot be swallowed: text that an input method put there, without a key code,
+    // or a key that it passed on. While it goes on `composing`, nothing can be done to the text.
+    bool delivered = false;
 };
 
 class KeyboardTapListener {

@@ -77,6 +77,7 @@ struct Scenario {
     std::shared_ptr<const UserDefaults> settings;
     std::u16string application = u"org.example.editor";
     std::u16string inputSource = u"org.example.keylayout.US";
+    std::map<std::u16string, std::u16string> inputMethod;  // words by the letters that are composed to them
     std::map<std::u16string, std::shared_ptr<const ContextInputSetting>> applicationSettings;
     std::optional<Date> now;     // nothing: the real time
     bool keepsKeysBack = false;  // the keyboard can, while Plume sends

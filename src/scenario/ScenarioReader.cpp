@@ -64,6 +64,9 @@ void readCircumstances(const ScenarioKeys& keys, Scenario& scenario) {
     keys.whenSet("timeZone", [&](const JsonNode& n) { scenario.timeZone = readTimeZone(n); });
     keys.whenSet("locale", [&](const JsonNode& n) { scenario.locale = toUtf8(n.string()); });
     keys.whenSet("now", [&](const JsonNode& n) { scenario.now = readNow(n, scenario.timeZone); });
+    keys.whenSet("inputMethod", [&](const JsonNode& n) {
+        for (const auto& [letters, word] : n.members()) scenario.inputMethod[fromUtf8(letters)] = word.string();
+    });
     keys.whenSet("keepsKeysBack", [&](const JsonNode& n) { scenario.keepsKeysBack = n.boolean(); });
     keys.whenSet("tellsItsText", [&](const JsonNode& n) { scenario.tellsItsText = n.boolean(); });
     keys.whenSet("scriptTime", [&](const JsonNode& n) { scenario.scriptTime = n.number(0, LongestScript); });
@@ -105,9 +108,9 @@ std::vector<Scenario> readCases(const JsonNode& cases, const JsonObject& file, c
     std::set<std::string> names;
     for (const JsonNode& node : cases.elements()) {
         const JsonObject object =
-            node.object({"name", "about", "library", "settings", "application", "inputSource", "applicationSettings",
-                         "now", "timeZone", "locale", "scriptTime", "keepsKeysBack", "tellsItsText", "clipboard",
-                         "text", "steps", "expect"});
+            node.object({"name", "about", "library", "settings", "application", "inputSource", "inputMethod",
+                         "applicationSettings", "now", "timeZone", "locale", "scriptTime", "keepsKeysBack",
+                         "tellsItsText", "clipboard", "text", "steps", "expect"});
         const std::string name = readName(object, names);
         scenarios.push_back(readScenario(ScenarioKeys(object, file), fileName));
         scenarios.back().name = name;
@@ -117,9 +120,10 @@ std::vector<Scenario> readCases(const JsonNode& cases, const JsonObject& file, c
 }
 
 std::vector<Scenario> readFrom(const JsonNode& node, const std::string& fileName) {
-    const JsonObject file = node.object(
-        {"about", "library", "settings", "application", "inputSource", "applicationSettings", "now", "timeZone",
-         "locale", "scriptTime", "keepsKeysBack", "tellsItsText", "clipboard", "text", "steps", "expect", "cases"});
+    const JsonObject file =
+        node.object({"about", "library", "settings", "application", "inputSource", "inputMethod", "applicationSettings",
+                     "now", "timeZone", "locale", "scriptTime", "keepsKeysBack", "tellsItsText", "clipboard", "text",
+                     "steps", "expect", "cases"});
     const std::optional<JsonNode> cases = file.find("cases");
     if (cases && !cases->isNull()) return readCases(*cases, file, fileName);
     return {readScenario(ScenarioKeys(file), fileName)};

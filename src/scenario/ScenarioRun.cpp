@@ -30,6 +30,8 @@ ScenarioRun::ScenarioRun(const Scenario& scenario)
         applicationSettings_.set(identifier, setting);
     }
     desktop_.inputSources().setIdentifier(scenario_.inputSource);
+    desktop_.keyboard().inputMethod().setWords(scenario_.inputMethod);
+    if (!scenario_.inputMethod.empty()) desktop_.poster().setCanType([](std::u16string_view) { return false; });
     desktop_.keyboard().setCanHold(scenario_.keepsKeysBack);
     if (!scenario_.tellsItsText) desktop_.accessibility().setFrontApplicationSource({});
     if (scenario_.clipboard) desktop_.pasteboard().copyFromProgram(*scenario_.clipboard);

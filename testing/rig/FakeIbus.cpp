@@ -14,6 +14,7 @@ namespace {
 
 constexpr const char* Name = "org.freedesktop.IBus";
 constexpr const char* Path = "/org/freedesktop/IBus";
+constexpr BusAddress Context{Name, "/org/freedesktop/IBus/InputContext_2", "org.freedesktop.IBus.InputContext"};
 
 void own(const BusConnection& connection) {
     const bool owned = connection && dbus_bus_request_name(connection.get(), Name, 0, nullptr) ==
@@ -49,6 +50,7 @@ FakeIbus::FakeIbus(DesktopRig& rig, std::string engine) : engine_(std::move(engi
         {"dbus-daemon", "--session", "--nofork", "--nopidfile", "--nosyslog", "--address=" + address}, "dbus-daemon");
     waitUntil([&] { return (service_ = openBus(address)) != nullptr || !bus_->isRunning(); });
     own(service_);
+    program_ = openBus(address);
     sayWhere(rig.server().display(), address);
     session_ = openBus(sessionBusAddress());
     own(session_);
@@ -78,6 +80,21 @@ void FakeIbus::setEngine(const std::string& name) {
     dbus_connection_send(service_.get(), signal.get(), nullptr);
 }
 
+void FakeIbus::takeKey(std::uint32_t code, const std::string& text, bool passes) {
+    {
+        const std::scoped_lock lock(mutex_);
+        outcomes_.push_back({text, passes});
+    }
+    const std::uint32_t nothing = 0;
+    dbus_connection_send(program_.get(), newCall(Context, "ProcessKeyEvent", {nothing, code, nothing}).get(), nullptr);
+    dbus_connection_flush(program_.get());
+}
+
+void FakeIbus::putElsewhere(const std::string& text) {
+    const std::scoped_lock lock(mutex_);
+    dbus_connection_send(service_.get(), commit("/org/freedesktop/IBus/InputContext_1", text).get(), nullptr);
+}
+
 void FakeIbus::serve() {
     constexpr int TurnMilliseconds = 5;
     while (!ended_ && dbus_connection_read_write(service_.get(), TurnMilliseconds) != 0) {
@@ -89,7 +106,8 @@ void FakeIbus::serve() {
 
 void FakeIbus::answer(DBusMessage* call) {
     const std::scoped_lock lock(mutex_);
-    dbus_connection_send(service_.get(), engineIn(call).get(), nullptr);
+    const bool isKey = dbus_message_has_member(call, "ProcessKeyEvent") != 0;
+    dbus_connection_send(service_.get(), (isKey ? outcomeOf(call) : engineIn(call)).get(), nullptr);
 }
 
 BusMessage FakeIbus::engineIn(DBusMessage* call) {
@@ -100,6 +118,26 @@ BusMessage FakeIbus::engineIn(DBusMessage* call) {
     dbus_message_iter_open_container(&iterator, DBUS_TYPE_VARIANT, "v", &variant);
     appendObject(variant, "IBusEngineDesc", engine_);
     dbus_message_iter_close_container(&iterator, &variant);
+    return reply;
+}
+
+BusMessage FakeIbus::commit(const char* context, const std::string& text) {
+    BusMessage signal(dbus_message_new_signal(context, Context.interface, "CommitText"));
+    dbus_message_set_destination(signal.get(), dbus_bus_get_unique_name(program_.get()));
+    DBusMessageIter iterator;
+    dbus_message_iter_init_append(signal.get(), &iterator);
+    appendObject(iterator, "IBusText", text);
+    return signal;
+}
+
+// What the program gets is said before the answer.
+BusMessage FakeIbus::outcomeOf(DBusMessage* call) {
+    const Outcome outcome = outcomes_.front();
+    outcomes_.pop_front();
+    if (!outcome.text.empty()) dbus_connection_send(service_.get(), commit(Context.path, outcome.text).get(), nullptr);
+    BusMessage reply(dbus_message_new_method_return(call));
+    const dbus_bool_t isTaken = outcome.passes ? FALSE : TRUE;
+    dbus_message_append_args(reply.get(), DBUS_TYPE_BOOLEAN, &isTaken, DBUS_TYPE_INVALID);
     return reply;
 }
 

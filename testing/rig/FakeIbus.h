@@ -1,6 +1,8 @@
 #pragma once
 
 #include <atomic>
+#include <cstdint>
+#include <deque>
 #include <memory>
 #include <mutex>
 #include <string>
@@ -11,7 +13,8 @@
 
 namespace plume::rig {
 
-// An input method in the process of the test: says which engine works, on a bus of its own.
+// An input method in the process of the test, and a program that gives it keys: on a bus of its own they say to each
+// other what IBus and programs say.
 class FakeIbus {
   public:
     // On this desktop, whose session this process has joined; throws RigError.
@@ -21,18 +24,31 @@ class FakeIbus {
     FakeIbus& operator=(const FakeIbus&) = delete;
 
     void setEngine(const std::string& name);
+    // The program gives it a key of this code, and gets that text before the key is taken or passed.
+    void takeKey(std::uint32_t code, const std::string& text, bool passes);
+    // It puts a text into a field that does not have the focus.
+    void putElsewhere(const std::string& text);
 
   private:
+    struct Outcome {
+        std::string text;
+        bool passes;
+    };
+
     static void sayWhere(const std::string& display, const std::string& address);
     void serve();
     void answer(DBusMessage* call);
     BusMessage engineIn(DBusMessage* call);
+    BusMessage outcomeOf(DBusMessage* call);
+    BusMessage commit(const char* context, const std::string& text);
 
     std::unique_ptr<ChildProcess> bus_;
     BusConnection service_;
+    BusConnection program_;
     BusConnection session_;
     std::mutex mutex_;
-    std::string engine_;  // guarded by mutex_
+    std::string engine_;            // guarded by mutex_
+    std::deque<Outcome> outcomes_;  // of the keys that come next; guarded by mutex_
     std::atomic<bool> ended_ = false;
     std::thread thread_;
 };

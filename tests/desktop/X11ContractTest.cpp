@@ -233,6 +233,46 @@ TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
     EXPECT_TRUE(becomes(u"us")) << "Fcitx has gone";
 }
 
+TEST(InputMethodTest, TellsWhatBecomesOfKeys) {
+    DesktopRig& rig = DesktopEnvironment::desktop_->rig;
+    FakeIbus ibus(rig, "anthy");
+    PollRunLoop loop;
+    const auto stop = [&loop] { loop.stop(); };
+    InputMethodWatch watch(
+        rig.server().display(), loop, [&](const auto& /*engine*/) { stop(); }, stop);
+    loop.run();
+    InputMethod& method = watch.inputMethod();
+    ASSERT_TRUE(method.takesText() && method.isIdle());
+    struct Case {
+        const char* text;
+        bool passes;
+    };
+    for (const Case& c : {Case{"\xE4\xBD\xA0", false}, Case{"", true}, Case{"", false}}) {
+        method.announceKey(57, false);
+        ibus.putElsewhere("y");
+        ibus.takeKey(30, "x", true);  // somebody else's, which says nothing about the key
+        loop.run();
+        EXPECT_EQ(method.next().value_or(InputMethod::Outcome()).text, u"x");
+        EXPECT_FALSE(method.next() || method.isIdle());
+        ibus.takeKey(57, c.text, c.passes);
+        loop.run();
+        method.settle();
+        const auto outcome = method.next();
+        ASSERT_TRUE(outcome && !outcome->unknown);
+        EXPECT_EQ(outcome->text, fromUtf8(c.text));
+        EXPECT_EQ(outcome->keyPassed, c.passes);
+        EXPECT_TRUE(!method.next() && method.isIdle());
+    }
+    method.announceKey(57, true);
+    method.settle();
+    EXPECT_TRUE(!method.next() && method.isIdle() && method.takesText()) << "a menu may have taken it";
+    method.announceKey(57, false);
+    method.settle();
+    const auto outcome = method.next();
+    EXPECT_TRUE(outcome && outcome->unknown);
+    EXPECT_FALSE(method.takesText()) << "the key went to no engine";
+}
+
 TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {
     setenv("DBUS_SYSTEM_BUS_ADDRESS", sessionBusAddress().c_str(), 1);
     const BusConnection manager = openBus(sessionBusAddress());

@@ -307,6 +307,53 @@ TEST_F(X11TapTest, PassesKeysUnheardIntoPasswordFields) {
     EXPECT_EQ(tap_->run([this] { return listener_.withheld; }), 2) << "what was typed before was for another field";
 }
 
+// Makes a word of two letters of every key.
+class Doubling final : public InputMethod {
+  public:
+    bool takesText() const override { return true; }
+    bool isComposing() const override { return false; }
+    bool isIdle() const override { return !announced && !outcome; }
+    void announceKey(std::uint32_t /*code*/, bool typesNothing) override {
+        announced = true;
+        passes = typesNothing;
+    }
+    void settle() override {
+        if (std::exchange(announced, false)) outcome = Outcome{.text = passes ? u"" : u"ab", .keyPassed = passes};
+    }
+    std::optional<Outcome> next() override { return std::exchange(outcome, std::nullopt); }
+
+    bool announced = false;
+    bool passes = false;
+    std::optional<Outcome> outcome;
+};
+
+TEST_F(X11TapTest, TellsWhatAKeyBecameBeforeTheNextKey) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    Doubling method;
+    tap_->run([&] { tap_->tap->setInputMethod(&method); });
+    createTap();
+    tapKey(38);
+    EXPECT_EQ(takeHeard(2).at(0), (Heard{Type::KeyDown, KeyCode::A, {}, u""})) << "undecided";
+    rig_->keyboard().tap(Key::Home);
+    EXPECT_THAT(takeHeard(3), testing::ElementsAre(Heard{Type::KeyDown, KeyCode::None, {}, u"ab"},
+                                                   Heard{Type::KeyDown, KeyCode::Home, {}, u""},
+                                                   Heard{Type::KeyUp, KeyCode::Home, {}, u""}));
+    EXPECT_TRUE(method.announced && method.passes) << "the next key waits, but this one is decided";
+    tapKey(56);
+    EXPECT_EQ(takeHeard(2).at(0), (Heard{Type::KeyDown, KeyCode::B, {}, u""}));
+    EXPECT_EQ(target->awaitText("ba"), "ba");
+    setDecision([this](const TapEvent& event) {
+        if (event.delivered) tap_->tap->remove();
+        return false;
+    });
+    tapKey(54);
+    EXPECT_EQ(target->awaitText("bca"), "bca") << "the session ended before the key was told";
+    EXPECT_EQ(takeHeard(1).size(), 1U);
+    method.outcome = InputMethod::Outcome{.text = u"d"};
+    tap_->run([this] { tap_->tap->inputMethodTold(); });
+    EXPECT_TRUE(method.isIdle()) << "nothing is kept for later";
+}
+
 TEST_F(X11TapTest, ComesBackAfterItsConnectionWasEndedAndMakesUpForWhatItMissed) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     createTap();

@@ -85,9 +85,11 @@ void LinuxPort::connectParts() {
     pasteboard_->setSharedCopy(&clipboardCopy_);
     followFocus();
     followScreen();
-    inputMethod_ =
-        std::make_unique<InputMethodWatch>(session_->connection().displayName(), tapLoop_,
-                                           [this](const std::string& engine) { inputSources_->setEngine(engine); });
+    inputMethod_ = std::make_unique<InputMethodWatch>(
+        session_->connection().displayName(), tapLoop_,
+        [this](const std::string& engine) { inputSources_->setEngine(engine); },
+        [this] { keyboardTap_->inputMethodTold(); });
+    keyboardTap_->setInputMethod(&inputMethod_->inputMethod());
 
     // Whoever waits on the tap thread tells the watchdog that this is no hang.
     session_->heartbeat = [this] { watchdog_->beat(); };

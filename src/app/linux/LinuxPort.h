@@ -92,6 +92,7 @@ class LinuxPort {
     std::unique_ptr<XkbKeyboard> keyboard_;
     std::unique_ptr<Watchdog> watchdog_;
     std::unique_ptr<TapConnection> tapConnection_;
+    std::unique_ptr<InputMethodWatch> inputMethod_;
     std::unique_ptr<X11KeyboardTap> keyboardTap_;
     std::unique_ptr<X11EventPoster> poster_;
     std::unique_ptr<X11MouseTap> mouseTap_;
@@ -100,7 +101,6 @@ class LinuxPort {
     std::unique_ptr<X11InputSources> inputSources_;
     std::unique_ptr<X11SecureInput> secureInput_;
     std::unique_ptr<X11SystemHotKeys> systemHotKeys_;
-    std::unique_ptr<InputMethodWatch> inputMethod_;
 };
 
 }  // namespace plume

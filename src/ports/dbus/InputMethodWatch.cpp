@@ -18,18 +18,18 @@ constexpr const char* Ibus = "org.freedesktop.IBus";
 // On the thread, but for what says otherwise.
 class InputMethodSession {
   public:
-    InputMethodSession(std::string display, RunLoop& tapLoop, InputMethodWatch::EngineListener engineChanged)
+    InputMethodSession(std::string display, RunLoop& tapLoop, InputMethodWatch::EngineListener engineChanged,
+                       InputMethodWatch::Happened happened)
         : display_(std::move(display)),
           bus_(loop_),
-          ibus_(loop_),
+          ibus_(loop_, keys_),
           fcitx_(loop_, bus_),
           engineChanged_(std::move(engineChanged)),
           tapLoop_(tapLoop) {
         bus_.heard = [this](DBusMessage& signal) { hear(signal); };
+        keys_.happened = [this, happened = std::move(happened)] { tapLoop_.perform(happened); };
         ibus_.engineChanged = [this](const std::string& name) {
-            // Engines of this kind leave the keys alone.
-            const bool isLayout = name.empty() || name.starts_with("xkb:");
-            tellEngine(ibusEngine_, isLayout ? std::string() : "ibus:" + name);
+            tellEngine(ibusEngine_, name.empty() ? name : "ibus:" + name);
         };
         fcitx_.engineChanged = [this](const std::string& name) {
             tellEngine(fcitxEngine_, name.empty() ? name : "fcitx:" + name);
@@ -55,6 +55,8 @@ class InputMethodSession {
         tapLoop_.cut();
         loop_.stop();
     }
+
+    ComposedKeys& keys() { return keys_; }  // which may be used on the tap thread
 
   private:
     // IBus comes to the session's bus when its own is there. Fcitx stands in for it there too, and says nothing.
@@ -83,6 +85,7 @@ class InputMethodSession {
     const std::string display_;
     PollRunLoop loop_;
     ServiceBus bus_;
+    ComposedKeys keys_;
     IbusConnection ibus_;
     FcitxConnection fcitx_;
     std::string ibusEngine_;  // their identifiers, empty for none
@@ -92,9 +95,14 @@ class InputMethodSession {
     MainLoopLink tapLoop_;
 };
 
-InputMethodWatch::InputMethodWatch(const std::string& display, RunLoop& loop, EngineListener engineChanged)
-    : thread_(std::make_shared<InputMethodSession>(display, loop, std::move(engineChanged))) {}
+InputMethodWatch::InputMethodWatch(const std::string& display, RunLoop& loop, EngineListener engineChanged,
+                                   Happened happened)
+    : thread_(std::make_shared<InputMethodSession>(display, loop, std::move(engineChanged), std::move(happened))) {}
 
 InputMethodWatch::~InputMethodWatch() = default;
+
+InputMethod& InputMethodWatch::inputMethod() {
+    return thread_->keys();
+}
 
 }  // namespace plume

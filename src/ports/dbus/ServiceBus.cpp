@@ -45,6 +45,10 @@ void ServiceBus::listen(const std::string& rule) {
     if (connection_) dbus_bus_add_match(connection_.get(), rule.c_str(), nullptr);
 }
 
+void ServiceBus::ignore(const std::string& rule) {
+    if (connection_) dbus_bus_remove_match(connection_.get(), rule.c_str(), nullptr);
+}
+
 void ServiceBus::drain() {
     if (!connection_) return;
     dbus_connection_read_write(connection_.get(), 0);

@@ -38,6 +38,8 @@ class ServiceBus {
     void call(const BusMessage& message, Reply reply);
     // From now on, signals of this match rule.
     void listen(const std::string& rule);
+    // No more.
+    void ignore(const std::string& rule);
 
   private:
     struct Waiting {

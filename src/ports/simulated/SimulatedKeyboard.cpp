@@ -77,7 +77,37 @@ void SimulatedKeyboard::arrive(Key key) {
     }
 }
 
+bool SimulatedKeyboard::goesToInputMethod(const Key& key) const {
+    constexpr EventFlags Shortcuts = EventFlag::Control | EventFlag::Option | EventFlag::Command;
+    const bool typesText = !key.string.empty() && key.string.front() >= u' ';
+    return key.type == TapEvent::Type::KeyDown && inputMethod_.takesText() && !key.flags.containsAny(Shortcuts) &&
+           (typesText || inputMethod_.isComposing());
+}
+
+// The program hears of it only what comes of it.
+void SimulatedKeyboard::compose(const Key& key) {
+    TapEvent event{key.type, key.keyCode, key.flags, {}};
+    event.undecided = true;
+    if (tap_.swallows(event)) return;
+    const SimulatedInputMethod::Outcome outcome = inputMethod_.press(key.string.empty() ? u'\0' : key.string.front());
+    if (!outcome.text.empty()) deliver_({key.type, UnmappedKeyCode, {}, outcome.text, true});
+    std::u16string text = outcome.text;
+    const bool typesText = !key.string.empty() && key.string.front() >= u' ';
+    if (outcome.keyPasses) pass(key);
+    if (outcome.keyPasses && typesText) text += key.string;
+    if (!text.empty()) tellDelivered(KeyCode::None, text);
+    if (outcome.keyPasses && !typesText) tellDelivered(key.keyCode, {});
+}
+
+void SimulatedKeyboard::tellDelivered(KeyCode keyCode, std::u16string_view text) {
+    TapEvent event{TapEvent::Type::KeyDown, keyCode, {}, text};
+    event.composing = inputMethod_.isComposing();
+    event.delivered = true;
+    tap_.swallows(event);
+}
+
 void SimulatedKeyboard::decide(const Key& key) {
+    if (goesToInputMethod(key)) return compose(key);
     if (tap_.swallows({key.type, key.keyCode, key.flags, key.string})) return;
     if (holding_) {
         // Its own output goes first; keys that came during the decision stay behind it.

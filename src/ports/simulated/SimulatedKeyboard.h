@@ -11,6 +11,7 @@
 
 #include "platform/InputSources.h"
 #include "platform/RunLoop.h"
+#include "ports/simulated/SimulatedInputMethod.h"
 #include "ports/simulated/SimulatedKeyboardTap.h"
 #include "ports/simulated/SimulatedSystemHotKeys.h"
 
@@ -46,6 +47,7 @@ class SimulatedKeyboard {
     void pressCharacter(std::u16string_view character);
     void releaseCharacter(std::u16string_view character);
 
+    SimulatedInputMethod& inputMethod() { return inputMethod_; }
     bool isDown(KeyCode keyCode) const { return down_.contains(keyCode); }
     EventFlags flags() const;
 
@@ -63,6 +65,9 @@ class SimulatedKeyboard {
 
     void arrive(Key key);
     void decide(const Key& key);
+    bool goesToInputMethod(const Key& key) const;
+    void compose(const Key& key);
+    void tellDelivered(KeyCode keyCode, std::u16string_view text);
     void pass(const Key& key);
 
     RunLoop& runLoop_;
@@ -70,6 +75,7 @@ class SimulatedKeyboard {
     SimulatedKeyboardTap& tap_;
     SimulatedSystemHotKeys& hotKeys_;
     const Deliver deliver_;
+    SimulatedInputMethod inputMethod_;
     std::set<KeyCode> down_;
     std::set<KeyCode> takenBySystem_;  // keys whose release the system keeps as well
     bool canHold_ = false;

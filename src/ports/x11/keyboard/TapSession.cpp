@@ -19,6 +19,11 @@ KeyCode modifierKeyOf(EventFlags flags) {
     return KeyCode::Command;
 }
 
+bool typesText(std::u16string_view text) {
+    constexpr char16_t Delete = 0x7F;
+    return !text.empty() && text.front() >= u' ' && text.front() != Delete;
+}
+
 bool isRepeat(const xcb_input_key_press_event_t& key) {
     return (key.flags & XCB_INPUT_KEY_EVENT_FLAGS_KEY_REPEAT) != 0;
 }
@@ -134,10 +139,18 @@ bool TapSession::isKey(const xcb_generic_event_t& event) const {
 void TapSession::drain() {
     const auto kept = shared_from_this();  // the listener may end the session
     const TapConnection& connection = dependencies_.connection;
+    tellOutcomes();
     while (!ended_ && !held_) {
-        const auto event = nextEvent();
+        auto event = nextEvent();
         if (!event) break;
-        handle(*event);
+        if (waitsForOutcome(*event)) {
+            // Whatever the listener does about the outcome comes before it, also the end of the session.
+            readAhead_.push_front(std::move(event));
+            dependencies_.inputMethod->settle();
+            tellOutcomes();
+        } else {
+            handle(*event);
+        }
     }
     if (!ended_ && readsAhead_) readAhead();
     if (!ended_ && connection.isBroken()) dependencies_.lost();
@@ -262,6 +275,7 @@ void TapSession::press(xcb_keycode_t keycode, bool repeated) {
     }
     if (ended_) return;
     swallowed_ = swallow;
+    if (!swallow && told_[keycode] && goesToInputMethod(key)) giveToInputMethod(key, keycode, repeated);
     if (swallow) {
         decoder_.undoLocks();
         // A repeat of a key that was passed on: let go of it, or it would go on repeating.
@@ -298,7 +312,73 @@ bool TapSession::tell(const KeyDecoder::Key& key, TapEvent::Type type) {
     dependencies_.toldFlags = key.flags;
     // Programs type nothing with Alt.
     const bool command = !key.modifier && key.flags.contains(EventFlag::Option);
-    return dependencies_.listener.keyboardEvent({type, key.keyCode, key.flags, key.string, key.composing, command});
+    TapEvent event{type, key.keyCode, key.flags, key.string, key.composing, command};
+    undecided_ = type == TapEvent::Type::KeyDown && goesToInputMethod(key) &&
+                 (typesText(key.string) || dependencies_.inputMethod->isComposing());
+    event.undecided = undecided_;
+    if (undecided_) event.string = {};
+    return dependencies_.listener.keyboardEvent(event);
+}
+
+bool TapSession::waitsForOutcome(const xcb_generic_event_t& event) const {
+    const InputMethod* const inputMethod = dependencies_.inputMethod;
+    return inputMethod && !inputMethod->isIdle() && isInput(event, XCB_INPUT_KEY_PRESS);
+}
+
+// Engines leave shortcuts alone. The others all go there; those that type nothing they take only while they compose.
+bool TapSession::goesToInputMethod(const KeyDecoder::Key& key) const {
+    constexpr EventFlags Shortcuts = EventFlag::Control | EventFlag::Option | EventFlag::Command;
+    if (!dependencies_.inputMethod || !dependencies_.inputMethod->takesText()) return false;
+    return !key.modifier && !key.flags.containsAny(Shortcuts);
+}
+
+// GTK resets the engine when it has moved the caret; a letter that the engine got before that would be lost.
+void TapSession::giveToInputMethod(const KeyDecoder::Key& key, xcb_keycode_t keycode, bool repeated) {
+    constexpr std::uint32_t FirstKeycode = 8;  // of X, for the first code of the hardware
+    if (repeated) {
+        // How often it repeats for the program nobody knows.
+        if (undecided_) dependencies_.listener.typingInterrupted();
+        return;
+    }
+    announced_.keyCode = key.keyCode;
+    announced_.flags = key.flags;
+    announced_.text = typesText(key.string) ? key.string : std::u16string_view();
+    announced_.isTold = !undecided_;
+    dependencies_.inputMethod->announceKey(keycode - FirstKeycode, announced_.isTold);
+}
+
+void TapSession::tellOutcomes() {
+    if (!dependencies_.inputMethod || dependencies_.inputMethod->isIdle()) return;
+    const auto kept = shared_from_this();  // the listener may end the session
+    while (!ended_ && !held_) {
+        const auto outcome = dependencies_.inputMethod->next();
+        if (!outcome) return;
+        if (outcome->unknown || !mayTell()) {
+            dependencies_.listener.typingInterrupted();
+        } else {
+            tellOutcome(*outcome);
+        }
+    }
+}
+
+void TapSession::tellOutcome(const InputMethod::Outcome& outcome) {
+    TapEvent event;
+    event.delivered = true;
+    event.flags = announced_.flags;
+    event.keyCode = KeyCode::Delete;
+    for (std::size_t i = 0; i < outcome.erased && !ended_; ++i) dependencies_.listener.keyboardEvent(event);
+    std::u16string text = outcome.text;
+    if (outcome.keyPassed) text += announced_.text;
+    if (!text.empty() && !ended_) {
+        event.keyCode = KeyCode::None;
+        event.string = text;
+        event.composing = outcome.composing;
+        dependencies_.listener.keyboardEvent(event);
+    }
+    if (!outcome.keyPassed || !announced_.text.empty() || announced_.isTold || ended_) return;
+    event.keyCode = announced_.keyCode;
+    event.string = {};
+    dependencies_.listener.keyboardEvent(event);
 }
 
 void TapSession::inject(Injection injection) {

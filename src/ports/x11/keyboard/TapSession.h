@@ -14,7 +14,9 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <string>
 
+#include "platform/InputMethod.h"
 #include "platform/KeyboardTap.h"
 #include "ports/posix/PollRunLoop.h"
 #include "ports/x11/keyboard/DeviceKeymaps.h"
@@ -46,6 +48,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
         const UserTyped& userTyped;  // may be empty
         std::function<void()> lost;  // the connection is gone
         EventFlags& toldFlags;       // the modifiers that the listener takes to be held
+        InputMethod* inputMethod;    // null: none
     };
 
     explicit TapSession(Dependencies dependencies);
@@ -64,6 +67,8 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     // See EventPoster::keepHoldingUserKeys().
     void keepHolding();
     void userClicked();
+    // Tells what the input method has put into programs.
+    void tellOutcomes();
 
   private:
     struct Injection {
@@ -96,6 +101,10 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     bool tellsKey(const KeyDecoder::Key& key);
     void tellMissedModifiers(EventFlags flags);
     bool tell(const KeyDecoder::Key& key, TapEvent::Type type);
+    bool waitsForOutcome(const xcb_generic_event_t& event) const;
+    bool goesToInputMethod(const KeyDecoder::Key& key) const;
+    void giveToInputMethod(const KeyDecoder::Key& key, xcb_keycode_t keycode, bool repeated);
+    void tellOutcome(const InputMethod::Outcome& outcome);
     void inject(Injection injection);
     void send(Injection injection);
 
@@ -112,6 +121,16 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     std::array<std::uint16_t, 256> devices_{};  // that a key went down on
     bool withholding_ = false;                  // the latest key went by untold
     bool swallowed_ = false;                    // the latest key that went down was swallowed
+
+    // The key that was announced to the input method last.
+    struct Announced {
+        KeyCode keyCode = KeyCode::None;
+        EventFlags flags;
+        std::u16string text;
+        bool isTold = false;  // as a key of the program's, which it is unless the engine does something
+    };
+    Announced announced_;
+    bool undecided_ = false;  // the latest key that was told is the input method's
 
     KeyMoments moments_;
 

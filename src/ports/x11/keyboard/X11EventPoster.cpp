@@ -121,6 +121,7 @@ void X11EventPoster::addText(std::u16string_view text) {
 }
 
 bool X11EventPoster::canType(std::u16string_view text) const {
+    if (tap_.composesKeys()) return false;
     const XkbKeymap& keymap = *keyboard_.keymap();
     const std::size_t spares = keymap.spareKeycodes().size();
     std::set<char32_t> missing;

@@ -46,7 +46,8 @@ Result<void> X11KeyboardTap::begin() {
                                                                          .focus = focus_,
                                                                          .userTyped = userTyped_,
                                                                          .lost = [this] { lost(); },
-                                                                         .toldFlags = toldFlags_});
+                                                                         .toldFlags = toldFlags_,
+                                                                         .inputMethod = inputMethod_});
     if (auto begun = session->begin(); !begun) return begun;
     session_ = std::move(session);
     return {};
@@ -84,6 +85,13 @@ void X11KeyboardTap::remove() {
 
 Result<void> X11KeyboardTap::check() const {
     return TapConnection::check(display_);
+}
+
+void X11KeyboardTap::inputMethodTold() {
+    if (session_) return session_->tellOutcomes();
+    // Nobody listens, and what was typed is not to be kept.
+    while (inputMethod_->next()) {
+    }
 }
 
 void X11KeyboardTap::hold() {

@@ -28,6 +28,12 @@ class X11KeyboardTap final : public KeyboardTap {
     // Asked for every key, so they must be quick. In a password, and while another program holds the keyboard, keys
     // pass unheard; where the focus has moved by itself, what was typed before is no part of an abbreviation any more.
     void setFocusQuestions(FocusQuestions questions);
+    // Where text is composed; null: nowhere. It outlives the tap.
+    void setInputMethod(InputMethod* inputMethod) { inputMethod_ = inputMethod; }
+    // What it tells is there to take.
+    void inputMethodTold();
+    // Keys that type text would be composed, whoever presses them.
+    bool composesKeys() const { return inputMethod_ != nullptr && inputMethod_->takesText(); }
     // Told of every press that passes, also of those that pass unheard; it must be quick, too.
     void setUserTyped(UserTyped userTyped);
 
@@ -58,6 +64,7 @@ class X11KeyboardTap final : public KeyboardTap {
     const std::string display_;
     FocusQuestions focus_;
     UserTyped userTyped_;
+    InputMethod* inputMethod_ = nullptr;
     KeyboardTapListener* listener_ = nullptr;
     EventFlags toldFlags_;                 // the modifiers that the listener takes to be held, across sessions
     std::shared_ptr<TapSession> session_;  // while the keyboards are taken
