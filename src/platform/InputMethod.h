@@ -32,7 +32,8 @@ class InputMethod {
     // This key of the hardware (its evdev code) is about to go there; the one announced before has been settled. Of a
     // key that types nothing it is only waited, for a shorter time, until the engine has had it.
     virtual void announceKey(std::uint32_t code, bool typesNothing) = 0;
-    // Waits until it is known what became of the key that was announced, a tenth of a second from then at most.
+    // Waits until it is known what became of the key that was announced, 0.1 s from then at most, and 0.3 s more
+    // while the engine has it.
     virtual void settle() = 0;
     // The next thing that programs got, in order; nothing when all has been taken.
     virtual std::optional<Outcome> next() = 0;

@@ -80,10 +80,10 @@ void FakeIbus::setEngine(const std::string& name) {
     dbus_connection_send(service_.get(), signal.get(), nullptr);
 }
 
-void FakeIbus::takeKey(std::uint32_t code, const std::string& text, bool passes) {
+void FakeIbus::takeKey(std::uint32_t code, const std::string& text, bool passes, Milliseconds delay) {
     {
         const std::scoped_lock lock(mutex_);
-        outcomes_.push_back({text, passes});
+        outcomes_.push_back({text, passes, delay});
     }
     const std::uint32_t nothing = 0;
     dbus_connection_send(program_.get(), newCall(Context, "ProcessKeyEvent", {nothing, code, nothing}).get(), nullptr);
@@ -134,6 +134,7 @@ BusMessage FakeIbus::commit(const char* context, const std::string& text) {
 BusMessage FakeIbus::outcomeOf(DBusMessage* call) {
     const Outcome outcome = outcomes_.front();
     outcomes_.pop_front();
+    waitUntil([] { return false; }, outcome.delay);
     if (!outcome.text.empty()) dbus_connection_send(service_.get(), commit(Context.path, outcome.text).get(), nullptr);
     BusMessage reply(dbus_message_new_method_return(call));
     const dbus_bool_t isTaken = outcome.passes ? FALSE : TRUE;

@@ -9,6 +9,7 @@
 #include <thread>
 
 #include "ports/dbus/BusMessages.h"
+#include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 
 namespace plume::rig {
@@ -24,8 +25,8 @@ class FakeIbus {
     FakeIbus& operator=(const FakeIbus&) = delete;
 
     void setEngine(const std::string& name);
-    // The program gives it a key of this code, and gets that text before the key is taken or passed.
-    void takeKey(std::uint32_t code, const std::string& text, bool passes);
+    // The program gives it a key of this code, and gets that text before the key is taken or passed, after the delay.
+    void takeKey(std::uint32_t code, const std::string& text, bool passes, Milliseconds delay = Milliseconds(0));
     // It puts a text into a field that does not have the focus.
     void putElsewhere(const std::string& text);
 
@@ -33,6 +34,7 @@ class FakeIbus {
     struct Outcome {
         std::string text;
         bool passes;
+        Milliseconds delay;
     };
 
     static void sayWhere(const std::string& display, const std::string& address);

@@ -263,6 +263,10 @@ TEST(InputMethodTest, TellsWhatBecomesOfKeys) {
         EXPECT_EQ(outcome->keyPassed, c.passes);
         EXPECT_TRUE(!method.next() && method.isIdle());
     }
+    method.announceKey(57, false);
+    ibus.takeKey(57, "late", false, Milliseconds(200));
+    method.settle();
+    EXPECT_EQ(method.next().value_or(InputMethod::Outcome()).text, u"late");
     method.announceKey(57, true);
     method.settle();
     EXPECT_TRUE(!method.next() && method.isIdle() && method.takesText()) << "a menu may have taken it";

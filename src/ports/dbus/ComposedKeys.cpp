@@ -4,9 +4,15 @@
 
 namespace plume {
 
+namespace {
+
+constexpr std::chrono::milliseconds ForText{100};
+constexpr std::chrono::milliseconds ForSlowEngine{300};  // more
+constexpr std::chrono::milliseconds ForNothing{20};
+
+}  // namespace
+
 void ComposedKeys::announceKey(std::uint32_t code, bool typesNothing) {
-    constexpr std::chrono::milliseconds ForText{100};
-    constexpr std::chrono::milliseconds ForNothing{20};
     typesNothing_ = typesNothing;
     longestWait_ = std::chrono::steady_clock::now() + (typesNothing ? ForNothing : ForText);
     const std::scoped_lock lock(mutex_);
@@ -20,6 +26,7 @@ void ComposedKeys::settle() {
     using std::chrono::milliseconds;
     const auto left = longestWait_ - std::chrono::steady_clock::now();
     owed_.await(std::max(milliseconds(0), std::chrono::ceil<milliseconds>(left)));
+    if (engineIsSlow()) owed_.await(ForSlowEngine);
     const std::scoped_lock lock(mutex_);
     if (!announced_) return;
     announced_.reset();
@@ -31,6 +38,14 @@ void ComposedKeys::settle() {
     Outcome nobodyKnows;
     nobodyKnows.unknown = true;
     outcomes_.push_back(std::move(nobodyKnows));
+}
+
+// It has the key. Other keys would wait in its program if not here.
+bool ComposedKeys::engineIsSlow() {
+    const std::scoped_lock lock(mutex_);
+    const bool isSlow = announced_ && current_ && !typesNothing_;
+    if (isSlow) owed_.owe();
+    return isSlow;
 }
 
 std::optional<InputMethod::Outcome> ComposedKeys::next() {

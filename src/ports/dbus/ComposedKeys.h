@@ -42,6 +42,7 @@ class ComposedKeys final : public InputMethod {
     void end();
 
   private:
+    bool engineIsSlow();
     void push(Outcome outcome);
 
     std::atomic<bool> takesText_ = false;

@@ -144,16 +144,22 @@ void TapSession::drain() {
         auto event = nextEvent();
         if (!event) break;
         if (waitsForOutcome(*event)) {
-            // Whatever the listener does about the outcome comes before it, also the end of the session.
             readAhead_.push_front(std::move(event));
-            dependencies_.inputMethod->settle();
-            tellOutcomes();
-        } else {
-            handle(*event);
+            settle();
+            break;
         }
+        handle(*event);
     }
     if (!ended_ && readsAhead_) readAhead();
     if (!ended_ && connection.isBroken()) dependencies_.lost();
+}
+
+// Whatever the listener does about the outcome comes before the key that waits for it, also the end of the session. The
+// loop answers the watchdog in between.
+void TapSession::settle() {
+    dependencies_.inputMethod->settle();
+    tellOutcomes();
+    if (!ended_ && !held_) nextDrain_ = dependencies_.loop.performAfterDelay(0, [this] { drain(); });
 }
 
 XcbOwned<xcb_generic_event_t> TapSession::nextEvent() {

@@ -84,6 +84,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void addSource();
     void passOnUnheard();
     void drain();
+    void settle();
     void readAhead();
     XcbOwned<xcb_generic_event_t> nextEvent();
     bool isForWindowManager(const xcb_generic_event_t& event) const;
