@@ -1,8 +1,12 @@
 #pragma once
 
+#include <cstdint>
+#include <deque>
+#include <mutex>
 #include <string>
 
 #include "testing/rig/BusService.h"
+#include "testing/rig/Deadline.h"
 
 namespace plume::rig {
 
@@ -16,12 +20,29 @@ class FakeFcitx {
     // In the field with the focus; the program alone is told.
     void setEngine(const std::string& name);
     void loseFocus();
+    // The program gives it a key of this code of the hardware, and gets that text after the delay; then the key is
+    // passed or taken, and without a text composed.
+    void takeKey(std::uint32_t code, const std::string& text, bool passes, Milliseconds delay = Milliseconds(0));
+    // Another field gets that text.
+    void putElsewhere(const std::string& text);
 
   private:
-    BusMessage answer(DBusMessage* call) const;
+    struct Outcome {
+        std::string text;
+        bool passes;
+        Milliseconds delay;
+    };
+
+    BusMessage answer(DBusMessage* call);
+    void tellOutcome(DBusMessage* call);
+    BusMessage signal(const char* path, const char* member) const;
+    BusMessage commit(const char* path, const std::string& text) const;
+    BusMessage preedit(const char* text) const;
 
     BusConnection program_;
     const std::string engine_;
+    std::mutex mutex_;
+    std::deque<Outcome> outcomes_;  // of the keys that come next; guarded by mutex_
     BusService service_;
 };
 

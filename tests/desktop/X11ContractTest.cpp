@@ -197,16 +197,20 @@ class X11Desk final : public ContractDesk {
 
 const ContractPort<ContractDesk> Desk{"X11", [] { return std::make_unique<X11Desk>(); }};
 
+bool runUntil(PollRunLoop& loop, const std::function<bool()>& condition) {
+    const Deadline deadline(Bound);
+    while (!condition() && !deadline.passed()) {
+        const Timer look = loop.performAfterDelay(Step, [&loop] { loop.stop(); });
+        loop.run();
+    }
+    return condition();
+}
+
 TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
     Desktop& desktop = *DesktopEnvironment::desktop_;
     const auto& identifier = desktop.port->ports().inputSources.currentInputSourceIdentifier();
     const auto becomes = [&](const std::u16string& expected) {
-        const Deadline deadline(Bound);
-        while (identifier != expected && !deadline.passed()) {
-            const Timer look = desktop.port->tapLoop().performAfterDelay(Step, [&] { desktop.port->tapLoop().stop(); });
-            desktop.port->tapLoop().run();
-        }
-        return identifier == expected;
+        return runUntil(desktop.port->tapLoop(), [&] { return identifier == expected; });
     };
     ASSERT_EQ(identifier, u"us");
     for (const bool comesBack : {false, true}) {
@@ -233,38 +237,37 @@ TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
     EXPECT_TRUE(becomes(u"us")) << "Fcitx has gone";
 }
 
-TEST(InputMethodTest, TellsWhatBecomesOfKeys) {
-    DesktopRig& rig = DesktopEnvironment::desktop_->rig;
-    FakeIbus ibus(rig, "anthy");
+template <typename Fake>
+void expectOutcomes(Fake& fake, bool tellsComposing) {
     PollRunLoop loop;
     const auto stop = [&loop] { loop.stop(); };
     InputMethodWatch watch(
-        rig.server().display(), loop, [&](const auto& /*engine*/) { stop(); }, stop);
-    loop.run();
+        DesktopEnvironment::desktop_->rig.server().display(), loop, [&](const auto& /*engine*/) { stop(); }, stop);
     InputMethod& method = watch.inputMethod();
-    ASSERT_TRUE(method.takesText() && method.isIdle());
+    ASSERT_TRUE(runUntil(loop, [&] { return method.takesText(); }) && method.isIdle());
     struct Case {
         const char* text;
         bool passes;
     };
-    for (const Case& c : {Case{"\xE4\xBD\xA0", false}, Case{"", true}, Case{"", false}}) {
+    for (const Case& c : {Case{"\xE4\xBD\xA0", false}, Case{"", true}, Case{"\xED\x95\x9C", true}, Case{"", false}}) {
         method.announceKey(57, false);
-        ibus.putElsewhere("y");
-        ibus.takeKey(30, "x", true);  // somebody else's, which says nothing about the key
+        fake.putElsewhere("y");
+        fake.takeKey(30, "x", true);  // somebody else's, which says nothing about the key
         loop.run();
         EXPECT_EQ(method.next().value_or(InputMethod::Outcome()).text, u"x");
         EXPECT_FALSE(method.next() || method.isIdle());
-        ibus.takeKey(57, c.text, c.passes);
+        fake.takeKey(57, c.text, c.passes);
         loop.run();
         method.settle();
         const auto outcome = method.next();
         ASSERT_TRUE(outcome && !outcome->unknown);
         EXPECT_EQ(outcome->text, fromUtf8(c.text));
         EXPECT_EQ(outcome->keyPassed, c.passes);
+        EXPECT_EQ(outcome->composing, tellsComposing && outcome->text.empty() && !c.passes);
         EXPECT_TRUE(!method.next() && method.isIdle());
     }
     method.announceKey(57, false);
-    ibus.takeKey(57, "late", false, Milliseconds(200));
+    fake.takeKey(57, "late", false, Milliseconds(200));
     method.settle();
     EXPECT_EQ(method.next().value_or(InputMethod::Outcome()).text, u"late");
     method.announceKey(57, true);
@@ -275,6 +278,16 @@ TEST(InputMethodTest, TellsWhatBecomesOfKeys) {
     const auto outcome = method.next();
     EXPECT_TRUE(outcome && outcome->unknown);
     EXPECT_FALSE(method.takesText()) << "the key went to no engine";
+}
+
+TEST(InputMethodTest, TellsWhatBecomesOfKeys) {
+    FakeIbus ibus(DesktopEnvironment::desktop_->rig, "anthy");
+    expectOutcomes(ibus, false);
+}
+
+TEST(InputMethodTest, TellsWhatFcitxMakesOfKeys) {
+    FakeFcitx fcitx("hangul");
+    expectOutcomes(fcitx, true);
 }
 
 TEST(SystemSleepTest, TellsWhatTheLoginManagerSays) {

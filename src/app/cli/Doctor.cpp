@@ -216,8 +216,10 @@ class Examination {
         const std::set<std::string> running = runningPrograms();
         for (const char* program : {"ibus-daemon", "fcitx5", "fcitx", "uim-xim"}) {
             if (!running.contains(program)) continue;
-            if (program == std::string_view("ibus-daemon")) {
-                good("input method", "ibus-daemon is running: what its engines put into programs counts as typed");
+            if (program == std::string_view("ibus-daemon") || program == std::string_view("fcitx5")) {
+                good("input method", std::string(program) +
+                                         " is running: what its engines put into programs counts as "
+                                         "typed, but not where programs reach them by XIM");
                 continue;
             }
             good("input method",

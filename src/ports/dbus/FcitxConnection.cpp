@@ -5,7 +5,6 @@ namespace plume {
 namespace {
 
 constexpr BusAddress Controller{FcitxConnection::Service, "/controller", "org.fcitx.Fcitx.Controller1"};
-constexpr BusAddress Monitoring{DBUS_SERVICE_DBUS, DBUS_PATH_DBUS, "org.freedesktop.DBus.Monitoring"};
 
 const std::vector<std::string>& rules() {
     static const std::vector<std::string> all = {
@@ -16,23 +15,25 @@ const std::vector<std::string>& rules() {
 
 }  // namespace
 
-FcitxConnection::FcitxConnection(PollRunLoop& loop, ServiceBus& session) : session_(session), monitor_(loop) {
+FcitxConnection::FcitxConnection(PollRunLoop& loop, ServiceBus& session, ComposedKeys& keys)
+    : session_(session), monitor_(loop), keys_(loop, session, keys) {
     monitor_.overheard = [this](DBusMessage& message) { overhear(message); };
-    monitor_.lost = [this] { setEngine({}); };
+    monitor_.lost = [this] { disconnect(); };
 }
 
 void FcitxConnection::connect(const std::string& address) {
     focus_.clear();
+    address_ = address;
     if (!monitor_.connect(address)) return setEngine({});
-    monitor_.call(newCall(Monitoring, "BecomeMonitor", {rules(), std::uint32_t{0}}), [this](const BusAnswer& answer) {
+    monitor_.monitor(rules(), [this](bool isAllowed) {
         // What was true once is worth nothing when changes are not heard.
-        if (answer) return askForEngine();
-        disconnect();
+        isAllowed ? askForEngine() : disconnect();
     });
 }
 
 void FcitxConnection::disconnect() {
     monitor_.disconnect();
+    keys_.disconnect();
     setEngine({});
 }
 
@@ -55,10 +56,11 @@ void FcitxConnection::overhear(DBusMessage& message) {
     }
 }
 
-void FcitxConnection::setEngine(const std::string& name) const {
+void FcitxConnection::setEngine(const std::string& name) {
     // Engines of this kind leave the keys alone.
-    const bool isLayout = name.starts_with("keyboard-");
-    engineChanged(isLayout ? std::string() : name);
+    const bool composes = !name.empty() && !name.starts_with("keyboard-");
+    composes ? keys_.connect(address_) : keys_.end();
+    engineChanged(composes ? name : std::string());
 }
 
 }  // namespace plume

@@ -23,7 +23,7 @@ class InputMethodSession {
         : display_(std::move(display)),
           bus_(loop_),
           ibus_(loop_, keys_),
-          fcitx_(loop_, bus_),
+          fcitx_(loop_, bus_, keys_),
           engineChanged_(std::move(engineChanged)),
           tapLoop_(tapLoop) {
         bus_.heard = [this](DBusMessage& signal) { hear(signal); };

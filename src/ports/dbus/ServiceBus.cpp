@@ -49,6 +49,12 @@ void ServiceBus::ignore(const std::string& rule) {
     if (connection_) dbus_bus_remove_match(connection_.get(), rule.c_str(), nullptr);
 }
 
+void ServiceBus::monitor(const std::vector<std::string>& rules, std::function<void(bool isAllowed)> begun) {
+    call(newCall({DBUS_SERVICE_DBUS, DBUS_PATH_DBUS, "org.freedesktop.DBus.Monitoring"}, "BecomeMonitor",
+                 {rules, std::uint32_t{0}}),
+         [begun = std::move(begun)](const BusAnswer& answer) { begun(static_cast<bool>(answer)); });
+}
+
 void ServiceBus::drain() {
     if (!connection_) return;
     dbus_connection_read_write(connection_.get(), 0);
@@ -64,7 +70,7 @@ void ServiceBus::drain() {
 
 void ServiceBus::take(DBusMessage& message) {
     const char* const destination = dbus_message_get_destination(&message);
-    if (destination != nullptr && std::string_view(destination) != dbus_bus_get_unique_name(connection_.get())) {
+    if (destination != nullptr && std::string_view(destination) != name()) {
         if (overheard) overheard(message);
         return;
     }

@@ -5,6 +5,7 @@
 #include <functional>
 #include <map>
 #include <string>
+#include <vector>
 
 #include "ports/dbus/BusMessages.h"
 #include "ports/posix/PollRunLoop.h"
@@ -33,6 +34,8 @@ class ServiceBus {
     // Calls that wait for an answer are forgotten.
     void disconnect();
     bool isConnected() const { return connection_ != nullptr; }
+    // As the bus knows the connection; null when there is none.
+    const char* name() const { return connection_ ? dbus_bus_get_unique_name(connection_.get()) : nullptr; }
 
     // The answer comes later, from the loop; an empty one when the service refuses, or says nothing for some seconds.
     void call(const BusMessage& message, Reply reply);
@@ -40,6 +43,9 @@ class ServiceBus {
     void listen(const std::string& rule);
     // No more.
     void ignore(const std::string& rule);
+    // Nothing else from now on: it overhears whatever matches one of the rules, and can say nothing any more. Told once
+    // the bus has begun, or does not allow it.
+    void monitor(const std::vector<std::string>& rules, std::function<void(bool isAllowed)> begun);
 
   private:
     struct Waiting {
