@@ -106,6 +106,20 @@ TEST_F(AccessibilityFocusTest, TypingAsksFewQuestions) {
     EXPECT_GE(steady_clock::now() - begin, std::chrono::milliseconds(450));  // two pauses between three looks
 }
 
+TEST_F(AccessibilityFocusTest, WhatAnExpansionWantsToKnowIsAskedAtOnce) {
+    const auto target = startFocused(TargetKind::GtkTextView);
+    awaitEndOfLooks();
+    BusMonitor roles(address(), {"GetRole"});
+    const auto focused = AXUtils::getFocusedUIElement(*accessibility_);
+    ASSERT_TRUE(focused);
+    EXPECT_FALSE(focused->stringAttribute("AXSubrole"));
+    EXPECT_EQ(AXUtils::getSelectedTextLength(*accessibility_), 0);
+    EXPECT_EQ(roles.count(), 0);
+    rig_->keyboard().type("abc");
+    rig_->keyboard().chord({Key::LeftShift}, Key::Left);
+    EXPECT_TRUE(waitUntil([] { return AXUtils::getSelectedTextLength(*accessibility_) == 1; }));
+}
+
 TEST_F(AccessibilityFocusTest, AProgramThatTellsNothingIsAskedEverMoreRarely) {
     const auto background = rig_->startTarget(TargetKind::GtkTextView);
     const auto terminal = rig_->startTarget(TargetKind::Xterm);

@@ -41,6 +41,22 @@ BusAnswer AtspiBus::property(const AtspiPart& part, const char* interface, const
     return call(part, DBUS_INTERFACE_PROPERTIES, "Get", {interface, name});
 }
 
+AtspiPendingCall AtspiBus::callAhead(const AtspiPart& part, const char* interface, const char* method) {
+    if (!part || !isConnected() || isSilent(part.program)) return nullptr;
+    const BusMessage call = newCall({part.program.c_str(), part.path.c_str(), interface}, method);
+    DBusPendingCall* pending = nullptr;
+    dbus_connection_send_with_reply(connection_.get(), call.get(), &pending, static_cast<int>(CallBound.count()));
+    return AtspiPendingCall(pending);
+}
+
+BusAnswer AtspiBus::answerTo(const AtspiPart& part, AtspiPendingCall call) const {
+    if (!call || !isConnected() || isSilent(part.program)) return {};
+    dbus_pending_call_block(call.get());
+    BusMessage reply(dbus_pending_call_steal_reply(call.get()));
+    const bool isAnswer = reply && dbus_message_get_type(reply.get()) == DBUS_MESSAGE_TYPE_METHOD_RETURN;
+    return isAnswer ? BusAnswer(std::move(reply)) : BusAnswer();
+}
+
 BusAnswer AtspiBus::callBus(const char* method, std::initializer_list<BusValue> arguments) {
     return send(DBUS_SERVICE_DBUS,
                 newCall({DBUS_SERVICE_DBUS, DBUS_PATH_DBUS, DBUS_INTERFACE_DBUS}, method, arguments));

@@ -8,6 +8,7 @@
 #include <chrono>
 #include <initializer_list>
 #include <map>
+#include <memory>
 #include <string>
 
 #include "ports/dbus/BusMessages.h"
@@ -22,6 +23,14 @@ struct AtspiPart {
     explicit operator bool() const { return !path.empty(); }
     bool operator==(const AtspiPart&) const = default;
 };
+
+struct PendingCallCancel {
+    void operator()(DBusPendingCall* call) const {
+        dbus_pending_call_cancel(call);
+        dbus_pending_call_unref(call);
+    }
+};
+using AtspiPendingCall = std::unique_ptr<DBusPendingCall, PendingCallCancel>;
 
 // Belongs to the accessibility thread.
 class AtspiBus {
@@ -45,6 +54,10 @@ class AtspiBus {
                    std::initializer_list<BusValue> arguments = {});
     // The value stands inside a variant.
     BusAnswer property(const AtspiPart& part, const char* interface, const char* name);
+    // A call that is on its way while another one is made. Its answer does not count as left out.
+    AtspiPendingCall callAhead(const AtspiPart& part, const char* interface, const char* method);
+    // Waits for the answer; nothing while the program is silent.
+    BusAnswer answerTo(const AtspiPart& part, AtspiPendingCall call) const;
     BusAnswer callBus(const char* method, std::initializer_list<BusValue> arguments);
 
     // For whoever waits for signals: what to wait on, and the next message that has come, if any.

@@ -43,7 +43,7 @@ std::optional<std::u16string> stringOf(AtspiBus& bus, const AtspiPart& part, con
 AtspiApplicationElement::Element AtspiApplicationElement::elementAttribute(std::string_view name) const {
     if (name != "AXFocusedUIElement") return nullptr;
     auto focused = session_->askForFocus();
-    if (!focused || !*focused) return nullptr;
+    if (!focused || !focused->part) return nullptr;
     return std::make_shared<AtspiElement>(session_, std::move(*focused));
 }
 
@@ -51,11 +51,14 @@ std::optional<std::u16string> AtspiApplicationElement::stringAttribute(std::stri
     return name == "AXRole" ? std::optional<std::u16string>(u"AXApplication") : std::nullopt;
 }
 
-AtspiElement::AtspiElement(std::shared_ptr<AtspiSession> session, AtspiPart part)
-    : session_(std::move(session)), part_(std::move(part)) {}
+AtspiElement::AtspiElement(std::shared_ptr<AtspiSession> session, AtspiFocused focused)
+    : session_(std::move(session)),
+      part_(std::move(focused.part)),
+      isText_(focused.isText),
+      selectsNothing_(focused.selectsNothing) {}
 
 AtspiElement::Element AtspiElement::elementFor(AtspiPart part) const {
-    return part ? std::make_shared<AtspiElement>(session_, std::move(part)) : nullptr;
+    return part ? std::make_shared<AtspiElement>(session_, AtspiFocused{std::move(part), false, {}}) : nullptr;
 }
 
 AtspiElement::Element AtspiElement::elementAttribute(std::string_view name) const {
@@ -78,6 +81,7 @@ std::vector<AtspiElement::Element> AtspiElement::elementsAttribute(std::string_v
 }
 
 std::optional<std::u16string> AtspiElement::stringAttribute(std::string_view name) const {
+    if (isText_ && name == "AXSubrole") return std::nullopt;  // texts have none
     return session_->ask<std::u16string>(
         [part = part_, name = std::string(name)](AtspiBus& bus) { return stringOf(bus, part, name); });
 }
@@ -126,6 +130,7 @@ std::optional<Rectangle> AtspiElement::rectangleForRange(std::string_view name, 
 }
 
 bool AtspiElement::selectsNothing() const {
+    if (selectsNothing_) return *selectsNothing_;
     return session_
         ->ask<bool>([part = part_](AtspiBus& bus) { return AtspiTextReader(bus, part, {}).selectsNothing(); })
         .value_or(false);

@@ -46,7 +46,7 @@ class AtspiApplicationElement final : public SilentElement {
 
 class AtspiElement final : public SilentElement {
   public:
-    AtspiElement(std::shared_ptr<AtspiSession> session, AtspiPart part);
+    AtspiElement(std::shared_ptr<AtspiSession> session, AtspiFocused focused);
 
     Element elementAttribute(std::string_view name) const override;
     std::vector<Element> elementsAttribute(std::string_view name) const override;
@@ -64,6 +64,8 @@ class AtspiElement final : public SilentElement {
 
     std::shared_ptr<AtspiSession> session_;
     AtspiPart part_;
+    bool isText_;
+    std::optional<bool> selectsNothing_;      // as told along with the focus; elements do not last
     mutable AtspiTextReader::Anchor anchor_;  // the selection when it was asked for last
 };
 

@@ -5,6 +5,8 @@
 #include <string_view>
 #include <utility>
 
+#include "ports/atspi/AtspiText.h"
+
 namespace plume {
 
 namespace {
@@ -101,9 +103,15 @@ void AtspiFocusTracker::lookAfterTyping() {
     afterTyping_ = loop_.performAfterDelay(TimeAfterTyping, [this] { look(); });
 }
 
-AtspiPart AtspiFocusTracker::focusedNow() {
-    if (Clock::now() - lookedAt_ > Fresh) look();
-    return focus_.part();
+// Who asks mostly wants to know of a selection next: both questions take the way to the program together.
+AtspiFocused AtspiFocusTracker::focusedNow() {
+    const AtspiPart known = focus_.part();
+    if (Clock::now() - lookedAt_ <= Fresh) return focus_.tell(known, std::nullopt);
+    AtspiPendingCall selections = AtspiTextReader::askForSelections(bus_, known);
+    look();
+    const bool isStill = known && focus_.part() == known;
+    return focus_.tell(known,
+                       isStill ? AtspiTextReader::selectsNothing(bus_, known, std::move(selections)) : std::nullopt);
 }
 
 void AtspiFocusTracker::lookSeveralTimes() {

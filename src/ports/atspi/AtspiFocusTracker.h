@@ -10,6 +10,7 @@
 #include <cstdint>
 #include <functional>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <utility>
 
@@ -18,6 +19,13 @@
 #include "ports/posix/OwedAnswer.h"
 
 namespace plume {
+
+// What has the focus, as its program told when it was asked.
+struct AtspiFocused {
+    AtspiPart part;
+    bool isText = false;                 // no password
+    std::optional<bool> selectsNothing;  // when that was asked, too
+};
 
 // What is known of the focus.
 class AtspiFocus {
@@ -37,6 +45,12 @@ class AtspiFocus {
     AtspiPart part() const {
         const std::scoped_lock lock(mutex_);
         return part_;
+    }
+    // Nothing if it was told longer ago than a delivery asks several things at once.
+    std::optional<AtspiFocused> justTold() const {
+        const std::scoped_lock lock(mutex_);
+        const bool isRecent = told_.part && Clock::now() - toldAt_ < JustTold;
+        return isRecent ? std::optional(told_) : std::nullopt;
     }
     bool isKnown() const { return isKnown_; }
     bool isPassword() const { return kind_ == Kind::Password; }
@@ -67,18 +81,32 @@ class AtspiFocus {
         const std::scoped_lock lock(mutex_);
         if (front.turn == front_.turn) change({}, Kind::Unknown, 0);
     }
+    // Somebody asks what has the focus; `selectsNothing` is what `asked` has told.
+    AtspiFocused tell(const AtspiPart& asked, std::optional<bool> selectsNothing) {
+        const std::scoped_lock lock(mutex_);
+        const bool isText = kind_ == Kind::Line || kind_ == Kind::Lines;
+        told_ = {part_, isText, part_ == asked ? selectsNothing : std::nullopt};
+        toldAt_ = Clock::now();
+        return told_;
+    }
 
   private:
+    using Clock = std::chrono::steady_clock;
+    static constexpr std::chrono::milliseconds JustTold{10};
+
     void change(AtspiPart part, Kind kind, pid_t process) {
         isKnown_ = static_cast<bool>(part);
         kind_ = kind;
         process_ = process;
+        if (part != part_) told_ = {};
         part_ = std::move(part);
     }
 
     mutable std::mutex mutex_;  // held to copy two strings, never longer
     Front front_;
     AtspiPart part_;
+    AtspiFocused told_;
+    Clock::time_point toldAt_{};
     AtspiPart lastLine_;  // what had the focus last, if it is a field of one line
     std::atomic<bool> isKnown_ = false;
     std::atomic<Kind> kind_ = Kind::Unknown;
@@ -111,7 +139,7 @@ class AtspiFocusTracker {
 
     // ---- On the accessibility thread ----
     // What has the focus now, or a moment ago.
-    AtspiPart focusedNow();
+    AtspiFocused focusedNow();
 
   private:
     using Clock = std::chrono::steady_clock;

@@ -74,8 +74,9 @@ void AtspiQueue::expectNoAnswers() {
 
 AtspiSession::AtspiSession() : tracker_(queue_.loop(), bus_, [this] { return connectedAddress(); }) {}
 
-std::optional<AtspiPart> AtspiSession::askForFocus() {
-    return queue_.ask<AtspiPart>([this] { return std::optional(tracker_.focusedNow()); });
+std::optional<AtspiFocused> AtspiSession::askForFocus() {
+    if (auto told = focus().justTold()) return told;
+    return queue_.ask<AtspiFocused>([this] { return std::optional(tracker_.focusedNow()); });
 }
 
 void AtspiSession::switchOn() {

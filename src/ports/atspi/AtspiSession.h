@@ -97,7 +97,7 @@ class AtspiSession {
         });
     }
     // What has the focus at this moment.
-    std::optional<AtspiPart> askForFocus();
+    std::optional<AtspiFocused> askForFocus();
 
     // From any thread.
     void switchOn();

@@ -40,6 +40,11 @@ std::optional<Rectangle> rectangleIn(BusReader reader) {
                      {static_cast<double>(width), static_cast<double>(height)}};
 }
 
+std::optional<bool> isNone(const BusAnswer& count) {
+    const auto number = count.values().int32();
+    return number ? std::optional(*number == 0) : std::nullopt;
+}
+
 std::int64_t charactersIn(std::u16string_view text) {
     return u_countChar32(text.data(), static_cast<std::int32_t>(text.size()));
 }
@@ -71,8 +76,16 @@ std::optional<std::u16string> AtspiTextReader::fetch(std::int64_t from, std::int
 }
 
 std::optional<bool> AtspiTextReader::selectsNothing() const {
-    const auto selections = ask("GetNSelections").values().int32();
-    return selections ? std::optional(*selections == 0) : std::nullopt;
+    return isNone(ask("GetNSelections"));
+}
+
+AtspiPendingCall AtspiTextReader::askForSelections(AtspiBus& bus, const AtspiPart& part) {
+    return bus.callAhead(part, TextInterface, "GetNSelections");
+}
+
+std::optional<bool> AtspiTextReader::selectsNothing(const AtspiBus& bus, const AtspiPart& part,
+                                                    AtspiPendingCall asked) {
+    return isNone(bus.answerTo(part, std::move(asked)));
 }
 
 std::optional<TextRange> AtspiTextReader::selectedRange() {

@@ -26,6 +26,9 @@ class AtspiTextReader {
 
     // Whether it says so itself.
     std::optional<bool> selectsNothing() const;
+    // The same in two steps, so that something else can be asked meanwhile.
+    static AtspiPendingCall askForSelections(AtspiBus& bus, const AtspiPart& part);
+    static std::optional<bool> selectsNothing(const AtspiBus& bus, const AtspiPart& part, AtspiPendingCall asked);
     // What was selected, or the caret as an empty stretch; the anchor then is its start. What lies more than 65,536
     // characters before the selection is counted as one unit a character.
     std::optional<TextRange> selectedRange();
