@@ -16,9 +16,9 @@ constexpr double LongestSettling = 0.3;
 X11PasteTarget::X11PasteTarget(X11Session& session)
     : session_(session), ping_(session, [this](bool isLatest) { noteAnswer(isLatest); }) {}
 
-void X11PasteTarget::begin() {
+void X11PasteTarget::begin(const X11FrontWindows& front) {
     end();
-    windows_ = windowsInFront(session_);
+    windows_ = front;
     asking_ = session_.runLoop().performAfterDelay(PingDelay, [this] { ask(); });
 }
 

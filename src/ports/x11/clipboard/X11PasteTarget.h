@@ -24,8 +24,8 @@ class X11PasteTarget {
     X11PasteTarget(const X11PasteTarget&) = delete;
     X11PasteTarget& operator=(const X11PasteTarget&) = delete;
 
-    // The keystroke was sent: the program in front is the target from now on.
-    void begin();
+    // The keystroke is sent: the program in front is the target from now on.
+    void begin(const X11FrontWindows& front);
     // The paste is of no interest any more.
     void end();
     // It is given something.

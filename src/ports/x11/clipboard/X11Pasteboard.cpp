@@ -62,7 +62,7 @@ X11Pasteboard::~X11Pasteboard() = default;
 
 void X11Pasteboard::connectOwners() {
     for (X11SelectionOwner* const owner : {clipboard_.get(), primary_.get()}) {
-        owner->readingCounts = [this](xcb_window_t requestor) { return isInFront(session_, requestor); };
+        owner->readingCounts = [this](xcb_window_t requestor) { return mayBePasting(requestor); };
         owner->isGiven = [this](xcb_window_t requestor) {
             if (target_.isOf(requestor)) target_.isGiven();
         };
@@ -98,11 +98,15 @@ void X11Pasteboard::offer(const std::vector<SharedClipboardCopy::Entry>& entries
     for (const auto& entry : entries) setData(entry.bytes, entry.type);
 }
 
+bool X11Pasteboard::mayBePasting(xcb_window_t requestor) const {
+    return target_.isOf(requestor) || isInFront(session_, requestor);
+}
+
 // A clipboard manager that is in the middle of what the user copied goes on with that, and one that was met before sees
 // no expansion at all. Whoever pastes is in front, or has asked what is on offer.
 std::shared_ptr<X11PasteboardContent> X11Pasteboard::contentBeforeFor(xcb_window_t requestor, xcb_atom_t target) {
     const bool isExpansion = content_ && content_->isExpansion();
-    if (!isExpansion || !sharedCopy_ || isInFront(session_, requestor)) return {};
+    if (!isExpansion || !sharedCopy_ || mayBePasting(requestor)) return {};
     const xcb_window_t client = clientOf(session_, requestor);
     if (managers_.size() >= MostManagers) managers_.clear();
     if (X11PasteboardContent::isHint(session_.connection().atomName(target))) {
@@ -207,8 +211,8 @@ void X11Pasteboard::keepForTarget() {
 }
 
 void X11Pasteboard::paste(std::function<void()> sendKeystroke) {
-    questions_.whenAnswered([this, sendKeystroke = std::move(sendKeystroke)] {
-        target_.begin();
+    questions_.whenAnswered([this, sendKeystroke = std::move(sendKeystroke)](const X11FrontWindows& front) {
+        target_.begin(front);
         sendKeystroke();
     });
 }
@@ -224,7 +228,7 @@ void X11Pasteboard::setData(std::string_view bytes, std::string_view type) {
 void X11Pasteboard::offerPrimary() {
     if (content_->isExpansion() && pastesPrimary_) {
         if (!primary_->isOwner()) selectedBefore_ = selectedText();
-        primary_->own(content_);
+        primary_->own(content_, clipboard_->ownedSince());
     } else if (primary_->isOwner() && primary_->content() != selectedBefore_) {
         if (selectedBefore_) {
             primary_->own(selectedBefore_);

@@ -69,6 +69,7 @@ class X11Pasteboard final : public Pasteboard {
     void offerPrimary();
     std::shared_ptr<X11PasteboardContent> selectedText();
     void connectOwners();
+    bool mayBePasting(xcb_window_t requestor) const;
     void hintForAMoment();
     void keepForTarget();
     std::shared_ptr<X11PasteboardContent> contentBeforeFor(xcb_window_t requestor, xcb_atom_t target);

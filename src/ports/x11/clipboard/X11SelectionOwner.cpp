@@ -53,10 +53,10 @@ xcb_window_t X11SelectionOwner::askOwner() const {
     return reply ? reply->owner : xcb_window_t{XCB_WINDOW_NONE};
 }
 
-bool X11SelectionOwner::own(std::shared_ptr<X11SelectionContent> content) {
+bool X11SelectionOwner::own(std::shared_ptr<X11SelectionContent> content, xcb_timestamp_t now) {
     content_ = std::move(content);
     for (int attempt = 0; attempt < Attempts; ++attempt) {
-        ownedSince_ = session_.serverTime();
+        ownedSince_ = now != 0 ? std::exchange(now, 0) : session_.serverTime();
         if (ownedSince_ == 0) return false;
         xcb_set_selection_owner(session_.get(), session_.window(), selection_, ownedSince_);
         const bool isOurs = askOwner() == session_.window();

@@ -50,8 +50,9 @@ class X11SelectionOwner {
     // This window has asked what is on offer, and the answer was sent. May be empty.
     std::function<void(xcb_window_t)> toldTargets;
 
-    // Takes the selection and offers this content; false when the server did not give it to us.
-    bool own(std::shared_ptr<X11SelectionContent> content);
+    // Takes the selection and offers this content; false when the server did not give it to us. `now` is the server's
+    // time, for those who have asked for it.
+    bool own(std::shared_ptr<X11SelectionContent> content, xcb_timestamp_t now = 0);
     // Leaves the selection without an owner.
     void release();
     // As far as it is known: collect() first.

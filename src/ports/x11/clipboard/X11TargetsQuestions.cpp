@@ -35,12 +35,12 @@ void X11TargetsQuestions::wasAnswered(xcb_window_t requestor) {
     if (paste_ && client == awaited_) waiting_ = session_.runLoop().performAfterDelay(0, [this] { proceed(); });
 }
 
-void X11TargetsQuestions::whenAnswered(std::function<void()> paste) {
+void X11TargetsQuestions::whenAnswered(Paste paste) {
     paste_ = std::move(paste);
     const X11FrontWindows front = windowsInFront(session_);
     awaited_ = clientOf(session_, front.focus);
     const double longest = answered_.contains(awaited_) ? 0 : longestWait(front.active);
-    if (longest == 0) return proceed();
+    if (longest == 0) return proceed(front);
     waiting_ = session_.runLoop().performAfterDelay(longest, [this] { giveUp(); });
 }
 
@@ -59,11 +59,16 @@ void X11TargetsQuestions::giveUp() {
 }
 
 void X11TargetsQuestions::proceed() {
+    proceed(windowsInFront(session_));
+}
+
+// The server has answered who is in front, so it has got everything that the keystroke, which goes another way, must
+// not overtake.
+void X11TargetsQuestions::proceed(const X11FrontWindows& front) {
     waiting_.cancel();
     ping_.end();
     hasPasted_ = true;
-    session_.connection().sync();
-    if (const auto paste = std::exchange(paste_, nullptr)) paste();
+    if (const auto paste = std::exchange(paste_, nullptr)) paste(front);
 }
 
 }  // namespace plume

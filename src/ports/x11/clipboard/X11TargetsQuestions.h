@@ -32,14 +32,16 @@ class X11TargetsQuestions {
     void wasAnswered(xcb_window_t requestor);
     // Whether its program asked since the owner changed.
     bool isAnswered(xcb_window_t requestor) const { return answered_.contains(clientOf(session_, requestor)); }
-    // Calls `paste` when the program in front knows what it wants to know: now, or from the run loop, at most 0.2 s
-    // later, or one second if it had the clipboard. A call that still waits is dropped.
-    void whenAnswered(std::function<void()> paste);
+    // Calls with what is in front, when that program knows what it wants to know: now, or from the run loop, at most
+    // 0.2 s later, or one second if it had the clipboard. A call that still waits is dropped.
+    using Paste = std::function<void(const X11FrontWindows& front)>;
+    void whenAnswered(Paste paste);
 
   private:
     double longestWait(xcb_window_t active);
     void giveUp();
     void proceed();
+    void proceed(const X11FrontWindows& front);
 
     X11Session& session_;
     xcb_window_t owner_ = XCB_WINDOW_NONE;   // client, as the next two
@@ -49,7 +51,7 @@ class X11TargetsQuestions {
     double changed_ = 0;                     // when the owner changed
     bool hasPasted_ = false;                 // since then: questions are part of the paste from then on
     xcb_window_t awaited_ = XCB_WINDOW_NONE;
-    std::function<void()> paste_;
+    Paste paste_;
     X11Ping ping_;  // of a former owner
     Timer waiting_;
 };
