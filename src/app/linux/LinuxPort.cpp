@@ -100,6 +100,7 @@ void LinuxPort::connectParts() {
 // Programs are asked for their focus when it may have moved.
 void LinuxPort::followFocus() {
     keyboardTap_->setUserTyped([this](KeyCode keyCode, EventFlags flags) {
+        secureInput_->somethingHappens();
         if (const auto mover = moverOf(keyCode, flags)) {
             userMovesFocus(*mover);
         } else if (maySetOff(keyCode, flags)) {
@@ -111,6 +112,7 @@ void LinuxPort::followFocus() {
     });
     // Where clicks cannot be heard, the tap says so when it is created.
     static_cast<void>(mouseTap_->setClicked([this] {
+        secureInput_->somethingHappens();
         keyboardTap_->userClicked();
         userMovesFocus(FocusMover::Click);
     }));
@@ -131,6 +133,7 @@ void LinuxPort::followScreen() {
 }
 
 void LinuxPort::tellFrontProcess() {
+    secureInput_->somethingHappens();
     const auto application = foregroundApplication(*processManager_);
     const pid_t process = application ? static_cast<pid_t>(application->processIdentifier) : 0;
     accessibility_.setFrontProcess(process);

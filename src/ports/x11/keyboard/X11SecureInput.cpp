@@ -6,6 +6,11 @@
 
 namespace plume {
 
+namespace {
+// A program that starts, or asks for a password after some work, takes its time.
+constexpr std::chrono::seconds LongestToGrab{10};
+}  // namespace
+
 Result<std::unique_ptr<X11SecureInput>> X11SecureInput::open(const std::string& display,
                                                              std::function<bool()> focusIsPassword) {
     auto connection = XcbConnection::open(display);
@@ -27,11 +32,13 @@ bool X11SecureInput::isSecureEventInputEnabled() const {
 }
 
 bool X11SecureInput::isKeyboardHeld() const {
+    if (!isHeld_ && Clock::now() - happenedAt_.load() > LongestToGrab) return false;
     xcb_connection_t* const server = connection_->get();
     const auto cookie =
         xcb_grab_keyboard(server, 0, neverShown_, XCB_CURRENT_TIME, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC);
     const XcbOwned<xcb_grab_keyboard_reply_t> reply(xcb_grab_keyboard_reply(server, cookie, nullptr));
-    return reply && tellsOfGrab(*reply);
+    isHeld_ = reply && tellsOfGrab(*reply);
+    return isHeld_;
 }
 
 }  // namespace plume

@@ -1,8 +1,11 @@
 // Whether another program has grabbed the keyboard, or the focused field takes a password.
 //
-// Belongs to the main thread and has a connection of its own.
+// Belongs to the main thread and has a connection of its own. The server tells nobody of a grab, so it is asked; but
+// while nobody does anything no program grabs the keyboard either, and a computer at rest stays asleep.
 #pragma once
 
+#include <atomic>
+#include <chrono>
 #include <functional>
 #include <memory>
 #include <string>
@@ -20,13 +23,21 @@ class X11SecureInput final : public SecureInput {
 
     bool isSecureEventInputEnabled() const override;
 
+    // Somebody types or clicks, or another window is in front: the server is asked for ten seconds from now on. From
+    // any thread, never waits.
+    void somethingHappens() { happenedAt_ = Clock::now(); }
+
   private:
+    using Clock = std::chrono::steady_clock;
+
     X11SecureInput(std::unique_ptr<XcbConnection> connection, std::function<bool()> focusIsPassword);
     bool isKeyboardHeld() const;
 
     const std::unique_ptr<XcbConnection> connection_;
     const std::function<bool()> focusIsPassword_;
     const xcb_window_t neverShown_;
+    std::atomic<Clock::time_point> happenedAt_ = Clock::now();
+    mutable bool isHeld_ = false;  // when the server was asked last
 };
 
 }  // namespace plume
