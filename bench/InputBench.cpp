@@ -83,7 +83,7 @@ void measureAdded(DesktopRig& rig, TargetProgram& target) {
     print("floor.input.added.median", median(passed) - median(without), "us");
     print("floor.input.added.p99", percentile99(passed) - percentile99(without), "us");
     print("input.added.median", median(with) - median(without), "us");
-    print("input.added.ratio", median(with) / median(without), "times");
+    print("input.added.ratio", (median(with) - median(without)) / (median(passed) - median(without)), "times");
     print("input.added.p99", percentile99(with) - percentile99(without), "us");
 }
 

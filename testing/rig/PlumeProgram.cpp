@@ -64,9 +64,9 @@ PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const st
 
 namespace {
 
-// Follows the changes until they have made the expected text.
-Expansion follow(TargetProgram& target, const std::string& expected, std::chrono::steady_clock::time_point start) {
-    std::u32string text;
+// Follows the changes of a text until they have made the expected one.
+Expansion follow(TargetProgram& target, std::u32string text, const std::string& expected,
+                 std::chrono::steady_clock::time_point start) {
     const std::u32string awaited = charactersOf(expected);
     Expansion result;
     const Deadline deadline(Milliseconds(10'000));
@@ -90,15 +90,15 @@ Expansion awaitExpansion(TargetProgram& target, const std::string& expected, con
     target.clear();
     const auto start = std::chrono::steady_clock::now();
     make();
-    return follow(target, expected, start);
+    return follow(target, {}, expected, start);
 }
 
 Expansion typeAndAwait(DesktopRig& rig, TargetProgram& target, const std::string& typed, const std::string& expected) {
-    target.clear();
-    rig.keyboard().type(typed.substr(0, typed.size() - 1));
+    const std::string first = typed.substr(0, typed.size() - 1);
+    awaitExpansion(target, first, [&] { rig.keyboard().type(first); });
     const auto pressed = std::chrono::steady_clock::now();
     rig.keyboard().type(typed.substr(typed.size() - 1));
-    return follow(target, expected, pressed);
+    return follow(target, charactersOf(first), expected, pressed);
 }
 
 }  // namespace plume::rig

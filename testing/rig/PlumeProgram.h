@@ -38,7 +38,8 @@ struct Expansion {
 // the call.
 Expansion awaitExpansion(TargetProgram& target, const std::string& expected, const std::function<void()>& make);
 
-// Types into the target that has the focus; the last character sets something off.
+// Types into the target that has the focus. The last character sets something off; it is typed, and the time counts,
+// when those before it are there, as nobody types faster than programs show it.
 Expansion typeAndAwait(DesktopRig& rig, TargetProgram& target, const std::string& typed, const std::string& expected);
 
 }  // namespace plume::rig
