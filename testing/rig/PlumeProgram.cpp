@@ -45,7 +45,11 @@ PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const st
     const auto program = std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume";
     std::vector<std::string> arguments{"/usr/bin/env"};
     if (accessibility == Accessibility::Missing) {
-        arguments.insert(arguments.end(), {"-u", "DBUS_SESSION_BUS_ADDRESS", "AT_SPI_BUS_ADDRESS=unix:path=/nowhere"});
+        // The session's bus is also found in the folder of the session.
+        const auto folder = rig.directory() / "run without a bus";
+        std::filesystem::create_directory(folder);
+        std::filesystem::permissions(folder, std::filesystem::perms::owner_all);
+        arguments.insert(arguments.end(), {"-u", "DBUS_SESSION_BUS_ADDRESS", "XDG_RUNTIME_DIR=" + folder.string()});
     }
     arguments.insert(arguments.end(), {program, "run"});
     arguments.insert(arguments.end(), {"--settings", writeFile(rig.directory() / "settings.json", settings)});
