@@ -6,7 +6,6 @@
 #include <utility>
 
 #include "testing/rig/Deadline.h"
-#include "testing/rig/RigError.h"
 
 namespace plume::rig {
 
@@ -15,12 +14,6 @@ namespace {
 constexpr const char* Name = "org.freedesktop.IBus";
 constexpr const char* Path = "/org/freedesktop/IBus";
 constexpr BusAddress Context{Name, "/org/freedesktop/IBus/InputContext_2", "org.freedesktop.IBus.InputContext"};
-
-void own(const BusConnection& connection) {
-    const bool owned = connection && dbus_bus_request_name(connection.get(), Name, 0, nullptr) ==
-                                         DBUS_REQUEST_NAME_REPLY_PRIMARY_OWNER;
-    if (!owned) throw RigError("a bus takes no input method");
-}
 
 void appendText(DBusMessageIter& iterator, const std::string& text) {
     const char* const value = text.c_str();
@@ -48,18 +41,10 @@ FakeIbus::FakeIbus(DesktopRig& rig, std::string engine) : engine_(std::move(engi
     const std::string address = "unix:path=" + (rig.directory() / "ibus").string();
     bus_ = rig.session().start(
         {"dbus-daemon", "--session", "--nofork", "--nopidfile", "--nosyslog", "--address=" + address}, "dbus-daemon");
-    waitUntil([&] { return (service_ = openBus(address)) != nullptr || !bus_->isRunning(); });
-    own(service_);
-    program_ = openBus(address);
+    waitUntil([&] { return (program_ = openBus(address)) != nullptr || !bus_->isRunning(); });
+    service_.emplace(address, Name, [this](DBusMessage* call) { return answer(call); });
     sayWhere(rig.server().display(), address);
-    session_ = openBus(sessionBusAddress());
-    own(session_);
-    thread_ = std::thread([this] { serve(); });
-}
-
-FakeIbus::~FakeIbus() {
-    ended_ = true;
-    thread_.join();
+    session_.emplace(sessionBusAddress(), Name, [](DBusMessage* /*call*/) { return BusMessage(); });
 }
 
 void FakeIbus::sayWhere(const std::string& display, const std::string& address) {
@@ -77,7 +62,7 @@ void FakeIbus::setEngine(const std::string& name) {
     appendText(iterator, name);
     const std::scoped_lock lock(mutex_);
     engine_ = name;
-    dbus_connection_send(service_.get(), signal.get(), nullptr);
+    service_->send(signal);
 }
 
 void FakeIbus::takeKey(std::uint32_t code, const std::string& text, bool passes, Milliseconds delay) {
@@ -92,22 +77,13 @@ void FakeIbus::takeKey(std::uint32_t code, const std::string& text, bool passes,
 
 void FakeIbus::putElsewhere(const std::string& text) {
     const std::scoped_lock lock(mutex_);
-    dbus_connection_send(service_.get(), commit("/org/freedesktop/IBus/InputContext_1", text).get(), nullptr);
+    service_->send(commit("/org/freedesktop/IBus/InputContext_1", text));
 }
 
-void FakeIbus::serve() {
-    constexpr int TurnMilliseconds = 5;
-    while (!ended_ && dbus_connection_read_write(service_.get(), TurnMilliseconds) != 0) {
-        while (const BusMessage message{dbus_connection_pop_message(service_.get())}) {
-            if (dbus_message_get_type(message.get()) == DBUS_MESSAGE_TYPE_METHOD_CALL) answer(message.get());
-        }
-    }
-}
-
-void FakeIbus::answer(DBusMessage* call) {
+BusMessage FakeIbus::answer(DBusMessage* call) {
     const std::scoped_lock lock(mutex_);
     const bool isKey = dbus_message_has_member(call, "ProcessKeyEvent") != 0;
-    dbus_connection_send(service_.get(), (isKey ? outcomeOf(call) : engineIn(call)).get(), nullptr);
+    return isKey ? outcomeOf(call) : engineIn(call);
 }
 
 BusMessage FakeIbus::engineIn(DBusMessage* call) {
@@ -135,7 +111,7 @@ BusMessage FakeIbus::outcomeOf(DBusMessage* call) {
     const Outcome outcome = outcomes_.front();
     outcomes_.pop_front();
     waitUntil([] { return false; }, outcome.delay);
-    if (!outcome.text.empty()) dbus_connection_send(service_.get(), commit(Context.path, outcome.text).get(), nullptr);
+    if (!outcome.text.empty()) service_->send(commit(Context.path, outcome.text));
     BusMessage reply(dbus_message_new_method_return(call));
     const dbus_bool_t isTaken = outcome.passes ? FALSE : TRUE;
     dbus_message_append_args(reply.get(), DBUS_TYPE_BOOLEAN, &isTaken, DBUS_TYPE_INVALID);

@@ -1,14 +1,13 @@
 #pragma once
 
-#include <atomic>
 #include <cstdint>
 #include <deque>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
-#include <thread>
 
-#include "ports/dbus/BusMessages.h"
+#include "testing/rig/BusService.h"
 #include "testing/rig/Deadline.h"
 #include "testing/rig/DesktopRig.h"
 
@@ -20,9 +19,6 @@ class FakeIbus {
   public:
     // On this desktop, whose session this process has joined; throws RigError.
     FakeIbus(DesktopRig& rig, std::string engine);
-    ~FakeIbus();
-    FakeIbus(const FakeIbus&) = delete;
-    FakeIbus& operator=(const FakeIbus&) = delete;
 
     void setEngine(const std::string& name);
     // The program gives it a key of this code, and gets that text before the key is taken or passed, after the delay.
@@ -38,21 +34,18 @@ class FakeIbus {
     };
 
     static void sayWhere(const std::string& display, const std::string& address);
-    void serve();
-    void answer(DBusMessage* call);
+    BusMessage answer(DBusMessage* call);
     BusMessage engineIn(DBusMessage* call);
     BusMessage outcomeOf(DBusMessage* call);
     BusMessage commit(const char* context, const std::string& text);
 
     std::unique_ptr<ChildProcess> bus_;
-    BusConnection service_;
     BusConnection program_;
-    BusConnection session_;
     std::mutex mutex_;
     std::string engine_;            // guarded by mutex_
     std::deque<Outcome> outcomes_;  // of the keys that come next; guarded by mutex_
-    std::atomic<bool> ended_ = false;
-    std::thread thread_;
+    std::optional<BusService> service_;
+    std::optional<BusService> session_;
 };
 
 }  // namespace plume::rig
