@@ -21,7 +21,9 @@ constexpr std::array PausesAfterNothing = {milliseconds(500), milliseconds(1'000
                                            milliseconds(5'000)};
 // Programs move their focus some time after the click or the key that makes them do it. From one look to the next.
 constexpr std::array TimesBetweenLooks = {0.015, 0.045, 0.190, 0.750};
-constexpr milliseconds Fresh{50};
+// While somebody only types; there is a look every so often then.
+constexpr milliseconds Fresh{300};
+constexpr milliseconds FreshWhileMoving{50};
 constexpr milliseconds LookBound{1'000};
 constexpr milliseconds LongestWait{50};
 // An answer to a question that was asked so long after a key is none of before it.
@@ -106,9 +108,8 @@ void AtspiFocusTracker::lookAfterTyping() {
 // Who asks mostly wants to know of a selection next: both questions take the way to the program together.
 AtspiFocused AtspiFocusTracker::focusedNow() {
     const AtspiPart known = focus_.part();
-    if (Clock::now() - lookedAt_ <= Fresh) return focus_.tell(known, std::nullopt);
     AtspiPendingCall selections = AtspiTextReader::askForSelections(bus_, known);
-    look();
+    if (Clock::now() - lookedAt_ > (isMoveExpected() ? FreshWhileMoving : Fresh)) look();
     const bool isStill = known && focus_.part() == known;
     return focus_.tell(known,
                        isStill ? AtspiTextReader::selectsNothing(bus_, known, std::move(selections)) : std::nullopt);

@@ -89,6 +89,7 @@ Result<void> TapConnection::reopen() {
     connection_ = std::move(connection).value();
     keysDown_.reset();
     userKeys.reset();
+    hearsPresses_ = false;
     ownPresses_.reset();
     progress_.begin();
     if (auto begun = begin(); !begun) return begun;
@@ -102,8 +103,13 @@ Result<void> TapConnection::reopen() {
 void TapConnection::sendKey(xcb_keycode_t keycode, bool down) {
     const auto cookie = xcb_test_fake_input(connection_->get(), down ? XCB_KEY_PRESS : XCB_KEY_RELEASE, keycode,
                                             XCB_CURRENT_TIME, XCB_NONE, 0, 0, 0);
-    ownPresses_[cookie.sequence % ownPresses_.size()] = down;
+    ownPresses_[cookie.sequence % ownPresses_.size()] = down && hearsPresses_;
     keysDown_[keycode] = down;
+}
+
+void TapConnection::setHearsPresses(bool hears) {
+    hearsPresses_ = hears;
+    selectDeviceEvents(*connection_, testKeyboard_, hears ? XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS : 0);
 }
 
 bool TapConnection::isOwnPress(unsigned sequence) {

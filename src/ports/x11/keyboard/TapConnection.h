@@ -50,9 +50,27 @@ class TapConnection {
     // Presses or releases a key on the XTEST keyboard. Sent with the next flush(), or when xcb's buffer is full.
     void sendKey(xcb_keycode_t keycode, bool down);
     void flush() const { connection_->flush(); }
+    // Whether the server tells of presses on the XTEST keyboard, by raw events.
+    void setHearsPresses(bool hears);
     // Whether sendKey() caused this press on the XTEST keyboard, which was told when our request with this number was
     // the latest; to be asked of each press once.
     bool isOwnPress(unsigned sequence);
+    // For as long as it lives, of presses nothing is told: those of a long text would keep the server, and us, busy.
+    class Unheard {
+      public:
+        explicit Unheard(TapConnection& connection) : connection_(connection), heard_(connection.hearsPresses_) {
+            if (heard_) connection_.setHearsPresses(false);
+        }
+        ~Unheard() {
+            if (heard_) connection_.setHearsPresses(true);
+        }
+        Unheard(const Unheard&) = delete;
+        Unheard& operator=(const Unheard&) = delete;
+
+      private:
+        TapConnection& connection_;
+        const bool heard_;
+    };
     // What is down on the XTEST keyboard once everything sent has been dealt with, and the real modifiers that it
     // holds.
     const KeycodeSet& keysDown() const { return keysDown_; }
@@ -82,7 +100,8 @@ class TapConnection {
     std::uint16_t masterKeyboard_ = 0;
     std::uint16_t testKeyboard_ = 0;
     KeycodeSet keysDown_;
-    std::bitset<65536> ownPresses_;  // the numbers, as far as they matter, of the requests that press a key
+    bool hearsPresses_ = false;
+    std::bitset<65536> ownPresses_;  // the numbers, as far as they matter, of the requests that press a key, if heard
     TapProgress progress_;
     std::function<void(xcb_window_t)> reopened_;
 };

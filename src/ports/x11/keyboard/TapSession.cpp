@@ -49,7 +49,7 @@ Result<void> TapSession::begin() {
     connection.userKeys = keyboards_.keysDown();
     decoder_.setKeymap(keymaps_.current(), connection.userKeys, dependencies_.keyboard.locks());
     selectEvents(XCB_INPUT_DEVICE_ALL, XCB_INPUT_XI_EVENT_MASK_HIERARCHY);
-    selectEvents(connection.testKeyboard(), XCB_INPUT_XI_EVENT_MASK_RAW_KEY_PRESS);
+    connection.setHearsPresses(true);
     becomeTypedOn();
     grabCheck_->ask(dependencies_.loop.now());
     connection.connection().sync();
@@ -105,7 +105,7 @@ void TapSession::end() {
     nextDrain_.cancel();
     TapConnection& connection = dependencies_.connection;
     keyboards_.ungrab();
-    selectEvents(connection.testKeyboard(), 0);
+    connection.setHearsPresses(false);
     grabCheck_.reset();
     connection.connection().sync();
     passOnUnheard();

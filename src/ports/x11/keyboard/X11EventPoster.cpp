@@ -152,6 +152,7 @@ void X11EventPoster::send(std::span<Item> items) {
     }
     const double start = loop_.now();
     {
+        const TapConnection::Unheard unheard(connection_);
         const NeutralKeyboard neutral(connection_, *keymap_);
         group_ = neutral.group();
         while (!items.empty()) {
