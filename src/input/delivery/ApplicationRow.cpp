@@ -136,9 +136,10 @@ std::uint64_t length(const JsonNode& node) {
 
 ContextInputSetting readApplicationRow(const JsonNode& node, const ContextInputSetting& otherwise,
                                        const ApplicationFamilies& families) {
-    const JsonObject row = node.object({"about", "family", "flags", "pasteKeys", "copyKeys", "pastesPrimary",
-                                        "pastingDelay", "afterPastingDelay", "afterErasingDelay", "overtypesCompletion",
-                                        "typesBeyondBmp", "erasesAtOnce", "longestTyped", "blockLength"});
+    const JsonObject row =
+        node.object({"about", "family", "flags", "pasteKeys", "copyKeys", "pastesPrimary", "pastingDelay",
+                     "afterPastingDelay", "afterErasingDelay", "overtypesCompletion", "losesRepeatedKeys",
+                     "typesBeyondBmp", "erasesAtOnce", "longestTyped", "blockLength"});
     ContextInputSetting setting = otherwise;
     const auto set = [&](std::string_view key, auto& field, auto read) {
         row.whenSet(key, [&](const JsonNode& value) { field = read(value); });
@@ -155,6 +156,7 @@ ContextInputSetting readApplicationRow(const JsonNode& node, const ContextInputS
     set("afterPastingDelay", setting.afterPastingDelay, delay);
     set("afterErasingDelay", setting.afterErasingDelay, delay);
     set("overtypesCompletion", setting.overtypesCompletion, isSo);
+    set("losesRepeatedKeys", setting.losesRepeatedKeys, isSo);
     set("typesBeyondBmp", setting.typesBeyondBmp, isSo);
     set("erasesAtOnce", setting.erasesAtOnce, [](const JsonNode& value) { return oneOf(ErasedNames, value); });
     set("longestTyped", setting.longestTyped, length);

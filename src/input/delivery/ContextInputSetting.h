@@ -76,6 +76,8 @@ struct ContextInputSetting {
     double afterErasingDelay = 0;
     // The program proposes the rest of a word as selected text, which the first Backspace would remove alone.
     bool overtypesCompletion = false;
+    // The program takes a key that is pressed twice at once for pressed once, unless another one is pressed in between.
+    bool losesRepeatedKeys = false;
     bool typesBeyondBmp = true;  // characters beyond U+FFFF can be typed
     ErasedAtOnce erasesAtOnce = ErasedAtOnce::Character;
     std::uint64_t longestTyped = 0;  // units; longer texts are pasted; 0 means no limit

@@ -1,5 +1,9 @@
 #include "input/delivery/KeySender.h"
 
+#include <unicode/utf16.h>
+
+#include <utility>
+
 #include "Foundation/KeyCode.h"
 #include "Foundation/KeyModifiers.h"
 #include "input/AXUtils.h"
@@ -11,6 +15,8 @@ namespace {
 
 // Carries typed text; which key it is does not matter.
 constexpr KeyCode TextKey = KeyCode::A;
+// Does nothing by itself.
+constexpr KeyCode Separator = KeyCode::Control;
 // A letter that no word is likely to go on with.
 constexpr std::u16string_view Overtyping = u"x";
 
@@ -35,13 +41,32 @@ void KeySender::post(KeyCode keyCode, EventFlags flags, bool down, std::u16strin
 }
 
 void KeySender::press(KeyCode keyCode, EventFlags flags) {
-    post(keyCode, flags, true);
-    post(keyCode, flags, false);
+    lastCharacter_.clear();
+    if (std::exchange(lastKey_, keyCode) == keyCode && losesRepeatedKeys()) tap(Separator, {});
+    tap(keyCode, flags);
+}
+
+void KeySender::tap(KeyCode keyCode, EventFlags flags, std::u16string_view text) {
+    post(keyCode, flags, true, text);
+    post(keyCode, flags, false, text);
 }
 
 void KeySender::type(std::u16string_view text) {
-    post(TextKey, {}, true, text);
-    post(TextKey, {}, false, text);
+    lastKey_ = KeyCode::None;
+    std::size_t start = 0;
+    if (losesRepeatedKeys()) {
+        for (std::size_t at = 0, next = 0; at < text.size(); at = next) {
+            U16_FWD_1(text.data(), next, text.size());
+            const auto character = text.substr(at, next - at);
+            const bool isRepeated = character == lastCharacter_;
+            lastCharacter_ = character;
+            if (!isRepeated) continue;
+            if (at > start) tap(TextKey, {}, text.substr(start, at - start));
+            tap(Separator, {});
+            start = at;
+        }
+    }
+    tap(TextKey, {}, text.substr(start));
 }
 
 void KeySender::press(const Keystrokes& keys) {

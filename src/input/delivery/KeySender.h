@@ -61,7 +61,9 @@ class KeySender {
     };
 
     void post(KeyCode keyCode, EventFlags flags, bool down, std::u16string_view text = {});
+    bool losesRepeatedKeys() const { return setting_ && setting_->losesRepeatedKeys; }
     void press(KeyCode keyCode, EventFlags flags);
+    void tap(KeyCode keyCode, EventFlags flags, std::u16string_view text = {});
     void type(std::u16string_view text);
     void press(const Keystrokes& keys);
     void sendAlternativePaste(const ContextInputSetting& setting, EventFlag modifier);
@@ -71,6 +73,9 @@ class KeySender {
     std::shared_ptr<const ContextInputSetting> setting_;
     CommandKeyCodes commandKeys_;
     bool sending_ = false;
+    // What was pressed last, or typed.
+    KeyCode lastKey_ = KeyCode::None;
+    std::u16string lastCharacter_;
 };
 
 }  // namespace plume

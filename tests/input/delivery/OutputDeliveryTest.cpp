@@ -95,6 +95,18 @@ TEST(OutputDelivery, ACompletionThatIsProposedIsOverwrittenBeforeItIsErased) {
     EXPECT_EQ(desk.poster.takeLine(), "hold vx ^x v51*3 vrich ^rich release") << "and no key pastes rich text";
 }
 
+TEST(OutputDelivery, KeysThatRepeatAreKeptApartWhereOneWouldBeLost) {
+    InputDesk desk;
+    auto setting = std::make_shared<ContextInputSetting>();
+    setting->losesRepeatedKeys = true;
+    setting->overtypesCompletion = true;
+    desk.service.setCustomApplicationSetting(u"editor", setting);
+    desk.service.sendOutput(InputDesk::output(u"Hello aA😀😀", 2));
+    EXPECT_EQ(desk.poster.takeLine(),
+              "hold vx ^x v51 ^51 v59 ^59 v51 ^51 v59 ^59 v51 ^51 "
+              "vHel ^Hel v59 ^59 vlo aA😀 ^lo aA😀 v59 ^59 v😀 ^😀 release");
+}
+
 struct PasteCase {
     const char* about;
     InputFlags flags;
