@@ -56,7 +56,7 @@ void KeySender::type(std::u16string_view text) {
     std::size_t start = 0;
     if (losesRepeatedKeys()) {
         for (std::size_t at = 0, next = 0; at < text.size(); at = next) {
-            U16_FWD_1(text.data(), next, text.size());
+            U16_FWD_1(text, next, text.size());
             const auto character = text.substr(at, next - at);
             const bool isRepeated = character == lastCharacter_;
             lastCharacter_ = character;

@@ -1,4 +1,4 @@
-// Follows the input method of the desktop (IBus or Fcitx): which engine of it turns keys into text; with IBus, also
+// Follows the input method of the desktop (IBus or Fcitx): which engine of it turns keys into text, and
 // into what.
 //
 // Heard on a thread of its own, which waits for the input method to come, and to come back. Without a session's bus, or
