@@ -7,7 +7,7 @@ import sys
 ROOT = pathlib.Path(__file__).resolve().parent.parent / "src"
 
 FOUNDATION = {"Foundation", "Foundation/archive", "Foundation/json", "Foundation/text"}
-CORE = FOUNDATION | {"platform", "library", "content", "content/scripts", "input", "engine"}
+CORE = FOUNDATION | {"platform", "library", "import", "content", "content/scripts", "input", "engine"}
 X11 = {"ports/x11", "ports/x11/clipboard", "ports/x11/keyboard", "ports/x11/watchdog", "ports/x11/windows"}
 PORT = FOUNDATION | {"platform"}
 
@@ -18,7 +18,7 @@ MAY_SEE = {
     "Foundation/text": {"Foundation"},
     "Foundation/json": {"Foundation"},
     "Foundation/archive": {"Foundation", "Foundation/text"},
-    "platform": {"Foundation", "Foundation/text"},
+    "platform": {"Foundation", "Foundation/archive", "Foundation/text"},
     "ports/posix": PORT,
     "ports/simulated": PORT,
     "ports/dbus": PORT | {"ports/posix"},
@@ -29,6 +29,7 @@ MAY_SEE = {
     "ports/x11/keyboard": PORT | {"ports/posix", "ports/x11"},
     "ports/x11/watchdog": PORT | {"ports/posix", "ports/x11", "ports/x11/clipboard", "ports/x11/keyboard"},
     "library": FOUNDATION | {"platform"},
+    "import": FOUNDATION | {"platform", "library", "content"},
     "content/scripts": {"Foundation", "platform"},
     "content": FOUNDATION | {"platform", "library", "content/scripts"},
     "input": FOUNDATION | {"platform", "library", "content"},
@@ -39,15 +40,18 @@ MAY_SEE = {
     "app/cli": CORE | X11 | {"app", "app/linux", "scenario", "ports/posix", "ports/dbus", "ports/atspi"},
 }
 # Foreign headers by folder; everything else that is included with <…> is the standard library's or the system's.
-FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib|nlohmann/|canberra)")
+FOREIGN = re.compile(r"^(unicode/|Q[A-Z]|xcb/|X11/|xkbcommon/|atspi|dbus|expat|sqlite3|CLI/|glib|nlohmann/|canberra|yaml-cpp/|libxml/|md4c)")
 # Folder, with those inside it -> what of these it may include; the first entry holds everywhere.
 MAY_USE = {
     "": ("unicode/",),
     "ports/x11": ("xcb/", "X11/", "xkbcommon/"),
     "ports/atspi": ("dbus",),
     "ports/dbus": ("dbus",),
-    "ports/posix": ("canberra",),
+    "ports/posix": ("canberra", "sqlite3"),
+    "Foundation/archive": ("expat",),
     "Foundation/json": ("nlohmann/",),
+    "Foundation/text": ("libxml/", "md4c"),
+    "import": ("expat", "nlohmann/", "yaml-cpp/"),
     "library": ("nlohmann/",),
     "scenario": ("nlohmann/",),
     "app/linux": ("xcb/",),

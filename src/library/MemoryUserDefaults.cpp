@@ -64,4 +64,18 @@ std::optional<std::vector<std::u16string>> MemoryUserDefaults::stringArrayForKey
     return valueIn<std::vector<std::u16string>>(values_, key);
 }
 
+std::optional<PropertyList> MemoryUserDefaults::objectForKey(std::string_view key) const {
+    const auto found = values_.find(key);
+    if (found == values_.end()) return std::nullopt;
+    return std::visit(
+        [](const auto& value) -> PropertyList {
+            if constexpr (std::is_same_v<std::decay_t<decltype(value)>, std::vector<std::u16string>>) {
+                return PropertyList::Array(value.begin(), value.end());
+            } else {
+                return value;
+            }
+        },
+        found->second);
+}
+
 }  // namespace plume

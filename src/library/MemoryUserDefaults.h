@@ -22,6 +22,7 @@ class MemoryUserDefaults final : public UserDefaults {
     bool boolForKey(std::string_view key) const override;
     std::optional<std::u16string> stringForKey(std::string_view key) const override;
     std::optional<std::vector<std::u16string>> stringArrayForKey(std::string_view key) const override;
+    std::optional<PropertyList> objectForKey(std::string_view key) const override;
 
   private:
     std::map<std::string, Value, std::less<>> values_;

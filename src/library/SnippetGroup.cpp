@@ -1,6 +1,7 @@
 #include "library/SnippetGroup.h"
 
 #include <algorithm>
+#include <any>
 #include <limits>
 #include <utility>
 
@@ -29,6 +30,15 @@ bool usesList(std::int64_t option) {
     return option == PLFunctionAvailability::ExceptListed || option == PLFunctionAvailability::OnlyListed;
 }
 
+// A snippet that stands in several groups is one object in all of them.
+std::shared_ptr<Snippet> decodeSnippet(KeyedDecoder& coder) {
+    std::any& decoded = coder.decodedObject();
+    if (const auto* known = std::any_cast<std::shared_ptr<Snippet>>(&decoded)) return *known;
+    auto snippet = std::make_shared<Snippet>(coder);
+    decoded = snippet;
+    return snippet;
+}
+
 }  // namespace
 
 SnippetGroup::SnippetGroup() : uuid_(Uuid::random()), dateCreated_(currentDate()) {}
@@ -45,8 +55,7 @@ std::shared_ptr<SnippetGroup> SnippetGroup::makeWithCoder(const KeyedDecoder& co
     }
     if (const auto date = coder.decodeDate("DateCreated")) group->dateCreated_ = date;
     group->name_ = coder.decodeString("Name");
-    coder.decodeObjects("Items",
-                        [&](const KeyedDecoder& item) { group->items_.push_back(std::make_shared<Snippet>(item)); });
+    coder.decodeObjects("Items", [&](KeyedDecoder& item) { group->items_.push_back(decodeSnippet(item)); });
     group->expandAfter_ = decodeSetting<ExpandAfter>(coder, "ExpandAfter");
     group->expandAfterDelimiters_ =
         replaceNewlineCharacterByCarriageReturnCharacter(coder.decodeCharacterSet("ExpandAfterDelimiters"));

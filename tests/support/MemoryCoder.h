@@ -3,6 +3,7 @@
 #pragma once
 
 #include <algorithm>
+#include <any>
 #include <cstdint>
 #include <functional>
 #include <optional>
@@ -21,7 +22,7 @@ struct MemoryArchive;
 // Objects are kept as what they are, whichever operation wrote them, as a real archive does.
 using MemoryValue =
     std::variant<std::monostate, std::int64_t, bool, std::u16string, Date, CharacterSet, std::vector<std::u16string>,
-                 ArchivedData, AttributedString, std::vector<MemoryArchive>>;
+                 ArchivedData, AttributedString, std::vector<MemoryArchive>, PropertyList>;
 
 // The values of one record.
 struct MemoryArchive {
@@ -40,8 +41,9 @@ struct MemoryArchive {
     }
     // The keys, each with its kind: "Name:string ShowInMenuBar:bool ".
     std::string layout() const {
-        static constexpr const char* Kinds[] = {"",        "integer", "bool",       "string", "date", "characterSet",
-                                                "strings", "data",    "attributed", "objects"};
+        static constexpr const char* Kinds[] = {"",           "integer",      "bool",        "string",
+                                                "date",       "characterSet", "strings",     "data",
+                                                "attributed", "objects",      "propertyList"};
         std::string keys;
         for (const auto& [key, value] : entries) keys += key + ":" + Kinds[value.index()] + " ";
         return keys;
@@ -77,6 +79,7 @@ class MemoryEncoder final : public KeyedEncoder {
         for (const KeyedCodable* value : values) objects.push_back(encode(*value));
         archive_.add(key, std::move(objects));
     }
+    void encodePropertyList(std::string_view key, const PropertyList& value) override { archive_.add(key, value); }
 
   private:
     template <typename Value>
@@ -117,6 +120,10 @@ class MemoryDecoder final : public KeyedDecoder {
         }
         return true;
     }
+    std::optional<PropertyList> decodePropertyList(std::string_view key) const override {
+        return get<PropertyList>(key);
+    }
+    std::any& decodedObject() override { return decoded_; }
 
   private:
     template <typename Value>
@@ -126,6 +133,7 @@ class MemoryDecoder final : public KeyedDecoder {
     }
 
     MemoryArchive archive_;
+    std::any decoded_;
 };
 
 }  // namespace plume::test

@@ -3,6 +3,7 @@
 // Keys are unique within one object. Encoders and decoders live for one pass over one archive, on one thread.
 #pragma once
 
+#include <any>
 #include <cstdint>
 #include <functional>
 #include <optional>
@@ -13,18 +14,13 @@
 
 #include "Foundation/CharacterSet.h"
 #include "Foundation/Date.h"
+#include "Foundation/archive/PropertyList.h"
 #include "Foundation/text/AttributedString.h"
 
 namespace plume {
 
 class KeyedEncoder;
 class KeyedDecoder;
-
-// Raw bytes in an archive.
-struct ArchivedData {
-    std::string bytes;
-    bool operator==(const ArchivedData&) const = default;
-};
 
 // A content as an archive may hold it: nothing, raw data, plain text or attributed text.
 using ArchivedContent = std::variant<std::monostate, ArchivedData, std::u16string, AttributedString>;
@@ -49,7 +45,9 @@ class KeyedEncoder {
     virtual void encodeCharacterSet(std::string_view key, const std::optional<CharacterSet>& value) = 0;
     virtual void encodeStrings(std::string_view key, const std::optional<std::vector<std::u16string>>& value) = 0;
     virtual void encodeContent(std::string_view key, const ArchivedContent& value) = 0;
+    // A record that is given several times is archived once.
     virtual void encodeObjects(std::string_view key, const std::vector<const KeyedCodable*>& values) = 0;
+    virtual void encodePropertyList(std::string_view key, const PropertyList& value) = 0;
 };
 
 // Reads what an encoder wrote, or an archive from elsewhere. A missing key, like a value of another kind than the one
@@ -68,6 +66,10 @@ class KeyedDecoder {
     // Calls `receive` once per object of the array, in order, with a decoder for that object; false when no array is
     // stored under the key.
     virtual bool decodeObjects(std::string_view key, const std::function<void(KeyedDecoder&)>& receive) const = 0;
+    virtual std::optional<PropertyList> decodePropertyList(std::string_view key) const = 0;
+    // What was made of this object: empty at first, and what was put there when the same object is met again, so that
+    // a record that stands in two lists is one record afterwards too.
+    virtual std::any& decodedObject() = 0;
 };
 
 }  // namespace plume

@@ -1,0 +1,27 @@
+// Reads the libraries of other text expanders, and Plume's own files, by the ending of the file's name.
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "Foundation/Result.h"
+#include "library/ImportedLibrary.h"
+#include "platform/Files.h"
+
+namespace plume {
+
+struct ImportOptions {
+    // Contents of CSV files hold the placeholders of TextExpander.
+    bool textExpanderPlaceholders = false;
+};
+
+// All that the file or folder holds, or the reason why nothing of it can be taken, with the file's name, the place and
+// what was expected. Endings count in either case.
+Result<ImportedLibrary> importLibrary(const std::filesystem::path& path, const Files& files,
+                                      const ImportOptions& options = {});
+
+// The endings that importLibrary() knows, in lower case and without the dot.
+const std::vector<std::string>& importableExtensions();
+
+}  // namespace plume
