@@ -1,31 +1,29 @@
-// Settings in memory.
+// Settings in memory, which nobody else changes.
 #pragma once
 
-#include <functional>
-#include <map>
-#include <variant>
+#include <string>
+#include <string_view>
 
 #include "platform/UserDefaults.h"
 
 namespace plume {
 
-class MemoryUserDefaults final : public UserDefaults {
+class MemoryUserDefaults final : public WritableUserDefaults {
   public:
-    using Value = std::variant<bool, std::int64_t, double, std::u16string, std::vector<std::u16string>>;
+    // setObject() for who knows that it cannot fail here.
+    void set(std::string_view key, PropertyList value) { (void)setObject(key, std::move(value)); }
 
-    void set(std::string key, Value value);
-    void remove(std::string_view key);
-
-    bool hasKey(std::string_view key) const override;
-    std::int64_t integerForKey(std::string_view key) const override;
-    double doubleForKey(std::string_view key) const override;
-    bool boolForKey(std::string_view key) const override;
-    std::optional<std::u16string> stringForKey(std::string_view key) const override;
-    std::optional<std::vector<std::u16string>> stringArrayForKey(std::string_view key) const override;
     std::optional<PropertyList> objectForKey(std::string_view key) const override;
+    void registerDefaults(const PropertyList::Dictionary& defaults) override;
+    Result<void> setObject(std::string_view key, PropertyList value) override;
+    Result<void> removeObject(std::string_view key) override;
+    std::vector<std::string> ownKeys() const override;
 
   private:
-    std::map<std::string, Value, std::less<>> values_;
+    void tellIfChanged(std::string_view key, const std::optional<PropertyList>& before);
+
+    PropertyList::Dictionary own_;
+    PropertyList::Dictionary registered_;
 };
 
 }  // namespace plume

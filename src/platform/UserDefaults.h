@@ -5,7 +5,9 @@
 // read ahead.
 #pragma once
 
+#include <cmath>
 #include <cstdint>
+#include <limits>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -21,20 +23,57 @@ namespace plume {
 class UserDefaults {
   public:
     virtual ~UserDefaults() = default;
-    virtual bool hasKey(std::string_view key) const = 0;
-    // Numbers and booleans are read as one another; 0 and false without one.
-    virtual std::int64_t integerForKey(std::string_view key) const = 0;
-    virtual double doubleForKey(std::string_view key) const = 0;
-    virtual bool boolForKey(std::string_view key) const = 0;
-    virtual std::optional<std::u16string> stringForKey(std::string_view key) const = 0;
-    virtual std::optional<std::vector<std::u16string>> stringArrayForKey(std::string_view key) const = 0;
+    // The user's own value, else the registered one.
     virtual std::optional<PropertyList> objectForKey(std::string_view key) const = 0;
-    std::optional<Date> dateForKey(std::string_view key) const {
+
+    bool hasKey(std::string_view key) const { return objectForKey(key).has_value(); }
+    // Numbers and booleans are read as one another; 0 and false without one. What is too large stops at the limits.
+    std::int64_t integerForKey(std::string_view key) const;
+    double doubleForKey(std::string_view key) const;
+    bool boolForKey(std::string_view key) const { return doubleForKey(key) != 0; }
+    std::optional<std::u16string> stringForKey(std::string_view key) const { return valueForKey<std::u16string>(key); }
+    // Nothing when an element is no string.
+    std::optional<std::vector<std::u16string>> stringArrayForKey(std::string_view key) const;
+    std::optional<Date> dateForKey(std::string_view key) const { return valueForKey<Date>(key); }
+
+  private:
+    template <typename Type>
+    std::optional<Type> valueForKey(std::string_view key) const {
         const auto object = objectForKey(key);
-        const Date* date = object ? object->as<Date>() : nullptr;
-        return date ? std::optional(*date) : std::nullopt;
+        const Type* value = object ? object->as<Type>() : nullptr;
+        return value ? std::optional(*value) : std::nullopt;
     }
 };
+
+inline double UserDefaults::doubleForKey(std::string_view key) const {
+    const auto object = objectForKey(key);
+    if (!object) return 0;
+    if (const auto* number = object->as<double>()) return std::isnan(*number) ? 0 : *number;
+    if (const auto* integer = object->as<std::int64_t>()) return static_cast<double>(*integer);
+    const auto* boolean = object->as<bool>();
+    return boolean && *boolean ? 1 : 0;
+}
+
+inline std::int64_t UserDefaults::integerForKey(std::string_view key) const {
+    if (const auto integer = valueForKey<std::int64_t>(key)) return *integer;
+    constexpr double Beyond = 9223372036854775808.0;  // 2 to the power of 63
+    const double number = doubleForKey(key);
+    if (number >= Beyond) return std::numeric_limits<std::int64_t>::max();
+    if (number <= -Beyond) return std::numeric_limits<std::int64_t>::min();
+    return static_cast<std::int64_t>(number);
+}
+
+inline std::optional<std::vector<std::u16string>> UserDefaults::stringArrayForKey(std::string_view key) const {
+    const auto array = valueForKey<PropertyList::Array>(key);
+    if (!array) return std::nullopt;
+    std::vector<std::u16string> strings;
+    for (const PropertyList& element : *array) {
+        const auto* string = element.as<std::u16string>();
+        if (!string) return std::nullopt;
+        strings.push_back(*string);
+    }
+    return strings;
+}
 
 // Settings that have another value than before.
 struct UserDefaultsChange {

@@ -34,7 +34,9 @@ struct PropertyList {
     using Value = std::variant<bool, std::int64_t, double, std::u16string, Date, ArchivedData, Array, Dictionary, Uid>;
 
     PropertyList() : value(Dictionary()) {}
+    // Never stands in for the copy: no value is made from a PropertyList.
     template <typename Type>
+    // NOLINTNEXTLINE(bugprone-forwarding-reference-overload)
     requires std::is_constructible_v<Value, Type&&> PropertyList(Type&& of) : value(std::forward<Type>(of)) {}
 
     // Null when the value is of another kind.
