@@ -3,6 +3,7 @@
 
 #include <filesystem>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "Foundation/Result.h"
@@ -20,6 +21,10 @@ struct ImportOptions {
 // what was expected. Endings count in either case.
 Result<ImportedLibrary> importLibrary(const std::filesystem::path& path, const Files& files,
                                       const ImportOptions& options = {});
+
+// The same for a file that was read already.
+Result<ImportedLibrary> importFile(const std::filesystem::path& path, std::string_view bytes,
+                                   const ImportOptions& options = {});
 
 // The endings that importLibrary() knows, in lower case and without the dot.
 const std::vector<std::string>& importableExtensions();

@@ -43,6 +43,9 @@ class CSVParser {
     // Hands over each row as soon as it is read, so that only one is held at a time. False when there is not even one.
     bool parseRowsForReceiver(const std::function<void(Row)>& receiver);
 
+    // Where the last parse ended: at the end of the text, or where it broke the rules.
+    std::size_t position() const { return position_; }
+
     // The columns known so far. Those beyond the given or read names are called FIELD_<number>, counted from 1.
     const std::vector<std::u16string>& fieldNames() const { return fieldNames_; }
 

@@ -4,10 +4,8 @@
 #include <system_error>
 #include <utility>
 
-#include "Foundation/Strings.h"
-#include "app/cli/CsvLibrary.h"
 #include "app/cli/Files.h"
-#include "library/LibraryFile.h"
+#include "import/Importers.h"
 
 namespace plume {
 
@@ -18,16 +16,6 @@ std::filesystem::path standardFile() {
     std::error_code problem;
     if (own.is_absolute() && std::filesystem::exists(own, problem)) return own;
     return dataFolder() / "sample-library.json";
-}
-
-bool isCsv(const std::filesystem::path& file) {
-    return equalsIgnoringCase(fromUtf8(file.extension().string()), u".csv");
-}
-
-Result<ChosenLibrary> readCsv(const std::filesystem::path& file, std::string_view bytes) {
-    auto group = readCsvLibrary(bytes, fromUtf8(file.stem().string()));
-    if (!group) return Error{file.string() + ": " + group.error().message};
-    return ChosenLibrary{{std::move(group).value()}, file};
 }
 
 }  // namespace
@@ -41,10 +29,9 @@ Result<ChosenLibrary> openLibrary(const std::optional<std::string>& named) {
     const std::filesystem::path file = named ? std::filesystem::path(*named) : standardFile();
     const Result<std::string> bytes = readWholeFile(file);
     if (!bytes) return bytes.error();
-    if (isCsv(file)) return readCsv(file, bytes.value());
-    auto groups = LibraryFile::read(bytes.value(), file.string());
-    if (!groups) return groups.error();
-    return ChosenLibrary{std::move(groups).value(), file};
+    auto imported = importFile(file, bytes.value());
+    if (!imported) return imported.error();
+    return ChosenLibrary{std::move(imported.value().groups), file};
 }
 
 }  // namespace plume

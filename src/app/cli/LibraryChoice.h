@@ -19,7 +19,7 @@ struct ChosenLibrary {
     std::size_t snippetCount() const;
 };
 
-// The named file, JSON or (by its ending) CSV; without one the user's own library, else the sample. A file that is
+// The named file, read by its ending; without one the user's own library, else the sample. A file that is
 // there and cannot be read is an error, never another library. The error names the file, and the place in it.
 Result<ChosenLibrary> openLibrary(const std::optional<std::string>& named);
 

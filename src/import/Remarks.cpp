@@ -1,0 +1,52 @@
+#include "import/Remarks.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "Foundation/CharacterSet.h"
+#include "Foundation/Strings.h"
+
+namespace plume {
+
+namespace {
+
+std::string quoted(std::u16string_view text) {
+    constexpr std::size_t MostUnits = 60;
+    std::u16string line(text.substr(0, MostUnits));
+    std::replace_if(
+        line.begin(), line.end(), [](char16_t unit) { return CharacterSet::newlines().contains(unit); }, u' ');
+    return '"' + toUtf8(line) + (text.size() > MostUnits ? "…\"" : "\"");
+}
+
+}  // namespace
+
+std::string nameInRemarks(const Snippet& snippet) {
+    if (snippet.abbreviation() && !snippet.abbreviation()->empty()) return quoted(*snippet.abbreviation());
+    if (snippet.label() && !snippet.label()->empty()) return "the snippet labelled " + quoted(*snippet.label());
+    return "a snippet without abbreviation";
+}
+
+void Remarks::add(std::string line) {
+    if (lines_.size() < MostLines) {
+        lines_.push_back(std::move(line));
+    } else {
+        ++further_;
+    }
+}
+
+void Remarks::add(const Snippet& snippet, std::string_view why) {
+    add(nameInRemarks(snippet) + ": " + std::string(why));
+}
+
+void Remarks::addCount(std::size_t count, std::string_view one, std::string_view many) {
+    if (count == 1) add("1 " + std::string(one));
+    if (count > 1) add(std::to_string(count) + " " + std::string(many));
+}
+
+std::vector<std::string> Remarks::take() {
+    if (further_ > 0) lines_.push_back(std::to_string(further_) + " further remarks are left out");
+    further_ = 0;
+    return std::exchange(lines_, {});
+}
+
+}  // namespace plume
