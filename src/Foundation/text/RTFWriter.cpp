@@ -233,7 +233,9 @@ RTFCharacterFormat RTFWriter::formatOf(const TextAttributes* attributes) {
     if (const auto& font = attributes->font) {
         format.hasFont = true;
         format.font = tables_.fontNumber(font->family);
-        format.halfPoints = std::max(rounded(font->size, RTFHalfPointsPerPoint, RTFMaximumHalfPoints), 1);
+        if (font->size != 0) {
+            format.halfPoints = std::max(rounded(font->size, RTFHalfPointsPerPoint, RTFMaximumHalfPoints), 1);
+        }
         format.bold = font->bold;
         format.italic = font->italic;
     }
