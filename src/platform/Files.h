@@ -34,12 +34,13 @@ class Files {
     virtual bool isFolder(const Path& path) const = 0;
     virtual Result<std::string> read(const Path& path) const = 0;
     // The file holds either what it held or all of these bytes, whatever happens meanwhile. A new one is the user's
-    // alone (0600).
+    // alone (0600). Its folder has to be there.
     virtual Result<void> write(const Path& path, std::string_view bytes) = 0;
     // With the folders above it; one that is there is no error.
     virtual Result<void> createFolder(const Path& path) = 0;
     // In the order in which the system tells them.
     virtual Result<std::vector<Entry>> list(const Path& folder) const = 0;
+    // A file, or an empty folder. What is not there is an error.
     virtual Result<void> remove(const Path& path) = 0;
     // Where there is no trash on the file's disk, beside the file under another name.
     virtual Result<void> moveToTrash(const Path& path) = 0;

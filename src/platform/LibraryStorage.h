@@ -29,7 +29,7 @@ class LibraryStorage {
         Generation generation = 0;
     };
 
-    // Refused: another process has written since. Nothing was changed.
+    // Refused: another process has written since, or a newer archive of this one is there already. Nothing was changed.
     struct Outdated {};
     using Written = Result<std::variant<Generation, Outdated>>;
 
