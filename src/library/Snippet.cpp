@@ -67,6 +67,7 @@ void Snippet::readContent(const KeyedDecoder& coder) {
 void Snippet::setAbbreviation(Text abbreviation) {
     const Text previous = std::exchange(abbreviation_, std::move(abbreviation));
     abbreviationHash_ = hashOfSuffix(abbreviation_.value_or(u""));
+    ++revision_;
     updateDateModified();
     if (abbreviation_ == previous) return;
     if (const auto group = parentGroup()) group->snippetAbbreviationChanged(*this, previous);
@@ -79,9 +80,15 @@ Snippet::Text Snippet::abbreviationWithPrefix() const {
     return *group->abbreviationPrefix() + *abbreviation_;
 }
 
+void Snippet::setCaseSensitivity(CaseSensitivity value) {
+    caseSensitivity_ = value;
+    ++revision_;
+}
+
 void Snippet::setContentType(ContentType type) {
     if (type == contentType_) return;
     contentType_ = type;
+    ++revision_;
     if (type == ContentType::PlainText && richTextContent_) {
         richTextContent_ = AttributedString(richTextContent_->string());
     }
@@ -91,6 +98,7 @@ void Snippet::setContentType(ContentType type) {
 void Snippet::setRichTextContent(std::optional<AttributedString> content) {
     richTextContent_ = std::move(content);
     unreadContent_.reset();
+    ++revision_;
     updateDateModified();
 }
 
@@ -133,7 +141,13 @@ bool Snippet::isContentEqualTo(const Snippet& other) const {
 
 void Snippet::setLabel(Text label) {
     label_ = std::move(label);
+    ++revision_;
     updateDateModified();
+}
+
+void Snippet::setNote(Text note) {
+    note_ = std::move(note);
+    ++revision_;
 }
 
 Snippet::Text Snippet::sortingContent() const {
@@ -147,6 +161,7 @@ void Snippet::updateDateModified() {
 
 void Snippet::updateLastTimeUsed() {
     lastTimeUsed_ = currentDate();
+    ++revision_;
 }
 
 std::shared_ptr<Snippet> Snippet::copySnippet() const {
@@ -159,6 +174,25 @@ std::shared_ptr<Snippet> Snippet::copySnippet() const {
     copy->setCaseSensitivity(caseSensitivity_);
     copy->setParentGroup(parentGroup_);
     copy->setNote(note_);
+    return copy;
+}
+
+std::shared_ptr<Snippet> Snippet::snapshot() const {
+    auto copy = std::make_shared<Snippet>(Empty());
+    copy->uuid_ = uuid_;
+    copy->revision_ = revision_;
+    copy->abbreviation_ = abbreviation_;
+    copy->abbreviationHash_ = abbreviationHash_;
+    copy->caseSensitivity_ = caseSensitivity_;
+    copy->contentType_ = contentType_;
+    copy->richTextContent_ = richTextContent_;
+    copy->unreadContent_ = unreadContent_;
+    copy->label_ = label_;
+    copy->dateCreated_ = dateCreated_;
+    copy->dateModified_ = dateModified_;
+    copy->lastTimeUsed_ = lastTimeUsed_;
+    copy->note_ = note_;
+    copy->initialized_ = true;
     return copy;
 }
 

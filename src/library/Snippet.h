@@ -35,6 +35,12 @@ class Snippet final : public KeyedCodable {
     // Reads an archived snippet; nothing that the archive holds or lacks makes it fail. A date that is missing stays
     // missing; an unreadable content is none.
     explicit Snippet(const KeyedDecoder& coder);
+    // For snapshot() alone: nothing is set.
+    class Empty {
+        friend class Snippet;
+        Empty() = default;
+    };
+    explicit Snippet(Empty /*nothing*/) {}
     Snippet(const Snippet&) = delete;
     Snippet& operator=(const Snippet&) = delete;
 
@@ -50,7 +56,7 @@ class Snippet final : public KeyedCodable {
 
     // Archives may hold values outside the named ones; they are kept.
     CaseSensitivity caseSensitivity() const { return caseSensitivity_; }
-    void setCaseSensitivity(CaseSensitivity value) { caseSensitivity_ = value; }
+    void setCaseSensitivity(CaseSensitivity value);
 
     ContentType contentType() const { return contentType_; }
     // Turning rich text into plain text drops its formatting.
@@ -73,7 +79,7 @@ class Snippet final : public KeyedCodable {
     const Text& label() const { return label_; }
     void setLabel(Text label);
     const Text& note() const { return note_; }
-    void setNote(Text note) { note_ = std::move(note); }
+    void setNote(Text note);
     // What lists sort by: the label when there is one, else the plain content.
     Text sortingContent() const;
 
@@ -90,6 +96,11 @@ class Snippet final : public KeyedCodable {
 
     // A duplicate with an identity and dates of its own, in the same group's name (not in its list).
     std::shared_ptr<Snippet> copySnippet() const;
+    // The same record, identity and dates included, as it is now, in no group: for a thread of its own, or to be
+    // compared with later.
+    std::shared_ptr<Snippet> snapshot() const;
+    // Grows with every change of what is archived.
+    std::uint64_t revision() const { return revision_; }
 
     std::string_view archiveClassName() const override { return "Snippet"; }
     void encodeWithCoder(KeyedEncoder& coder) const override;
@@ -99,6 +110,7 @@ class Snippet final : public KeyedCodable {
     ArchivedContent archivedContent() const;
 
     std::optional<Uuid> uuid_;
+    std::uint64_t revision_ = 0;
     bool initialized_ = false;
     Text abbreviation_;
     std::uint64_t abbreviationHash_ = EmptySuffixHash;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <any>
 #include <limits>
+#include <tuple>
 #include <utility>
 
 namespace plume {
@@ -146,6 +147,18 @@ void SnippetGroup::removeItem(const std::shared_ptr<Snippet>& snippet) {
     }
 }
 
+void SnippetGroup::replaceItems(const std::vector<std::shared_ptr<Snippet>>& snippets) {
+    // A copy: they may be this group's own.
+    const auto added = snippets;
+    while (!items_.empty()) {
+        const std::shared_ptr<Snippet> removed = items_.back();
+        items_.pop_back();
+        if (removed->parentGroup().get() == this) removed->setParentGroup({});
+        notifyObservers([&](SnippetGroupObserver& observer) { observer.itemRemoved(*this, *removed, items_.size()); });
+    }
+    addItems(added);
+}
+
 void SnippetGroup::setExpandTrigger(ExpandTrigger value) {
     if (std::exchange(expandTrigger_, value) != value) notifyMatchingSettingsChanged();
 }
@@ -190,6 +203,25 @@ void SnippetGroup::copySettingsFromGroup(const SnippetGroup& other) {
     suggestAbbreviations_ = other.suggestAbbreviations_;
     availability_ = other.availability_;
     if (matchingChanges) notifyMatchingSettingsChanged();
+}
+
+std::shared_ptr<SnippetGroup> SnippetGroup::snapshot() const {
+    auto copy = make();
+    copy->uuid_ = uuid_;
+    copy->dateCreated_ = dateCreated_;
+    copy->name_ = name_;
+    copy->abbreviationPrefix_ = abbreviationPrefix_;
+    copy->copySettingsFromGroup(*this);
+    return copy;
+}
+
+bool SnippetGroup::hasSameSettings(const SnippetGroup& other) const {
+    const auto settings = [](const SnippetGroup& group) {
+        return std::tie(group.name_, group.abbreviationPrefix_, group.expandAfter_, group.expandAfterDelimiters_,
+                        group.expandTrigger_, group.delimiters_, group.caseSensitivity_, group.resetFormatting_,
+                        group.showInMenuBar_, group.suggestAbbreviations_, group.availability_);
+    };
+    return settings(*this) == settings(other);
 }
 
 std::shared_ptr<Snippet> SnippetGroup::findSnippetWithAbbreviation(std::u16string_view abbreviation) const {

@@ -77,6 +77,8 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     // From every place, should there be several. No error when the snippet is not listed. The parentGroup of a listed
     // one is cleared when it is this group.
     void removeItem(const std::shared_ptr<Snippet>& snippet);
+    // All of them in place of those that are there.
+    void replaceItems(const std::vector<std::shared_ptr<Snippet>>& snippets);
 
     ExpandAfter expandAfter() const { return expandAfter_; }
     void setExpandAfter(ExpandAfter value) { expandAfter_ = value; }
@@ -105,6 +107,10 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     // A new group with the name, the prefix and the settings, and duplicates of the snippets when asked for.
     std::shared_ptr<SnippetGroup> copySnippetGroup(bool withItems) const;
     void copySettingsFromGroup(const SnippetGroup& other);
+    // The same group as it is now, identity included, without its snippets.
+    std::shared_ptr<SnippetGroup> snapshot() const;
+    // All that copySettingsFromGroup() copies, the name and the prefix are equal.
+    bool hasSameSettings(const SnippetGroup& other) const;
 
     // The first snippet with exactly this abbreviation, the prefix not considered; null when there is none.
     std::shared_ptr<Snippet> findSnippetWithAbbreviation(std::u16string_view abbreviation) const;

@@ -31,7 +31,8 @@ class LibraryStorage {
 
     // Refused: another process has written since, or a newer archive of this one is there already. Nothing was changed.
     struct Outdated {};
-    using Written = Result<std::variant<Generation, Outdated>>;
+    using Outcome = std::variant<Generation, Outdated>;
+    using Written = Result<Outcome>;
 
     virtual ~LibraryStorage() = default;
     virtual Result<Stored> load() = 0;
