@@ -7,8 +7,10 @@
 
 namespace plume {
 
-// Equal strings, numbers and data are written once.
+// Equal values are written once.
 std::string binaryPropertyList(const PropertyList& list);
+// XML holds dates to the second, and what it has no characters for, like unpaired surrogates and most control
+// characters, as U+FFFD.
 std::string xmlPropertyList(const PropertyList& list);
 
 }  // namespace plume
