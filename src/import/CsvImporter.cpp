@@ -109,8 +109,7 @@ class CsvReading {
     void tellOfRest() {
         remarks_.addCount(longer_, "record has more than three columns; only the first three are taken",
                           "records have more than three columns; only the first three are taken");
-        remarks_.addCount(tooMany_, "record is left out, as an import takes no more than 250000 snippets",
-                          "records are left out, as an import takes no more than 250000 snippets");
+        remarks_.addTooMany(tooMany_);
         if (stoppedAt_ == text_.size()) return;
         remarks_.add("line " + std::to_string(lineNumberAt(text_, stoppedAt_)) +
                      ": a double quote breaks the record; nothing from there on is read");

@@ -25,6 +25,7 @@ struct ForeignFile {
 // Reads one format. Pure. Errors name the file, the place and what was expected.
 using Importer = Result<ImportedLibrary>(const ForeignFile& file);
 
+Importer importAutoHotkey;
 Importer importCsv;
 Importer importReadableLibrary;
 

@@ -17,6 +17,7 @@ struct Format {
 
 // What files are, by their ending alone.
 constexpr std::array Formats = {
+    Format{"ahk", importAutoHotkey},
     Format{"csv", importCsv},
     Format{"json", importReadableLibrary},
 };

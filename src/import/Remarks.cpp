@@ -43,6 +43,12 @@ void Remarks::addCount(std::size_t count, std::string_view one, std::string_view
     if (count > 1) add(std::to_string(count) + " " + std::string(many));
 }
 
+void Remarks::addTooMany(std::size_t count) {
+    const std::string most = std::to_string(MostImportedSnippets);
+    addCount(count, "snippet is left out, as an import takes no more than " + most,
+             "snippets are left out, as an import takes no more than " + most);
+}
+
 std::vector<std::string> Remarks::take() {
     if (further_ > 0) lines_.push_back(std::to_string(further_) + " further remarks are left out");
     further_ = 0;

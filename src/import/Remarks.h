@@ -22,6 +22,9 @@ class Remarks {
     // Unless there are none: "12 lines are no hotstrings". `one` holds for a single one: "1 line is no hotstring".
     void addCount(std::size_t count, std::string_view one, std::string_view many);
 
+    // Snippets beyond MostImportedSnippets.
+    void addTooMany(std::size_t count);
+
     std::vector<std::string> take();
 
   private:
