@@ -152,10 +152,7 @@ class AutoHotkeyReading {
             lost.emplace_back("keys in braces are taken as text");
         }
         if (hotstring.content.find(u'`') != View::npos) lost.emplace_back("escapes with ` are taken as text");
-        if (lost.empty()) return;
-        std::string line = "line " + std::to_string(number) + ", " + nameInRemarks(snippet) + ": ";
-        for (std::size_t i = 0; i < lost.size(); ++i) line += (i > 0 ? "; " : "") + lost[i];
-        remarks_.add(std::move(line));
+        remarks_.addAll(snippet, lost, number);
     }
 
     void tellOfRest() {

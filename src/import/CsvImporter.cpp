@@ -7,6 +7,7 @@
 #include "Foundation/text/CSV.h"
 #include "import/ForeignFile.h"
 #include "import/Remarks.h"
+#include "import/TextExpanderMacros.h"
 #include "import/TextFile.h"
 
 namespace plume {
@@ -60,12 +61,18 @@ std::u16string withDoubledQuotes(std::u16string_view text) {
 
 class CsvReading {
   public:
-    explicit CsvReading(std::u16string text) : text_(std::move(text)), separator_(separatorOf(text_)) {}
+    CsvReading(std::u16string text, bool convertsMacros)
+        : text_(std::move(text)), separator_(separatorOf(text_)), convertsMacros_(convertsMacros) {}
 
     Result<ImportedLibrary> read(const ForeignFile& file) {
         const bool readsToEnd = parse();
         if (!readsToEnd && stoppedAt_ > 0) readEscapedQuotes();
         if (snippets_.empty()) return file.fault("line 1: no snippet could be read; " + std::string(Expected));
+        if (convertsMacros_) {
+            for (const auto& snippet : snippets_) remarks_.addAll(*snippet, convertTextExpanderMacros(*snippet));
+        } else {
+            tellOfMacros();
+        }
         tellOfRest();
         auto group = SnippetGroup::make();
         group->setName(file.title());
@@ -106,6 +113,15 @@ class CsvReading {
         parse();
     }
 
+    void tellOfMacros() {
+        const auto count = std::count_if(snippets_.begin(), snippets_.end(), [](const auto& snippet) {
+            return holdsTextExpanderMacros(snippet->richTextContent()->string());
+        });
+        remarks_.addCount(static_cast<std::size_t>(count),
+                          "snippet seems to hold placeholders of TextExpander, which stay as text",
+                          "snippets seem to hold placeholders of TextExpander, which stay as text");
+    }
+
     void tellOfRest() {
         remarks_.addCount(longer_, "record has more than three columns; only the first three are taken",
                           "records have more than three columns; only the first three are taken");
@@ -117,6 +133,7 @@ class CsvReading {
 
     std::u16string text_;
     char16_t separator_;
+    bool convertsMacros_;
     std::vector<std::shared_ptr<Snippet>> snippets_;
     std::size_t stoppedAt_ = 0;
     std::size_t tooMany_ = 0;
@@ -129,7 +146,7 @@ class CsvReading {
 Result<ImportedLibrary> importCsv(const ForeignFile& file) {
     Result<std::u16string> text = textOfFile(file.bytes, CodePage::MacRoman);
     if (!text) return file.fault(text.error().message);
-    return CsvReading(std::move(text).value()).read(file);
+    return CsvReading(std::move(text).value(), file.options.textExpanderPlaceholders).read(file);
 }
 
 }  // namespace plume

@@ -38,6 +38,15 @@ void Remarks::add(const Snippet& snippet, std::string_view why) {
     add(nameInRemarks(snippet) + ": " + std::string(why));
 }
 
+void Remarks::addAll(const Snippet& snippet, const std::vector<std::string>& reasons,
+                     std::optional<std::size_t> lineNumber) {
+    if (reasons.empty()) return;
+    std::string line = lineNumber ? "line " + std::to_string(*lineNumber) + ", " : std::string();
+    line += nameInRemarks(snippet) + ": ";
+    for (std::size_t i = 0; i < reasons.size(); ++i) line += (i > 0 ? "; " : "") + reasons[i];
+    add(std::move(line));
+}
+
 void Remarks::addCount(std::size_t count, std::string_view one, std::string_view many) {
     if (count == 1) add("1 " + std::string(one));
     if (count > 1) add(std::to_string(count) + " " + std::string(many));

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -19,6 +20,9 @@ class Remarks {
     void add(std::string line);
     // "btw": why
     void add(const Snippet& snippet, std::string_view why);
+    // "btw": this; that, or line 3, "btw": this; that. Nothing when there are no reasons.
+    void addAll(const Snippet& snippet, const std::vector<std::string>& reasons,
+                std::optional<std::size_t> lineNumber = std::nullopt);
     // Unless there are none: "12 lines are no hotstrings". `one` holds for a single one: "1 line is no hotstring".
     void addCount(std::size_t count, std::string_view one, std::string_view many);
 

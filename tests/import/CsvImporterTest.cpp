@@ -56,6 +56,16 @@ TEST(CsvImporter, WithoutARecordIsAnError) {
     }
 }
 
+TEST(CsvImporter, ConvertsPlaceholdersOfTextExpanderWhenAsked) {
+    const std::string text = "a,at %1I:%M %p %|\nb,%key:end%\n";
+    const auto asked = importFile("/x/words.csv", text, {.textExpanderPlaceholders = true});
+    EXPECT_EQ(shown(asked.value()), "[words]\na|at 【time:\"h:mm a\"】 【|】|\nb|%key:end%|\n");
+    EXPECT_EQ(remarksOf(asked.value()), "\"b\": the key end is not known and stays as text\n");
+    const auto plain = importFile("/x/words.csv", text);
+    EXPECT_EQ(shown(plain.value()), "[words]\na|at %1I:%M %p %||\nb|%key:end%|\n");
+    EXPECT_THAT(remarksOf(plain.value()), HasSubstr("1 snippet seems to hold placeholders of TextExpander"));
+}
+
 TEST(Importers, AreChosenByTheEnding) {
     EXPECT_THAT(importFile("/x/words.doc", "a").error().message, HasSubstr("/x/words.doc: no library has this ending"));
     const auto library =
