@@ -15,6 +15,7 @@ struct ForeignFile {
     std::filesystem::path path;
     std::string_view bytes;  // never empty
     ImportOptions options;
+    const Files* files = nullptr;  // for what the file names; null when only its bytes are at hand
 
     // The file's name without its folder and ending, after which groups are named that have no name of their own.
     std::u16string title() const;
@@ -27,6 +28,7 @@ using Importer = Result<ImportedLibrary>(const ForeignFile& file);
 
 Importer importAutoHotkey;
 Importer importCsv;
+Importer importEspanso;
 Importer importReadableLibrary;
 
 }  // namespace plume

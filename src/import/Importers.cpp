@@ -4,6 +4,7 @@
 #include <array>
 
 #include "Foundation/Strings.h"
+#include "import/EspansoImporter.h"
 #include "import/ForeignFile.h"
 
 namespace plume {
@@ -17,9 +18,8 @@ struct Format {
 
 // What files are, by their ending alone.
 constexpr std::array Formats = {
-    Format{"ahk", importAutoHotkey},
-    Format{"csv", importCsv},
-    Format{"json", importReadableLibrary},
+    Format{"ahk", importAutoHotkey}, Format{"csv", importCsv},     Format{"json", importReadableLibrary},
+    Format{"yaml", importEspanso},   Format{"yml", importEspanso},
 };
 
 const Format* formatOf(const std::filesystem::path& path) {
@@ -36,6 +36,17 @@ std::string knownEndings() {
     return list;
 }
 
+Result<ImportedLibrary> readWith(const Format* format, const ForeignFile& file) {
+    if (!format) return file.fault("no library has this ending; expected one of " + knownEndings());
+    if (file.bytes.empty()) return file.fault("the file is empty; expected a library");
+    return format->importer(file);
+}
+
+Result<ImportedLibrary> importFolder(const std::filesystem::path& folder, const Files& files) {
+    if (isEspansoFolder(folder, files)) return importEspansoFolder(folder, files);
+    return Error{folder.string() + ": no library is in this folder; expected that of espanso"};
+}
+
 }  // namespace
 
 std::u16string ForeignFile::title() const {
@@ -48,17 +59,15 @@ Error ForeignFile::fault(const std::string& placeAndExpected) const {
 
 Result<ImportedLibrary> importLibrary(const std::filesystem::path& path, const Files& files,
                                       const ImportOptions& options) {
+    if (files.isFolder(path)) return importFolder(path, files);
     const Result<std::string> bytes = files.read(path);
-    return bytes ? importFile(path, bytes.value(), options) : bytes.error();
+    if (!bytes) return bytes.error();
+    return readWith(formatOf(path), {path, bytes.value(), options, &files});
 }
 
 Result<ImportedLibrary> importFile(const std::filesystem::path& path, std::string_view bytes,
                                    const ImportOptions& options) {
-    const ForeignFile file{path, bytes, options};
-    const Format* format = formatOf(path);
-    if (!format) return file.fault("no library has this ending; expected one of " + knownEndings());
-    if (bytes.empty()) return file.fault("the file is empty; expected a library");
-    return format->importer(file);
+    return readWith(formatOf(path), {path, bytes, options, nullptr});
 }
 
 const std::vector<std::string>& importableExtensions() {
