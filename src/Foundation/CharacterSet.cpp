@@ -72,6 +72,15 @@ CharacterSet CharacterSet::withRange(char32_t first, char32_t last) {
     return Storage::make(icu::UnicodeSet(static_cast<UChar32>(first), static_cast<UChar32>(last)));
 }
 
+CharacterSet CharacterSet::withRanges(const Ranges& ranges) {
+    icu::UnicodeSet set;
+    for (const auto& [first, last] : ranges) {
+        if (first > LastCodePoint) continue;
+        set.add(static_cast<UChar32>(first), static_cast<UChar32>(std::min(last, LastCodePoint)));
+    }
+    return Storage::make(set);
+}
+
 const CharacterSet& CharacterSet::letters() {
     static const CharacterSet set = Storage::make(Storage::ofCategories(U_GC_L_MASK | U_GC_M_MASK));
     return set;
@@ -152,6 +161,15 @@ std::u16string CharacterSet::characters() const {
         }
     }
     return result;
+}
+
+CharacterSet::Ranges CharacterSet::ranges() const {
+    const icu::UnicodeSet& set = storage_->set;
+    Ranges ranges;
+    for (int32_t i = 0; i < set.getRangeCount(); ++i) {
+        ranges.emplace_back(set.getRangeStart(i), set.getRangeEnd(i));
+    }
+    return ranges;
 }
 
 bool CharacterSet::operator==(const CharacterSet& other) const {

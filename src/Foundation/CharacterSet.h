@@ -8,6 +8,8 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
+#include <vector>
 
 namespace plume {
 
@@ -23,6 +25,10 @@ class CharacterSet {
     static CharacterSet withCharacters(std::u16string_view characters);
     // All code points from first to last, both included.
     static CharacterSet withRange(char32_t first, char32_t last);
+    // First and last code points, both included.
+    using Ranges = std::vector<std::pair<char32_t, char32_t>>;
+    // Fastest in ascending order.
+    static CharacterSet withRanges(const Ranges& ranges);
 
     // The platform's standard sets. Letters are L* and M*, lower case Ll, upper case Lu and Lt, alphanumerics L*, M*
     // and N*, decimal digits Nd, white space Zs and tab, newlines U+000A to U+000D, U+0085, U+2028 and U+2029.
@@ -48,6 +54,8 @@ class CharacterSet {
 
     // Every member as text, in code-point order. Meant for the small sets a user writes, not for `letters()`.
     std::u16string characters() const;
+    // In ascending order, apart from each other.
+    Ranges ranges() const;
 
     bool operator==(const CharacterSet& other) const;
 

@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "Foundation/Strings.h"
+#include "Foundation/text/FontNames.h"
 #include "Foundation/text/RTFFormats.h"
 
 namespace plume {
@@ -14,19 +15,6 @@ namespace plume {
 namespace {
 
 constexpr std::size_t MaximumComponents = 5;
-
-// Some writers name the face instead of the family.
-struct FaceSuffix {
-    std::u16string_view suffix;
-    bool bold;
-    bool italic;
-};
-
-constexpr std::array FaceSuffixes = {
-    FaceSuffix{u"-BoldItalic", true, true}, FaceSuffix{u"-BoldOblique", true, true},
-    FaceSuffix{u"-Bold", true, false},      FaceSuffix{u"-Italic", false, true},
-    FaceSuffix{u"-Oblique", false, true},   FaceSuffix{u"-Regular", false, false},
-};
 
 constexpr int BulletNumberFormat = 23;
 constexpr int EmptyNumberFormat = 255;
@@ -170,15 +158,11 @@ void RTFFontTable::addText(std::u16string_view text) {
 
 void RTFFontTable::finishName() {
     if (current_) {
-        std::u16string_view name = trimmed(name_);
-        for (const FaceSuffix& face : FaceSuffixes) {
-            if (name.size() <= face.suffix.size() || !name.ends_with(face.suffix)) continue;
-            name.remove_suffix(face.suffix.size());
-            current_->bold = face.bold;
-            current_->italic = face.italic;
-            break;
-        }
-        current_->family = name;
+        // Some writers name the face instead of the family.
+        const FontAttribute font = fontFromFaceName(trimmed(name_));
+        current_->bold = current_->bold || font.bold;
+        current_->italic = current_->italic || font.italic;
+        current_->family = font.family;
     }
     name_.clear();
     current_ = nullptr;
