@@ -29,6 +29,10 @@ using Importer = Result<ImportedLibrary>(const ForeignFile& file);
 Importer importAutoHotkey;
 Importer importCsv;
 Importer importEspanso;
+Importer importGlossary;
+Importer importPropertyList;
 Importer importReadableLibrary;
+Importer importTextExpander;
+Importer importTypeIt4Me;
 
 }  // namespace plume

@@ -18,8 +18,17 @@ struct Format {
 
 // What files are, by their ending alone.
 constexpr std::array Formats = {
-    Format{"ahk", importAutoHotkey}, Format{"csv", importCsv},     Format{"json", importReadableLibrary},
-    Format{"yaml", importEspanso},   Format{"yml", importEspanso},
+    Format{"ahk", importAutoHotkey},
+    Format{"csv", importCsv},
+    Format{"glossary", importGlossary},
+    Format{"json", importReadableLibrary},
+    Format{"plist", importPropertyList},
+    Format{"tedist", importTextExpander},
+    Format{"textexpander", importTextExpander},
+    Format{"textexpbackup", importTextExpander},
+    Format{"typeit4me", importTypeIt4Me},
+    Format{"yaml", importEspanso},
+    Format{"yml", importEspanso},
 };
 
 const Format* formatOf(const std::filesystem::path& path) {

@@ -12,6 +12,10 @@
 
 namespace plume {
 
+// The group that text replacements of the system become: who has one of that name puts them into it, in place of what
+// it holds.
+inline constexpr const char16_t* SystemSubstitutionsGroup = u"System's Symbol And Text Substitutions";
+
 struct ImportOptions {
     // Contents of CSV files hold the placeholders of TextExpander.
     bool textExpanderPlaceholders = false;

@@ -52,6 +52,10 @@ void Remarks::addCount(std::size_t count, std::string_view one, std::string_view
     if (count > 1) add(std::to_string(count) + " " + std::string(many));
 }
 
+void Remarks::addStrange(std::size_t count) {
+    addCount(count, "entry is no snippet and is left out", "entries are no snippets and are left out");
+}
+
 void Remarks::addTooMany(std::size_t count) {
     const std::string most = std::to_string(MostImportedSnippets);
     addCount(count, "snippet is left out, as an import takes no more than " + most,

@@ -26,6 +26,8 @@ class Remarks {
     // Unless there are none: "12 lines are no hotstrings". `one` holds for a single one: "1 line is no hotstring".
     void addCount(std::size_t count, std::string_view one, std::string_view many);
 
+    // Entries of a list of snippets that are none.
+    void addStrange(std::size_t count);
     // Snippets beyond MostImportedSnippets.
     void addTooMany(std::size_t count);
 

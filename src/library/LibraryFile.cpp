@@ -15,6 +15,9 @@ using Text = std::optional<std::u16string>;
 
 // ---- Reading ----
 
+// Behind those that Plume knows: JavaScript of imported libraries, which is kept.
+constexpr std::int64_t LargestContentType = 4;
+
 template <typename Enum>
 Enum code(const JsonNode& node, std::int64_t most) {
     return static_cast<Enum>(node.integer(0, most));
@@ -56,7 +59,8 @@ std::shared_ptr<Snippet> readSnippet(const JsonNode& node) {
     });
     if (!snippet) snippet = std::make_shared<Snippet>();
     object.whenSet("abbreviation", [&](const JsonNode& n) { snippet->setAbbreviation(n.string()); });
-    object.whenSet("contentType", [&](const JsonNode& n) { snippet->setContentType(code<ContentType>(n, 3)); });
+    object.whenSet("contentType",
+                   [&](const JsonNode& n) { snippet->setContentType(code<ContentType>(n, LargestContentType)); });
     object.whenSet("caseSensitivity",
                    [&](const JsonNode& n) { snippet->setCaseSensitivity(code<CaseSensitivity>(n, 2)); });
     object.whenSet("label", [&](const JsonNode& n) { snippet->setLabel(n.string()); });

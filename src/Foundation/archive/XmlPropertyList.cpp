@@ -13,6 +13,7 @@
 #include <utility>
 #include <vector>
 
+#include "Foundation/Base64.h"
 #include "Foundation/Strings.h"
 #include "Foundation/archive/PropertyListLimits.h"
 #include "Foundation/archive/ReferenceDate.h"
@@ -58,36 +59,14 @@ std::optional<PropertyList> realFrom(std::string_view text) {
     return PropertyList(number);
 }
 
-// The value of a character of base 64, or -1.
-int base64Value(char c) {
-    if (c >= 'A' && c <= 'Z') return c - 'A';
-    if (c >= 'a' && c <= 'z') return c - 'a' + 26;
-    if (c >= '0' && c <= '9') return c - '0' + 52;
-    return c == '+' ? 62 : c == '/' ? 63 : -1;
-}
-
-std::optional<PropertyList> dataFrom(std::string_view text) {
-    ArchivedData data;
-    std::uint32_t bits = 0;
-    unsigned count = 0;
-    for (const char c : text) {
-        if (c == '=' || WhiteSpace.find(c) != std::string_view::npos) continue;
-        const int value = base64Value(c);
-        if (value < 0) return std::nullopt;
-        bits = bits << 6 | static_cast<std::uint32_t>(value);
-        count += 6;
-        if (count < 8) continue;
-        count -= 8;
-        data.bytes.push_back(static_cast<char>(bits >> count & 0xFF));
-    }
-    return PropertyList(std::move(data));
-}
-
 std::optional<PropertyList> scalarFrom(std::string_view element, std::string_view text) {
     if (element == "string") return PropertyList(fromUtf8(text));
     if (element == "true") return PropertyList(true);
     if (element == "false") return PropertyList(false);
-    if (element == "data") return dataFrom(text);
+    if (element == "data") {
+        auto bytes = bytesFromBase64(text);
+        return bytes ? std::optional(PropertyList(ArchivedData{std::move(*bytes)})) : std::nullopt;
+    }
     text = withoutSpace(text);
     if (element == "integer") return integerFrom(text);
     if (element == "real") return realFrom(text);

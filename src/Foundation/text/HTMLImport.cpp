@@ -10,6 +10,7 @@
 #include <utility>
 #include <vector>
 
+#include "Foundation/Base64.h"
 #include "Foundation/Strings.h"
 #include "Foundation/text/HTMLFormat.h"
 #include "Foundation/text/HTMLTextBuilder.h"
@@ -40,25 +41,6 @@ bool isBlock(std::string_view tag) {
     return isOneOf(Blocks, tag);
 }
 
-std::optional<std::string> bytesOfBase64(std::string_view text) {
-    constexpr std::string_view Digits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
-    std::string bytes;
-    std::uint32_t group = 0;
-    unsigned bits = 0;
-    for (const char c : text) {
-        if (c == '=') break;
-        if (c == ' ' || c == '\n' || c == '\r' || c == '\t') continue;
-        const std::size_t digit = Digits.find(c);
-        if (digit == std::string_view::npos) return std::nullopt;
-        group = group << 6 | static_cast<std::uint32_t>(digit);
-        bits += 6;
-        if (bits < 8) continue;
-        bits -= 8;
-        bytes += static_cast<char>(group >> bits & 0xff);
-    }
-    return bytes;
-}
-
 // The file in "data:image/png;base64,…"; null for all other addresses.
 std::shared_ptr<const TextAttachment> imageAt(std::string_view address, std::u16string name) {
     constexpr std::string_view Start = "data:image/";
@@ -66,7 +48,7 @@ std::shared_ptr<const TextAttachment> imageAt(std::string_view address, std::u16
     if (!address.starts_with(Start) || comma == std::string_view::npos) return nullptr;
     const std::string_view kind = address.substr(Start.size(), comma - Start.size());
     if (!kind.ends_with(";base64")) return nullptr;
-    auto bytes = bytesOfBase64(address.substr(comma + 1));
+    auto bytes = bytesFromBase64(address.substr(comma + 1));
     if (!bytes || bytes->empty()) return nullptr;
     if (name.empty()) name = u"image." + fromUtf8(kind.substr(0, kind.find_first_of(";+")));
     return std::make_shared<const TextAttachment>(TextAttachment{std::move(name), std::move(*bytes), {}});
