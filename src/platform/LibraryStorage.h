@@ -36,10 +36,10 @@ class LibraryStorage {
 
     virtual ~LibraryStorage() = default;
     virtual Result<Stored> load() = 0;
-    // On the disk when this returns.
+    // Outlives the process, however that ends, once this returns; a power cut may take the entries of the last seconds.
     virtual Written append(std::string_view journalEntry, Generation basedOn) = 0;
     // Keeps the archive, and drops the journal entries up to generation `basedOn`, in one step. Entries that this same
-    // process appended after that stay, and apply to the archive.
+    // process appended after that stay, and apply to the archive. On the disk when this returns.
     virtual Written save(std::string_view archive, Generation basedOn) = 0;
     // Calls from the main loop when another process has written.
     [[nodiscard]] virtual Subscription addObserver(std::function<void()> changedByAnotherProcess) = 0;

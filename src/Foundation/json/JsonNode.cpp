@@ -36,7 +36,7 @@ class Watch {
 };
 
 // The library's own messages name the line and column behind a prefix of no use to people.
-std::string explanation(const Json::parse_error& error) {
+std::string explanation(const Json::exception& error) {
     const std::string message = error.what();
     const std::size_t place = message.find("] ");
     return place == std::string::npos ? message : message.substr(place + 2);
@@ -55,7 +55,7 @@ JsonNode JsonNode::parse(std::string_view text, const std::string& fileName) {
     auto document = std::make_shared<Json>();
     try {
         *document = Json::parse(text, std::ref(watch));
-    } catch (const Json::parse_error& error) {
+    } catch (const Json::exception& error) {
         throw JsonError(fileName + ": this is no JSON: " + explanation(error));
     }
     return {std::move(document), std::make_shared<const std::string>(fileName), "$"};
