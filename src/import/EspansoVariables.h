@@ -59,7 +59,7 @@ class EspansoVariables {
     const YamlValue* formFields_ = nullptr;
     std::u16string matchName_;
     std::vector<std::u16string> groupNames_;  // of what a regular expression takes; each is asked for in a field
-    std::vector<std::u16string> resolving_;  // innermost last
+    std::vector<std::u16string> resolving_;   // innermost last
     std::vector<std::string> problems_;
     std::size_t steps_ = 0;
     std::size_t units_ = 0;

@@ -27,6 +27,7 @@ struct ForeignFile {
 using Importer = Result<ImportedLibrary>(const ForeignFile& file);
 
 Importer importAutoHotkey;
+Importer importAutomaton;
 Importer importCsv;
 Importer importEspanso;
 Importer importGlossary;

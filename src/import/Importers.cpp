@@ -19,6 +19,7 @@ struct Format {
 // What files are, by their ending alone.
 constexpr std::array Formats = {
     Format{"ahk", importAutoHotkey},
+    Format{"autotyper", importAutomaton},
     Format{"csv", importCsv},
     Format{"glossary", importGlossary},
     Format{"json", importReadableLibrary},

@@ -46,6 +46,11 @@ TEST(PropertyListImporters, ReadWhatOtherProgramsWrite) {
          "[System's Symbol And Text Substitutions]\nomw|On my way!|nil\n(c)|©|nil\nbtw|by the way|nil\n",
          "1 replacement was switched off; it expands here\n1 entry is no snippet and is left out\n"},
         {"global.plist", "[System's Symbol And Text Substitutions]\nomw|On my way!|nil\n", ""},
+        {"letters.autotyper",
+         "[letters]\n"
+         "dear|Dear 【field:Who】 on 【date:dd.MM.yyyy】【|】x|A & letter\n"
+         "btw|by 【clipboard】 the 【field:\"a ${b} c\"】 way ${odd}|nil\nbad||nil\nworse||nil\n",
+         "\"worse\": its content cannot be read (expected base 64) and is empty\n"},
         {"words.glossary", "[words]\nteh|the|nil\nrecieve|receive|nil\nadn|and|nil\n", ""},
     };
     for (const auto& one : cases) {
@@ -93,12 +98,16 @@ TEST(PropertyListImporters, SayWhatIsWrong) {
         {"/x/a.typeit4me", start + "<dict/></plist>", "at Clippings: there is none"},
         {"/x/a.plist", start + "<dict/></plist>", "no text replacements"},
         {"/x/a.plist", start + "<array><dict/></array></plist>", "nothing in its list is a replacement"},
+        {"/x/a.autotyper", "<database>\n<object", "/x/a.autotyper: line 2: expected well-formed XML"},
+        {"/x/a.autotyper", "<database/>", "no object of type TYPERABBREVIATION"},
         {"/x/a.glossary", start + "<dict/></plist>", "at $objects: there is none"},
         {"/x/a.glossary", start + "<dict><key>$objects</key><array/></dict></plist>", "no abbreviation"},
     };
     for (const auto& one : cases) {
         EXPECT_THAT(importFile(one.file, one.bytes).error().message, HasSubstr(one.error));
     }
+    const auto cut = importFile("/x/a.autotyper", "<d><object type=\"TYPERABBREVIATION\"></object>\n<d");
+    EXPECT_THAT(remarksOf(cut.value()), HasSubstr("nothing behind a fault is read: line 2"));
     const auto renamed = importFile("/x/a.plist", start + "<dict><key>Clippings</key><array/></dict></plist>");
     EXPECT_TRUE(renamed) << renamed.error().message;
 }
