@@ -77,7 +77,10 @@ FontAttribute fontFromFaceName(std::u16string_view name) {
     }
     for (const FaceSuffix& known : FaceSuffixes) {
         if (!name.ends_with(known.suffix)) continue;
-        return face(name.substr(0, name.size() - known.suffix.size()), known.bold, known.italic);
+        const std::u16string_view stem = name.substr(0, name.size() - known.suffix.size());
+        const auto named = std::find_if(NamedFamilies.begin(), NamedFamilies.end(),
+                                        [&](const NamedFamily& family) { return family.stem == stem; });
+        return face(named == NamedFamilies.end() ? stem : named->family, known.bold, known.italic);
     }
     return face(name, false, false);
 }
