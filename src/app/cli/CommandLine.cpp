@@ -26,13 +26,15 @@ constexpr std::array Forms = {
                 "Show the snippets whose abbreviation, label, content or note holds every word of TEXT"},
     CommandForm{Command::Expand, "expand", "plume expand ABBREVIATION [--library FILE.json|FILE.csv]",
                 "Print what an abbreviation expands to; its scripts are run"},
+    CommandForm{Command::Settings, "settings", "plume settings [KEY [VALUE]] [--default]",
+                "Show all settings, or one; or set it to VALUE, or back to its default"},
     CommandForm{Command::Doctor, "doctor", "plume doctor",
                 "Check what Plume needs of this desktop, and say what to do about what is missing"},
     CommandForm{Command::Simulate, "simulate", "plume simulate FILE... [--case NAME]",
                 "Play scenarios of typing on a simulated desktop and compare what comes out"},
 };
 
-constexpr const char* GeneralForm = "plume run|list|search|expand|doctor|simulate ...";
+constexpr const char* GeneralForm = "plume run|list|search|expand|settings|doctor|simulate ...";
 
 constexpr const char* Examples = R"(
 Examples:
@@ -41,6 +43,7 @@ Examples:
   plume list                        what there is to type
   plume search arrow                find a snippet
   plume expand ;date                print an expansion
+  plume settings FeedbackSound Pop  change a setting
   plume doctor                      why does nothing happen?
 
 Without --library, the library is $XDG_CONFIG_HOME/plume/library.json (or ~/.config/plume/library.json) when it is
@@ -94,6 +97,9 @@ class Parser {
                 addLibrary(*command);
                 command->add_option("ABBREVIATION", result_.text, "With its group's prefix, or without")->required();
                 break;
+            case Command::Settings:
+                addSettings(*command);
+                break;
             case Command::Simulate:
                 command->add_option("FILE", result_.files, "Scenarios")->required();
                 command->add_option("--case", result_.onlyCase, "Play only the case of this name")->type_name("NAME");
@@ -101,6 +107,15 @@ class Parser {
             case Command::Doctor:
                 break;
         }
+    }
+
+    void addSettings(CLI::App& command) {
+        CLI::Option* key = command.add_option("KEY", result_.request.key, "A setting's name");
+        CLI::Option* value =
+            command.add_option("VALUE", result_.request.value, "A text, a number, true or false; lists as JSON");
+        command.add_flag("--default", result_.request.toDefault, "Forget the value that was set")
+            ->needs(key)
+            ->excludes(value);
     }
 
     void addLibrary(CLI::App& command) {

@@ -6,6 +6,8 @@
 #include <variant>
 #include <vector>
 
+#include "app/cli/SettingsCommand.h"
+
 namespace plume {
 
 // Exit statuses of the program.
@@ -16,7 +18,7 @@ inline constexpr int WrongInput = 2;     // wrong arguments, or a file that does
 inline constexpr int MissingSystem = 3;  // the desktop lacks what a text expander needs
 }  // namespace ExitStatus
 
-enum class Command { Run, Simulate, List, Search, Expand, Doctor };
+enum class Command { Run, Simulate, List, Search, Expand, Settings, Doctor };
 
 struct CommandLine {
     Command command = Command::Run;
@@ -24,6 +26,7 @@ struct CommandLine {
     std::optional<std::string> settings;  // for Run
     std::vector<std::string> files;       // for Simulate
     std::optional<std::string> onlyCase;  // for Simulate
+    SettingsRequest request;              // for Settings
     std::string text;                     // what to search for, or the abbreviation to expand
 };
 

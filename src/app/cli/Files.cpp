@@ -16,6 +16,14 @@ Error cannotRead(const std::filesystem::path& path, const std::string& reason) {
     return Error{path.string() + " cannot be read: " + reason};
 }
 
+// Plume's own in the folder that the variable names, or in that one below the home.
+std::filesystem::path ownFolder(const char* variable, const char* belowHome) {
+    const char* const named = std::getenv(variable);
+    if (named && *named == '/') return std::filesystem::path(named) / "plume";
+    const char* const home = std::getenv("HOME");
+    return home && *home ? std::filesystem::path(home) / belowHome / "plume" : std::filesystem::path();
+}
+
 }  // namespace
 
 Result<std::string> readWholeFile(const std::filesystem::path& path) {
@@ -37,10 +45,12 @@ Result<std::string> readWholeFile(const std::filesystem::path& path) {
 }
 
 std::filesystem::path configurationFolder() {
-    const char* const configuration = std::getenv("XDG_CONFIG_HOME");
-    if (configuration && *configuration == '/') return std::filesystem::path(configuration) / "plume";
-    const char* const home = std::getenv("HOME");
-    return home && *home ? std::filesystem::path(home) / ".config" / "plume" : std::filesystem::path();
+    return ownFolder("XDG_CONFIG_HOME", ".config");
+}
+
+std::filesystem::path backupFolder() {
+    const auto data = ownFolder("XDG_DATA_HOME", ".local/share");
+    return data.empty() ? data : data / "Backups";
 }
 
 std::filesystem::path programFolder() {

@@ -13,6 +13,9 @@ Result<std::string> readWholeFile(const std::filesystem::path& path);
 
 // Where the user's settings and library are: $XDG_CONFIG_HOME/plume, or ~/.config/plume. Empty without a home.
 std::filesystem::path configurationFolder();
+// Where backups are written until the user names another folder: $XDG_DATA_HOME/plume/Backups, or
+// ~/.local/share/plume/Backups. Empty without a home.
+std::filesystem::path backupFolder();
 // What came with this program, found from where the program lies: ../share/plume beside its folder.
 std::filesystem::path dataFolder();
 // Plume's own sounds, of which some may be missing.

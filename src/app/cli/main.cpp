@@ -5,9 +5,11 @@
 
 #include "app/cli/CommandLine.h"
 #include "app/cli/Doctor.h"
+#include "app/cli/Files.h"
 #include "app/cli/LibraryChoice.h"
 #include "app/cli/LibraryCommands.h"
 #include "app/cli/RunCommand.h"
+#include "app/cli/SettingsCommand.h"
 #include "app/cli/SimulateCommand.h"
 
 namespace {
@@ -44,6 +46,9 @@ int run(int argc, const char* const* argv) {
     }
     const auto& line = std::get<CommandLine>(parsed);
     if (line.command == Command::Doctor) return plume::examineDesktop(std::cout);
+    if (line.command == Command::Settings) {
+        return plume::runSettingsCommand(line.request, plume::configurationFolder(), std::cout, std::cerr);
+    }
     if (line.command == Command::Simulate) {
         return plume::simulateFiles(line.files, line.onlyCase, std::cout, std::cerr);
     }

@@ -24,9 +24,9 @@ TEST(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
         const char* says;
         const char* rightForm;
     } cases[] = {
-        {{}, "there is no command", "plume run|list|search|expand|doctor|simulate"},
-        {{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|doctor|simulate"},
-        {{"--verbose"}, "--verbose", "plume run|list|search|expand|doctor|simulate"},
+        {{}, "there is no command", "plume run|list|search|expand|settings|doctor|simulate"},
+        {{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|settings|doctor|simulate"},
+        {{"--verbose"}, "--verbose", "plume run|list|search|expand|settings|doctor|simulate"},
         {{"run", "--librari", "x"}, "--librari", "plume run [--library FILE.json|FILE.csv]"},
         {{"run", "--library"}, "--library", "[--settings FILE.json]"},
         {{"run", "now"}, "now", "plume run [--library"},
@@ -34,6 +34,8 @@ TEST(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
         {{"search"}, "TEXT", "plume search TEXT"},
         {{"expand"}, "ABBREVIATION", "plume expand ABBREVIATION"},
         {{"expand", "a", "b"}, "b", "plume expand ABBREVIATION"},
+        {{"settings", "IsEnabled", "true", "false"}, "false", "plume settings [KEY [VALUE]]"},
+        {{"settings", "--default"}, "KEY", "plume settings [KEY [VALUE]]"},
         {{"doctor", "--all"}, "--all", "plume doctor"},
         {{"simulate"}, "FILE", "plume simulate FILE... [--case NAME]"},
     };
@@ -54,7 +56,7 @@ TEST(Help, HasExamplesOfEveryKind) {
          {"plume run ", "plume list ", "plume search arrow", "plume expand ;date", "plume doctor"}) {
         EXPECT_THAT(result.output, HasSubstr(example));
     }
-    for (const char* command : {"run", "list", "search", "expand", "doctor", "simulate"}) {
+    for (const char* command : {"run", "list", "search", "expand", "settings", "doctor", "simulate"}) {
         const ProgramResult ofCommand = home.run({command, "--help"});
         EXPECT_EQ(ofCommand.status, 0);
         EXPECT_THAT(ofCommand.output, HasSubstr(std::string("plume ") + command));
@@ -193,6 +195,72 @@ TEST(Run, ReadsItsSettingsFirst) {
     const ProgramResult result = home.run({"run", "--settings", file});
     EXPECT_EQ(result.status, 2);
     EXPECT_THAT(result.error, AllOf(HasSubstr(file), HasSubstr("LongTextLength")));
+}
+
+// ---- Settings ----
+
+TEST(Settings, AreShownChangedAndTakenBack) {
+    const ProgramHome home;
+    const struct {
+        std::vector<std::string> change;
+        std::string shown;
+    } cases[] = {
+        {{"IsEnabled"}, "true"},
+        {{"IsEnabled", "false"}, "false"},
+        {{"FeedbackSound", "Pop"}, "Pop"},
+        {{"FeedbackSound", "5"}, "5"},
+        {{"FontSizeDelta", "-2"}, "-2"},
+        {{"RestoreClipboardDelay", "1"}, "1.0"},
+        {{"UseClipboardApplications", R"(["a", "b"])"}, R"(["a","b"])"},
+        {{"CustomApplicationSettings", R"({"xterm": {}})"}, R"({"xterm":{}})"},
+        {{"LastBackupTime", "2026-01-31T18:30:00Z"}, "2026-01-31T18:30:00Z"},
+        {{"IsEnabled", "--default"}, "true"},
+        {{"UndoHotKey"}, ""},
+    };
+    for (const auto& [change, shown] : cases) {
+        std::vector<std::string> arguments{"settings"};
+        arguments.insert(arguments.end(), change.begin(), change.end());
+        if (change.size() > 1) {
+            const ProgramResult changed = home.run(arguments);
+            EXPECT_EQ(changed.status, 0);
+            EXPECT_EQ(changed.output + changed.error, "");
+        }
+        EXPECT_THAT(home.run({"settings", change.front()}).output, HasSubstr(shown + (shown.empty() ? "" : "\n")));
+    }
+    EXPECT_THAT(home.run({"settings"}).output,
+                AllOf(HasSubstr("\n* FeedbackSound                         \"5\"\n"),
+                      HasSubstr("\n  BackupQuantity                        10\n"), HasSubstr("\n  UndoHotKey\n")));
+}
+
+TEST(Settings, AreCheckedBeforeTheyAreKept) {
+    const ProgramHome home;
+    const struct {
+        std::vector<std::string> arguments;
+        const char* says;
+    } cases[] = {
+        {{"settings", "Nonsense", "1"}, "there is no setting \"Nonsense\""},
+        {{"settings", "IsEnabled", "yes"}, "$.IsEnabled: expected true or false"},
+        {{"settings", "BackupQuantity", "-1"}, "$.BackupQuantity: expected a whole number of at least 0"},
+        {{"settings", "UseClipboardApplications", "[1]"}, "$.UseClipboardApplications[0]: expected a string"},
+        {{"settings", "RestoreClipboardDelay", "1e999"}, "expected a number from 0"},
+        {{"settings", "IsEnabled", "true, \"FeedbackSound\": true"}, "expected true or false"},
+    };
+    for (const auto& [arguments, says] : cases) {
+        const ProgramResult result = home.run(arguments);
+        EXPECT_EQ(result.status, 2) << says;
+        EXPECT_THAT(result.error, AllOf(StartsWith("plume: "), HasSubstr(says)));
+        EXPECT_EQ(std::count(result.error.begin(), result.error.end(), '\n'), 1) << result.error;
+    }
+    EXPECT_THAT(home.run({"settings"}).output, Not(HasSubstr("\n* ")));
+}
+
+TEST(Settings, TellOfADamagedStore) {
+    const ProgramHome home;
+    home.write("config/plume/plume.sqlite3", "no database");
+    const ProgramResult result = home.run({"settings", "IsEnabled"});
+    EXPECT_EQ(result.status, 0);
+    EXPECT_EQ(result.output, "true\n");
+    EXPECT_THAT(result.error, HasSubstr("plume.sqlite3 was damaged; it is kept as plume.sqlite3.damaged-"));
 }
 
 TEST(Doctor, FindsWhatIsMissing) {
