@@ -3,6 +3,8 @@
 #include <gmock/gmock.h>
 
 #include <cmath>
+#include <fstream>
+#include <iterator>
 
 #include "library/KnownSettings.h"
 #include "library/SettingsFile.h"
@@ -81,6 +83,14 @@ TEST(KnownSettingsTest, ReadsDatesAndDictionaries) {
     EXPECT_EQ(*font->find<std::int64_t>("NSFontSizeAttribute"), 9);
     for (const char* wrong : {"2026-02-30T00:00:00Z", "2026-01-31T24:00:00Z", "2026-01-31", "2026-01-31T18:30:05Zx"}) {
         EXPECT_FALSE(SettingsFile::read(R"({"LastBackupTime": ")" + std::string(wrong) + "\"}", "s.json")) << wrong;
+    }
+}
+
+TEST(KnownSettingsTest, AreAllOnTheirPage) {
+    std::ifstream file("docs/settings.md");
+    const std::string page{std::istreambuf_iterator<char>(file), {}};
+    for (const KnownSetting& setting : knownSettings()) {
+        EXPECT_THAT(page, testing::HasSubstr("`" + std::string(setting.name) + "`"));
     }
 }
 

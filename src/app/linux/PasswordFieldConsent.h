@@ -18,7 +18,7 @@ namespace plume {
 // Belongs to the main thread.
 class PasswordFieldConsent {
   public:
-    // The setting: true switches accessibility on at every start, false asks no more.
+    // The setting: true switches accessibility on at every start, false asks no more. An answer becomes its value.
     static constexpr const char* Setting = "LetProgramsTellPasswordFields";
 
     struct Dependencies {
@@ -27,6 +27,8 @@ class PasswordFieldConsent {
         RunLoop& mainLoop;
         const UserDefaults& settings;
         std::function<void(const std::string& sentence)> report;
+        // Keeps the answer, so that the user is asked once; without it, the user has to.
+        WritableUserDefaults* kept = nullptr;
     };
 
     // All of them outlive it; no notice is answered any more once it is gone.
@@ -40,6 +42,7 @@ class PasswordFieldConsent {
   private:
     void ask();
     void answer(bool yes);
+    std::string keep(bool yes);
 
     const Dependencies around_;
     Timer again_;
