@@ -4,6 +4,7 @@
 #include <array>
 
 #include "Foundation/Strings.h"
+#include "import/AutoKeyImporter.h"
 #include "import/EspansoImporter.h"
 #include "import/ForeignFile.h"
 
@@ -54,7 +55,8 @@ Result<ImportedLibrary> readWith(const Format* format, const ForeignFile& file) 
 
 Result<ImportedLibrary> importFolder(const std::filesystem::path& folder, const Files& files) {
     if (isEspansoFolder(folder, files)) return importEspansoFolder(folder, files);
-    return Error{folder.string() + ": no library is in this folder; expected that of espanso"};
+    if (isAutoKeyFolder(folder, files)) return importAutoKeyFolder(folder, files);
+    return Error{folder.string() + ": no library is in this folder; expected that of espanso or AutoKey"};
 }
 
 }  // namespace

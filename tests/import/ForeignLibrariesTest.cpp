@@ -75,8 +75,9 @@ std::string shownWhole(const Result<ImportedLibrary>& library) {
 TEST(ForeignLibraries, BecomeWhatIsExpected) {
     SimulatedFiles files;
     copyDataTo(files);
-    for (const char* const name : {"espanso/all", "espanso/single/text.yml", "espanso/single/broken.yml",
-                                   "espanso/single/variables.yml", "espanso/all/match/packages/greek"}) {
+    for (const char* const name :
+         {"espanso/all", "espanso/single/text.yml", "espanso/single/broken.yml", "espanso/single/variables.yml",
+          "espanso/all/match/packages/greek", "autokey", "autokey-broken"}) {
         const fs::path expected = (Data / name).string() + ".expected";
         const std::string shown = shownWhole(importLibrary(fs::path("/") / name, files));
         if (std::getenv("PLUME_WRITE_EXPECTED")) std::ofstream(expected) << shown;

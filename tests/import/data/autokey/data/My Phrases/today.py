@@ -1,0 +1,2 @@
+import datetime
+print("it's", datetime.date.today())
