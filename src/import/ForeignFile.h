@@ -28,6 +28,7 @@ using Importer = Result<ImportedLibrary>(const ForeignFile& file);
 
 Importer importAutoHotkey;
 Importer importAutomaton;
+Importer importBeeftext;
 Importer importCsv;
 Importer importEspanso;
 Importer importGlossary;
@@ -35,5 +36,8 @@ Importer importPropertyList;
 Importer importReadableLibrary;
 Importer importTextExpander;
 Importer importTypeIt4Me;
+
+// Turns variables of Beeftext, which its exports as CSV hold, into placeholders.
+void convertBeeftextVariables(ImportedLibrary& library);
 
 }  // namespace plume

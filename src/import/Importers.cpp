@@ -12,6 +12,19 @@ namespace plume {
 
 namespace {
 
+// Plume's own library is a list, that of Beeftext is not.
+Result<ImportedLibrary> importJson(const ForeignFile& file) {
+    const std::size_t start = file.bytes.find_first_not_of("\xef\xbb\xbf \t\r\n");
+    const bool isObject = start != std::string_view::npos && file.bytes[start] == '{';
+    return isObject ? importBeeftext(file) : importReadableLibrary(file);
+}
+
+Result<ImportedLibrary> importSeparatedValues(const ForeignFile& file) {
+    Result<ImportedLibrary> library = importCsv(file);
+    if (library) convertBeeftextVariables(library.value());
+    return library;
+}
+
 struct Format {
     const char* extension;  // in lower case
     Importer* importer;
@@ -21,9 +34,9 @@ struct Format {
 constexpr std::array Formats = {
     Format{"ahk", importAutoHotkey},
     Format{"autotyper", importAutomaton},
-    Format{"csv", importCsv},
+    Format{"csv", importSeparatedValues},
     Format{"glossary", importGlossary},
-    Format{"json", importReadableLibrary},
+    Format{"json", importJson},
     Format{"plist", importPropertyList},
     Format{"tedist", importTextExpander},
     Format{"textexpander", importTextExpander},

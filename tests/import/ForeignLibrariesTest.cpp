@@ -77,7 +77,8 @@ TEST(ForeignLibraries, BecomeWhatIsExpected) {
     copyDataTo(files);
     for (const char* const name :
          {"espanso/all", "espanso/single/text.yml", "espanso/single/broken.yml", "espanso/single/variables.yml",
-          "espanso/all/match/packages/greek", "autokey", "autokey-broken"}) {
+          "espanso/all/match/packages/greek", "autokey", "autokey-broken", "beeftext/comboList.json",
+          "beeftext/broken.json", "beeftext/export.csv"}) {
         const fs::path expected = (Data / name).string() + ".expected";
         const std::string shown = shownWhole(importLibrary(fs::path("/") / name, files));
         if (std::getenv("PLUME_WRITE_EXPECTED")) std::ofstream(expected) << shown;
