@@ -6,6 +6,7 @@
 
 #include "Foundation/Strings.h"
 #include "Foundation/archive/PropertyListReader.h"
+#include "Foundation/archive/TypedStream.h"
 #include "Foundation/text/HTMLImport.h"
 #include "import/ForeignFile.h"
 #include "import/PropertyListFields.h"
@@ -90,7 +91,7 @@ class TextExpanderReading {
 
     void setContent(Snippet& snippet, const PropertyList& entry) {
         const std::int64_t type = integerAt(entry, "snippetType").value_or(0);
-        if (entry.find("richText")) remarks_.add(snippet, "its formatting is not read, its text is taken");
+        if (setRichText(snippet, entry)) return;
         const auto plain = textAt(entry, "plainText");
         if (type == Html) {
             snippet.setContentType(ContentType::RichText);
@@ -103,6 +104,20 @@ class TextExpanderReading {
             snippet.setPlainTextContent(plain);
             remarks_.add(snippet, "its type " + std::to_string(type) + " is not known; it is taken as plain text");
         }
+    }
+
+    // The formatted text, when there is one that can be read.
+    bool setRichText(Snippet& snippet, const PropertyList& entry) {
+        const auto* data = entry.find<ArchivedData>("richText");
+        if (!data) return false;
+        Result<AttributedString> text = attributedStringFromTypedStream(data->bytes);
+        if (!text) {
+            remarks_.add(snippet, "its formatting cannot be read (" + text.error().message + "), its text is taken");
+            return false;
+        }
+        snippet.setContentType(ContentType::RichText);
+        snippet.setRichTextContent(std::move(text).value());
+        return true;
     }
 
     void makeGroups() {

@@ -32,10 +32,12 @@ TEST(PropertyListImporters, ReadWhatOtherProgramsWrite) {
          "js|1 + 1|A sum\n"
          "pct|100% of 【field:x value:y】|\n"
          "ht|a bold 【date:yyyy】|\n"
-         "odd|text|\n",
+         "odd|text|\n"
+         "rich|plain|\n"
+         "broken|kept 【date:yyyy】|\n",
          "\"js\": it is JavaScript, which Plume does not run; it is kept and expands to nothing\n"
          "\"odd\": its type 9 is not known; it is taken as plain text\n"
-         "the note of the group Greetings is left out\n"},
+         "\"broken\": its formatting cannot be read"},
         {"settings.textexpbackup",
          "[First]\nb|B|\na|A|\nd|D|\ne|E|\n[Second]\na|A|\n[TextExpander Snippets]\n[settings]\nc|C|\n",
          "1 snippet was in no group and is put into one named settings\n"},
@@ -77,6 +79,8 @@ TEST(PropertyListImporters, KeepHowGroupsAndSnippetsExpand) {
     EXPECT_EQ(group.items()[3]->contentType(), ContentType::ShellScript);
     EXPECT_EQ(group.items()[4]->contentType(), ContentType{4});
     EXPECT_EQ(group.items()[6]->contentType(), ContentType::RichText);
+    EXPECT_EQ(group.items()[8]->contentType(), ContentType::RichText);
+    EXPECT_EQ(group.items()[9]->contentType(), ContentType::RichText);
     const auto clips = importedFile("clips.typeit4me");
     EXPECT_EQ(clips.value().groups[0]->items()[0]->contentType(), ContentType::RichText);
     EXPECT_EQ(importedFile("words.glossary").value().groups[0]->expandTrigger(), ExpandTrigger::DelimiterKept);
