@@ -66,7 +66,7 @@ class Session {
         if (!request_.key) return showAll(settings_, output_), ExitStatus::Success;
         const KnownSetting* setting = findKnownSetting(*request_.key);
         if (!setting) {
-            return refuse("there is no setting \"" + *request_.key + "\"; \"plume settings\" shows all",
+            return refuse("there is no setting \"" + *request_.key + R"("; "plume settings" shows all)",
                           ExitStatus::WrongInput);
         }
         if (request_.toDefault) return ended(settings_.removeObject(setting->name));

@@ -38,7 +38,7 @@ void PasswordFieldConsent::answer(bool yes) {
         keep(yes));
 }
 
-std::string PasswordFieldConsent::keep(bool yes) {
+std::string PasswordFieldConsent::keep(bool yes) const {
     const std::string value = yes ? "true" : "false";
     if (!around_.kept)
         return "To keep this answer, set \"" + std::string(Setting) + "\" to " + value + " in the settings file.";

@@ -42,7 +42,7 @@ class PasswordFieldConsent {
   private:
     void ask();
     void answer(bool yes);
-    std::string keep(bool yes);
+    std::string keep(bool yes) const;
 
     const Dependencies around_;
     Timer again_;
