@@ -5,6 +5,7 @@
 #include <set>
 
 #include "Foundation/Strings.h"
+#include "Foundation/json/JsonPlace.h"
 
 namespace plume {
 
@@ -42,12 +43,6 @@ std::string explanation(const Json::exception& error) {
     return place == std::string::npos ? message : message.substr(place + 2);
 }
 
-bool isPlainKey(const std::string& key) {
-    return !key.empty() && std::all_of(key.begin(), key.end(), [](char c) {
-        return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') || c == '_';
-    });
-}
-
 }  // namespace
 
 JsonNode JsonNode::parse(std::string_view text, const std::string& fileName) {
@@ -58,16 +53,20 @@ JsonNode JsonNode::parse(std::string_view text, const std::string& fileName) {
     } catch (const Json::exception& error) {
         throw JsonError(fileName + ": this is no JSON: " + explanation(error));
     }
-    return {std::move(document), std::make_shared<const std::string>(fileName), "$"};
+    auto source = std::make_shared<const Source>(Source{fileName, std::string(text)});
+    return {std::move(document), std::move(source), "$"};
 }
 
 void JsonNode::fail(const std::string& expected) const {
-    throw JsonError(*fileName_ + ": at " + path_ + ": " + expected);
+    const bool hasLines = source_->text.find('\n') != std::string::npos;
+    const auto line = hasLines ? lineOfJsonPath(source_->text, path_) : std::nullopt;
+    const std::string place = line ? "line " + std::to_string(*line) + ", at " : "at ";
+    throw JsonError(source_->fileName + ": " + place + path_ + ": " + expected);
 }
 
 JsonNode JsonNode::child(const Json& value, const std::string& step) const {
     // Shares the ownership of the whole document.
-    return {std::shared_ptr<const Json>(value_, &value), fileName_, path_ + step};
+    return {std::shared_ptr<const Json>(value_, &value), source_, path_ + step};
 }
 
 bool JsonNode::boolean() const {
@@ -115,7 +114,7 @@ std::vector<JsonNode> JsonNode::elements() const {
     if (!value_->is_array()) fail("expected a list");
     std::vector<JsonNode> nodes;
     nodes.reserve(value_->size());
-    for (const Json& element : *value_) nodes.push_back(child(element, "[" + std::to_string(nodes.size()) + "]"));
+    for (const Json& element : *value_) nodes.push_back(child(element, jsonStep(nodes.size())));
     return nodes;
 }
 
@@ -123,7 +122,7 @@ std::vector<std::pair<std::string, JsonNode>> JsonNode::members() const {
     if (!value_->is_object()) fail("expected an object");
     std::vector<std::pair<std::string, JsonNode>> found;
     for (const auto& [key, value] : value_->items()) {
-        found.emplace_back(key, child(value, isPlainKey(key) ? "." + key : "[" + Json(key).dump() + "]"));
+        found.emplace_back(key, child(value, jsonStep(key)));
     }
     return found;
 }
@@ -146,7 +145,7 @@ bool JsonObject::has(std::string_view key) const {
 std::optional<JsonNode> JsonObject::find(std::string_view key) const {
     const auto found = node_.value().find(key);
     if (found == node_.value().end()) return std::nullopt;
-    return node_.child(*found, "." + std::string(key));
+    return node_.child(*found, jsonStep(std::string(key)));
 }
 
 }  // namespace plume

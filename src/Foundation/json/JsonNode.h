@@ -51,18 +51,23 @@ class JsonNode {
     // Where it stands in the document, such as "$[0].items[2].rtf".
     const std::string& path() const { return path_; }
 
-    // "library.json: at $[0].items[2].rtf: expected …".
+    // "library.json: line 14, at $[0].items[2].rtf: expected …".
     [[noreturn]] void fail(const std::string& expected) const;
 
   private:
     friend class JsonObject;
-    JsonNode(std::shared_ptr<const nlohmann::ordered_json> value, std::shared_ptr<const std::string> fileName,
+    // Kept for messages.
+    struct Source {
+        std::string fileName;
+        std::string text;
+    };
+    JsonNode(std::shared_ptr<const nlohmann::ordered_json> value, std::shared_ptr<const Source> source,
              std::string path)
-        : value_(std::move(value)), fileName_(std::move(fileName)), path_(std::move(path)) {}
+        : value_(std::move(value)), source_(std::move(source)), path_(std::move(path)) {}
     JsonNode child(const nlohmann::ordered_json& value, const std::string& step) const;
 
     std::shared_ptr<const nlohmann::ordered_json> value_;
-    std::shared_ptr<const std::string> fileName_;
+    std::shared_ptr<const Source> source_;
     std::string path_;
 };
 
