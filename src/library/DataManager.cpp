@@ -69,7 +69,7 @@ void DataManager::scheduleSave(double delay) {
 }
 
 Result<void> DataManager::writeJournal() {
-    const auto written = stored_.recordChanges(library_);
+    auto written = stored_.recordChanges(library_);
     if (written && stored_.journalLength() > LongestJournal) saveInBackground();
     return written;
 }
@@ -94,13 +94,19 @@ Result<void> DataManager::saveData() {
     return Error{"the store is written by another process all the time"};
 }
 
+Result<void> DataManager::saveRest() {
+    // Nobody waits for what is under way any more.
+    saving_ = false;
+    if (auto recorded = stored_.recordChanges(library_); !recorded) return recorded;
+    return stored_.journalLength() > 0 ? saveData() : Result<void>();
+}
+
 void DataManager::saveInBackground() {
     saveTimer_.cancel();
     if (saving_) {
         saveAgain_ = true;
         return;
     }
-    if (!around_.inBackground) return reportOnce(saveData());
     if (const auto recorded = stored_.recordChanges(library_); !recorded) {
         reportOnce(recorded);
         return scheduleSave(DelayOfRepeatedSave);
@@ -111,8 +117,12 @@ void DataManager::saveInBackground() {
         LibraryStorage::Written written = LibraryStorage::Outcome(LibraryStorage::Outdated());
     };
     const auto work = std::make_shared<Work>(stored_.beginSave());
+    const auto save = [work] { work->written = work->save.run(); };
+    const auto ended = [this, work] { saveEnded(work->written); };
     saving_ = true;
-    around_.inBackground([work] { work->written = work->save.run(); }, [this, work] { saveEnded(work->written); });
+    if (around_.inBackground) return around_.inBackground(save, ended);
+    save();
+    ended();
 }
 
 void DataManager::saveEnded(const LibraryStorage::Written& written) {
@@ -161,8 +171,12 @@ void DataManager::raise(ZDEvent<LibraryEvent>& event) {
 
 std::string DataManager::archivedDataIncludingPreferences(bool includingPreferences) const {
     LibraryContents contents = library_;
-    if (includingPreferences) contents.preferences = preferencesOfLibrary(around_.settings);
+    if (includingPreferences) contents.preferences = preferences();
     return libraryArchive(contents);
+}
+
+PropertyList::Dictionary DataManager::preferences() const {
+    return preferencesOfLibrary(around_.settings);
 }
 
 std::string DataManager::dataFromSnippetGroup(const std::shared_ptr<SnippetGroup>& group) const {

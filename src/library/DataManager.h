@@ -37,12 +37,12 @@ class DataManager {
 
     // Where things lie that are looked for at the first start, and where damaged ones are put. An empty path: nowhere.
     struct Places {
-        Path sampleLibrary;
-        Path ownEarlierLibrary;     // a readable library, which then stands in place of the sample
-        Path sandboxedPreferences;  // a property list with a library under "Data"
-        Path textExpanderSettings;
-        Path systemSubstitutions;
-        Path damagedFiles;  // a folder
+        Path sampleLibrary = {};
+        Path ownEarlierLibrary = {};     // a readable library, which then stands in place of the sample
+        Path sandboxedPreferences = {};  // a property list with a library under "Data"
+        Path textExpanderSettings = {};
+        Path systemSubstitutions = {};
+        Path damagedFiles = {};  // a folder
     };
 
     struct Dependencies {
@@ -89,8 +89,12 @@ class DataManager {
     // Writes the whole library into the store now. While a save is on its way in the background, the journal alone is
     // written, and the save follows.
     Result<void> saveData();
+    // At the end: saves if anything was changed since the last time.
+    Result<void> saveRest();
 
     std::string archivedDataIncludingPreferences(bool includingPreferences) const;
+    // The settings that travel with a library.
+    PropertyList::Dictionary preferences() const;
     std::string dataFromSnippetGroup(const std::shared_ptr<SnippetGroup>& group) const;
     // By the ending of the path: "plume" is an archive, "csv" a list; others write nothing.
     Result<void> backupToFile(const Path& path, bool includePrefs = false);
@@ -100,6 +104,8 @@ class DataManager {
     // Returns what could not be carried over whole. After an error nothing was imported. The caller tells of the change
     // by notifyDataChanged().
     Result<std::vector<std::string>> importDataFromFile(const Path& path);
+    // The same for what was read already.
+    void append(const ImportedLibrary& imported);
     void generateSnippetSamples();
     // Pairs of abbreviation and content; one without a content is left out.
     std::shared_ptr<SnippetGroup> generateSnippetGroupSamples(const std::u16string& name,
@@ -127,11 +133,10 @@ class DataManager {
     void keepDamagedArchive(const std::string& bytes, const std::string& damage);
     void offerBackup();
     bool migrateSandboxedLibrary();
-    void makeFirstLibrary();
+    Result<void> makeFirstLibrary();
     void importAtFirstStart(const Path& path);
     Result<void> completeIdentity();
 
-    void append(const ImportedLibrary& imported);
     void setGroups(const SnippetGroups& groups);
     void takeDownload(const LibraryContents& file);
     void replaceLibrary(LibraryContents contents);

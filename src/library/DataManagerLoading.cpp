@@ -28,7 +28,7 @@ Result<void> DataManager::readStored(bool storeWasDamaged) {
     } else if (storeWasDamaged) {
         offerBackup();
     } else if (library_.snippetGroups.empty() && !migrateSandboxedLibrary()) {
-        makeFirstLibrary();
+        return makeFirstLibrary();
     }
     return {};
 }
@@ -36,7 +36,8 @@ Result<void> DataManager::readStored(bool storeWasDamaged) {
 // The bytes stay for whoever can read them; the backups have what was there before.
 void DataManager::keepDamagedArchive(const std::string& bytes, const std::string& damage) {
     const Path file = around_.places.damagedFiles / ("Damaged Library " + fileNameTime(currentDate()) + ".plume");
-    const auto kept = around_.files.write(file, bytes);
+    const auto made = around_.files.createFolder(file.parent_path());
+    const auto kept = made ? around_.files.write(file, bytes) : made;
     around_.report("The library cannot be read: " + damage + ". " +
                    (kept ? "It is kept in " + file.string() + "." : kept.error().message));
     offerBackup();
@@ -64,16 +65,19 @@ bool DataManager::migrateSandboxedLibrary() {
     return true;
 }
 
-void DataManager::makeFirstLibrary() {
+Result<void> DataManager::makeFirstLibrary() {
     emptyData_ = true;
     const Path& own = around_.places.ownEarlierLibrary;
     if (!own.empty() && around_.files.exists(own)) {
-        importAtFirstStart(own);
+        // With a mistake in it, nothing else takes its place.
+        const auto imported = importDataFromFile(own);
+        if (!imported) return imported.error();
     } else {
         generateSnippetSamples();
     }
     importAtFirstStart(around_.places.textExpanderSettings);
     importAtFirstStart(around_.places.systemSubstitutions);
+    return {};
 }
 
 void DataManager::generateSnippetSamples() {

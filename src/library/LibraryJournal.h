@@ -17,6 +17,6 @@ std::string journalEntry(const LibraryContents& library, const LibraryDelta& del
 
 // Changes the library as the entry says. One that does not fit the library, or is damaged, changes nothing and is an
 // error.
-Result<void> applyJournalEntry(std::string_view entry, LibraryContents& library);
+Result<void> applyJournalEntry(std::string_view bytes, LibraryContents& library);
 
 }  // namespace plume

@@ -207,17 +207,17 @@ void LibrarySync::syncDispatchSourceEventHandler() {
 
 void LibrarySync::syncDownload() {
     if (!directory_) return;
-    auto file = readFile();
+    const auto file = readFile();
     if (!file) return;
     const auto& version = file->contents.versionUUIDString;
     if (version && version == around_.library().versionUUIDString) markSynced();
     if (version && previousVersionUUIDStrings_.contains(*version)) return;
     previousVersionUUIDStrings_.clear();
     if (!version || version == around_.library().versionUUIDString) return;
-    takeOver(*std::move(file));
+    takeOver(*file);
 }
 
-void LibrarySync::takeOver(SyncFile file) {
+void LibrarySync::takeOver(const SyncFile& file) {
     if (hasUnsentChanges()) {
         const auto kept = around_.backups.backup();
         if (!kept) {

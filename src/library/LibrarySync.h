@@ -66,10 +66,10 @@ class LibrarySync {
     Files::Path syncDataFile() const { return *directory_ / "Plume" / "Data.plume"; }
     void startSync(bool interactive);
     bool makeFolder();
-    void compareWithFile(bool interactive);
+    void compareWithFile(bool localIsLater);
     void syncUpload();
     void syncDownload();
-    void takeOver(SyncFile file);
+    void takeOver(const SyncFile& file);
     void takeOverPreferences(const LibraryContents& contents);
     void monitorSyncDataFile();
     void waitForFolder();
