@@ -32,6 +32,7 @@ Importer importBeeftext;
 Importer importCsv;
 Importer importEspanso;
 Importer importGlossary;
+Importer importPlume;
 Importer importPropertyList;
 Importer importReadableLibrary;
 Importer importTextExpander;

@@ -38,6 +38,7 @@ constexpr std::array Formats = {
     Format{"glossary", importGlossary},
     Format{"json", importJson},
     Format{"plist", importPropertyList},
+    Format{"plume", importPlume},
     Format{"tedist", importTextExpander},
     Format{"textexpander", importTextExpander},
     Format{"textexpbackup", importTextExpander},
