@@ -234,6 +234,41 @@ TEST_F(Program, RunsOncePerDisplay) {
     EXPECT_TRUE(plume_->process().isRunning());
 }
 
+TEST_F(Program, FollowsTheFileOfItsLibrary) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    const auto write = [&](const std::string& content) {
+        std::ofstream(rig_->directory() / "library.json") << content;
+    };
+    const auto expandsTo = [&](const std::string& expected) {
+        target->clear();
+        rig_->keyboard().tap(Key::Home);
+        rig_->keyboard().type("x ;sig");
+        return target->awaitText(expected) == expected;
+    };
+    write(
+        R"([{"abbreviationPrefix": ";", "expandAfter": 2, "items": [{"abbreviation": "sig", "content": "changed"}]}])");
+    EXPECT_TRUE(waitUntil([&] { return expandsTo("x changed"); }, Bound)) << log();
+    write("[\n{\"items\": 5}]");
+    EXPECT_TRUE(
+        waitUntil([&] { return log().find("line 2, at $[0].items: expected a list") != std::string::npos; }, Bound))
+        << log();
+    EXPECT_TRUE(expandsTo("x changed")) << log();
+}
+
+TEST_F(Program, TakesOverWhatOthersChangeInTheUsersLibrary) {
+    start("");
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    const auto add = rig_->session().start({plumeProgram(), "add", "omw;", "on my way"}, "plume");
+    ASSERT_EQ(add->waitForExit(Bound), 0) << add->logTail();
+    const auto expands = [&] {
+        target->clear();
+        rig_->keyboard().tap(Key::Home);
+        rig_->keyboard().type("x omw;");
+        return target->awaitText("x on my way") == "x on my way";
+    };
+    EXPECT_TRUE(waitUntil(expands, Bound)) << log();
+}
+
 TEST_F(Program, DoctorFindsAllThatIsNeededHere) {
     const auto doctor = rig_->session().start({plumeProgram(), "doctor"}, "doctor");
     EXPECT_EQ(doctor->waitForExit(Milliseconds(5'000)), 0) << doctor->logTail();

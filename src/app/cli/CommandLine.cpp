@@ -26,6 +26,22 @@ constexpr std::array Forms = {
                 "Show the snippets whose abbreviation, label, content or note holds every word of TEXT"},
     CommandForm{Command::Expand, "expand", "plume expand ABBREVIATION [--library FILE.json|FILE.csv]",
                 "Print what an abbreviation expands to; its scripts are run"},
+    CommandForm{Command::Add, "add", "plume add ABBREVIATION TEXT [--group NAME] [--label TEXT]",
+                "Add a snippet to your library"},
+    CommandForm{Command::Remove, "remove", "plume remove ABBREVIATION", "Remove a snippet from your library"},
+    CommandForm{Command::Edit, "edit", "plume edit", "Change your library as JSON in $VISUAL or $EDITOR"},
+    CommandForm{Command::Import, "import", "plume import FILE|FOLDER... [--placeholders textexpander]",
+                "Add the snippets of other files, and of other text expanders, to your library"},
+    CommandForm{Command::Export, "export",
+                "plume export FILE.plume|FILE.csv|FILE.json [--group NAME] [--with-preferences]",
+                "Write your library, or one group of it, into a file"},
+    CommandForm{Command::Convert, "convert",
+                "plume convert FILE|FOLDER FILE.plume|FILE.csv|FILE.json [--placeholders textexpander]",
+                "Write what import would read as a file, without touching your library"},
+    CommandForm{Command::Backup, "backup", "plume backup", "Make a backup of your library now"},
+    CommandForm{Command::Backups, "backups", "plume backups", "Show the backups, the newest last"},
+    CommandForm{Command::Restore, "restore", "plume restore FILE|latest",
+                "Put a backup, or another file, in place of your library, after a backup of it"},
     CommandForm{Command::Settings, "settings", "plume settings [KEY [VALUE]] [--default]",
                 "Show all settings, or one; or set it to VALUE, or back to its default"},
     CommandForm{Command::Doctor, "doctor", "plume doctor",
@@ -34,21 +50,25 @@ constexpr std::array Forms = {
                 "Play scenarios of typing on a simulated desktop and compare what comes out"},
 };
 
-constexpr const char* GeneralForm = "plume run|list|search|expand|settings|doctor|simulate ...";
+constexpr const char* GeneralForm =
+    "plume "
+    "run|list|search|expand|add|remove|edit|import|export|convert|backup|backups|restore|settings|doctor|simulate ...";
 
 constexpr const char* Examples = R"(
 Examples:
-  plume run                         expand your library, or the sample library while you have none
-  plume run --library mine.json     expand the snippets of this file
+  plume run                         expand your snippets in every program
+  plume run --library mine.json     expand the snippets of this file, also when it changes
   plume list                        what there is to type
   plume search arrow                find a snippet
   plume expand ;date                print an expansion
   plume settings FeedbackSound Pop  change a setting
+  plume add btw "by the way"        add a snippet
+  plume import old.csv              take over the snippets of a file
+  plume restore latest              go back to the newest backup
   plume doctor                      why does nothing happen?
 
-Without --library, the library is $XDG_CONFIG_HOME/plume/library.json (or ~/.config/plume/library.json) when it is
-there, else the sample library that comes with Plume.
-A library in CSV has an abbreviation, a text and a label on each line, without a heading.
+Your library and settings are kept in $XDG_CONFIG_HOME/plume (or ~/.config/plume). The first command that needs the
+library begins it with examples. A library in CSV has an abbreviation, a text and a label on each line, without a heading.
 
 Exit status: 0 all is well, 1 it did not work, 2 wrong arguments or a file with a mistake, 3 the desktop lacks
 something that Plume needs.)";
@@ -104,6 +124,35 @@ class Parser {
                 command->add_option("FILE", result_.files, "Scenarios")->required();
                 command->add_option("--case", result_.onlyCase, "Play only the case of this name")->type_name("NAME");
                 break;
+            case Command::Add:
+                command->add_option("ABBREVIATION", result_.text, "What will be typed")->required();
+                command->add_option("TEXT", result_.content, "What will stand there instead")->required();
+                command->add_option("--group", result_.group, "The group to put it into")->type_name("NAME");
+                command->add_option("--label", result_.label, "What lists call it")->type_name("TEXT");
+                break;
+            case Command::Remove:
+                command->add_option("ABBREVIATION", result_.text, "With its group's prefix, or without")->required();
+                break;
+            case Command::Import:
+                command->add_option("FILE", result_.files, "Libraries, or folders of them")->required();
+                addPlaceholders(*command);
+                break;
+            case Command::Export:
+                command->add_option("FILE", result_.files, "What to write")->required()->expected(1);
+                command->add_option("--group", result_.group, "Only the group of this name")->type_name("NAME");
+                command->add_flag("--with-preferences", result_.withPreferences,
+                                  "Also the settings that belong to a library; only in a .plume file");
+                break;
+            case Command::Convert:
+                command->add_option("FILES", result_.files, "What to read, and what to write")->required()->expected(2);
+                addPlaceholders(*command);
+                break;
+            case Command::Restore:
+                command->add_option("FILE", result_.files, "A backup, or latest")->required()->expected(1);
+                break;
+            case Command::Edit:
+            case Command::Backup:
+            case Command::Backups:
             case Command::Doctor:
                 break;
         }
@@ -116,6 +165,15 @@ class Parser {
         command.add_flag("--default", result_.request.toDefault, "Forget the value that was set")
             ->needs(key)
             ->excludes(value);
+    }
+
+    void addPlaceholders(CLI::App& command) {
+        command
+            .add_option_function<std::string>(
+                "--placeholders", [this](const std::string&) { result_.textExpanderPlaceholders = true; },
+                "Whose placeholders the contents of CSV files hold")
+            ->check(CLI::IsMember({"textexpander"}))
+            ->type_name("textexpander");
     }
 
     void addLibrary(CLI::App& command) {

@@ -18,16 +18,38 @@ inline constexpr int WrongInput = 2;     // wrong arguments, or a file that does
 inline constexpr int MissingSystem = 3;  // the desktop lacks what a text expander needs
 }  // namespace ExitStatus
 
-enum class Command { Run, Simulate, List, Search, Expand, Settings, Doctor };
+enum class Command {
+    Run,
+    List,
+    Search,
+    Expand,
+    Add,
+    Remove,
+    Edit,
+    Import,
+    Export,
+    Convert,
+    Backup,
+    Backups,
+    Restore,
+    Settings,
+    Doctor,
+    Simulate
+};
 
 struct CommandLine {
     Command command = Command::Run;
-    std::optional<std::string> library;   // for Run, List, Search and Expand
-    std::optional<std::string> settings;  // for Run
-    std::vector<std::string> files;       // for Simulate
-    std::optional<std::string> onlyCase;  // for Simulate
-    SettingsRequest request;              // for Settings
-    std::string text;                     // what to search for, or the abbreviation to expand
+    std::optional<std::string> library;     // for Run, List, Search and Expand
+    std::optional<std::string> settings;    // for Run
+    std::vector<std::string> files;         // what is read or written
+    std::optional<std::string> onlyCase;    // for Simulate
+    SettingsRequest request;                // for Settings
+    std::string text;                       // what to search for, or the abbreviation
+    std::string content;                    // for Add
+    std::optional<std::string> group;       // for Add and Export
+    std::optional<std::string> label;       // for Add
+    bool withPreferences = false;           // for Export
+    bool textExpanderPlaceholders = false;  // for Import and Convert
 };
 
 // Nothing is left to do but to print this and to end.

@@ -265,10 +265,12 @@ class Examination {
     }
 
     void examineLibrary() {
-        const auto library = openLibrary(std::nullopt);
+        const auto library =
+            openLibrary(std::nullopt, [this](const std::string& sentence) { warn("library", sentence); });
         if (!library) return bad("library", library.error().message);
-        good("library",
-             std::to_string(library.value().snippetCount()) + " snippets in " + library.value().file.string());
+        std::size_t snippets = 0;
+        for (const auto& group : library.value().groups) snippets += group->items().size();
+        good("library", std::to_string(snippets) + " snippets in " + library.value().file.string());
     }
 
     std::ostream& output_;

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -15,12 +16,11 @@ namespace plume {
 struct ChosenLibrary {
     std::vector<std::shared_ptr<SnippetGroup>> groups;
     std::filesystem::path file;
-
-    std::size_t snippetCount() const;
 };
 
-// The named file, read by its ending; without one the user's own library, else the sample. A file that is
+// The named file, of any kind that can be imported; without one the user's own library, for reading. A library that is
 // there and cannot be read is an error, never another library. The error names the file, and the place in it.
-Result<ChosenLibrary> openLibrary(const std::optional<std::string>& named);
+Result<ChosenLibrary> openLibrary(const std::optional<std::string>& named,
+                                  const std::function<void(const std::string& sentence)>& report);
 
 }  // namespace plume

@@ -4,6 +4,7 @@
 
 #include <atomic>
 #include <csignal>
+#include <filesystem>
 #include <memory>
 #include <mutex>
 #include <ostream>
@@ -14,22 +15,29 @@
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
 #include "app/cli/InstanceLock.h"
+#include "app/cli/RunSources.h"
 #include "app/linux/LinuxApplications.h"
 #include "app/linux/LinuxPort.h"
 #include "app/linux/PasswordFieldConsent.h"
+#include "library/MemoryUserDefaults.h"
 #include "library/SettingsFile.h"
 
 namespace plume {
 
 namespace {
 
-using Settings = std::shared_ptr<const UserDefaults>;
+// Null when none is named.
+Result<std::unique_ptr<FollowedLibrary>> openFile(const std::optional<std::string>& named, const Files& files) {
+    if (!named) return std::unique_ptr<FollowedLibrary>();
+    return FollowedLibrary::open(std::filesystem::absolute(*named), files);
+}
 
-Result<Settings> readSettings(const std::optional<std::string>& file) {
-    if (!file) return SettingsFile::registeredDefaults();
-    const Result<std::string> text = readWholeFile(*file);
+// Null when none are named.
+Result<std::shared_ptr<const UserDefaults>> readSettings(const std::optional<std::string>& named) {
+    if (!named) return std::shared_ptr<const UserDefaults>();
+    const Result<std::string> text = readWholeFile(*named);
     if (!text) return text.error();
-    return SettingsFile::read(text.value(), *file);
+    return SettingsFile::read(text.value(), *named);
 }
 
 // Writes sentences for the user, from any thread.
@@ -59,8 +67,8 @@ FileDescriptor endSignals() {
 
 class Run {
   public:
-    Run(LinuxPort& port, const ChosenLibrary& library, const UserDefaults& settings, std::ostream& output, Voice& voice)
-        : port_(port), library_(library), settings_(settings), output_(output), voice_(voice) {}
+    Run(LinuxPort& port, RunSources& sources, std::ostream& output, Voice& voice)
+        : port_(port), sources_(sources), output_(output), voice_(voice) {}
 
     int untilAskedToEnd(int signals) {
         const Subscription source = port_.mainLoop().addSource(signals, [this, signals] {
@@ -72,10 +80,15 @@ class Run {
             voice_.say("The X server is gone.");
             end(ExitStatus::Failure);
         });
-        PasswordFieldConsent consent({port_.accessibility(), port_.ports().notices, port_.mainLoop(), settings_,
-                                      [this](const std::string& sentence) { voice_.say(sentence); }});
+        PasswordFieldConsent consent(
+            {port_.accessibility(), port_.ports().notices, port_.mainLoop(), sources_.userDefaults(),
+             [this](const std::string& sentence) { voice_.say(sentence); }, sources_.writableSettings()});
         consent.begin();
-        std::thread tapThread([this] { expand(); });
+        const std::string description = sources_.description();
+        std::thread tapThread([this, description, groups = sources_.groups(), settings = sources_.settings()] {
+            settings_.registerDefaults(settings);
+            expand(groups, description);
+        });
         port_.mainLoop().run();
         port_.tapLoop().stop();
         tapThread.join();
@@ -89,16 +102,17 @@ class Run {
     }
 
     // The tap thread.
-    void expand() {
+    void expand(const SnippetGroups& groups, const std::string& description) {
         {
             Composition composition(port_.ports(), environment());
-            composition.setSnippetGroups(library_.groups);
+            composition.setSnippetGroups(groups);
             composition.loadPreferences();
             MacInputService& service = composition.inputService();
             port_.mainLoop().perform([this, &service] {
                 service_ = &service;
                 keyboardGivenUp_ = service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost);
             });
+            port_.mainLoop().perform([this, &composition] { feed(composition); });
             composition.start();
             // What happens to the keyboard during a sleep, nobody hears.
             port_.setSleepListener([this, &composition](bool sleeps) {
@@ -106,17 +120,31 @@ class Run {
                 sleeps ? composition.stop() : composition.inputService().enableEvents();
             });
             // After the start, which waits in the loop, too.
-            port_.tapLoop().perform([this, &service] { tellWhetherStarted(service); });
+            port_.tapLoop().perform([this, &service, &description] { tellWhetherStarted(service, description); });
             port_.tapLoop().run();
         }
         port_.leave();
     }
 
-    void tellWhetherStarted(const MacInputService& service) {
+    // The main thread, from which what changes goes to the tap thread as records of its own.
+    void feed(Composition& composition) {
+        sources_.begin(
+            [this, &composition] {
+                port_.tapLoop().perform(
+                    [&composition, groups = sources_.groups()] { composition.setSnippetGroups(groups); });
+            },
+            [this, &composition] {
+                port_.tapLoop().perform([this, &composition, settings = sources_.settings()] {
+                    settings_.registerDefaults(settings);
+                    composition.loadPreferences();
+                });
+            });
+    }
+
+    void tellWhetherStarted(const MacInputService& service, const std::string& description) {
         // What is missing was told already.
         if (!service.evenTapCreated()) return end(ExitStatus::MissingSystem);
-        output_ << "Plume is ready: " << library_.snippetCount() << " snippets from " << library_.file.string()
-                << ". Ctrl+C ends it." << std::endl;
+        output_ << "Plume is ready: " << description << ". Ctrl+C ends it." << std::endl;
     }
 
     Composition::Environment environment() {
@@ -154,8 +182,8 @@ class Run {
     }
 
     LinuxPort& port_;
-    const ChosenLibrary& library_;
-    const UserDefaults& settings_;
+    RunSources& sources_;          // of the main thread
+    MemoryUserDefaults settings_;  // of the tap thread
     std::ostream& output_;
     Voice& voice_;
     std::atomic<int> status_ = ExitStatus::Success;
@@ -165,14 +193,17 @@ class Run {
 
 }  // namespace
 
-int runInSession(const ChosenLibrary& library, const std::optional<std::string>& settingsFile, std::ostream& output,
-                 std::ostream& error) {
+int runInSession(const std::optional<std::string>& libraryFile, const std::optional<std::string>& settingsFile,
+                 std::ostream& output, std::ostream& error) {
     Voice voice(error);
     const auto refuse = [&voice](const Error& reason, int status) {
         voice.say(reason.message);
         return status;
     };
-    const Result<Settings> settings = readSettings(settingsFile);
+    PosixFiles files;
+    const auto file = openFile(libraryFile, files);
+    if (!file) return refuse(file.error(), ExitStatus::WrongInput);
+    const auto settings = readSettings(settingsFile);
     if (!settings) return refuse(settings.error(), ExitStatus::WrongInput);
 
     const FileDescriptor signals = endSignals();
@@ -180,10 +211,14 @@ int runInSession(const ChosenLibrary& library, const std::optional<std::string>&
     if (!port) return refuse(port.error(), ExitStatus::MissingSystem);
     const Result<InstanceLock> lock = InstanceLock::take({});
     if (!lock) return refuse(lock.error(), ExitStatus::Failure);
+    const auto sources =
+        RunSources::open({file.value().get(), settings.value(), port.value()->mainLoop(), port.value()->ports().notices,
+                          [&voice](const std::string& sentence) { voice.say(sentence); }});
+    if (!sources) return refuse(sources.error(), ExitStatus::Failure);
     if (const auto watched = port.value()->startWatchdog(); !watched) {
         return refuse(watched.error(), ExitStatus::MissingSystem);
     }
-    return Run(*port.value(), library, *settings.value(), output, voice).untilAskedToEnd(signals.get());
+    return Run(*port.value(), *sources.value(), output, voice).untilAskedToEnd(signals.get());
 }
 
 }  // namespace plume

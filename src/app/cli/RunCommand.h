@@ -5,13 +5,13 @@
 #include <optional>
 #include <string>
 
-#include "app/cli/LibraryChoice.h"
-
 namespace plume {
 
-// Returns the exit status when SIGINT, SIGTERM or SIGHUP has come, or something essential is missing. On the thread
-// that main() runs on, before any other exists: it becomes the main thread, and a second one hears the keys.
-int runInSession(const ChosenLibrary& library, const std::optional<std::string>& settingsFile, std::ostream& output,
-                 std::ostream& error);
+// Expands the snippets of the file, also when it changes, or those of the user's own library; the settings are those of
+// the file, or the user's own. Returns the exit status when SIGINT, SIGTERM or SIGHUP has come, or something essential
+// is missing. On the thread that main() runs on, before any other exists: it becomes the main thread, and a second one
+// hears the keys.
+int runInSession(const std::optional<std::string>& libraryFile, const std::optional<std::string>& settingsFile,
+                 std::ostream& output, std::ostream& error);
 
 }  // namespace plume

@@ -5,12 +5,14 @@
 
 #include "app/cli/CommandLine.h"
 #include "app/cli/Doctor.h"
+#include "app/cli/EditCommand.h"
 #include "app/cli/Files.h"
 #include "app/cli/LibraryChoice.h"
 #include "app/cli/LibraryCommands.h"
 #include "app/cli/RunCommand.h"
 #include "app/cli/SettingsCommand.h"
 #include "app/cli/SimulateCommand.h"
+#include "app/cli/StoreCommands.h"
 
 namespace {
 
@@ -20,9 +22,10 @@ using plume::ExitStatus::Failure;
 using plume::ExitStatus::WrongInput;
 
 int withLibrary(const CommandLine& line) {
-    const auto library = plume::openLibrary(line.library);
+    const auto report = [](const std::string& sentence) { std::cerr << "plume: " << sentence << '\n'; };
+    const auto library = plume::openLibrary(line.library, report);
     if (!library) {
-        std::cerr << "plume: " << library.error().message << '\n';
+        report(library.error().message);
         return WrongInput;
     }
     switch (line.command) {
@@ -30,10 +33,8 @@ int withLibrary(const CommandLine& line) {
             return listSnippets(library.value(), std::cout);
         case Command::Search:
             return searchSnippets(library.value(), line.text, std::cout, std::cerr);
-        case Command::Expand:
-            return expandSnippet(library.value(), line.text, std::cout, std::cerr);
         default:
-            return runInSession(library.value(), line.settings, std::cout, std::cerr);
+            return expandSnippet(library.value(), line.text, std::cout, std::cerr);
     }
 }
 
@@ -45,14 +46,39 @@ int run(int argc, const char* const* argv) {
         return farewell->status;
     }
     const auto& line = std::get<CommandLine>(parsed);
-    if (line.command == Command::Doctor) return plume::examineDesktop(std::cout);
-    if (line.command == Command::Settings) {
-        return plume::runSettingsCommand(line.request, plume::configurationFolder(), std::cout, std::cerr);
+    switch (line.command) {
+        case Command::Run:
+            return plume::runInSession(line.library, line.settings, std::cout, std::cerr);
+        case Command::List:
+        case Command::Search:
+        case Command::Expand:
+            return withLibrary(line);
+        case Command::Add:
+            return plume::addSnippet(line, std::cout, std::cerr);
+        case Command::Remove:
+            return plume::removeSnippet(line, std::cout, std::cerr);
+        case Command::Edit:
+            return plume::editLibrary(std::cin, std::cout, std::cerr);
+        case Command::Import:
+            return plume::importFiles(line, std::cout, std::cerr);
+        case Command::Export:
+            return plume::exportLibrary(line, std::cout, std::cerr);
+        case Command::Convert:
+            return plume::convertFile(line, std::cout, std::cerr);
+        case Command::Backup:
+            return plume::makeBackup(std::cout, std::cerr);
+        case Command::Backups:
+            return plume::listBackups(std::cout, std::cerr);
+        case Command::Restore:
+            return plume::restoreBackup(line, std::cout, std::cerr);
+        case Command::Settings:
+            return plume::runSettingsCommand(line.request, plume::configurationFolder(), std::cout, std::cerr);
+        case Command::Doctor:
+            return plume::examineDesktop(std::cout);
+        case Command::Simulate:
+            return plume::simulateFiles(line.files, line.onlyCase, std::cout, std::cerr);
     }
-    if (line.command == Command::Simulate) {
-        return plume::simulateFiles(line.files, line.onlyCase, std::cout, std::cerr);
-    }
-    return withLibrary(line);
+    return Failure;
 }
 
 }  // namespace

@@ -24,9 +24,9 @@ TEST(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
         const char* says;
         const char* rightForm;
     } cases[] = {
-        {{}, "there is no command", "plume run|list|search|expand|settings|doctor|simulate"},
-        {{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|settings|doctor|simulate"},
-        {{"--verbose"}, "--verbose", "plume run|list|search|expand|settings|doctor|simulate"},
+        {{}, "there is no command", "plume run|list|search|expand|add|"},
+        {{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|add|"},
+        {{"--verbose"}, "--verbose", "plume run|list|search|expand|add|"},
         {{"run", "--librari", "x"}, "--librari", "plume run [--library FILE.json|FILE.csv]"},
         {{"run", "--library"}, "--library", "[--settings FILE.json]"},
         {{"run", "now"}, "now", "plume run [--library"},
@@ -38,6 +38,9 @@ TEST(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
         {{"settings", "--default"}, "KEY", "plume settings [KEY [VALUE]]"},
         {{"doctor", "--all"}, "--all", "plume doctor"},
         {{"simulate"}, "FILE", "plume simulate FILE... [--case NAME]"},
+        {{"add", "x"}, "TEXT", "plume add ABBREVIATION TEXT"},
+        {{"convert", "x"}, "FILES", "plume convert FILE|FOLDER"},
+        {{"import", "x", "--placeholders", "mine"}, "--placeholders", "[--placeholders textexpander]"},
     };
     for (const auto& one : cases) {
         const ProgramResult result = ProgramHome().run(one.arguments);
@@ -153,12 +156,86 @@ TEST(Library, OfTheUserComesBeforeTheSample) {
 TEST(Library, ThatIsDamagedIsNeverReplacedByAnother) {
     const ProgramHome home;
     const std::string file = home.write("config/plume/library.json", R"([{"items": [{"abbreviation": 5}]}])");
-    for (const char* command : {"list", "run"}) {
+    for (const char* command : {"list", "backup"}) {
         const ProgramResult result = home.run({command});
-        EXPECT_EQ(result.status, 2);
+        EXPECT_NE(result.status, 0);
         EXPECT_THAT(result.output, IsEmpty());
         EXPECT_THAT(result.error, AllOf(HasSubstr(file), HasSubstr("abbreviation")));
     }
+}
+
+// ---- The user's own library ----
+
+std::string lastLineOf(const std::string& text) {
+    const std::size_t end = text.find_last_not_of('\n');
+    return text.substr(text.rfind('\n', end) + 1, end - text.rfind('\n', end));
+}
+
+TEST(OwnLibrary, KeepsWhatIsAddedRemovedAndRestored) {
+    const ProgramHome home;
+    EXPECT_EQ(home.run({"add", "omw", "on my way", "--group", "Short", "--label", "Coming"}).status, 0);
+    EXPECT_EQ(home.run({"expand", "omw"}).output, "on my way\n");
+    EXPECT_THAT(home.run({"add", "omw", "again", "--group", "Short"}).error,
+                HasSubstr("\"Short\" has \"omw\" already"));
+    EXPECT_EQ(home.run({"backups"}).status, 1);
+    const std::string backup = lastLineOf(home.run({"backup"}).output);
+    EXPECT_THAT(home.run({"remove", "omw"}).output, HasSubstr("gone"));
+    EXPECT_EQ(home.run({"expand", "omw"}).status, 1);
+    EXPECT_EQ(home.run({"remove", "omw"}).status, 1);
+    EXPECT_THAT(home.run({"restore", "latest"}).output, HasSubstr(backup));
+    EXPECT_EQ(home.run({"expand", "omw"}).output, "on my way\n");
+    EXPECT_THAT(home.run({"backups"}).output, HasSubstr(backup));
+}
+
+TEST(OwnLibrary, TakesFilesInAndGivesThemOut) {
+    const ProgramHome home;
+    const std::string csv = home.write("words.csv", "brb,be right back,Away\n");
+    const std::string bad = home.write("bad.json", "[\n{\"items\": [{\"abbreviation\": 5}]}]");
+    const ProgramResult imported = home.run({"import", bad, csv});
+    EXPECT_EQ(imported.status, 2);
+    EXPECT_THAT(imported.error, AllOf(HasSubstr(bad + ": line 2, at $[0].items[0].abbreviation: expected")));
+    EXPECT_THAT(imported.output, HasSubstr("1 snippet from " + csv));
+    const std::string folder = csv.substr(0, csv.rfind('/') + 1);
+    EXPECT_EQ(home.run({"export", folder + "group.csv", "--group", "words"}).status, 0);
+    EXPECT_EQ(home.run({"export", folder + "all.plume", "--with-preferences"}).status, 0);
+    EXPECT_EQ(home.run({"convert", folder + "all.plume", folder + "all.json"}).status, 0);
+    EXPECT_EQ(home.run({"expand", "brb", "--library", folder + "group.csv"}).output, "be right back\n");
+    EXPECT_EQ(home.run({"expand", "brb", "--library", folder + "all.json"}).output, "be right back\n");
+    for (const std::vector<std::string>& wrong : {std::vector<std::string>{"export", folder + "all.txt"},
+                                                  {"export", folder + "x.csv", "--with-preferences"},
+                                                  {"export", folder + "x.csv", "--group", "none"},
+                                                  {"convert", csv, folder + "x.doc"},
+                                                  {"restore", bad}}) {
+        EXPECT_EQ(home.run(wrong).status, 2) << wrong[1];
+    }
+}
+
+TEST(OwnLibrary, IsEditedAsTextWithoutLosingIt) {
+    ProgramHome home;
+    EXPECT_EQ(home.run({"add", "omw", "on my way"}).status, 0);
+    home.set("VISUAL", "sed -i 's/on my way/coming/'");
+    EXPECT_THAT(home.run({"edit"}).output, HasSubstr("is changed"));
+    EXPECT_EQ(home.run({"expand", "omw"}).output, "coming\n");
+    EXPECT_THAT(home.run({"edit"}).output, HasSubstr("Nothing has changed"));
+    home.set("VISUAL", "sed -i 's/\"abbreviation\": \"omw\"/\"abbreviation\": 5/'");
+    const ProgramResult wrong = home.run({"edit"});
+    EXPECT_EQ(wrong.status, 2);
+    EXPECT_THAT(wrong.error, AllOf(HasSubstr(": line "), HasSubstr("your text is in ")));
+    EXPECT_EQ(home.run({"expand", "omw"}).output, "coming\n");
+    home.set("VISUAL", "false");
+    EXPECT_EQ(home.run({"edit"}).status, 1);
+}
+
+TEST(OwnLibrary, ThatIsDamagedIsKeptAsideAndTheWayBackIsTold) {
+    const ProgramHome home;
+    EXPECT_EQ(home.run({"add", "omw", "on my way"}).status, 0);
+    const std::string backup = lastLineOf(home.run({"backup"}).output);
+    home.write("config/plume/plume.sqlite3", "no database");
+    const ProgramResult listed = home.run({"list"});
+    EXPECT_THAT(listed.error, AllOf(HasSubstr("damaged"), HasSubstr(backup)));
+    EXPECT_THAT(listed.output, IsEmpty());
+    EXPECT_EQ(home.run({"restore", "latest"}).status, 0);
+    EXPECT_EQ(home.run({"expand", "omw"}).output, "on my way\n");
 }
 
 TEST(Library, MayBeSeparatedValues) {

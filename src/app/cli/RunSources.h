@@ -1,0 +1,69 @@
+// Where a running Plume has its snippets and settings from: the user's library and settings, or files that were named.
+//
+// Belongs to the main thread. What it gives away are records of their own, for the thread that hears the keys.
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+#include "Foundation/Result.h"
+#include "app/cli/BackgroundWork.h"
+#include "app/cli/FollowedLibrary.h"
+#include "app/cli/UserLibrary.h"
+#include "platform/Notices.h"
+
+namespace plume {
+
+class RunSources {
+  public:
+    struct Options {
+        FollowedLibrary* file = nullptr;                   // null: the user's library
+        std::shared_ptr<const UserDefaults> fileSettings;  // null: the user's settings
+        PollRunLoop& loop;
+        Notices& notices;
+        std::function<void(const std::string& sentence)> report;
+    };
+
+    // The error says why the user's library cannot be opened. Everything outlives this.
+    static Result<std::unique_ptr<RunSources>> open(Options options);
+    ~RunSources();
+    RunSources(const RunSources&) = delete;
+    RunSources& operator=(const RunSources&) = delete;
+
+    SnippetGroups groups() const;
+    // Every setting that has a value.
+    PropertyList::Dictionary settings() const;
+    // Where the user's answers can be kept; null when the settings are a file's.
+    WritableUserDefaults* writableSettings();
+    const UserDefaults& userDefaults() const { return *settings_; }
+    // "12 snippets from library.json".
+    std::string description() const;
+
+    // From now on changes are told, backups made, and the library is kept in step with the sync folder.
+    void begin(std::function<void()> groupsChanged, std::function<void()> settingsChanged);
+
+  private:
+    explicit RunSources(Options options);
+    Result<void> openLibrary();
+    void openSettings();
+    void offerBackup(const std::optional<Files::Path>& newest);
+    void libraryReplaced(LibraryEvent&) { groupsChanged_(); }
+    void settingsReplaced(UserDefaultsChange& change);
+
+    const Options options_;
+    InotifyFileWatcher watcher_;
+    BackgroundWork background_;
+    std::unique_ptr<UserLibrary> own_;    // null when the library is a file
+    std::unique_ptr<SqliteStore> store_;  // for settings alone, when the library is a file
+    std::shared_ptr<const UserDefaults> settings_;
+    mutable std::optional<std::u16string> givenVersion_;
+    std::function<void()> groupsChanged_;
+    std::function<void()> settingsChanged_;
+    Subscription imported_;
+    Subscription synced_;
+    Subscription settingsObserver_;
+};
+
+}  // namespace plume
