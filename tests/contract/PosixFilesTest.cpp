@@ -41,6 +41,9 @@ class PosixFilesBench final : public ContractFiles {
     explicit PosixFilesBench(Inotify inotify) {
         setenv("XDG_DATA_HOME", (home_.path() / "data").c_str(), 1);
         constexpr double LooksOften = 0.01;
+        // A sanitizer that meets the class for the first time needs a descriptor itself.
+        watcher_ = std::make_unique<InotifyFileWatcher>(loop_, LooksOften);
+        watcher_.reset();
         std::unique_ptr<NoDescriptors> none;
         if (inotify == Inotify::UsedUp) none = std::make_unique<NoDescriptors>();
         watcher_ = std::make_unique<InotifyFileWatcher>(loop_, LooksOften);

@@ -69,7 +69,7 @@ TEST(PropertyList, ReadsXml) {
     expectReads("<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><plist><string>\xE9</string></plist>",
                 std::u16string(u"\u00E9"));
     const std::string deep = plist("<array><array/></array>");
-    expectReads(deep, Array{Array{}});
+    expectReads(deep, Array(1, PropertyList(Array())));
 }
 
 TEST(PropertyList, RefusesWrongXml) {
