@@ -52,7 +52,9 @@ PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const st
         arguments.insert(arguments.end(), {"-u", "DBUS_SESSION_BUS_ADDRESS", "XDG_RUNTIME_DIR=" + folder.string()});
     }
     arguments.insert(arguments.end(), {program, "run"});
-    arguments.insert(arguments.end(), {"--settings", writeFile(rig.directory() / "settings.json", settings)});
+    if (!settings.empty()) {
+        arguments.insert(arguments.end(), {"--settings", writeFile(rig.directory() / "settings.json", settings)});
+    }
     if (!library.empty()) {
         arguments.insert(arguments.end(), {"--library", writeFile(rig.directory() / "library.json", library)});
     }

@@ -14,7 +14,7 @@ class PlumeProgram {
   public:
     enum class Accessibility { Found, Missing };
 
-    // The contents of a library and a settings file; an empty library means the sample library. Throws RigError.
+    // The contents of a library and a settings file; empty ones mean those of the user's store. Throws RigError.
     PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings = "{}",
                  Accessibility accessibility = Accessibility::Found);
 

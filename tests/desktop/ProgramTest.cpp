@@ -269,6 +269,29 @@ TEST_F(Program, TakesOverWhatOthersChangeInTheUsersLibrary) {
     EXPECT_TRUE(waitUntil(expands, Bound)) << log();
 }
 
+TEST_F(Program, StaysSwitchedOffWhateverElseIsSet) {
+    const auto set = [&](const std::string& key, const std::string& value) {
+        const auto command = rig_->session().start({plumeProgram(), "settings", key, value}, "plume");
+        ASSERT_EQ(command->waitForExit(Bound), 0) << command->logTail();
+    };
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    const auto becomes = [&](const std::string& typed, const std::string& expected) {
+        target->clear();
+        rig_->keyboard().tap(Key::Home);
+        rig_->keyboard().type(typed);
+        return target->awaitText(expected) == expected;
+    };
+    set("switchHotKey", "120");  // F2
+    start("", "");
+    ASSERT_TRUE(becomes("x btw ", "x by the way ")) << log();
+    rig_->keyboard().tap(Key::F2);
+    EXPECT_TRUE(becomes("x btw ", "x btw ")) << log();
+    set("LongTextLength", "90");
+    EXPECT_FALSE(waitUntil([&] { return becomes("x btw ", "x by the way "); }, Milliseconds(1'000))) << log();
+    set("IsEnabled", "true");
+    EXPECT_TRUE(waitUntil([&] { return becomes("x btw ", "x by the way "); }, Bound)) << log();
+}
+
 TEST_F(Program, DoctorFindsAllThatIsNeededHere) {
     const auto doctor = rig_->session().start({plumeProgram(), "doctor"}, "doctor");
     EXPECT_EQ(doctor->waitForExit(Milliseconds(5'000)), 0) << doctor->logTail();

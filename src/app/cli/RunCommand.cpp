@@ -160,7 +160,16 @@ class Run {
                 .suggest = {},
                 .vmHelper = nullptr,
                 .applications = applications(),
-                .enabledChanged = {}};
+                .enabledChanged = [this](bool enabled) {
+                    port_.mainLoop().perform([this, enabled] { keepEnabled(enabled); });
+                }};
+    }
+
+    // Or the next change of any setting would undo what the hot key did.
+    void keepEnabled(bool enabled) {
+        WritableUserDefaults* settings = sources_.writableSettings();
+        if (!settings) return;
+        if (const auto kept = settings->setObject("IsEnabled", enabled); !kept) voice_.say(kept.error().message);
     }
 
     std::shared_ptr<const ApplicationTable> applications() {
