@@ -53,6 +53,18 @@ class Program : public testing::Test {
     }
     std::string log() { return plume_->process().logTail(); }
 
+    static bool becomes(TargetProgram& target, const std::string& typed, const std::string& expected) {
+        target.clear();
+        rig_->keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
+        rig_->keyboard().type(typed);
+        return target.awaitText(expected, Milliseconds(1'000)) == expected;
+    }
+
+    // Plume may not know yet that another program has come to the front, or may not have started yet.
+    static bool soonBecomes(TargetProgram& target, const std::string& typed, const std::string& expected) {
+        return waitUntil([&] { return becomes(target, typed, expected); }, Bound);
+    }
+
     static inline std::unique_ptr<DesktopRig> rig_;
     std::unique_ptr<PlumeProgram> plume_;
 };
@@ -61,13 +73,10 @@ class ProgramInTarget : public Program, public testing::WithParamInterface<Targe
 
 TEST_P(ProgramInTarget, ExpandsWhatIsTyped) {
     const auto target = rig_->startTarget(GetParam());
+    ASSERT_TRUE(soonBecomes(*target, "x ;sig", "x Kind regards, Jo")) << log();
     const auto typeAndExpect = [&](const std::string& typed, const std::string& expected) {
-        target->clear();
-        rig_->keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
-        rig_->keyboard().type(typed);
-        EXPECT_EQ(target->awaitText(expected), expected) << log();
+        EXPECT_TRUE(becomes(*target, typed, expected)) << "not " << expected << "\n" << log();
     };
-    typeAndExpect("x ;sig", "x Kind regards, Jo");
     typeAndExpect("btw, Btw BTW ", "by the way, By the way BY THE WAY ");
     typeAndExpect("x ;uni.", "x naïve Ünïcödé — 日本語 【】 😀.");
     typeAndExpect("x ;two", "x a\n  b");
@@ -123,8 +132,12 @@ TEST_F(Program, TypesAllOfATextWhereNoKeyPastes) {
     start(R"([{"items": [{"abbreviation": "cjk", "content": ")" + toUtf8(text) + R"("}]}])",
           R"({"PlayFeedbackSound": false, "CustomApplicationSettings": {"gtk_*": {"pasteKeys": "none"}}})");
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    rig_->keyboard().type("cjk");
-    EXPECT_EQ(target->awaitText(toUtf8(text)), toUtf8(text)) << log();
+    const auto types = [&] {
+        target->clear();
+        rig_->keyboard().type("cjk");
+        return target->awaitText(toUtf8(text)) == toUtf8(text);
+    };
+    EXPECT_TRUE(waitUntil(types, 2 * Bound)) << log();
 }
 
 INSTANTIATE_TEST_SUITE_P(Targets, ProgramInPasswordField,
@@ -189,9 +202,7 @@ TEST_F(Program, SaysThatASnippetNeedsAFormOrAChoiceAndErasesNothing) {
 TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     for (const int signal : {SIGINT, SIGTERM}) {
-        target->clear();
-        rig_->keyboard().type(";sig");
-        EXPECT_EQ(target->awaitText("Kind regards, Jo"), "Kind regards, Jo");
+        ASSERT_TRUE(soonBecomes(*target, ";sig", "Kind regards, Jo")) << log();
         ASSERT_EQ(kill(plume_->process().pid(), signal), 0);
         EXPECT_EQ(plume_->process().waitForExit(Bound), 0) << log();
         target->clear();
@@ -204,15 +215,9 @@ TEST_F(Program, EndsWhenAskedToAndGivesTheKeyboardBack) {
 TEST_F(Program, LetsWhatIsTypedWhileAScriptRunsFollowItsOutput) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     // A busy machine may be slower than keys wait for it.
-    const auto follows = [&](const std::string& typed, const std::string& expected) {
-        target->clear();
-        rig_->keyboard().tap(Key::Home);
-        rig_->keyboard().type(typed);
-        return target->awaitText(expected, Milliseconds(2'000)) == expected;
-    };
-    EXPECT_TRUE(waitUntil([&] { return follows("x ;run and on", "x out42 and on"); }, Bound)) << log();
+    EXPECT_TRUE(soonBecomes(*target, "x ;run and on", "x out42 and on")) << log();
     // Keys do not wait for this one, but what they typed can be asked for.
-    EXPECT_TRUE(waitUntil([&] { return follows("x ;late and on", "x late and on"); }, Bound)) << log();
+    EXPECT_TRUE(soonBecomes(*target, "x ;late and on", "x late and on")) << log();
 }
 
 TEST_F(Program, EndsInTheMiddleOfAScript) {
@@ -239,20 +244,14 @@ TEST_F(Program, FollowsTheFileOfItsLibrary) {
     const auto write = [&](const std::string& content) {
         std::ofstream(rig_->directory() / "library.json") << content;
     };
-    const auto expandsTo = [&](const std::string& expected) {
-        target->clear();
-        rig_->keyboard().tap(Key::Home);
-        rig_->keyboard().type("x ;sig");
-        return target->awaitText(expected) == expected;
-    };
     write(
         R"([{"abbreviationPrefix": ";", "expandAfter": 2, "items": [{"abbreviation": "sig", "content": "changed"}]}])");
-    EXPECT_TRUE(waitUntil([&] { return expandsTo("x changed"); }, Bound)) << log();
+    EXPECT_TRUE(soonBecomes(*target, "x ;sig", "x changed")) << log();
     write("[\n{\"items\": 5}]");
     EXPECT_TRUE(
         waitUntil([&] { return log().find("line 2, at $[0].items: expected a list") != std::string::npos; }, Bound))
         << log();
-    EXPECT_TRUE(expandsTo("x changed")) << log();
+    EXPECT_TRUE(becomes(*target, "x ;sig", "x changed")) << log();
 }
 
 TEST_F(Program, TakesOverWhatOthersChangeInTheUsersLibrary) {
@@ -260,13 +259,7 @@ TEST_F(Program, TakesOverWhatOthersChangeInTheUsersLibrary) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     const auto add = rig_->session().start({plumeProgram(), "add", "omw;", "on my way"}, "plume");
     ASSERT_EQ(add->waitForExit(Bound), 0) << add->logTail();
-    const auto expands = [&] {
-        target->clear();
-        rig_->keyboard().tap(Key::Home);
-        rig_->keyboard().type("x omw;");
-        return target->awaitText("x on my way") == "x on my way";
-    };
-    EXPECT_TRUE(waitUntil(expands, Bound)) << log();
+    EXPECT_TRUE(soonBecomes(*target, "x omw;", "x on my way")) << log();
 }
 
 TEST_F(Program, StaysSwitchedOffWhateverElseIsSet) {
@@ -275,21 +268,16 @@ TEST_F(Program, StaysSwitchedOffWhateverElseIsSet) {
         ASSERT_EQ(command->waitForExit(Bound), 0) << command->logTail();
     };
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    const auto becomes = [&](const std::string& typed, const std::string& expected) {
-        target->clear();
-        rig_->keyboard().tap(Key::Home);
-        rig_->keyboard().type(typed);
-        return target->awaitText(expected) == expected;
-    };
     set("switchHotKey", "120");  // F2
     start("", "");
-    ASSERT_TRUE(becomes("x btw ", "x by the way ")) << log();
+    ASSERT_TRUE(soonBecomes(*target, "x btw ", "x by the way ")) << log();
     rig_->keyboard().tap(Key::F2);
-    EXPECT_TRUE(becomes("x btw ", "x btw ")) << log();
+    EXPECT_TRUE(becomes(*target, "x btw ", "x btw ")) << log();
     set("LongTextLength", "90");
-    EXPECT_FALSE(waitUntil([&] { return becomes("x btw ", "x by the way "); }, Milliseconds(1'000))) << log();
+    const auto listens = [&] { return becomes(*target, "x btw ", "x by the way "); };
+    EXPECT_FALSE(waitUntil(listens, Milliseconds(2'000))) << log();
     set("IsEnabled", "true");
-    EXPECT_TRUE(waitUntil([&] { return becomes("x btw ", "x by the way "); }, Bound)) << log();
+    EXPECT_TRUE(soonBecomes(*target, "x btw ", "x by the way ")) << log();
 }
 
 TEST_F(Program, DoctorFindsAllThatIsNeededHere) {
