@@ -75,14 +75,14 @@ void LibrarySync::startSync(bool interactive) {
         if (file) compareWithFile(isLater);
     } else {
         if (!makeFolder()) return;
-        writeFile(false);
+        send(false);
     }
     monitorSyncDataFile();
 }
 
 void LibrarySync::compareWithFile(bool localIsLater) {
     if (localIsLater) {
-        if (keepUnknownVersion()) writeFile(false);
+        send(false);
     } else {
         syncDownload();
     }
@@ -112,8 +112,8 @@ void LibrarySync::initalSyncSheetDidEnd(int returnCode) {
     if (!directory_) return;
     if (returnCode == TakeFoldersLibrary) {
         syncDownload();
-    } else if (keepUnknownVersion()) {
-        writeFile(false);
+    } else {
+        send(false);
     }
     monitorSyncDataFile();
 }
@@ -131,39 +131,51 @@ void LibrarySync::syncUpload() {
     watching_ = false;
     // The folder has gone: nothing is made where a disk was mounted, say.
     if (!syncDirectory()) return loadSyncPreferences(false);
-    const bool sent = makeFolder() && keepUnknownVersion() && writeFile(around_.settings.boolForKey("SyncPreferences"));
+    const bool sent = makeFolder() && send(around_.settings.boolForKey("SyncPreferences"));
     if (!sent && !fileIsUnreadable_) {
         upload_ = around_.loop.performAfterDelay(DelayOfRepeatedUpload, [this] { syncUpload(); });
     }
     monitor_ = around_.loop.performAfterDelay(MonitorDelayAfterUpload, [this] { monitorSyncDataFile(); });
 }
 
-bool LibrarySync::writeFile(bool includingPreferences) {
-    const auto written = around_.files.write(syncDataFile(), around_.archive(includingPreferences));
-    if (!written) {
-        reportOnce("The library was not sent to the sync folder: " + written.error().message);
-        return false;
+// Looks again and again at what another machine may have written meanwhile.
+bool LibrarySync::send(bool includingPreferences) {
+    constexpr int MostAttempts = 8;
+    const std::string archive = around_.archive(includingPreferences);
+    for (int attempt = 0; attempt < MostAttempts; ++attempt) {
+        const auto known = keepUnknownVersion();
+        if (!known) return false;
+        const auto written = around_.files.replace(syncDataFile(), known->bytes, archive);
+        if (!written) {
+            reportOnce("The library was not sent to the sync folder: " + written.error().message);
+            return false;
+        }
+        if (written.value()) {
+            lastReport_.clear();
+            return true;
+        }
     }
-    lastReport_.clear();
-    return true;
+    reportOnce("The library was not sent to the sync folder: another machine writes it all the time");
+    return false;
 }
 
-// Another machine's version that this one has not taken over goes into the backups before it is written over. False
+// Another machine's version that this one has not taken over goes into the backups before it is written over. Nothing
 // when the file must not be written over now.
-bool LibrarySync::keepUnknownVersion() {
-    if (!around_.files.exists(syncDataFile())) return true;
-    const auto file = readFile();
-    if (!file) return false;
-    if (isKnown(file->contents)) return true;
-    const auto kept = around_.backups.backup(file->bytes);
-    if (!kept) {
-        reportOnce("The library is not sent, because the other one in the sync folder cannot be kept: " +
-                   kept.error().message);
-        return false;
+std::optional<LibrarySync::WrittenOver> LibrarySync::keepUnknownVersion() {
+    if (!around_.files.exists(syncDataFile())) return WrittenOver{};
+    auto file = readFile();
+    if (!file) return std::nullopt;
+    if (!isKnown(file->contents)) {
+        const auto kept = around_.backups.backup(file->bytes);
+        if (!kept) {
+            reportOnce("The library is not sent, because the other one in the sync folder cannot be kept: " +
+                       kept.error().message);
+            return std::nullopt;
+        }
+        around_.report("Another machine had changed the library meanwhile; its version is kept in " +
+                       kept.value().string() + ".");
     }
-    around_.report("Another machine had changed the library meanwhile; its version is kept in " +
-                   kept.value().string() + ".");
-    return true;
+    return WrittenOver{std::move(file->bytes)};
 }
 
 std::optional<LibrarySync::SyncFile> LibrarySync::readFile() {

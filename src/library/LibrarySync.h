@@ -76,8 +76,13 @@ class LibrarySync {
     void stopSync() { watch_.end(); }
     void syncDispatchSourceEventHandler();
 
-    bool writeFile(bool includingPreferences);
-    bool keepUnknownVersion();
+    // What stands in the way of this machine's library and may be written over: nothing, or these bytes.
+    struct WrittenOver {
+        std::optional<std::string> bytes;
+    };
+
+    bool send(bool includingPreferences);
+    std::optional<WrittenOver> keepUnknownVersion();
     // The file, or nothing when there is none or it cannot be read, which is reported.
     std::optional<SyncFile> readFile();
     bool isKnown(const LibraryContents& contents) const;

@@ -36,6 +36,10 @@ class Files {
     // The file holds either what it held or all of these bytes, whatever happens meanwhile. A new one is the user's
     // alone (0600). Its folder has to be there.
     virtual Result<void> write(const Path& path, std::string_view bytes) = 0;
+    // The same as long as the file holds what is expected (nothing: is not there), which is looked at in the last
+    // moment. False, and nothing is written, when it does not.
+    virtual Result<bool> replace(const Path& path, const std::optional<std::string>& expected,
+                                 std::string_view bytes) = 0;
     // With the folders above it; one that is there is no error.
     virtual Result<void> createFolder(const Path& path) = 0;
     // In the order in which the system tells them.

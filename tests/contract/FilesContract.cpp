@@ -28,6 +28,19 @@ TEST_P(FilesContract, ReadsWhatWasWritten) {
     EXPECT_THAT(namesIn(files_, folder_), testing::ElementsAre("file")) << "something was left beside the file";
 }
 
+TEST_P(FilesContract, ReplacesOnlyWhatIsExpected) {
+    const auto file = folder_ / "file";
+    EXPECT_FALSE(files_.replace(file, "1", "2").value());
+    EXPECT_TRUE(files_.replace(file, std::nullopt, "1").value());
+    for (const std::optional<std::string>& other : {std::optional<std::string>("0"), std::optional<std::string>()}) {
+        EXPECT_FALSE(files_.replace(file, other, "2").value());
+    }
+    EXPECT_EQ(files_.read(file).value(), "1");
+    EXPECT_TRUE(files_.replace(file, "1", "2").value());
+    EXPECT_EQ(files_.read(file).value(), "2");
+    EXPECT_THAT(namesIn(files_, folder_), testing::ElementsAre("file")) << "something was left beside the file";
+}
+
 TEST_P(FilesContract, MakesFoldersWithThoseAboveThem) {
     ASSERT_TRUE(files_.createFolder(folder_ / "a/b/c"));
     EXPECT_TRUE(files_.createFolder(folder_ / "a/b")) << "one that is there";
@@ -59,6 +72,7 @@ TEST_P(FilesContract, ErrorsNameTheFileAndChangeNothing) {
     expectError(files_.read(folder_ / "full"), folder_ / "full");
     expectError(files_.write(folder_ / "full", "x"), folder_ / "full");
     expectError(files_.write(folder_ / "none/file", "x"), folder_ / "none/file");
+    expectError(files_.replace(folder_ / "none/file", std::nullopt, "x"), folder_ / "none/file");
     expectError(files_.createFolder(folder_ / "full/file"), folder_ / "full/file");
     expectError(files_.list(folder_ / "none"), folder_ / "none");
     expectError(files_.list(folder_ / "full/file"), folder_ / "full/file");

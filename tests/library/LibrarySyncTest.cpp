@@ -76,6 +76,20 @@ TEST_F(LibrarySyncTest, ADownloadKeepsWhatWasNotSent) {
     EXPECT_THAT(kept, Contains(HasSubstr("from b")));
 }
 
+TEST_F(LibrarySyncTest, KeepsWhatCameInTheLastMomentBeforeItSends) {
+    meet();
+    b.add(u"of b");
+    b.add(u"more");
+    const std::string other = b.manager->archivedDataIncludingPreferences(false);
+    b.restart();  // and never sends it itself
+    a.add(u"of a");
+    world.files.setBeforeReplace([&] { (void)world.files.write(SyncFile, other); });
+    world.loop.advance(30);
+    ASSERT_THAT(a.backupNames(), SizeIs(1));
+    EXPECT_THAT(a.libraryIn("/a/Backups/" + a.backupNames()[0]), ElementsAre("Mine: common=text of b=text more=text"));
+    EXPECT_THAT(a.libraryIn(SyncFile), ElementsAre("Mine: common=text of a=text"));
+}
+
 TEST_F(LibrarySyncTest, OneThatStartsLaterTakesTheLaterLibrary) {
     a.add(u"old");
     a.syncWith("/shared");

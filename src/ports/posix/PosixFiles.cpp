@@ -129,13 +129,31 @@ Result<std::string> PosixFiles::read(const Path& path) const {
 }
 
 Result<void> PosixFiles::write(const Path& path, std::string_view bytes) {
+    const auto written = writeIf([] { return Result<bool>(true); }, path, bytes);
+    return written ? Result<void>() : written.error();
+}
+
+Result<bool> PosixFiles::replace(const Path& path, const std::optional<std::string>& expected, std::string_view bytes) {
+    const auto holdsExpected = [&]() -> Result<bool> {
+        if (!exists(path)) return !expected;
+        const auto there = read(path);
+        if (!there) return there.error();
+        return there.value() == expected;
+    };
+    return writeIf(holdsExpected, path, bytes);
+}
+
+Result<bool> PosixFiles::writeIf(const std::function<Result<bool>()>& wanted, const Path& path,
+                                 std::string_view bytes) {
     const Path place = followLinks(path);
     if (place.empty()) return cannot("written", path, ELOOP);
     if (isFolder(place)) return cannot("written", path, EISDIR);
     Draft draft(place.parent_path());
-    if (!draft.isOpen() || !draft.fill(bytes) || !draft.putInPlaceOf(place)) return cannot("written", path, errno);
+    if (!draft.isOpen() || !draft.fill(bytes)) return cannot("written", path, errno);
+    if (const auto still = wanted(); !still || !still.value()) return still;
+    if (!draft.putInPlaceOf(place)) return cannot("written", path, errno);
     bringToDisk(place.parent_path());
-    return {};
+    return true;
 }
 
 Result<void> PosixFiles::createFolder(const Path& path) {

@@ -4,6 +4,8 @@
 // symbolic link stays, and what it leads to is written. Folders that are made are the user's alone (0700).
 #pragma once
 
+#include <functional>
+
 #include "platform/Files.h"
 
 namespace plume {
@@ -14,10 +16,15 @@ class PosixFiles final : public Files {
     bool isFolder(const Path& path) const override;
     Result<std::string> read(const Path& path) const override;
     Result<void> write(const Path& path, std::string_view bytes) override;
+    Result<bool> replace(const Path& path, const std::optional<std::string>& expected, std::string_view bytes) override;
     Result<void> createFolder(const Path& path) override;
     Result<std::vector<Entry>> list(const Path& folder) const override;
     Result<void> remove(const Path& path) override;
     Result<void> moveToTrash(const Path& path) override;
+
+  private:
+    // Asked when everything is written that can be written before.
+    Result<bool> writeIf(const std::function<Result<bool>()>& wanted, const Path& path, std::string_view bytes);
 };
 
 }  // namespace plume

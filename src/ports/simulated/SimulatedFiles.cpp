@@ -80,6 +80,16 @@ Result<void> SimulatedFiles::write(const Path& path, std::string_view bytes) {
     return told(write(), path);
 }
 
+Result<bool> SimulatedFiles::replace(const Path& path, const std::optional<std::string>& expected,
+                                     std::string_view bytes) {
+    if (const auto call = std::exchange(beforeReplace_, nullptr)) call();
+    const auto there = exists(path) ? read(path) : Result<std::string>(std::string());
+    if (!there) return there.error();
+    if (exists(path) != expected.has_value() || there.value() != expected.value_or("")) return false;
+    if (auto written = write(path, bytes); !written) return written.error();
+    return true;
+}
+
 Result<void> SimulatedFiles::addFolders(const Path& path, std::vector<Path>& made) {
     if (isFolderAt(path)) return {};
     if (find(path)) return cannot("made a folder", path, NoFolder);

@@ -25,6 +25,7 @@ class SimulatedFiles final : public Files {
     bool isFolder(const Path& path) const override;
     Result<std::string> read(const Path& path) const override;
     Result<void> write(const Path& path, std::string_view bytes) override;
+    Result<bool> replace(const Path& path, const std::optional<std::string>& expected, std::string_view bytes) override;
     Result<void> createFolder(const Path& path) override;
     // In the order in which they came to be.
     Result<std::vector<Entry>> list(const Path& folder) const override;
@@ -44,6 +45,8 @@ class SimulatedFiles final : public Files {
     std::vector<TrashedFile> trash() const;
     // Called on the writer's thread with the path of what has changed. Set while nothing else uses the files.
     void setListener(std::function<void(const Path&)> listener) { listener_ = std::move(listener); }
+    // Called once, in the last moment before the next replace() looks at the file.
+    void setBeforeReplace(std::function<void()> call) { beforeReplace_ = std::move(call); }
 
   private:
     struct Node {
@@ -68,6 +71,7 @@ class SimulatedFiles final : public Files {
     std::optional<std::size_t> freeBytes_;
     std::uint64_t lastNumber_ = 0;
     std::function<void(const Path&)> listener_;
+    std::function<void()> beforeReplace_;
 };
 
 }  // namespace plume
