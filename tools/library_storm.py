@@ -68,32 +68,33 @@ def kill_again_and_again(worker, kills, seed):
 
 
 def storm(worker, seconds, seed):
-    with tempfile.TemporaryDirectory(prefix="plume-storm-") as name:
-        folder = pathlib.Path(name)
-        shared = folder / "shared"
-        shared.mkdir()
-        machines = [folder / "one", folder / "two"]
-        errors = [open(folder / f"errors-{machine.name}", "w+") for machine in machines]
-        processes = [
-            subprocess.Popen([worker, "edit", str(machine), str(folder / f"log-{machine.name}"), str(seed + i),
-                              str(shared), str(seconds)], stderr=errors[i])
-            for i, machine in enumerate(machines)]
-        for process in processes:
-            if process.wait(seconds + 60) != 0:
-                raise SystemExit(f"a machine failed: {process.returncode}")
-        ends = [output(worker, "show", machine) for machine in machines]
-        everything = set(ends[0][1:]) | set(ends[1][1:])
-        backups = [path for machine in machines for path in (machine / "Backups").glob("*.plume")]
-        for path in backups:
-            everything |= set(output(worker, "read", path))
-        had = {each for machine in machines for entry in log_entries(folder / f"log-{machine.name}") for each in entry[2]}
-        downloads = sum(open(error.name).read().count("replaced by another") for error in errors)
-        print(f"{len(had)} snippets were made, {len(ends[0]) - 1} are in the library, {len(backups)} backups, "
-              f"{downloads} downloads over unsent changes", flush=True)
-        if ends[0] != ends[1]:
-            raise SystemExit(f"the machines end differently: {ends[0][0]} and {ends[1][0]}")
-        if had - everything:
-            raise SystemExit(f"{len(had - everything)} snippets are nowhere, such as {sorted(had - everything)[:3]}")
+    folder = pathlib.Path(tempfile.mkdtemp(prefix="plume-storm-"))
+    shared = folder / "shared"
+    shared.mkdir()
+    machines = [folder / "one", folder / "two"]
+    errors = [open(folder / f"errors-{machine.name}", "w+") for machine in machines]
+    processes = [
+        subprocess.Popen([worker, "edit", str(machine), str(folder / f"log-{machine.name}"), str(seed + i),
+                          str(shared), str(seconds)], stderr=errors[i])
+        for i, machine in enumerate(machines)]
+    for process in processes:
+        if process.wait(seconds + 60) != 0:
+            raise SystemExit(f"a machine failed: {process.returncode}")
+    ends = [output(worker, "show", machine) for machine in machines]
+    everything = set(ends[0][1:]) | set(ends[1][1:])
+    backups = [path for machine in machines for path in (machine / "Backups").glob("*.plume")]
+    for path in backups:
+        everything |= set(output(worker, "read", path))
+    had = {each for machine in machines for entry in log_entries(folder / f"log-{machine.name}") for each in entry[2]}
+    downloads = sum(open(error.name).read().count("replaced by another") for error in errors)
+    print(f"{len(had)} snippets were made, {len(ends[0]) - 1} are in the library, {len(backups)} backups, "
+          f"{downloads} downloads over unsent changes", flush=True)
+    if ends[0] != ends[1]:
+        raise SystemExit(f"the machines end differently: {ends[0][0]} and {ends[1][0]}")
+    if had - everything:
+        raise SystemExit(f"{len(had - everything)} snippets are nowhere, such as {sorted(had - everything)[:3]}; "
+                         f"see {folder}")
+    subprocess.run(["rm", "-rf", str(folder)], check=True)
 
 
 def main():

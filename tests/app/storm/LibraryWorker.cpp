@@ -14,6 +14,7 @@
 #include <random>
 
 #include "Foundation/Strings.h"
+#include "app/cli/BackgroundWork.h"
 #include "import/Importers.h"
 #include "library/DataManager.h"
 #include "library/KnownSettings.h"
@@ -80,6 +81,7 @@ class Worker {
             .import = [this](const Files::Path& path) { return importLibrary(path, files_); },
             .convertOldSnippet = {},
             .report = [](const std::string& sentence) { std::cerr << sentence << '\n'; },
+            .inBackground = [this](auto work, auto done) { saves_.begin(std::move(work), std::move(done)); },
             .offerBackup = [](const auto&) { throw std::runtime_error("the library is damaged"); },
         });
         if (const auto loaded = manager_->loadAutoTextData(); !loaded) throw std::runtime_error(loaded.error().message);
@@ -104,6 +106,7 @@ class Worker {
         // What is under way is sent, and arrives.
         if (seconds > 0) stop_ = loop_.performAfterDelay(seconds + 8, [this] { loop_.stop(); });
         loop_.run();
+        saves_.finish();
         if (const auto saved = manager_->saveRest(); !saved) throw std::runtime_error(saved.error().message);
     }
 
@@ -169,6 +172,7 @@ class Worker {
     InotifyFileWatcher watcher_{loop_};
     std::unique_ptr<SqliteStore> store_;
     std::unique_ptr<DataManager> manager_;
+    BackgroundWork saves_{loop_};
     Subscription synced_;
     std::mt19937 random_{std::random_device()()};  // edit() seeds it anew
     std::string prefix_;
