@@ -1,90 +1,41 @@
-// How long a library of 10,000 snippets takes to be written as an archive and read back, and how large it becomes.
+// How long a library of 10,000 snippets takes to be written as an archive and read back, and how large it becomes; what
+// a change and a save cost; how fast foreign libraries come in; and when a Plume with such a library is ready, and what
+// its changes cost who types meanwhile.
+#include <poll.h>
+
+#include <algorithm>
 #include <chrono>
 #include <cstdlib>
+#include <filesystem>
+#include <fstream>
 #include <memory>
 #include <optional>
 #include <string>
-#include <string_view>
 #include <utility>
+#include <vector>
 
-#include "Foundation/Date.h"
-#include "Foundation/Strings.h"
+#include "app/cli/BackgroundWork.h"
 #include "bench/Figures.h"
-#include "library/LibraryArchive.h"
+#include "bench/GeneratedLibrary.h"
+#include "import/Importers.h"
+#include "library/DataManager.h"
+#include "library/KnownSettings.h"
+#include "ports/posix/InotifyFileWatcher.h"
+#include "ports/posix/PosixFiles.h"
+#include "ports/posix/store/SqliteStore.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/PlumeProgram.h"
 
 namespace plume::bench {
 namespace {
 
-constexpr std::size_t GroupCount = 100;
-constexpr std::size_t SnippetsPerGroup = 100;
-constexpr std::size_t SnippetCount = GroupCount * SnippetsPerGroup;
+using rig::DesktopRig;
+using rig::Milliseconds;
+using rig::PlumeProgram;
+using rig::TargetKind;
+using rig::TargetProgram;
+
 constexpr int Runs = 15;
-
-// A benchmark of something that does not work would be worth nothing.
-void require(bool condition) {
-    if (!condition) std::abort();
-}
-
-std::u16string numbered(const char* name, std::size_t number) {
-    return fromUtf8(name + std::to_string(number));
-}
-
-constexpr std::u16string_view Sentence = u"The quick brown fox jumps over the lazy dog and runs away into the wood. ";
-
-// Of 5 to 150 units, most of them short; one in eight is not ASCII.
-std::u16string contentOf(std::size_t number) {
-    std::u16string text = numbered("Text ", number);
-    text += Sentence.substr(0, number * 7 % 73);
-    if (number % 5 == 0) text += Sentence;
-    if (number % 8 == 0) text += u" \u2014 na\u00EFve \U0001F600";
-    return text;
-}
-
-SharedAttributes attributesOf(const char16_t* family, bool bold, double red) {
-    auto attributes = std::make_shared<TextAttributes>();
-    attributes->font = FontAttribute{family, 12, bold, false};
-    if (red > 0) attributes->foregroundColor = ColorAttribute{red, 0, 0, 1};
-    attributes->paragraphStyle.emplace().headIndent = 36;
-    return attributes;
-}
-
-AttributedString richContentOf(std::size_t number) {
-    AttributedString text(contentOf(number), attributesOf(u"Helvetica", false, 0));
-    text.append(u" bold ", attributesOf(u"Helvetica", true, 0));
-    text.append(u" red\n", attributesOf(u"Times", false, number % 2 == 0 ? 1 : 0.5));
-    return text;
-}
-
-std::shared_ptr<Snippet> makeSnippet(std::size_t number, bool rich) {
-    auto snippet = std::make_shared<Snippet>(numbered("abbr", number), contentOf(number));
-    if (number % 3 != 0) snippet->setLabel(numbered("A label of snippet ", number));
-    if (number % 20 == 0) snippet->setNote(u"A note.");
-    if (rich) {
-        snippet->setContentType(ContentType::RichText);
-        snippet->setRichTextContent(richContentOf(number));
-    }
-    snippet->updateLastTimeUsed();
-    return snippet;
-}
-
-// One in `richEvery` snippets is rich, none for 0.
-LibraryContents makeLibrary(std::size_t snippetsPerGroup, std::size_t richEvery) {
-    Date now{std::chrono::seconds(1'700'000'000)};
-    const ScopedDateSource dates([&now] { return now += std::chrono::microseconds(1'234'567'891); });
-    LibraryContents library;
-    library.dateInstalled = currentDate();
-    for (std::size_t g = 0; g < GroupCount; ++g) {
-        auto group = SnippetGroup::make();
-        group->setName(numbered("Group ", g));
-        if (g % 10 == 0) group->setDelimiters(CharacterSet::withCharacters(u" \t\r.,;"));
-        for (std::size_t i = 0; i < snippetsPerGroup; ++i) {
-            const std::size_t number = g * snippetsPerGroup + i;
-            group->addItem(makeSnippet(number, richEvery != 0 && number % richEvery == 0));
-        }
-        library.snippetGroups.push_back(std::move(group));
-    }
-    return library;
-}
 
 void benchArchive() {
     const LibraryContents library = makeLibrary(SnippetsPerGroup, 10);
@@ -104,10 +55,187 @@ void benchSize() {
     print("library.archive.bytes_per_snippet", static_cast<double>(all - groups) / SnippetCount, "bytes");
 }
 
+// ---- The store ----
+
+// A library in a store on the disk, with a loop that runs.
+class StoredBench {
+  public:
+    explicit StoredBench(const std::filesystem::path& folder) : work_(loop_) {
+        auto opened = SqliteStore::open(folder, nullptr);
+        require(opened.ok());
+        store_ = std::move(opened.value().store);
+        store_->settings().registerDefaults(registeredSettings(folder / "Backups"));
+        DataManager::Dependencies dependencies{
+            .settings = store_->settings(),
+            .storage = store_->library(),
+            .files = files_,
+            .watcher = watcher_,
+            .loop = loop_,
+            .places = {},
+            .import = [this](const Files::Path& path) { return importLibrary(path, files_); },
+            .convertOldSnippet = {},
+            .report = [](const std::string& sentence) { std::fprintf(stderr, "%s\n", sentence.c_str()); },
+            .inBackground = [this](auto work, auto done) { work_.begin(std::move(work), std::move(done)); },
+        };
+        manager_ = std::make_unique<DataManager>(std::move(dependencies));
+        require(manager_->loadAutoTextData().ok());
+        manager_->snippetGroups() = makeLibrary(SnippetsPerGroup, 10).snippetGroups;
+        manager_->notifyDataChanged();
+        require(manager_->saveData().ok());
+    }
+    ~StoredBench() { work_.finish(); }
+
+    void measureJournal() {
+        std::vector<double> times;
+        for (std::size_t i = 0; i < 200; ++i) {
+            change(i * 37);
+            times.push_back(nanosecondsOf([this] { require(manager_->writeJournal().ok()); }));
+        }
+        print("library.journal.append", median(std::move(times)) / 1e6, "ms");
+    }
+
+    // The longest that a call which is due every half millisecond has to wait beyond that, while a save comes and goes.
+    void measureSave() {
+        change(1);
+        probe(loop_.now());
+        const Timer end = loop_.performAfterDelay(7, [this] { loop_.stop(); });
+        loop_.run();
+        print("library.save.blocked", longest_ * 1e3, "ms");
+    }
+
+  private:
+    void change(std::size_t number) {
+        auto& group = *manager_->snippetGroups()[number % GroupCount];
+        group.items()[number % SnippetsPerGroup]->setPlainTextContent(u"Changed " + std::u16string(number % 90, u'x'));
+        manager_->notifyDataChanged();
+    }
+    void probe(double due) {
+        longest_ = std::max(longest_, loop_.now() - due);
+        const double next = loop_.now() + 0.0005;
+        probe_ = loop_.performAfterDelay(0.0005, [this, next] { probe(next); });
+    }
+
+    PollRunLoop loop_;
+    BackgroundWork work_;
+    PosixFiles files_;
+    InotifyFileWatcher watcher_{loop_};
+    std::unique_ptr<SqliteStore> store_;
+    std::unique_ptr<DataManager> manager_;
+    Timer probe_;
+    double longest_ = 0;
+};
+
+// ---- Foreign libraries ----
+
+void benchImport(const std::filesystem::path& folder) {
+    const auto file = folder / "five-thousand.ahk";
+    std::ofstream lines(file);
+    for (int i = 0; i < 5000; ++i) lines << "::abbr" << i << "::The replacement of number " << i << ", a short one\n";
+    lines.close();
+    const PosixFiles files;
+    const auto import = [&] {
+        const auto imported = importLibrary(file, files);
+        require(imported.ok() && imported.value().groups.front()->items().size() == 5000);
+    };
+    print("library.import.ahk5000", medianNanoseconds(Runs, import) / 1e6, "ms");
+}
+
+void benchConvert(const std::filesystem::path& folder, const std::string& program) {
+    const auto file = folder / "many.textexpander";
+    std::ofstream list(file);
+    list << R"(<?xml version="1.0" encoding="UTF-8"?><plist version="1.0"><dict><key>groupInfo</key><dict>)"
+         << "<key>groupName</key><string>Many</string></dict><key>snippetsTE2</key><array>";
+    for (int i = 0; i < 1500; ++i) {
+        list << "<dict><key>abbreviation</key><string>te" << i
+             << "</string><key>abbreviationMode</key><integer>0</integer>"
+             << "<key>label</key><string>Label " << i
+             << "</string><key>plainText</key><string>Dear %filltext:name=who%, "
+             << "today is %A, %e %B; number " << i << ".%|</string><key>snippetType</key><integer>0</integer>"
+             << "<key>uuidString</key><string>uuid-" << i << "</string></dict>";
+    }
+    list << "</array></dict></plist>";
+    list.close();
+    const std::string command =
+        program + " convert " + file.string() + " " + (folder / "many.plume").string() + " >/dev/null";
+    const auto convert = [&] { require(std::system(command.c_str()) == 0); };
+    print("library.convert.textexpander1500", medianNanoseconds(Runs, convert) / 1e6, "ms");
+}
+
+// ---- A Plume that runs ----
+
+// Microseconds from the press of a key to its letter in the text.
+std::vector<double> latencies(DesktopRig& rig, TargetProgram& target, double seconds) {
+    std::vector<double> times;
+    const int keycode = rig.keyboard().keycodeOf(U'a');
+    const rig::Deadline deadline(Milliseconds(static_cast<int>(seconds * 1000)));
+    for (int i = 0; !deadline.passed(); ++i) {
+        if (i % 100 == 0) target.clear();
+        const auto pressed = std::chrono::steady_clock::now();
+        rig.keyboard().press(keycode);
+        const auto change = target.takeChange(Milliseconds(2'000));
+        rig.keyboard().release(keycode);
+        rig.keyboard().sync();
+        if (change) times.push_back(std::chrono::duration<double, std::micro>(change->time - pressed).count());
+        poll(nullptr, 0, 5);
+    }
+    return times;
+}
+
+void append(std::vector<double>& all, const std::vector<double>& more) {
+    all.insert(all.end(), more.begin(), more.end());
+}
+
+double percentile99(std::vector<double> values) {
+    std::sort(values.begin(), values.end());
+    return values[values.size() * 99 / 100];
+}
+
+// Every addition loads and saves the library in a process of its own, and the running one takes it over.
+constexpr const char* Additions = R"(for i in 1 2 3 4; do "$0" add "key-$1-$i" x; sleep 0.8; done)";
+
+void benchRunning(const std::string& program) {
+    DesktopRig rig;
+    const auto all = rig.directory() / "all.plume";
+    std::ofstream(all, std::ios::binary) << libraryArchive(makeLibrary(SnippetsPerGroup, 10));
+    require(rig.session().start({program, "import", all.string()}, "plume")->waitForExit(Milliseconds(20'000)) == 0);
+
+    std::vector<double> ready;
+    for (int i = 0; i < 7; ++i) ready.push_back(PlumeProgram(rig, "").secondsToReady());
+    print("library.ready.10000", median(std::move(ready)) * 1e3, "ms");
+
+    PlumeProgram plume(rig, "");
+    const auto target = rig.startTarget(TargetKind::GtkTextView);
+    latencies(rig, *target, 2);
+    // Turn by turn, since a machine is not equally fast all the time.
+    std::vector<double> quiet;
+    std::vector<double> busy;
+    for (int turn = 0; turn < 6; ++turn) {
+        append(quiet, latencies(rig, *target, 4));
+        const auto editor = rig.session().start({"/bin/sh", "-c", Additions, program, std::to_string(turn)}, "plume");
+        append(busy, latencies(rig, *target, 4));
+    }
+    const double quietest = percentile99(std::move(quiet));
+    print("library.key_during_save.quiet.p99", quietest, "us");
+    print("library.key_during_save.p99", percentile99(std::move(busy)) - quietest, "us");
+}
+
 }  // namespace
 }  // namespace plume::bench
 
 int main() {
-    plume::bench::benchArchive();
-    plume::bench::benchSize();
+    using namespace plume::bench;
+    const auto program = (std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume").string();
+    std::string name = (std::filesystem::temp_directory_path() / "plume-bench-XXXXXX").string();
+    require(mkdtemp(name.data()) != nullptr);
+    benchArchive();
+    benchSize();
+    {
+        StoredBench stored(std::filesystem::path(name) / "store");
+        stored.measureJournal();
+        stored.measureSave();
+    }
+    benchImport(name);
+    benchConvert(name, program);
+    std::filesystem::remove_all(name);
+    benchRunning(program);
 }

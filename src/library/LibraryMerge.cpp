@@ -1,6 +1,7 @@
 #include "library/LibraryMerge.h"
 
 #include <algorithm>
+#include <map>
 #include <utility>
 
 namespace plume {
@@ -55,11 +56,7 @@ class Merge {
         const bool isBefore = change.group < list.at;
         const auto& before = before_.groups()[isBefore ? change.group : change.group - list.added + list.removed];
         SnippetGroup& theirs = theirGroup(*mine);
-        if (change.settings) {
-            theirs.setName(mine->name());
-            theirs.setAbbreviationPrefix(mine->abbreviationPrefix());
-            theirs.copySettingsFromGroup(*mine);
-        }
+        if (change.settings) theirs.takeSettings(*mine);
         for (std::size_t i = 0; i < change.items.removed; ++i) {
             removeFrom(theirs, *before.items[change.items.at + i].state);
         }
@@ -98,6 +95,15 @@ class Merge {
     LibraryContents& theirs_;
 };
 
+using Records = std::map<Uuid, std::shared_ptr<Snippet>>;
+
+// Every record is given once: a library may repeat an identity.
+std::shared_ptr<Snippet> keptRecord(Records& mine, const std::shared_ptr<Snippet>& theirs) {
+    const auto found = theirs->uuid() ? mine.find(*theirs->uuid()) : mine.end();
+    if (found == mine.end() || !found->second->isSameRecordAs(*theirs)) return theirs;
+    return mine.extract(found).mapped();
+}
+
 }  // namespace
 
 void mergeLibraries(const RecordedLibrary& before, const LibraryContents& mine, const LibraryDelta& delta,
@@ -105,6 +111,27 @@ void mergeLibraries(const RecordedLibrary& before, const LibraryContents& mine, 
     Merge merge(before, mine, theirs);
     merge.mergeList(delta.groups);
     for (const GroupChange& change : delta.groupChanges) merge.mergeGroup(change, delta.groups);
+}
+
+void keepRecords(const LibraryContents& mine, LibraryContents& theirs) {
+    Records known;
+    for (const auto& group : mine.snippetGroups) {
+        for (const auto& snippet : group->items()) {
+            if (snippet->uuid()) known.emplace(*snippet->uuid(), snippet);
+        }
+    }
+    SnippetGroups left = mine.snippetGroups;
+    for (auto& group : theirs.snippetGroups) {
+        std::vector<std::shared_ptr<Snippet>> items;
+        items.reserve(group->items().size());
+        for (const auto& snippet : group->items()) items.push_back(keptRecord(known, snippet));
+        if (const auto kept = withIdentityOf(left, *group)) {
+            std::erase(left, kept);
+            kept->takeSettings(*group);
+            group = kept;
+        }
+        if (group->items() != items) group->replaceItems(items);
+    }
 }
 
 }  // namespace plume

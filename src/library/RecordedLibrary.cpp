@@ -33,27 +33,6 @@ void forEachThatStayed(const ListChange& change, std::size_t now, Call call) {
     for (std::size_t i = change.at + change.added; i < now; ++i) call(i - change.added + change.removed, i);
 }
 
-RecordedSnippet recorded(const std::shared_ptr<Snippet>& snippet) {
-    return {snippet, snippet->snapshot()};
-}
-
-RecordedGroup recorded(const std::shared_ptr<SnippetGroup>& group) {
-    RecordedGroup result{group, group->snapshot(), {}};
-    result.items.reserve(group->items().size());
-    for (const auto& snippet : group->items()) result.items.push_back(recorded(snippet));
-    return result;
-}
-
-template <typename Recorded, typename Today>
-void replay(const ListChange& change, std::vector<Recorded>& before, const std::vector<Today>& now) {
-    const auto at = before.begin() + static_cast<std::ptrdiff_t>(change.at);
-    const auto place = before.erase(at, at + static_cast<std::ptrdiff_t>(change.removed));
-    std::vector<Recorded> added;
-    added.reserve(change.added);
-    for (std::size_t i = 0; i < change.added; ++i) added.push_back(recorded(now[change.at + i]));
-    before.insert(place, std::make_move_iterator(added.begin()), std::make_move_iterator(added.end()));
-}
-
 GroupChange changesOf(const RecordedGroup& before, const SnippetGroup& now, std::size_t place) {
     GroupChange change;
     change.group = place;
@@ -61,12 +40,34 @@ GroupChange changesOf(const RecordedGroup& before, const SnippetGroup& now, std:
     change.items = changeOfList(before.items, now.items());
     forEachThatStayed(change.items, now.items().size(), [&](std::size_t was, std::size_t is) {
         const RecordedSnippet& snippet = before.items[was];
-        if (snippet.state->revision() != snippet.live->revision()) change.changed.push_back(is);
+        if (snippet.revision != snippet.live->revision()) change.changed.push_back(is);
     });
     return change;
 }
 
 }  // namespace
+
+RecordedSnippet RecordedLibrary::recorded(const std::shared_ptr<Snippet>& snippet) const {
+    return {snippet, snippet->revision(), keep_ == Keep::States ? snippet->snapshot() : nullptr};
+}
+
+RecordedGroup RecordedLibrary::recorded(const std::shared_ptr<SnippetGroup>& group) const {
+    RecordedGroup result{group, group->snapshot(), {}};
+    result.items.reserve(group->items().size());
+    for (const auto& snippet : group->items()) result.items.push_back(recorded(snippet));
+    return result;
+}
+
+template <typename Recorded, typename Today>
+void RecordedLibrary::replay(const ListChange& change, std::vector<Recorded>& before,
+                             const std::vector<Today>& now) const {
+    const auto at = before.begin() + static_cast<std::ptrdiff_t>(change.at);
+    const auto place = before.erase(at, at + static_cast<std::ptrdiff_t>(change.removed));
+    std::vector<Recorded> added;
+    added.reserve(change.added);
+    for (std::size_t i = 0; i < change.added; ++i) added.push_back(recorded(now[change.at + i]));
+    before.insert(place, std::make_move_iterator(added.begin()), std::make_move_iterator(added.end()));
+}
 
 void RecordedLibrary::record(const LibraryContents& library) {
     identity_ = library;

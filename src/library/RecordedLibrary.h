@@ -43,13 +43,19 @@ class RecordedLibrary {
   public:
     struct RecordedSnippet {
         std::shared_ptr<Snippet> live;
-        std::shared_ptr<Snippet> state;
+        std::uint64_t revision = 0;
+        std::shared_ptr<Snippet> state;  // null when revisions alone are kept
     };
     struct RecordedGroup {
         std::shared_ptr<SnippetGroup> live;
         std::shared_ptr<SnippetGroup> state;  // without items
         std::vector<RecordedSnippet> items;
     };
+
+    // For who wants to know that a snippet has changed, its revision is enough; contents() needs its state.
+    enum class Keep : std::uint8_t { States, Revisions };
+
+    explicit RecordedLibrary(Keep keep = Keep::States) : keep_(keep) {}
 
     void record(const LibraryContents& library);
     // Microseconds for ten thousand snippets.
@@ -62,6 +68,12 @@ class RecordedLibrary {
     LibraryContents contents() const;
 
   private:
+    RecordedSnippet recorded(const std::shared_ptr<Snippet>& snippet) const;
+    RecordedGroup recorded(const std::shared_ptr<SnippetGroup>& group) const;
+    template <typename Recorded, typename Today>
+    void replay(const ListChange& change, std::vector<Recorded>& before, const std::vector<Today>& now) const;
+
+    Keep keep_;
     LibraryContents identity_;  // without groups
     std::vector<RecordedGroup> groups_;
 };

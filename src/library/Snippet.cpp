@@ -1,5 +1,6 @@
 #include "library/Snippet.h"
 
+#include <tuple>
 #include <utility>
 #include <variant>
 
@@ -194,6 +195,15 @@ std::shared_ptr<Snippet> Snippet::snapshot() const {
     copy->note_ = note_;
     copy->initialized_ = true;
     return copy;
+}
+
+bool Snippet::isSameRecordAs(const Snippet& other) const {
+    const auto record = [](const Snippet& snippet) {
+        return std::tie(snippet.uuid_, snippet.abbreviation_, snippet.caseSensitivity_, snippet.contentType_,
+                        snippet.richTextContent_, snippet.unreadContent_, snippet.label_, snippet.note_,
+                        snippet.dateCreated_, snippet.dateModified_, snippet.lastTimeUsed_);
+    };
+    return record(*this) == record(other);
 }
 
 void Snippet::encodeWithCoder(KeyedEncoder& coder) const {

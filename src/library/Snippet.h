@@ -75,6 +75,8 @@ class Snippet final : public KeyedCodable {
     bool isSimpleSnippet() const;
     bool isScript() const;
     bool isContentEqualTo(const Snippet& other) const;
+    // Everything that is archived is equal, identity and dates included.
+    bool isSameRecordAs(const Snippet& other) const;
 
     const Text& label() const { return label_; }
     void setLabel(Text label);

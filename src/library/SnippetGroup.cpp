@@ -224,6 +224,12 @@ bool SnippetGroup::hasSameSettings(const SnippetGroup& other) const {
     return settings(*this) == settings(other);
 }
 
+void SnippetGroup::takeSettings(const SnippetGroup& other) {
+    setName(other.name_);
+    setAbbreviationPrefix(other.abbreviationPrefix_);
+    copySettingsFromGroup(other);
+}
+
 std::shared_ptr<Snippet> SnippetGroup::findSnippetWithAbbreviation(std::u16string_view abbreviation) const {
     const auto found = std::find_if(items_.begin(), items_.end(),
                                     [&](const auto& snippet) { return snippet->abbreviation() == abbreviation; });

@@ -111,6 +111,8 @@ class SnippetGroup final : public KeyedCodable, public std::enable_shared_from_t
     std::shared_ptr<SnippetGroup> snapshot() const;
     // All that copySettingsFromGroup() copies, the name and the prefix are equal.
     bool hasSameSettings(const SnippetGroup& other) const;
+    // Makes them so.
+    void takeSettings(const SnippetGroup& other);
 
     // The first snippet with exactly this abbreviation, the prefix not considered; null when there is none.
     std::shared_ptr<Snippet> findSnippetWithAbbreviation(std::u16string_view abbreviation) const;

@@ -90,6 +90,7 @@ Result<void> StoredLibrary::mergeWithStored(LibraryContents& library, const Libr
         return Error{"what another process has stored cannot be read: " + loaded.value().damage};
     }
     LibraryContents theirs = std::move(loaded.value().contents);
+    if (delta.isEmpty()) keepRecords(library, theirs);
     const RecordedLibrary previously = std::exchange(recorded_, RecordedLibrary());
     recorded_.record(theirs);
     if (!delta.isEmpty()) {

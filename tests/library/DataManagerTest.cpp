@@ -220,15 +220,26 @@ TEST_F(DataManagerTest, TakesOverWhatAnotherProcessHasWritten) {
     Machine one(world, "one", disk);
     Machine two(world, "two", disk);
     one.load();
-    const auto shared = one.add(u"shared");
+    one.add(u"shared");
     one.add(u"gone");
     world.loop.advance(6);
     two.load();
     EXPECT_EQ(two.library(), one.library());
 
+    // What the other has left alone stays the very record that it was.
+    one.restart();
+    one.load();
+    const auto group = one.manager->snippetGroups().front();
+    const auto shared = group->items()[0];
     two.add(u"from two");
+    two.manager->snippetGroups().front()->items()[1]->setNote(u"changed");
+    two.manager->notifyDataChanged();
     world.loop.advance(0.5);
     EXPECT_THAT(one.library(), ElementsAre("Mine: shared=text gone=text from two=text"));
+    EXPECT_EQ(one.manager->snippetGroups().front(), group);
+    EXPECT_EQ(group->items()[0], shared);
+    EXPECT_EQ(shared->parentGroup(), group);
+    EXPECT_EQ(group->items()[1]->note(), u"changed");
 
     // Both at once: neither loses anything.
     auto& mine = *one.manager->snippetGroups().front();

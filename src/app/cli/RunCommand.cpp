@@ -85,9 +85,10 @@ class Run {
              [this](const std::string& sentence) { voice_.say(sentence); }, sources_.writableSettings()});
         consent.begin();
         const std::string description = sources_.description();
-        std::thread tapThread([this, description, groups = sources_.groups(), settings = sources_.settings()] {
+        std::thread tapThread([this, description, update = libraryUpdate(), settings = sources_.settings()] {
             settings_.registerDefaults(settings);
-            expand(groups, description);
+            if (update) library_.apply(*update);
+            expand(description);
         });
         port_.mainLoop().run();
         port_.tapLoop().stop();
@@ -102,10 +103,10 @@ class Run {
     }
 
     // The tap thread.
-    void expand(const SnippetGroups& groups, const std::string& description) {
+    void expand(const std::string& description) {
         {
             Composition composition(port_.ports(), environment());
-            composition.setSnippetGroups(groups);
+            composition.setSnippetGroups(library_.groups());
             composition.loadPreferences();
             MacInputService& service = composition.inputService();
             port_.mainLoop().perform([this, &service] {
@@ -130,8 +131,14 @@ class Run {
     void feed(Composition& composition) {
         sources_.begin(
             [this, &composition] {
-                port_.tapLoop().perform(
-                    [&composition, groups = sources_.groups()] { composition.setSnippetGroups(groups); });
+                auto update = libraryUpdate();
+                if (!update) return;
+                port_.tapLoop().perform([this, &composition, update = std::move(update)]() mutable {
+                    library_.apply(*update);
+                    composition.setSnippetGroups(library_.groups());
+                    // What went out is freed where nobody waits for a key.
+                    port_.mainLoop().perform([freed = std::move(update)] {});
+                });
             },
             [this, &composition] {
                 port_.tapLoop().perform([this, &composition, settings = sources_.settings()] {
@@ -139,6 +146,11 @@ class Run {
                     composition.loadPreferences();
                 });
             });
+    }
+
+    std::shared_ptr<LibraryUpdate> libraryUpdate() {
+        auto update = sources_.libraryUpdate();
+        return update ? std::make_shared<LibraryUpdate>(*std::move(update)) : nullptr;
     }
 
     void tellWhetherStarted(const MacInputService& service, const std::string& description) {
@@ -193,6 +205,7 @@ class Run {
     LinuxPort& port_;
     RunSources& sources_;          // of the main thread
     MemoryUserDefaults settings_;  // of the tap thread
+    FedLibrary library_;           // of the tap thread
     std::ostream& output_;
     Voice& voice_;
     std::atomic<int> status_ = ExitStatus::Success;

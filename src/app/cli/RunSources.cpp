@@ -72,10 +72,8 @@ void RunSources::openSettings() {
     }
 }
 
-SnippetGroups RunSources::groups() const {
-    if (options_.file) return copiesOfGroups(options_.file->groups());
-    givenVersion_ = own_->manager().library().versionUUIDString;
-    return copiesOfGroups(own_->manager().snippetGroups());
+const SnippetGroups& RunSources::groups() const {
+    return options_.file ? options_.file->groups() : own_->manager().snippetGroups();
 }
 
 PropertyList::Dictionary RunSources::settings() const {
@@ -93,7 +91,7 @@ WritableUserDefaults* RunSources::writableSettings() {
 }
 
 std::string RunSources::description() const {
-    const SnippetGroups& all = options_.file ? options_.file->groups() : own_->manager().snippetGroups();
+    const SnippetGroups& all = groups();
     const std::size_t count =
         std::accumulate(all.begin(), all.end(), std::size_t{0},
                         [](std::size_t sum, const auto& group) { return sum + group->items().size(); });
@@ -111,7 +109,7 @@ void RunSources::begin(std::function<void()> groupsChanged, std::function<void()
     imported_ = manager.didImportDataEvent.addObserver(this, &RunSources::libraryReplaced);
     synced_ = manager.didSyncDataEvent.addObserver(this, &RunSources::libraryReplaced);
     // Another process may have been faster than the start.
-    if (manager.library().versionUUIDString != givenVersion_) groupsChanged_();
+    groupsChanged_();
     manager.sync().loadSyncPreferences(false);
     manager.backups().startAutoBackupTimer();
 }

@@ -1,6 +1,6 @@
 // Where a running Plume has its snippets and settings from: the user's library and settings, or files that were named.
 //
-// Belongs to the main thread. What it gives away are records of their own, for the thread that hears the keys.
+// Belongs to the main thread. What it gives away is for the thread that hears the keys, which has records of its own.
 #pragma once
 
 #include <functional>
@@ -12,6 +12,7 @@
 #include "app/cli/BackgroundWork.h"
 #include "app/cli/FollowedLibrary.h"
 #include "app/cli/UserLibrary.h"
+#include "library/LibraryFeed.h"
 #include "platform/Notices.h"
 
 namespace plume {
@@ -32,7 +33,8 @@ class RunSources {
     RunSources(const RunSources&) = delete;
     RunSources& operator=(const RunSources&) = delete;
 
-    SnippetGroups groups() const;
+    // What has happened in the library since the last call, the first time all of it; nothing when nothing has.
+    std::optional<LibraryUpdate> libraryUpdate() { return feed_.changesTo(groups()); }
     // Every setting that has a value.
     PropertyList::Dictionary settings() const;
     // Where the user's answers can be kept; null when the settings are a file's.
@@ -48,6 +50,7 @@ class RunSources {
     explicit RunSources(Options options);
     Result<void> openLibrary();
     void openSettings();
+    const SnippetGroups& groups() const;
     void offerBackup(const std::optional<Files::Path>& newest);
     void libraryReplaced(LibraryEvent&) { groupsChanged_(); }
     void settingsReplaced(UserDefaultsChange& change);
@@ -58,7 +61,7 @@ class RunSources {
     std::unique_ptr<UserLibrary> own_;    // null when the library is a file
     std::unique_ptr<SqliteStore> store_;  // for settings alone, when the library is a file
     std::shared_ptr<const UserDefaults> settings_;
-    mutable std::optional<std::u16string> givenVersion_;
+    LibraryFeed feed_;
     std::function<void()> groupsChanged_;
     std::function<void()> settingsChanged_;
     Subscription imported_;
