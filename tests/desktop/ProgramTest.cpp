@@ -152,6 +152,15 @@ TEST_F(Program, AsksOnceWhetherProgramsMayTellAboutPasswordFields) {
     NoticeBoard board;
     const auto isAsked = [&] { return board.body("Password fields in browsers").has_value(); };
     start(Library, R"({ "LetProgramsTellPasswordFields": false })");
+    start("", "");
+    ASSERT_TRUE(waitUntil(isAsked, Bound)) << log();
+    board.press("Password fields in browsers", "Not now");
+    const auto isKept = [&] {
+        const auto setting =
+            rig_->session().start({plumeProgram(), "settings", "LetProgramsTellPasswordFields"}, "plume");
+        return setting->waitForExit(Bound) == 0 && setting->logTail().find("false") != std::string::npos;
+    };
+    EXPECT_TRUE(waitUntil(isKept, Bound)) << log();
     start(Library, "{}");
     ASSERT_TRUE(waitUntil(isAsked, Bound)) << log();
     EXPECT_EQ(findAccessibilityBus().status, AccessibilityStatus::SwitchedOff);
