@@ -149,7 +149,7 @@ void SnippetGroup::removeItem(const std::shared_ptr<Snippet>& snippet) {
 
 void SnippetGroup::replaceItems(const std::vector<std::shared_ptr<Snippet>>& snippets) {
     // A copy: they may be this group's own.
-    const auto added = snippets;
+    const std::vector<std::shared_ptr<Snippet>> added(snippets.begin(), snippets.end());
     while (!items_.empty()) {
         const std::shared_ptr<Snippet> removed = items_.back();
         items_.pop_back();

@@ -144,13 +144,13 @@ Result<bool> PosixFiles::replace(const Path& path, const std::optional<std::stri
 }
 
 Result<bool> PosixFiles::writeIf(const std::function<Result<bool>()>& wanted, const Path& path,
-                                 std::string_view bytes) {
+                                 std::string_view bytes) const {
     const Path place = followLinks(path);
     if (place.empty()) return cannot("written", path, ELOOP);
     if (isFolder(place)) return cannot("written", path, EISDIR);
     Draft draft(place.parent_path());
     if (!draft.isOpen() || !draft.fill(bytes)) return cannot("written", path, errno);
-    if (const auto still = wanted(); !still || !still.value()) return still;
+    if (auto still = wanted(); !still || !still.value()) return still;
     if (!draft.putInPlaceOf(place)) return cannot("written", path, errno);
     bringToDisk(place.parent_path());
     return true;

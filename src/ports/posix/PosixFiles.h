@@ -24,7 +24,7 @@ class PosixFiles final : public Files {
 
   private:
     // Asked when everything is written that can be written before.
-    Result<bool> writeIf(const std::function<Result<bool>()>& wanted, const Path& path, std::string_view bytes);
+    Result<bool> writeIf(const std::function<Result<bool>()>& wanted, const Path& path, std::string_view bytes) const;
 };
 
 }  // namespace plume
