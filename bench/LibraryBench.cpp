@@ -14,6 +14,7 @@
 #include <utility>
 #include <vector>
 
+#include "Foundation/Strings.h"
 #include "app/cli/BackgroundWork.h"
 #include "bench/Figures.h"
 #include "bench/GeneratedLibrary.h"
@@ -190,30 +191,70 @@ double percentile99(std::vector<double> values) {
     return values[values.size() * 99 / 100];
 }
 
-// Every addition loads and saves the library in a process of its own, and the running one takes it over.
-constexpr const char* Additions = R"(for i in 1 2 3 4; do "$0" add "key-$1-$i" x; sleep 0.8; done)";
+// Two versions of the library turn by turn from "another machine". Every one has Plume take it over and save it.
+class OtherMachine {
+  public:
+    explicit OtherMachine(DesktopRig& rig) : folder_(rig.directory() / "shared") {
+        std::filesystem::create_directories(folder_ / "Plume");
+        LibraryContents library = makeLibrary(SnippetsPerGroup, 10);
+        for (const char* name : {"0", "1"}) {
+            library.snippetGroups[7]->items()[7]->setPlainTextContent(fromUtf8(name));
+            library.versionUUIDString = Uuid::random().toString();
+            library.dateCreated = currentDate();
+            std::ofstream(folder_ / name, std::ios::binary) << libraryArchive(library);
+        }
+        send();
+    }
 
-void benchRunning(const std::string& program) {
-    DesktopRig rig;
+    const std::filesystem::path& folder() const { return folder_; }
+
+    void send() {
+        const auto draft = folder_ / "draft";
+        std::filesystem::copy_file(folder_ / std::to_string(++sent_ % 2), draft);
+        std::filesystem::rename(draft, folder_ / "Plume" / "Data.plume");
+    }
+
+  private:
+    std::filesystem::path folder_;
+    int sent_ = 0;
+};
+
+LibraryStorage::Generation savesIn(DesktopRig& rig) {
+    const auto opened = SqliteStore::open(rig.directory() / "home/.config/plume", nullptr);
+    require(opened.ok());
+    return opened.value().store->library().load().value().generation;
+}
+
+void benchReady(DesktopRig& rig, const std::string& program) {
     const auto all = rig.directory() / "all.plume";
     std::ofstream(all, std::ios::binary) << libraryArchive(makeLibrary(SnippetsPerGroup, 10));
     require(rig.session().start({program, "import", all.string()}, "plume")->waitForExit(Milliseconds(20'000)) == 0);
-
     std::vector<double> ready;
     for (int i = 0; i < 7; ++i) ready.push_back(PlumeProgram(rig, "").secondsToReady());
     print("library.ready.10000", median(std::move(ready)) * 1e3, "ms");
+}
 
+void benchSaving(DesktopRig& rig, const std::string& program) {
+    OtherMachine other(rig);
+    const std::pair<const char*, std::string> settings[] = {{"SyncDirectory", other.folder()}, {"SyncEnabled", "true"}};
+    for (const auto& [name, value] : settings) {
+        const auto set = rig.session().start({program, "settings", name, value}, "plume");
+        require(set->waitForExit(Milliseconds(5'000)) == 0);
+    }
     PlumeProgram plume(rig, "");
     const auto target = rig.startTarget(TargetKind::GtkTextView);
-    latencies(rig, *target, 2);
+    latencies(rig, *target, 5);
     // Turn by turn, since a machine is not equally fast all the time.
+    constexpr int Turns = 12;
     std::vector<double> quiet;
     std::vector<double> busy;
-    for (int turn = 0; turn < 6; ++turn) {
-        append(quiet, latencies(rig, *target, 4));
-        const auto editor = rig.session().start({"/bin/sh", "-c", Additions, program, std::to_string(turn)}, "plume");
-        append(busy, latencies(rig, *target, 4));
+    const auto before = savesIn(rig);
+    for (int turn = 0; turn < Turns; ++turn) {
+        append(quiet, latencies(rig, *target, 2));
+        other.send();
+        append(busy, latencies(rig, *target, 2));
     }
+    require(savesIn(rig) >= before + Turns);
     const double quietest = percentile99(std::move(quiet));
     print("library.key_during_save.quiet.p99", quietest, "us");
     print("library.key_during_save.p99", percentile99(std::move(busy)) - quietest, "us");
@@ -237,5 +278,7 @@ int main() {
     benchImport(name);
     benchConvert(name, program);
     std::filesystem::remove_all(name);
-    benchRunning(program);
+    plume::rig::DesktopRig desktop;
+    benchReady(desktop, program);
+    benchSaving(desktop, program);
 }

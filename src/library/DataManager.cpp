@@ -5,6 +5,7 @@
 
 #include "Foundation/Uuid.h"
 #include "library/LibraryExport.h"
+#include "library/LibraryMerge.h"
 #include "library/LibraryPreferences.h"
 
 namespace plume {
@@ -33,7 +34,7 @@ DataManager::DataManager(Dependencies dependencies)
       sync_({around_.settings, around_.files, around_.watcher, around_.loop, backups_,
              [this]() -> const LibraryContents& { return library_; },
              [this](bool preferences) { return archivedDataIncludingPreferences(preferences); },
-             [this](const LibraryContents& file) { takeDownload(file); }, around_.loadPreferences, around_.askFirst,
+             [this](LibraryContents file) { takeDownload(std::move(file)); }, around_.loadPreferences, around_.askFirst,
              around_.report}) {}
 
 std::shared_ptr<SnippetGroup> DataManager::groupWithName(std::u16string_view name) const {
@@ -154,8 +155,9 @@ void DataManager::replaceLibrary(LibraryContents contents) {
     if (previous && previous != library_.versionUUIDString) sync_.libraryChanged(*previous);
 }
 
-void DataManager::takeDownload(const LibraryContents& file) {
+void DataManager::takeDownload(LibraryContents file) {
     raise(willSyncDataEvent);
+    keepRecords(library_, file);
     setGroups(file.snippetGroups);
     library_.versionUUIDString = file.versionUUIDString;
     raise(didSyncDataEvent);

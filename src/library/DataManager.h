@@ -138,7 +138,7 @@ class DataManager {
     Result<void> completeIdentity();
 
     void setGroups(const SnippetGroups& groups);
-    void takeDownload(const LibraryContents& file);
+    void takeDownload(LibraryContents file);
     void replaceLibrary(LibraryContents contents);
     void stampVersion();
     void scheduleSave(double delay);

@@ -13,9 +13,9 @@ namespace plume {
 void mergeLibraries(const RecordedLibrary& before, const LibraryContents& mine, const LibraryDelta& delta,
                     LibraryContents& theirs);
 
-// Puts the records of `mine` into `theirs` wherever both mean the same, so that who holds one keeps holding it: a
-// snippet that is equal in everything, a group of the same identity, which gets their settings and list. For a `mine`
-// in which nothing has changed since both knew the same.
+// Puts the records of `mine` into `theirs`, which takes its place, wherever both mean the same, so that who holds one
+// keeps holding it: a snippet that is equal in everything; a group of the same identity, which gets their settings and
+// list. What only `mine` had is gone then.
 void keepRecords(const LibraryContents& mine, LibraryContents& theirs);
 
 }  // namespace plume
