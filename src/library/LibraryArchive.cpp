@@ -1,7 +1,6 @@
 #include "library/LibraryArchive.h"
 
 #include <any>
-#include <unordered_map>
 #include <utility>
 
 #include "Foundation/Strings.h"
@@ -82,26 +81,6 @@ void convertOldSnippets(const SnippetGroups& groups, const ConvertOldSnippet& co
             }
         }
     }
-}
-
-SnippetGroups copiesOfGroups(const SnippetGroups& groups) {
-    SnippetGroups copies;
-    copies.reserve(groups.size());
-    // One that stands in several groups stays one.
-    std::unordered_map<const Snippet*, std::shared_ptr<Snippet>> shared;
-    for (const auto& group : groups) {
-        auto copy = group->snapshot();
-        std::vector<std::shared_ptr<Snippet>> items;
-        items.reserve(group->items().size());
-        for (const auto& snippet : group->items()) {
-            auto& known = shared[snippet.get()];
-            if (!known) known = snippet->snapshot();
-            items.push_back(known);
-        }
-        copy->addItems(items);
-        copies.push_back(std::move(copy));
-    }
-    return copies;
 }
 
 }  // namespace plume

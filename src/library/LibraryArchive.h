@@ -45,7 +45,4 @@ Result<LibraryContents> readLibraryArchive(std::string_view bytes, const Convert
 // A snippet whose conversion throws stays as it was.
 void convertOldSnippets(const SnippetGroups& groups, const ConvertOldSnippet& convertOldSnippet);
 
-// Records of their own with the same identities and values: for another thread.
-SnippetGroups copiesOfGroups(const SnippetGroups& groups);
-
 }  // namespace plume

@@ -52,14 +52,25 @@ void applyTo(SnippetGroup& group, LibraryUpdate::Group& update) {
     }
 }
 
+std::vector<std::shared_ptr<Snippet>> copiesOf(const SnippetGroup& group, std::size_t first, std::size_t count) {
+    std::vector<std::shared_ptr<Snippet>> copies;
+    copies.reserve(count);
+    for (std::size_t i = first; i < first + count; ++i) copies.push_back(group.items()[i]->snapshot());
+    return copies;
+}
+
+std::shared_ptr<SnippetGroup> copyOf(const SnippetGroup& group) {
+    auto copy = group.snapshot();
+    copy->addItems(copiesOf(group, 0, group.items().size()));
+    return copy;
+}
+
 LibraryUpdate::Group updateOf(const SnippetGroup& group, const GroupChange& change) {
     LibraryUpdate::Group update;
     update.place = change.group;
     if (change.settings) update.settings = group.snapshot();
     update.items = change.items;
-    for (std::size_t i = 0; i < change.items.added; ++i) {
-        update.added.push_back(group.items()[change.items.at + i]->snapshot());
-    }
+    update.added = copiesOf(group, change.items.at, change.items.added);
     for (const std::size_t place : change.changed) update.changed.emplace_back(place, group.items()[place]->snapshot());
     return update;
 }
@@ -73,8 +84,9 @@ std::optional<LibraryUpdate> LibraryFeed::changesTo(const SnippetGroups& groups)
     if (delta.isEmpty()) return std::nullopt;
     LibraryUpdate update;
     update.groups = delta.groups;
-    const auto first = placeIn(library.snippetGroups, delta.groups.at);
-    update.added = copiesOfGroups({first, first + static_cast<std::ptrdiff_t>(delta.groups.added)});
+    for (std::size_t i = 0; i < delta.groups.added; ++i) {
+        update.added.push_back(copyOf(*groups[delta.groups.at + i]));
+    }
     for (const GroupChange& change : delta.groupChanges) {
         update.changed.push_back(updateOf(*groups[change.group], change));
     }

@@ -15,7 +15,8 @@
 
 namespace plume {
 
-// Records in it belong to whoever holds it. By places, as the library's changes are.
+// Records in it belong to whoever holds it; one that the library lists twice is two here. By places, as the library's
+// changes are.
 struct LibraryUpdate {
     struct Group {
         std::size_t place = 0;                   // in the list of after the change

@@ -41,7 +41,7 @@ void edit(SnippetGroups& groups) {
     }
     auto& group = *groups[below(groups.size())];
     const std::size_t count = group.items().size();
-    switch (below(9)) {
+    switch (below(10)) {
         case 0:
             groups.erase(groups.begin() + static_cast<std::ptrdiff_t>(below(groups.size())));
             break;
@@ -66,6 +66,9 @@ void edit(SnippetGroups& groups) {
             break;
         case 7:
             if (count > 0) group.items()[below(count)]->setAbbreviation(abbreviation());
+            break;
+        case 8:  // the same record in two places
+            if (count > 0) groups[below(groups.size())]->insertItem(group.items()[below(count)], below(3));
             break;
         default:
             if (count > 0) group.items()[below(count)]->setRichTextContent(test::richText());
