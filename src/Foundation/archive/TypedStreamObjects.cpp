@@ -121,7 +121,8 @@ class StreamReader {
         std::int64_t reference = 0;
         if (!readInteger(reference)) return false;
         if (reference < FirstReference) return fails("a reference before this byte");
-        number = static_cast<std::size_t>(reference - FirstReference);
+        // Unsigned: the largest reference and the first one are further apart than a signed number tells.
+        number = static_cast<std::size_t>(reference) - static_cast<std::size_t>(FirstReference);
         return number < count || fails("a reference to what was there before");
     }
 

@@ -77,6 +77,7 @@ TEST(TypedStream, RefusesDamage) {
         {"\x04\x0Bstreamtypes\x81\xE8\x03"s, "the signature"},
         {stream(StringClass), "more bytes"},
         {stream("\x93"s), "a reference to what was there before"},
+        {stream("\x87" + std::string(7, '\xFF') + "\x7F"), "a reference to what was there before"},
         {stream("\x92"s), "a reference to a class"},
         {stream("\x84\x84\x7FNSString"s), "as many bytes as the length before says"},
         {stream(StringClass + "\x84\x01+\x82\xFF\xFF\xFF\xFF"s), "as many bytes as the length before says"},
