@@ -84,11 +84,6 @@ std::string settings(bool paste) {
            R"(, "UseClipboardIn": 0, "UseClipboardForLongText": false})";
 }
 
-double percentile(std::vector<double> values, double part) {
-    std::ranges::sort(values);
-    return values[std::min(values.size() - 1, static_cast<std::size_t>(static_cast<double>(values.size()) * part))];
-}
-
 // What expands: Plume, the bare synthesiser, or another program.
 using Expand = std::function<Expansion(const Case&, const std::string& expected)>;
 

@@ -24,6 +24,13 @@ inline double median(std::vector<double> values) {
     return *middle;
 }
 
+// That of the values which `part` of them do not exceed.
+inline double percentile(std::vector<double> values, double part) {
+    std::sort(values.begin(), values.end());
+    const auto place = static_cast<std::size_t>(static_cast<double>(values.size()) * part);
+    return values[std::min(place, values.size() - 1)];
+}
+
 // The median of `runs` timings of `work`, in nanoseconds.
 template <typename Work>
 double medianNanoseconds(int runs, Work&& work) {

@@ -14,6 +14,7 @@
 
 #include "Foundation/Strings.h"
 #include "bench/Figures.h"
+#include "bench/KeyLatency.h"
 #include "ports/x11/windows/DesktopFiles.h"
 #include "ports/x11/windows/X11ProcessManager.h"
 #include "testing/rig/KeyboardPort.h"
@@ -36,34 +37,13 @@ std::string shortName(TargetKind kind) {
     return kind == TargetKind::GtkTextView ? "gtk" : kind == TargetKind::QtTextEdit ? "qt" : "xterm";
 }
 
-// Microseconds from a key's press to its letter in the text, for each of some keys, once all that comes with a start
-// and with the first keys has been done.
+// For each of some keys, once all that comes with a start and with the first keys has been done.
 std::vector<double> latencies(DesktopRig& rig, TargetProgram& target, int keys) {
-    std::vector<double> result;
-    const int keycode = rig.keyboard().keycodeOf(U'a');
     constexpr int FirstKeys = 50;
     // Programs and the window manager ask for the keyboard's layout again when Plume has taken it.
     poll(nullptr, 0, 500);
-    for (int i = -FirstKeys; i < keys; ++i) {
-        if (i % 100 == 0) target.clear();
-        const auto pressed = std::chrono::steady_clock::now();
-        rig.keyboard().press(keycode);
-        const auto change = target.takeChange(Milliseconds(2'000));
-        rig.keyboard().release(keycode);
-        rig.keyboard().sync();
-        if (change && i >= 0)
-            result.push_back(std::chrono::duration<double, std::micro>(change->time - pressed).count());
-    }
-    return result;
-}
-
-double percentile99(std::vector<double> values) {
-    std::ranges::sort(values);
-    return values[values.size() * 99 / 100];
-}
-
-void append(std::vector<double>& all, const std::vector<double>& more) {
-    all.insert(all.end(), more.begin(), more.end());
+    keyLatencies(rig, target, 0, [](int typed) { return typed < FirstKeys; });
+    return keyLatencies(rig, target, 0, [keys](int typed) { return typed < keys; });
 }
 
 // What Plume adds to a key, and what a tap that does nothing but pass keys on adds: by turns with keys that nobody
@@ -81,10 +61,10 @@ void measureAdded(DesktopRig& rig, TargetProgram& target) {
     }
     print("input.untapped.median", median(without), "us");
     print("floor.input.added.median", median(passed) - median(without), "us");
-    print("floor.input.added.p99", percentile99(passed) - percentile99(without), "us");
+    print("floor.input.added.p99", percentile(passed, 0.99) - percentile(without, 0.99), "us");
     print("input.added.median", median(with) - median(without), "us");
     print("input.added.ratio", (median(with) - median(without)) / (median(passed) - median(without)), "times");
-    print("input.added.p99", percentile99(with) - percentile99(without), "us");
+    print("input.added.p99", percentile(with, 0.99) - percentile(without, 0.99), "us");
 }
 
 constexpr int Keys = 1000;

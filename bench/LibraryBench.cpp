@@ -1,8 +1,6 @@
 // How long a library of 10,000 snippets takes to be written as an archive and read back, and how large it becomes; what
 // a change and a save cost; how fast foreign libraries come in; and when a Plume with such a library is ready, and what
 // its changes cost who types meanwhile.
-#include <poll.h>
-
 #include <algorithm>
 #include <chrono>
 #include <cstdlib>
@@ -18,6 +16,7 @@
 #include "app/cli/BackgroundWork.h"
 #include "bench/Figures.h"
 #include "bench/GeneratedLibrary.h"
+#include "bench/KeyLatency.h"
 #include "import/Importers.h"
 #include "library/DataManager.h"
 #include "library/KnownSettings.h"
@@ -164,31 +163,9 @@ void benchConvert(const std::filesystem::path& folder, const std::string& progra
 
 // ---- A Plume that runs ----
 
-// Microseconds from the press of a key to its letter in the text.
-std::vector<double> latencies(DesktopRig& rig, TargetProgram& target, double seconds) {
-    std::vector<double> times;
-    const int keycode = rig.keyboard().keycodeOf(U'a');
-    const rig::Deadline deadline(Milliseconds(static_cast<int>(seconds * 1000)));
-    for (int i = 0; !deadline.passed(); ++i) {
-        if (i % 100 == 0) target.clear();
-        const auto pressed = std::chrono::steady_clock::now();
-        rig.keyboard().press(keycode);
-        const auto change = target.takeChange(Milliseconds(2'000));
-        rig.keyboard().release(keycode);
-        rig.keyboard().sync();
-        if (change) times.push_back(std::chrono::duration<double, std::micro>(change->time - pressed).count());
-        poll(nullptr, 0, 5);
-    }
-    return times;
-}
-
-void append(std::vector<double>& all, const std::vector<double>& more) {
-    all.insert(all.end(), more.begin(), more.end());
-}
-
-double percentile99(std::vector<double> values) {
-    std::sort(values.begin(), values.end());
-    return values[values.size() * 99 / 100];
+std::vector<double> latencies(DesktopRig& rig, TargetProgram& target, int seconds) {
+    const rig::Deadline deadline(Milliseconds(seconds * 1000));
+    return keyLatencies(rig, target, 5, [&deadline](int) { return !deadline.passed(); });
 }
 
 // Two versions of the library turn by turn from "another machine". Every one has Plume take it over and save it.
@@ -255,9 +232,9 @@ void benchSaving(DesktopRig& rig, const std::string& program) {
         append(busy, latencies(rig, *target, 2));
     }
     require(savesIn(rig) >= before + Turns);
-    const double quietest = percentile99(std::move(quiet));
+    const double quietest = percentile(std::move(quiet), 0.99);
     print("library.key_during_save.quiet.p99", quietest, "us");
-    print("library.key_during_save.p99", percentile99(std::move(busy)) - quietest, "us");
+    print("library.key_during_save.p99", percentile(std::move(busy), 0.99) - quietest, "us");
 }
 
 }  // namespace

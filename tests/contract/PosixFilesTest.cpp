@@ -9,6 +9,7 @@
 #include "ports/posix/InotifyFileWatcher.h"
 #include "ports/posix/PosixFiles.h"
 #include "tests/contract/ContractFiles.h"
+#include "tests/support/RunUntil.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace plume {
@@ -51,14 +52,7 @@ class PosixFilesBench final : public ContractFiles {
     Files& files() override { return files_; }
     FileWatcher& watcher() override { return *watcher_; }
     fs::path folder() override { return work_.path(); }
-    bool runUntil(const std::function<bool()>& condition) override {
-        const double end = loop_.now() + 10;
-        while (!condition() && loop_.now() < end) {
-            const Timer pause = loop_.performAfterDelay(0.002, [this] { loop_.stop(); });
-            loop_.run();
-        }
-        return condition();
-    }
+    bool runUntil(const std::function<bool()>& condition) override { return test::runUntil(loop_, condition); }
     void removeAll(const fs::path& folder) override { fs::remove_all(folder); }
 
   private:

@@ -2,6 +2,7 @@
 #include "ports/posix/InotifyFileWatcher.h"
 #include "ports/posix/store/SqliteStore.h"
 #include "tests/contract/ContractStorage.h"
+#include "tests/support/RunUntil.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace plume {
@@ -13,14 +14,7 @@ class SqliteStorageBench final : public ContractStorage {
     LibraryStorage& open() override {
         return stores_.emplace_back(std::move(SqliteStore::open(folder_.path(), &watcher_).value().store))->library();
     }
-    bool runUntil(const std::function<bool()>& condition) override {
-        const double end = loop_.now() + 10;
-        while (!condition() && loop_.now() < end) {
-            const Timer pause = loop_.performAfterDelay(0.002, [this] { loop_.stop(); });
-            loop_.run();
-        }
-        return condition();
-    }
+    bool runUntil(const std::function<bool()>& condition) override { return test::runUntil(loop_, condition); }
 
   private:
     TemporaryFolder folder_;

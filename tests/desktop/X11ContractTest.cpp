@@ -17,6 +17,7 @@
 #include "testing/rig/SelectionClients.h"
 #include "testing/rig/XcbReply.h"
 #include "tests/contract/ContractDesk.h"
+#include "tests/support/RunUntil.h"
 
 namespace plume::rig {
 
@@ -197,20 +198,11 @@ class X11Desk final : public ContractDesk {
 
 const ContractPort<ContractDesk> Desk{"X11", [] { return std::make_unique<X11Desk>(); }};
 
-bool runUntil(PollRunLoop& loop, const std::function<bool()>& condition) {
-    const Deadline deadline(Bound);
-    while (!condition() && !deadline.passed()) {
-        const Timer look = loop.performAfterDelay(Step, [&loop] { loop.stop(); });
-        loop.run();
-    }
-    return condition();
-}
-
 TEST(InputMethodTest, IsNamedInPlaceOfTheLayoutWhileItsEngineWorks) {
     Desktop& desktop = *DesktopEnvironment::desktop_;
     const auto& identifier = desktop.port->ports().inputSources.currentInputSourceIdentifier();
     const auto becomes = [&](const std::u16string& expected) {
-        return runUntil(desktop.port->tapLoop(), [&] { return identifier == expected; });
+        return test::runUntil(desktop.port->tapLoop(), [&] { return identifier == expected; });
     };
     ASSERT_EQ(identifier, u"us");
     for (const bool comesBack : {false, true}) {
@@ -244,7 +236,7 @@ void expectOutcomes(Fake& fake, bool tellsComposing) {
     InputMethodWatch watch(
         DesktopEnvironment::desktop_->rig.server().display(), loop, [&](const auto& /*engine*/) { stop(); }, stop);
     InputMethod& method = watch.inputMethod();
-    ASSERT_TRUE(runUntil(loop, [&] { return method.takesText(); }) && method.isIdle());
+    ASSERT_TRUE(test::runUntil(loop, [&] { return method.takesText(); }) && method.isIdle());
     struct Case {
         const char* text;
         bool passes;

@@ -14,6 +14,7 @@
 
 #include "ports/posix/InotifyFileWatcher.h"
 #include "ports/posix/PosixFiles.h"
+#include "tests/support/RunUntil.h"
 #include "tests/support/TemporaryFolder.h"
 
 namespace plume {
@@ -36,14 +37,7 @@ class SqliteStoreTest : public testing::Test {
         const auto opened = SqliteStore::open(folder_, nullptr);
         return opened ? "none" : opened.error().message;
     }
-    bool runUntil(const std::function<bool()>& condition) {
-        const double end = loop_.now() + 10;
-        while (!condition() && loop_.now() < end) {
-            const Timer pause = loop_.performAfterDelay(0.002, [this] { loop_.stop(); });
-            loop_.run();
-        }
-        return condition();
-    }
+    bool runUntil(const std::function<bool()>& condition) { return test::runUntil(loop_, condition); }
     std::vector<std::string> names() {
         std::vector<std::string> names;
         for (const auto& entry : fs::directory_iterator(folder_)) names.push_back(entry.path().filename());
