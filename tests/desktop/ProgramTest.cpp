@@ -53,16 +53,17 @@ class Program : public testing::Test {
     }
     std::string log() { return plume_->process().logTail(); }
 
-    static bool becomes(TargetProgram& target, const std::string& typed, const std::string& expected) {
+    static bool becomes(TargetProgram& target, const std::string& typed, const std::string& expected,
+                        Milliseconds within = Bound) {
         target.clear();
         rig_->keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
         rig_->keyboard().type(typed);
-        return target.awaitText(expected, Milliseconds(1'000)) == expected;
+        return target.awaitText(expected, within) == expected;
     }
 
     // Plume may not know yet that another program has come to the front, or may not have started yet.
     static bool soonBecomes(TargetProgram& target, const std::string& typed, const std::string& expected) {
-        return waitUntil([&] { return becomes(target, typed, expected); }, Bound);
+        return waitUntil([&] { return becomes(target, typed, expected, Milliseconds(2'000)); }, Bound);
     }
 
     static inline std::unique_ptr<DesktopRig> rig_;
@@ -283,7 +284,7 @@ TEST_F(Program, StaysSwitchedOffWhateverElseIsSet) {
     rig_->keyboard().tap(Key::F2);
     EXPECT_TRUE(becomes(*target, "x btw ", "x btw ")) << log();
     set("LongTextLength", "90");
-    const auto listens = [&] { return becomes(*target, "x btw ", "x by the way "); };
+    const auto listens = [&] { return becomes(*target, "x btw ", "x by the way ", Milliseconds(1'000)); };
     EXPECT_FALSE(waitUntil(listens, Milliseconds(2'000))) << log();
     set("IsEnabled", "true");
     EXPECT_TRUE(soonBecomes(*target, "x btw ", "x by the way ")) << log();
