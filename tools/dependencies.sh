@@ -18,9 +18,9 @@ need_packages() {
 }
 
 BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config libcanberra-dev libcli11-dev libdbus-1-dev
-    libexpat1-dev libicu-dev libmd4c-html0-dev libsqlite3-dev libx11-dev libxcb-xfixes0-dev libxcb-xinput-dev
+    libexpat1-dev libicu-dev libmd4c-dev libmd4c-html0-dev libsqlite3-dev libx11-dev libxcb-xfixes0-dev libxcb-xinput-dev
     libxcb-xkb-dev libxcb-xtest0-dev libxcb1-dev libxkbcommon-dev libxkbcommon-x11-dev libxml2-dev libyaml-cpp-dev
-    nlohmann-json3-dev)
+    nlohmann-json3-dev qt6-base-dev qt6-l10n-tools)
 TEST_PACKAGES=(clang libclang-rt-14-dev libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
 CHECK_PACKAGES=(clang-format clang-tidy git)
 
@@ -33,5 +33,5 @@ build() {
 
 # What the desktop tests are built with and run: a real X server, a window manager, programs to type into.
 DESKTOP_PACKAGES=(pkg-config xserver-xorg-dev libxcb1-dev libxcb-xinput-dev libxkbcommon-dev libpng-dev libgtk-3-dev
-    qt6-base-dev nlohmann-json3-dev xserver-xorg-core xserver-xorg-video-dummy x11-xkb-utils xkb-data
-    openbox dbus-daemon at-spi2-core xterm xfonts-base fonts-dejavu-core)
+    nlohmann-json3-dev xserver-xorg-core xserver-xorg-video-dummy x11-xkb-utils xkb-data
+    openbox trayer dbus-daemon at-spi2-core xterm xfonts-base fonts-dejavu-core)
