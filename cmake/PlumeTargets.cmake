@@ -50,3 +50,19 @@ function(plume_test name)
   endif()
   gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST WORKING_DIRECTORY ${CMAKE_SOURCE_DIR} PROPERTIES ${properties})
 endfunction()
+
+# plume_add_qt_library(<name> SOURCES <files…> SEES <libraries…>): a folder with windows.
+function(plume_add_qt_library name)
+  plume_add_library(${name} ${ARGN})
+  set_target_properties(${name} PROPERTIES AUTOMOC ON)
+  target_link_libraries(${name} PUBLIC Qt6::Widgets Qt6::DBus)
+  target_compile_definitions(${name} PRIVATE QT_NO_CAST_TO_ASCII QT_NO_FOREACH QT_NO_KEYWORDS)
+endfunction()
+
+# The same as plume_test, for tests of windows.
+function(plume_qt_test name)
+  cmake_parse_arguments(TEST "" "" "SOURCES" ${ARGN})
+  plume_test(${name} SOURCES ${CMAKE_SOURCE_DIR}/tests/support/OffscreenMain.cpp ${TEST_SOURCES} ${TEST_UNPARSED_ARGUMENTS})
+  target_link_libraries(${name} PRIVATE Qt6::Test)
+  add_dependencies(${name} plume_translation_files)
+endfunction()

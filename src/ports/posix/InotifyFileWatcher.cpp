@@ -96,7 +96,7 @@ struct InotifyFileWatcher::Look {
     std::tuple<dev_t, ino_t, off_t, time_t, long, time_t, long> what = {};
 };
 
-InotifyFileWatcher::InotifyFileWatcher(PollRunLoop& loop, double timeBetweenLooks)
+InotifyFileWatcher::InotifyFileWatcher(DescriptorLoop& loop, double timeBetweenLooks)
     : loop_(loop), timeBetweenLooks_(timeBetweenLooks), inotify_(inotify_init1(IN_NONBLOCK | IN_CLOEXEC)) {
     if (inotify_.isOpen()) source_ = loop_.addSource(inotify_.get(), [this] { drain(); });
 }

@@ -14,8 +14,8 @@
 
 #include "Foundation/Observers.h"
 #include "platform/FileWatcher.h"
+#include "ports/posix/DescriptorLoop.h"
 #include "ports/posix/FileDescriptor.h"
-#include "ports/posix/PollRunLoop.h"
 
 namespace plume {
 
@@ -24,7 +24,7 @@ class InotifyFileWatcher final : public FileWatcher {
     static constexpr double TimeBetweenLooks = 3;  // seconds
 
     // The loop outlives it, and is the thread's own.
-    explicit InotifyFileWatcher(PollRunLoop& loop, double timeBetweenLooks = TimeBetweenLooks);
+    explicit InotifyFileWatcher(DescriptorLoop& loop, double timeBetweenLooks = TimeBetweenLooks);
 
     [[nodiscard]] Subscription watch(const std::filesystem::path& file, std::function<void()> changed) override;
 
@@ -56,7 +56,7 @@ class InotifyFileWatcher final : public FileWatcher {
     void lookAgainLater();
     void lookAtAll();
 
-    PollRunLoop& loop_;
+    DescriptorLoop& loop_;
     const double timeBetweenLooks_;
     FileDescriptor inotify_;
     Subscription source_;

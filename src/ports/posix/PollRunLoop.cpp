@@ -37,19 +37,11 @@ double PollRunLoop::now() const {
 }
 
 RunLoop::CallId PollRunLoop::schedule(double delay, Call call) {
-    const double due = now() + std::max(delay, 0.0);
-    const CallId id = ++lastId_;
-    delayed_.emplace(Moment(due, id), std::move(call));
-    dueOf_.emplace(id, due);
-    return id;
+    return delayed_.add(now() + std::max(delay, 0.0), std::move(call));
 }
 
 void PollRunLoop::cancel(CallId id) {
-    const auto found = dueOf_.find(id);
-    if (found == dueOf_.end()) return;
-    // Kept until the bookkeeping is right: what the call holds may use the loop when it goes.
-    const auto dropped = delayed_.extract(Moment(found->second, id));
-    dueOf_.erase(found);
+    delayed_.cancel(id);
 }
 
 void PollRunLoop::perform(Call call) {
@@ -110,21 +102,18 @@ void PollRunLoop::runHandedOver() {
 }
 
 void PollRunLoop::runDue() {
-    // What is asked for now comes later: a call that repeats itself without delay must not keep the sources waiting.
-    const CallId newest = lastId_;
-    const double moment = delayed_.empty() ? 0 : now();
-    while (!delayed_.empty() && !stopped_) {
-        const auto first = delayed_.begin();
-        if (first->first.first > moment || first->first.second > newest) return;
-        const auto due = delayed_.extract(first);
-        dueOf_.erase(due.key().second);
-        due.mapped()();
+    const CallId newest = delayed_.newest();
+    const double moment = delayed_.firstDue() ? now() : 0;
+    while (!stopped_) {
+        const auto call = delayed_.takeDue(moment, newest);
+        if (!call) return;
+        (*call)();
     }
 }
 
 double PollRunLoop::secondsToWait() const {
-    if (delayed_.empty()) return Forever;
-    return std::clamp(delayed_.begin()->first.first - now(), 0.0, LongestWait);
+    const auto due = delayed_.firstDue();
+    return due ? std::clamp(*due - now(), 0.0, LongestWait) : Forever;
 }
 
 void PollRunLoop::wait() {

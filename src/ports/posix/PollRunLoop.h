@@ -13,16 +13,14 @@
 #include <map>
 #include <memory>
 #include <mutex>
-#include <unordered_map>
-#include <utility>
 #include <vector>
 
-#include "Foundation/Subscription.h"
-#include "platform/RunLoop.h"
+#include "ports/posix/DelayedCalls.h"
+#include "ports/posix/DescriptorLoop.h"
 
 namespace plume {
 
-class PollRunLoop final : public RunLoop {
+class PollRunLoop final : public DescriptorLoop {
   public:
     PollRunLoop();
     ~PollRunLoop() override;
@@ -37,10 +35,8 @@ class PollRunLoop final : public RunLoop {
     // From any thread, and from signal handlers.
     void stop();
 
-    // Calls `drain` when the descriptor can be read, and before every wait: a library that reads ahead may hold input
-    // that no poll() would tell of. It must take all there is. Until the subscription ends, which comes before the
-    // descriptor is closed. Only on the loop's own thread, or before run().
-    [[nodiscard]] Subscription addSource(int descriptor, Call drain);
+    // Drains before every wait, too: a library that reads ahead may hold input that no poll() would tell of.
+    [[nodiscard]] Subscription addSource(int descriptor, Call drain) override;
     // A paused source is left alone: what arrives waits in the system's buffers, in order.
     void setSourcePaused(int descriptor, bool paused);
 
@@ -50,8 +46,6 @@ class PollRunLoop final : public RunLoop {
         bool paused = false;
         bool ended = false;
     };
-    using Moment = std::pair<double, CallId>;
-
     CallId schedule(double delay, Call call) override;
     void cancel(CallId id) override;
 
@@ -63,9 +57,7 @@ class PollRunLoop final : public RunLoop {
 
     const int wakeUp_;  // an eventfd
     std::atomic<bool> stopped_ = false;
-    CallId lastId_ = 0;
-    std::map<Moment, Call> delayed_;
-    std::unordered_map<CallId, double> dueOf_;
+    DelayedCalls delayed_;
     std::map<int, std::shared_ptr<Source>> sources_;
     std::vector<pollfd> polled_;  // kept for its memory
     std::mutex mutex_;
