@@ -102,10 +102,13 @@ struct Miss {
 Miss missCost(const SnippetMatcher& matcher, std::size_t bufferLength, std::mt19937& random) {
     const std::u16string text = prose(bufferLength + KeysInBatch, random);
     Editor editor;
+    SnippetMatcher::Refusals refusals;
+    refusals.reserve(DecisionLog::Capacity);
     const auto finds = [&](std::size_t start) {
         const auto letters = std::u16string_view(text).substr(start, bufferLength + 1);
         const auto before = letters.substr(0, bufferLength);
-        return !matcher.findSnippetsInLetters(letters, letters.back(), before, editor.destination()).empty();
+        refusals.clear();
+        return !matcher.findSnippetsInLetters(letters, letters.back(), before, editor.destination(), refusals).empty();
     };
     std::vector<std::size_t> misses;
     for (std::size_t start = 0; start < KeysInBatch; ++start) {
@@ -154,14 +157,17 @@ void benchHits() {
         }
     }
     Editor editor;
+    SnippetMatcher::Refusals refusals;
     std::size_t found = 0;
     const double batch = medianNanoseconds(31, [&] {
         found = 0;
         for (const auto& typing : typings) {
             const std::u16string_view letters = typing;
             const auto before = letters.substr(0, letters.size() - 1);
-            found +=
-                matcher.findSnippetsInLetters(letters, letters.back(), before, editor.destination()).empty() ? 0U : 1U;
+            const auto matches =
+                matcher.findSnippetsInLetters(letters, letters.back(), before, editor.destination(), refusals);
+            found += matches.empty() ? 0U : 1U;
+            refusals.clear();
         }
     });
     if (found != typings.size()) std::abort();

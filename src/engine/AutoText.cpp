@@ -25,11 +25,12 @@ AutoText::AutoText(Dependencies dependencies)
       snippetAdaptToAbbreviationCaseOption_(
           dependencies_.userDefaults.integerForKey("SnippetAdaptToAbbreviationCaseOption")),
       correction_(dependencies_.inputService, dependencies_.accessibility),
-      sender_(
-          {dependencies_.inputService, dependencies_.snippetParser, dependencies_.scriptRunner, dependencies_.sounds,
-           dependencies_.accessibility, letters_, dependencies_.makeFieldsEditor, dependencies_.report},
-          [this](const SnippetSender::Sent& sent) { follow(sent); }) {
+      sender_({dependencies_.inputService, dependencies_.snippetParser, dependencies_.scriptRunner,
+               dependencies_.sounds, dependencies_.accessibility, letters_, dependencies_.makeFieldsEditor,
+               dependencies_.report, dependencies_.snippetUsed},
+              [this](const SnippetSender::Sent& sent) { follow(sent); }) {
     letters_.reserve(UsualBufferLength);
+    refusals_.reserve(DecisionLog::Capacity);
     MacInputService& service = dependencies_.inputService;
     subscriptions_ = {
         service.keyDownEvent.addObserver(this, &AutoText::onSystemInputServiceKeyDown),
@@ -47,6 +48,7 @@ const CharacterSet& AutoText::defaultDelimiters() {
 
 void AutoText::setEnabled(bool enabled) {
     enabled_ = enabled;
+    noteSwitch();
     clear();
 }
 
@@ -85,15 +87,18 @@ void AutoText::expandAtHotkey() {
     std::vector<Match> matches = findSnippetsInLetters(letters(), 0, letters());
     if (matches.size() == 1) {
         hideSnippetSuggestion();
-        sendSnippet(matches[0].first, matches[0].second, SnippetTrigger::HotKey);
+        sendMatch(matches[0], SnippetTrigger::HotKey);
     } else if (!matches.empty()) {
         offerMatches(std::move(matches));
     }
 }
 
 std::vector<AutoText::Match> AutoText::findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
-                                                             std::u16string_view lettersWithoutSeparator) const {
-    return matcher_.findSnippetsInLetters(letters, trigger, lettersWithoutSeparator, lastKeyDestination());
+                                                             std::u16string_view lettersWithoutSeparator) {
+    std::vector<Match> matches =
+        matcher_.findSnippetsInLetters(letters, trigger, lettersWithoutSeparator, lastKeyDestination(), refusals_);
+    if (!refusals_.empty()) noteRefusals();
+    return matches;
 }
 
 AutoText::Groups AutoText::filteredGroupsByApplication() const {
@@ -111,13 +116,25 @@ KeyDestination AutoText::lastKeyDestination() const {
 
 bool AutoText::sendSnippet(const std::shared_ptr<Snippet>& snippet, const std::optional<std::u16string>& abbreviation,
                            SnippetTriggers snippetTrigger) {
+    const auto sent = send(snippet, abbreviation, snippetTrigger);
+    return sent && sent->swallowsKey;
+}
+
+bool AutoText::sendMatch(const Match& match, SnippetTriggers snippetTrigger) {
+    const auto sent = send(match.first, match.second, snippetTrigger);
+    noteMatch(sent ? MatchDecision::Outcome::Expanded : MatchDecision::Outcome::Failed, match.first);
+    return sent && sent->swallowsKey;
+}
+
+std::optional<SnippetSender::Sent> AutoText::send(const std::shared_ptr<Snippet>& snippet,
+                                                  const std::optional<std::u16string>& abbreviation,
+                                                  SnippetTriggers snippetTrigger) {
     clear();
-    const auto sent =
+    auto sent =
         sender_.send({snippet, abbreviation, snippetTrigger, snippetGroups_, snippetAdaptToAbbreviationCaseOption_,
                       dependencies_.inputService.lastKeyString(), dependencies_.inputService.lastKeyIsDelivered()});
-    if (!sent) return false;
-    follow(*sent);
-    return sent->swallowsKey;
+    if (sent) follow(*sent);
+    return sent;
 }
 
 void AutoText::sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet) {

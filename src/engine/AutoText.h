@@ -17,6 +17,7 @@
 
 #include "Foundation/Subscription.h"
 #include "engine/AutoCorrection.h"
+#include "engine/DecisionLog.h"
 #include "engine/KeyDestination.h"
 #include "engine/QuickSearchController.h"
 #include "engine/SnippetMatcher.h"
@@ -55,6 +56,8 @@ class AutoText {
         std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController = {};
         std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
         Suggest suggest = {};  // empty: there is never anything to suggest
+        // Told of each snippet that was sent. Empty: nobody is.
+        std::function<void(const Snippet&)> snippetUsed = {};
     };
 
     // Starts disabled.
@@ -90,8 +93,9 @@ class AutoText {
     // ---- Matching ----
     // Expands what stands at the end of the buffer; for the hot key that does that.
     void expandAtHotkey();
+    // Remembers what was refused.
     std::vector<Match> findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
-                                             std::u16string_view lettersWithoutSeparator) const;
+                                             std::u16string_view lettersWithoutSeparator);
     // The groups of the library, in order, that admit the application which received the last key.
     Groups filteredGroupsByApplication() const;
     // For those who derive other triggers from what is typed; does nothing.
@@ -108,6 +112,13 @@ class AutoText {
     void sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet);
     // Takes the last expansion back, for the hot keys that do that. False when there is nothing to take back.
     bool undo(bool withTrigger);
+
+    // ---- Why did it not expand? ----
+    // What became lately of the abbreviations that were typed, the newest last.
+    std::vector<MatchDecision> recentDecisions() const;
+    void forgetDecisions() { decisions_.clear(); }
+    // Keys stay away from now on, or come again: for whoever hears of that, which happens on another thread.
+    void noteSecureInput(bool began);
 
     // ---- The list at the caret ----
     const SuggestionList& suggestions() const { return suggestions_; }
@@ -158,6 +169,15 @@ class AutoText {
     void offerMatches(std::vector<Match> matches);
     void keyCompletedNothing(ZDKeyEventArgs& event);
     void sendCorrection(const AutoCorrection::Correction& correction, ZDKeyEventArgs& event);
+    // sendSnippet() for an abbreviation that was typed to its end.
+    bool sendMatch(const Match& match, SnippetTriggers snippetTrigger);
+    std::optional<SnippetSender::Sent> send(const std::shared_ptr<Snippet>& snippet,
+                                            const std::optional<std::u16string>& abbreviation,
+                                            SnippetTriggers snippetTrigger);
+
+    void noteSwitch();
+    void noteRefusals();
+    void noteMatch(MatchDecision::Outcome outcome, const std::shared_ptr<Snippet>& snippet);
 
     KeyDestination lastKeyDestination() const;
     void follow(const SnippetSender::Sent& sent);
@@ -168,6 +188,9 @@ class AutoText {
 
     Dependencies dependencies_;
     SnippetMatcher matcher_;
+    SnippetMatcher::Refusals refusals_;  // of one key; kept for its capacity
+    DecisionLog decisions_;
+    bool isKnownAsEnabled_ = true;  // from the decisions; nobody wonders about a start that is switched on
     std::array<Subscription, 4> subscriptions_;
     Groups snippetGroups_;
     TypedLetters letters_;

@@ -209,7 +209,7 @@ void AutoText::processNormalKeyDown(ZDKeyEventArgs& event) {
 
 void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
     hideSnippetSuggestion();
-    event.cancel = sendSnippet(match.first, match.second, SnippetTrigger::Typed);
+    event.cancel = sendMatch(match, SnippetTrigger::Typed);
     // The kept delimiter stands behind the expansion, in the text as in the buffer.
     const std::shared_ptr<SnippetGroup> group = match.first->parentGroup();
     if (group && group->expandTrigger() == ExpandTrigger::DelimiterKept) letters_.append(*event.s);
@@ -217,7 +217,11 @@ void AutoText::sendTypedMatch(const Match& match, ZDKeyEventArgs& event) {
 
 void AutoText::offerMatches(std::vector<Match> matches) {
     hideSnippetSuggestion();
-    if (!dependencies_.makeSuggestionController) {
+    const bool canOffer = dependencies_.makeSuggestionController != nullptr;
+    for (const Match& match : matches) {
+        noteMatch(canOffer ? MatchDecision::Outcome::Offered : MatchDecision::Outcome::Failed, match.first);
+    }
+    if (!canOffer) {
         return dependencies_.report("Several snippets match \"" + toUtf8(matches.front().second) +
                                     "\", and there is no list here to choose from.");
     }

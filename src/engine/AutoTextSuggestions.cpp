@@ -64,11 +64,15 @@ void AutoText::sendSuggestionAtIndex(std::size_t index, SnippetTriggers snippetT
         hideSnippetSuggestion();
         return;
     }
-    const std::shared_ptr<Snippet> snippet = std::move(suggestions_.suggestions[index]);
-    const std::u16string typed = std::move(suggestions_.suggestionFilters[index]);
+    const Match chosen{std::move(suggestions_.suggestions[index]), std::move(suggestions_.suggestionFilters[index])};
     hideSnippetSuggestion();
-    sender_.performOnceKeysAreTaken(
-        [this, snippet, typed, snippetTrigger] { sendSnippet(snippet, typed, snippetTrigger); });
+    sender_.performOnceKeysAreTaken([this, chosen, snippetTrigger] {
+        if (snippetTrigger.contains(SnippetTrigger::FromSeveralMatches)) {
+            sendMatch(chosen, snippetTrigger);
+        } else {
+            sendSnippet(chosen.first, chosen.second, snippetTrigger);
+        }
+    });
 }
 
 bool AutoText::snippetQuickSearchWindowVisible() const {

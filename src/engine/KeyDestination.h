@@ -20,11 +20,14 @@ class KeyDestination {
     // Nothing when the process has no name. Good as long as the resolver.
     const std::optional<std::u16string>& bundleIdentifier() const { return resolver_.getBundleIdentifier(process_); }
 
-    // Costs nothing where there are no limits.
+    // Cost nothing where there are no limits.
     bool isAdmittedBy(const PLFunctionAvailability& where) const {
-        if (where.availability != PLFunctionAvailability::Everywhere && !where.admitsApplication(bundleIdentifier())) {
-            return false;
-        }
+        return isApplicationAdmittedBy(where) && isInputSourceAdmittedBy(where);
+    }
+    bool isApplicationAdmittedBy(const PLFunctionAvailability& where) const {
+        return where.availability == PLFunctionAvailability::Everywhere || where.admitsApplication(bundleIdentifier());
+    }
+    bool isInputSourceAdmittedBy(const PLFunctionAvailability& where) const {
         return where.inputMethodsOption == PLFunctionAvailability::Everywhere ||
                where.admitsInputSource(inputSources_.currentInputSourceIdentifier());
     }

@@ -44,33 +44,47 @@ bool isFoundFromLeft(std::u16string_view text, std::size_t position, std::u16str
     return found == position;
 }
 
-bool matchesPrefixed(const SnippetMatcher& matcher, const Candidate& candidate, std::u16string_view text) {
-    const IndexedGroup& group = *candidate.group;
-    const Snippet& snippet = **candidate.snippet;
-    const std::size_t start = text.size() - candidate.length;
-    const std::u16string_view typed = text.substr(start);
-    if (!standsAt(text, start, group.prefix)) return false;
-    if (!equalsIgnoringCase(typed.substr(group.prefix.size()), *snippet.abbreviation())) return false;
-    if (!matcher.checkGroup(*group.group, text, start)) return false;
-    if (group.prefixOverlapsItself && !isFoundFromLeft(text, start, group.prefix)) return false;
-    return snippet.caseSensitivity() != CaseSensitivity::CaseSensitive || typed == snippet.abbreviationWithPrefix();
-}
-
 // A snippet tells one group of a new abbreviation; another that lists it has it filed under the former one.
 bool isUpToDate(const Candidate& candidate) {
     const auto& abbreviation = (*candidate.snippet)->abbreviation();
     return abbreviation && candidate.group->prefix.size() + abbreviation->size() == candidate.length;
 }
 
-bool matchesPlain(const SnippetMatcher& matcher, const Candidate& candidate, std::u16string_view text) {
+// The abbreviation with its prefix is really there, if perhaps in another case.
+bool isTyped(const Candidate& candidate, std::u16string_view text) {
+    const std::u16string& prefix = candidate.group->prefix;
+    const std::u16string_view typed = text.substr(text.size() - candidate.length);
+    return standsAt(typed, 0, prefix) &&
+           equalsIgnoringCase(typed.substr(prefix.size()), *(*candidate.snippet)->abbreviation());
+}
+
+bool isTypedInItsCase(const Candidate& candidate, std::u16string_view text) {
     const Snippet& snippet = **candidate.snippet;
-    const bool caseSensitive = snippet.caseSensitivity() == CaseSensitivity::CaseSensitive;
-    return matcher.checkAbbreviation(*snippet.abbreviation(), text, *candidate.group->group, caseSensitive).has_value();
+    if (snippet.caseSensitivity() != CaseSensitivity::CaseSensitive) return true;
+    const std::u16string_view typed = text.substr(text.size() - candidate.length);
+    return candidate.group->prefix.empty() ? typed == *snippet.abbreviation()
+                                           : typed == snippet.abbreviationWithPrefix();
+}
+
+// What MatchDecision calls that which must stand before the abbreviation.
+std::u16string_view nameOf(ExpandAfter rule) {
+    switch (rule) {
+        case ExpandAfter::Delimiter:
+            return MatchDecision::AfterDelimiter;
+        case ExpandAfter::Whitespace:
+            return MatchDecision::AfterWhitespace;
+        case ExpandAfter::Digits:
+            return MatchDecision::AfterDigits;
+        case ExpandAfter::Anything:
+            break;
+    }
+    return {};
 }
 
 // One look through the library for one key: the rules, applied to the index's candidates.
 class Search final : public AbbreviationIndex::Visitor {
   private:
+    using Verdict = DecisionLog::Verdict;
     struct Found {
         Candidate candidate;
         std::u16string_view typed;
@@ -83,8 +97,9 @@ class Search final : public AbbreviationIndex::Visitor {
     };
 
   public:
-    Search(const SnippetMatcher& matcher, char16_t trigger, const KeyDestination& destination)
-        : matcher_(matcher), trigger_(trigger), destination_(destination) {}
+    Search(const SnippetMatcher& matcher, char16_t trigger, const KeyDestination& destination,
+           SnippetMatcher::Refusals& refusals)
+        : matcher_(matcher), trigger_(trigger), destination_(destination), refusals_(refusals) {}
 
     void run(const AbbreviationIndex& index, Trigger way, std::u16string_view text) {
         way_ = way;
@@ -93,14 +108,25 @@ class Search final : public AbbreviationIndex::Visitor {
     }
 
     void visit(const Candidate& candidate) override {
-        const SnippetGroup& group = *candidate.group->group;
-        if (way_ == Trigger::Delimiter && !matcher_.delimitersOf(group).contains(trigger_)) return;
-        if (!isUpToDate(candidate) || !(*candidate.snippet)->hasContent() ||
-            !destination_.isAdmittedBy(group.availability()))
-            return;
-        const bool matches = candidate.group->prefix.empty() ? matchesPlain(matcher_, candidate, text_)
-                                                             : matchesPrefixed(matcher_, candidate, text_);
-        if (matches) found_.push_back({candidate, text_.substr(text_.size() - candidate.length)});
+        if (!isUpToDate(candidate) || !isTyped(candidate, text_)) return;
+        std::optional<Verdict> against = verdictAgainst(candidate);
+        if (!isTriggeredFor(*candidate.group->group)) {
+            // Not two reasons, and none where the abbreviation is only the end of some word.
+            if (against) return;
+            against = Verdict{MatchDecision::Outcome::WrongTrigger};
+        }
+        if (!against) {
+            found_.push_back({candidate, text_.substr(text_.size() - candidate.length)});
+        } else if (refusals_.size() < DecisionLog::Capacity) {
+            refusals_.push_back({*against, *candidate.snippet, candidate.group->group, candidate.length});
+        }
+    }
+
+    // Where a match covers it, nobody wonders why another did not expand.
+    void dropCoveredRefusals() {
+        std::size_t longest = 0;
+        for (const Found& found : found_) longest = std::max(longest, found.typed.size());
+        std::erase_if(refusals_, [&](const auto& refusal) { return refusal.length <= longest; });
     }
 
     // Library order; within a group with a prefix, the occurrences of the prefix from left to right first.
@@ -113,9 +139,32 @@ class Search final : public AbbreviationIndex::Visitor {
     }
 
   private:
+    bool isTriggeredFor(const SnippetGroup& group) const {
+        return way_ != Trigger::Delimiter || matcher_.delimitersOf(group).contains(trigger_);
+    }
+
+    // What keeps a snippet from expanding whose abbreviation is there, besides the key behind it.
+    std::optional<Verdict> verdictAgainst(const Candidate& candidate) const {
+        using Outcome = MatchDecision::Outcome;
+        const SnippetGroup& group = *candidate.group->group;
+        const std::size_t start = text_.size() - candidate.length;
+        if (!(*candidate.snippet)->hasContent()) return Verdict{Outcome::Failed};
+        if (!destination_.isApplicationAdmittedBy(group.availability())) return Verdict{Outcome::WrongApplication};
+        if (!destination_.isInputSourceAdmittedBy(group.availability())) return Verdict{Outcome::WrongInputSource};
+        if (!matcher_.checkGroup(group, text_, start)) {
+            return Verdict{Outcome::WrongTextBefore, nameOf(group.expandAfter())};
+        }
+        if (candidate.group->prefixOverlapsItself && !isFoundFromLeft(text_, start, candidate.group->prefix)) {
+            return Verdict{Outcome::WrongTextBefore, MatchDecision::AfterPrefix};
+        }
+        if (!isTypedInItsCase(candidate, text_)) return Verdict{Outcome::WrongCase};
+        return std::nullopt;
+    }
+
     const SnippetMatcher& matcher_;
     char16_t trigger_;
     const KeyDestination& destination_;
+    SnippetMatcher::Refusals& refusals_;
     Trigger way_ = Trigger::Immediately;
     std::u16string_view text_;
     std::vector<Found> found_;
@@ -134,14 +183,16 @@ void SnippetMatcher::setSnippetGroups(const Groups& groups) {
 
 std::vector<SnippetMatcher::Match> SnippetMatcher::findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                                                          std::u16string_view lettersWithoutSeparator,
-                                                                         const KeyDestination& destination) const {
-    Search search(*this, trigger, destination);
+                                                                         const KeyDestination& destination,
+                                                                         Refusals& refusals) const {
+    Search search(*this, trigger, destination, refusals);
     if (trigger == 0) {
         search.run(*index_, Trigger::HotKey, lettersWithoutSeparator);
     } else {
         search.run(*index_, Trigger::Immediately, letters);
         if (index_->isDelimiter(trigger)) search.run(*index_, Trigger::Delimiter, lettersWithoutSeparator);
     }
+    if (!refusals.empty()) search.dropCoveredRefusals();
     return search.matchesInOrder();
 }
 
@@ -176,17 +227,6 @@ bool SnippetMatcher::checkGroup(const SnippetGroup& group, std::u16string_view t
             break;
     }
     return false;
-}
-
-std::optional<std::u16string_view> SnippetMatcher::checkAbbreviation(std::u16string_view abbreviation,
-                                                                     std::u16string_view letters,
-                                                                     const SnippetGroup& group,
-                                                                     bool caseSensitive) const {
-    const std::size_t start = letters.size() - abbreviation.size();
-    if (!checkGroup(group, letters, start)) return std::nullopt;
-    const std::u16string_view typed = letters.substr(start);
-    const bool equal = caseSensitive ? typed == abbreviation : equalsIgnoringCase(typed, abbreviation);
-    return equal ? std::optional(typed) : std::nullopt;
 }
 
 }  // namespace plume

@@ -96,6 +96,7 @@ std::optional<SnippetSender::Sent> SnippetSender::send(const Request& request) {
     }
     if (changesNothing(request, *content) || refuses(request, *content)) return std::nullopt;
     snippet.updateLastTimeUsed();
+    if (dependencies_.snippetUsed) dependencies_.snippetUsed(snippet);
     content->originalSnippet = request.snippet;
 
     const auto output = std::make_shared<PLOutput>();

@@ -48,6 +48,8 @@ class SnippetSender final : private FieldsEditor::Target {
         FieldsEditor::Factory makeFieldsEditor;  // empty: what needs a form is refused
         // Tells the user that something cannot work, in one sentence. Never empty.
         std::function<void(const std::string&)> report;
+        // Told of each snippet that is used. Empty: nobody is.
+        std::function<void(const Snippet&)> snippetUsed = {};
     };
 
     // One snippet to send.

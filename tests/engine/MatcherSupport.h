@@ -43,9 +43,12 @@ class Place {
 inline std::vector<SnippetMatcher::Match> typeKey(const SnippetMatcher& matcher, const std::u16string& before,
                                                   const std::u16string& key,
                                                   const Place& place = Place(u"org.editor", u"US")) {
-    if (key.empty() || key[0] == 0) return matcher.findSnippetsInLetters(before, 0, before, place.destination());
+    SnippetMatcher::Refusals refusals;
+    if (key.empty() || key[0] == 0) {
+        return matcher.findSnippetsInLetters(before, 0, before, place.destination(), refusals);
+    }
     const std::u16string letters = before + key;
-    return matcher.findSnippetsInLetters(letters, key[0], before, place.destination());
+    return matcher.findSnippetsInLetters(letters, key[0], before, place.destination(), refusals);
 }
 
 inline std::vector<std::u16string> contentsOf(const std::vector<SnippetMatcher::Match>& matches) {
