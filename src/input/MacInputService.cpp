@@ -192,7 +192,7 @@ void MacInputService::exportACLs() {
 }
 
 bool MacInputService::isSameProcess() const {
-    return lastProcessReceivedKeyEvent_ == around_.processManager.currentProcess();
+    return !expandsInOwnWindows_ && lastProcessReceivedKeyEvent_ == around_.processManager.currentProcess();
 }
 
 std::optional<std::u16string> MacInputService::stringForKeyCode(KeyCode keyCode, EventFlags flags) const {

@@ -101,6 +101,9 @@ class MacInputService final : private KeyboardTapListener {
     void unregisterHotKey(const GeneralHotKey& hotKey) { hotKeys_.unregisterHotKey(hotKey); }
     // The release of the modifiers held now is no hot key.
     void ignoreNextHotKey() { hotKeys_.ignoreNextHotKey(); }
+    // While there is a recorder, it gets what is pressed as a hot key would be: each key with the modifiers that are
+    // held, modifiers alone when they are let go without one. Nobody else hears of these keys. Empty ends it.
+    void setHotKeyRecorder(std::function<void(const GeneralHotKey&)> recorder);
     // Whether to swallow the key; KeyCode::None checks the held modifiers alone.
     bool checkHotKeys(KeyCode keyCode) { return hotKeys_.checkHotKeys(keyCode); }
     // A hot key that the system recognises, in place of the previous one under this id; one without a key is none. The
@@ -126,6 +129,8 @@ class MacInputService final : private KeyboardTapListener {
     }
     // Main thread.
     void checkSecureInput() { secureInputWatch_.checkSecureInput(); }
+    // Main thread, before the service is destroyed on the other one.
+    void stopCheckingSecureInput() { secureInputWatch_.stop(); }
 
     // Other programs that can swallow keys.
     std::vector<RunningApplication> tappingProcesses() const;
@@ -143,8 +148,10 @@ class MacInputService final : private KeyboardTapListener {
 
     // The modifiers held now.
     KeyModifiers keyModifier() const { return hotKeys_.keyModifier(); }
-    // The last key went to Plume itself.
+    // The last key went to Plume itself, where nothing is to expand.
     bool isSameProcess() const;
+    // From any thread: whether Plume's own windows count as another program's for now, so that one can try it there.
+    void setExpandsInOwnWindows(bool expands) { expandsInOwnWindows_ = expands; }
     ProcessSerialNumber lastProcessReceivedKeyEvent() const { return lastProcessReceivedKeyEvent_; }
     // What a key code produces with the modifiers of these event flags.
     std::optional<std::u16string> stringForKeyCode(KeyCode keyCode, EventFlags flags) const;
@@ -184,6 +191,7 @@ class MacInputService final : private KeyboardTapListener {
     void keyDelivered(const TapEvent& event);
     bool keyDown(ZDKeyEventArgs& key, const TapEvent& event);
     bool keyUp(const ZDKeyEventArgs& key);
+    bool record(const TapEvent& event);
     bool unregisteredHotKey(const ZDKeyEventArgs& key);
     void followFrontProcess();
     void raiseInputContextChanged();
@@ -201,6 +209,9 @@ class MacInputService final : private KeyboardTapListener {
 
     std::atomic<std::thread::id> eventTapThread_;
     std::atomic<bool> keyUpObserved_ = false;
+    std::atomic<bool> expandsInOwnWindows_ = false;
+    std::function<void(const GeneralHotKey&)> hotKeyRecorder_;
+    KeyModifiers recordedModifiers_;  // held since a key was recorded: none
     bool active_ = false;
     bool listenMouseDownEvents_ = false;
     std::optional<KeyCode> lastKeyCode_;

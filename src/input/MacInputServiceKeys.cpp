@@ -8,6 +8,7 @@ namespace plume {
 bool MacInputService::keyboardEvent(const TapEvent& event) {
     if (!active_ || delivery_.letsEverythingPass()) return false;
     forgetLastKey();
+    if (hotKeyRecorder_ && !event.delivered) return record(event);
     if (event.type == TapEvent::Type::FlagsChanged) return hotKeys_.modifiersChanged(modifiersFromFlags(event.flags));
     secureInputWatch_.keysArrive();
     followFrontProcess();
@@ -23,6 +24,34 @@ bool MacInputService::keyboardEvent(const TapEvent& event) {
     lastKeyString_ = key.s;
     lastKeyCode_ = key.key;
     return event.type == TapEvent::Type::KeyUp ? keyUp(key) : keyDown(key, event);
+}
+
+void MacInputService::setHotKeyRecorder(std::function<void(const GeneralHotKey&)> recorder) {
+    recordedModifiers_ = {};
+    hotKeyRecorder_ = std::move(recorder);
+}
+
+// Modifiers reach the programs, which would otherwise take them for held for ever; keys do not.
+bool MacInputService::record(const TapEvent& event) {
+    if (event.type == TapEvent::Type::FlagsChanged) {
+        const KeyModifiers held = modifiersFromFlags(event.flags);
+        const bool wasLetGo = held.bits() < recordedModifiers_.bits();
+        const KeyModifiers before = std::exchange(recordedModifiers_, wasLetGo ? KeyModifiers{} : held);
+        // Their release ends no hot key that was registered meanwhile.
+        static_cast<void>(hotKeys_.modifiersChanged(held));
+        hotKeys_.ignoreNextHotKey();
+        if (wasLetGo) hotKeyRecorder_({before, KeyCode::None});
+        return false;
+    }
+    if (event.type == TapEvent::Type::KeyUp) {
+        if (canceledKeyCode_ != event.keyCode) return false;
+        canceledKeyCode_ = KeyCode::None;
+        return true;
+    }
+    canceledKeyCode_ = event.keyCode;
+    recordedModifiers_ = {};
+    hotKeyRecorder_({hotKeys_.keyModifier(), event.keyCode});
+    return true;
 }
 
 void MacInputService::keyDelivered(const TapEvent& event) {

@@ -42,6 +42,8 @@ class ProcessManager {
     virtual std::uint32_t frontWindow() const { return 0; }
     // Nothing when the process is gone or is no application.
     virtual std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const = 0;
+    // Those that have windows, without Plume itself; none when the port cannot tell. May take milliseconds.
+    virtual std::vector<RunningApplication> runningApplications() const = 0;
     // Asks for the process to be brought to the front; a port may take a moment to do it.
     virtual void bringToFront(ProcessSerialNumber process) = 0;
     // Who else listens to the keyboard, as far as the system tells; at most 10. May take milliseconds: not for a key.

@@ -27,4 +27,12 @@ std::optional<RunningApplication> SimulatedProcessManager::runningApplication(Pr
     return found->second;
 }
 
+std::vector<RunningApplication> SimulatedProcessManager::runningApplications() const {
+    std::vector<RunningApplication> others;
+    for (const auto& [process, application] : running_) {
+        if (process != own_) others.push_back(application);
+    }
+    return others;
+}
+
 }  // namespace plume

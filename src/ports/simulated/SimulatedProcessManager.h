@@ -28,6 +28,7 @@ class SimulatedProcessManager final : public ProcessManager {
     ProcessSerialNumber currentProcess() const override { return own_; }
     std::optional<ProcessSerialNumber> frontProcess() const override { return front_; }
     std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
+    std::vector<RunningApplication> runningApplications() const override;
     void bringToFront(ProcessSerialNumber process) override { front_ = process; }
     std::vector<EventTapInformation> eventTaps() const override { return eventTaps_; }
 

@@ -32,6 +32,7 @@ bool X11SecureInput::isSecureEventInputEnabled() const {
 }
 
 bool X11SecureInput::isKeyboardHeld() const {
+    if (heldByUs_ && heldByUs_()) return false;
     if (!isHeld_ && Clock::now() - happenedAt_.load() > LongestToGrab) return false;
     xcb_connection_t* const server = connection_->get();
     const auto cookie =

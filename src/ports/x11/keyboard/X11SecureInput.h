@@ -9,6 +9,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "platform/SecureInput.h"
 #include "ports/x11/XcbConnection.h"
@@ -22,6 +23,9 @@ class X11SecureInput final : public SecureInput {
                                                         std::function<bool()> focusIsPassword);
 
     bool isSecureEventInputEnabled() const override;
+    // Whether this program itself holds the keyboard, as its open menus do: that is no secret, and while it lasts
+    // nobody else can.
+    void setHeldByUs(std::function<bool()> heldByUs) { heldByUs_ = std::move(heldByUs); }
 
     // Somebody types or clicks, or another window is in front: the server is asked for ten seconds from now on. From
     // any thread, never waits.
@@ -35,6 +39,7 @@ class X11SecureInput final : public SecureInput {
 
     const std::unique_ptr<XcbConnection> connection_;
     const std::function<bool()> focusIsPassword_;
+    std::function<bool()> heldByUs_;
     const xcb_window_t neverShown_;
     std::atomic<Clock::time_point> happenedAt_ = Clock::now();
     mutable bool isHeld_ = false;  // when the server was asked last

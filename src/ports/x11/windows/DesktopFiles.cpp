@@ -85,6 +85,8 @@ DesktopFile desktopFileOf(std::string identifier, const Entries& entries, std::s
     }
     file.startupWMClass = valueOf(entries, "StartupWMClass");
     file.program = programOf(valueOf(entries, "Exec"));
+    file.icon = valueOf(entries, "Icon");
+    file.isHidden = valueOf(entries, "NoDisplay") == "true" || valueOf(entries, "Hidden") == "true";
     return file;
 }
 
@@ -156,6 +158,14 @@ void DesktopFiles::makeIndexes() {
     }
     // An interpreter, or an office suite: its name does not tell which application it is.
     for (const std::string& program : shared) byProgram_.erase(program);
+}
+
+std::vector<DesktopFile> DesktopFiles::shown() const {
+    std::vector<DesktopFile> files;
+    for (const auto& [key, file] : files_) {
+        if (!file.isHidden && !file.name.empty()) files.push_back(file);
+    }
+    return files;
 }
 
 const DesktopFile* DesktopFiles::find(const WindowIdentity& window) const {

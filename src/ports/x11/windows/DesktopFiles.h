@@ -18,6 +18,8 @@ struct DesktopFile {
     std::string name;            // in the user's language
     std::string startupWMClass;  // empty when not told
     std::string program;         // the file name of what it runs
+    std::string icon;            // of an icon theme, or a path
+    bool isHidden = false;       // not for menus
 };
 
 // What a window and its process tell; empty where they tell nothing.
@@ -37,6 +39,8 @@ class DesktopFiles {
 
     // The application that a window belongs to; null when none fits. Letter case makes no difference.
     const DesktopFile* find(const WindowIdentity& window) const;
+    // Those that menus show.
+    std::vector<DesktopFile> shown() const;
 
   private:
     using Index = std::map<std::string, const DesktopFile*, std::less<>>;

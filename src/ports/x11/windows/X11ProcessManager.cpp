@@ -9,6 +9,7 @@
 #include <csignal>
 #include <cstring>
 #include <filesystem>
+#include <set>
 #include <string_view>
 #include <system_error>
 #include <utility>
@@ -296,13 +297,29 @@ void X11ProcessManager::bringToFront(ProcessSerialNumber process) {
     session_.flush();
 }
 
-// Where the process was seen last, or else the topmost of its windows.
-xcb_window_t X11ProcessManager::windowOf(ProcessSerialNumber process) {
+std::vector<xcb_window_t> X11ProcessManager::windowsInStackingOrder() const {
     XcbConnection& connection = session_.connection();
     const PropertyRequest request(connection, connection.root(), "_NET_CLIENT_LIST_STACKING");
     const std::string bytes = request.bytes();
     std::vector<xcb_window_t> windows(bytes.size() / sizeof(xcb_window_t));
     if (!windows.empty()) std::memcpy(windows.data(), bytes.data(), windows.size() * sizeof(xcb_window_t));
+    return windows;
+}
+
+std::vector<RunningApplication> X11ProcessManager::runningApplications() const {
+    std::set<ProcessSerialNumber> seen{currentProcess()};
+    std::vector<RunningApplication> applications;
+    for (const xcb_window_t window : windowsInStackingOrder()) {
+        const auto process = const_cast<X11ProcessManager*>(this)->processOf(window);
+        if (!process || !seen.insert(*process).second) continue;
+        if (auto application = runningApplication(*process)) applications.push_back(*std::move(application));
+    }
+    return applications;
+}
+
+// Where the process was seen last, or else the topmost of its windows.
+xcb_window_t X11ProcessManager::windowOf(ProcessSerialNumber process) {
+    const std::vector<xcb_window_t> windows = windowsInStackingOrder();
     const auto known = applications_.find(process);
     const xcb_window_t last = known == applications_.end() ? xcb_window_t{XCB_WINDOW_NONE} : known->second.window;
     if (windows.empty() || std::find(windows.begin(), windows.end(), last) != windows.end()) return last;

@@ -31,6 +31,7 @@ class X11ProcessManager final : public ProcessManager {
     std::optional<ProcessSerialNumber> frontProcess() const override;
     std::uint32_t frontWindow() const override;
     std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
+    std::vector<RunningApplication> runningApplications() const override;
     void bringToFront(ProcessSerialNumber process) override;
     // X does not tell who takes keys: those programs that are known to do it.
     std::vector<EventTapInformation> eventTaps() const override;
@@ -54,6 +55,7 @@ class X11ProcessManager final : public ProcessManager {
     std::optional<ProcessSerialNumber> processOf(xcb_window_t window);
     ProcessSerialNumber numberOf(const RunningApplication& application, xcb_window_t window);
     std::uint32_t clientOf(xcb_window_t window) const;
+    std::vector<xcb_window_t> windowsInStackingOrder() const;
     xcb_window_t windowOf(ProcessSerialNumber process);
 
     X11Session& session_;
