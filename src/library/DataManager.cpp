@@ -5,6 +5,7 @@
 
 #include "Foundation/Uuid.h"
 #include "library/LibraryExport.h"
+#include "library/LibraryFile.h"
 #include "library/LibraryMerge.h"
 #include "library/LibraryPreferences.h"
 
@@ -56,6 +57,7 @@ void DataManager::notifyDataChanged() {
         });
     }
     scheduleSave(SaveDelay);
+    raise(didChangeDataEvent);
 }
 
 void DataManager::stampVersion() {
@@ -189,7 +191,8 @@ Result<void> DataManager::backupToFile(const Path& path, bool includePrefs) {
     const std::string extension = extensionOf(path.filename().string());
     if (extension == "plume") return around_.files.write(path, archivedDataIncludingPreferences(includePrefs));
     if (extension == "csv") return around_.files.write(path, csvFromLibrary(library_.snippetGroups));
-    return {};
+    if (extension == "json") return around_.files.write(path, LibraryFile::write(library_.snippetGroups));
+    return Error{path.string() + ": a library can be written to files that end with .plume, .csv or .json"};
 }
 
 Result<void> DataManager::saveGroup(const std::shared_ptr<SnippetGroup>& group, const Path& toFile) {

@@ -96,7 +96,7 @@ class DataManager {
     // The settings that travel with a library.
     PropertyList::Dictionary preferences() const;
     std::string dataFromSnippetGroup(const std::shared_ptr<SnippetGroup>& group) const;
-    // By the ending of the path: "plume" is an archive, "csv" a list; others write nothing.
+    // By the ending of the path: "plume" is an archive, "csv" a list, "json" the readable form; others are an error.
     Result<void> backupToFile(const Path& path, bool includePrefs = false);
     Result<void> saveGroup(const std::shared_ptr<SnippetGroup>& group, const Path& toFile);
 
@@ -123,6 +123,8 @@ class DataManager {
     LibraryBackups& backups() { return backups_; }
     LibrarySync& sync() { return sync_; }
 
+    // The library has changed, in parts or as a whole.
+    ZDEvent<LibraryEvent> didChangeDataEvent;
     ZDEvent<LibraryEvent> willClearDataEvent;
     ZDEvent<LibraryEvent> didImportDataEvent;
     ZDEvent<LibraryEvent> willSyncDataEvent;

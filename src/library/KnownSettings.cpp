@@ -79,6 +79,16 @@ PropertyList hotKey(const JsonNode& node) {
     return packed;
 }
 
+constexpr const char* Place = "settings";
+
+// The value where it would stand in a file of settings, so that a mistake is told with the setting's name.
+Result<PropertyList> valueFrom(const KnownSetting& setting, const nlohmann::ordered_json& value) {
+    return readingJson([&] {
+        const nlohmann::ordered_json object{{std::string(setting.name), value}};
+        return setting.read(JsonNode::parse(object.dump(), Place).members().front().second);
+    });
+}
+
 }  // namespace
 
 const std::vector<KnownSetting>& knownSettings() {
@@ -145,6 +155,14 @@ const KnownSetting* findKnownSetting(std::string_view name) {
     const auto& known = knownSettings();
     const auto found = std::find_if(known.begin(), known.end(), [&](const KnownSetting& s) { return s.name == name; });
     return found == known.end() ? nullptr : &*found;
+}
+
+Result<PropertyList> settingFromText(const KnownSetting& setting, const std::string& text) {
+    const auto json = readingJson([&] { return JsonNode::parse(text, Place).value(); });
+    Result<PropertyList> asJson = json ? valueFrom(setting, json.value()) : Result<PropertyList>(json.error());
+    if (asJson) return asJson;
+    Result<PropertyList> asText = valueFrom(setting, toUtf8(fromUtf8(text)));
+    return asText || !json ? asText : asJson;
 }
 
 PropertyList::Dictionary registeredSettings(const std::filesystem::path& backupFolder) {

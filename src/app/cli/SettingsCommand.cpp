@@ -2,10 +2,8 @@
 
 #include <algorithm>
 #include <ostream>
-#include <set>
 #include <utility>
 
-#include "Foundation/Strings.h"
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
 #include "library/KnownSettings.h"
@@ -16,26 +14,7 @@ namespace plume {
 
 namespace {
 
-constexpr const char* Place = "settings";
-
 using Json = nlohmann::ordered_json;
-
-// The value where it would stand in a file of settings, so that a mistake is told with the setting's name.
-Result<PropertyList> read(const KnownSetting& setting, const Json& value) {
-    return readingJson([&] {
-        const Json object{{std::string(setting.name), value}};
-        return setting.read(JsonNode::parse(object.dump(), Place).members().front().second);
-    });
-}
-
-// As JSON when it is that and fits, else as a text.
-Result<PropertyList> readValue(const KnownSetting& setting, const std::string& value) {
-    const auto json = readingJson([&] { return JsonNode::parse(value, Place).value(); });
-    Result<PropertyList> asJson = json ? read(setting, json.value()) : Result<PropertyList>(json.error());
-    if (asJson) return asJson;
-    Result<PropertyList> asText = read(setting, toUtf8(fromUtf8(value)));
-    return asText || !json ? asText : asJson;
-}
 
 // A text that stands alone needs no quotes.
 std::string shown(const PropertyList& value) {
@@ -77,7 +56,7 @@ class Session {
 
   private:
     int set(const KnownSetting& setting) {
-        auto value = readValue(setting, *request_.value);
+        auto value = settingFromText(setting, *request_.value);
         if (!value) return refuse(value.error().message, ExitStatus::WrongInput);
         return ended(settings_.setObject(setting.name, std::move(value).value()));
     }
