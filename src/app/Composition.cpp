@@ -84,6 +84,7 @@ void Composition::makeParts() {
         .makeSuggestionController = environment_.makeSuggestionController,
         .makeQuickSearchController = environment_.makeQuickSearchController,
         .suggest = environment_.suggest,
+        .snippetUsed = environment_.snippetUsed,
     });
 
     hotKeys_ = std::make_unique<HotKeyDispatch>(*inputService_, hotKeyActions());
@@ -105,6 +106,10 @@ HotKeyDispatch::Actions Composition::hotKeyActions() {
         actions.suggestAbbreviations = [this] { engine_->suggestAbbreviations(); };
     }
     if (environment_.makeQuickSearchController) actions.quickSearch = [this] { engine_->quickSearch(); };
+    if (const auto& toWindow = environment_.hotKeyForWindow) {
+        actions.makeSnippetFromClipboard = [&toWindow] { toWindow(HotKeyForWindow::MakeSnippetFromClipboard); };
+        actions.makeSnippetFromSelection = [&toWindow] { toWindow(HotKeyForWindow::MakeSnippetFromSelection); };
+    }
     return actions;
 }
 
@@ -127,10 +132,14 @@ void Composition::loadPreferences() {
     }
 }
 
-void Composition::start() {
+void Composition::registerHotKeys() {
     if (const Result<void> registered = hotKeys_->registerHotKeys(environment_.settings); !registered) {
         environment_.report(registered.error().message);
     }
+}
+
+void Composition::start() {
+    registerHotKeys();
     for (const std::string_view name : hotKeys_->hotKeysWithoutAction(environment_.settings)) {
         environment_.log("What the hot key " + std::string(name) + " is for is not there yet: its keys pass.");
     }

@@ -63,6 +63,10 @@ class Composition {
         std::shared_ptr<const ApplicationTable> applications = {};
         // The switch hot key has enabled or disabled the engine.
         std::function<void(bool enabled)> enabledChanged = {};
+        // A snippet has been sent.
+        std::function<void(const Snippet& snippet)> snippetUsed = {};
+        // A hot key asks for a window. Empty: there are none, and these keys pass.
+        std::function<void(HotKeyForWindow hotKey)> hotKeyForWindow = {};
     };
 
     Composition(const Ports& ports, Environment environment);
@@ -74,6 +78,9 @@ class Composition {
     void setSnippetGroups(AutoText::Groups groups) { engine_->setSnippetGroups(std::move(groups)); }
     // Gives every setting to whom it concerns; again whenever settings have changed.
     void loadPreferences();
+    // In place of those before.
+    void registerHotKeys();
+    void unregisterHotKeys() { hotKeys_->unregisterHotKeys(); }
     // Hot keys, then keys: from now on the user is heard.
     void start();
     void stop();

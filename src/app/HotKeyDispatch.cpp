@@ -65,7 +65,12 @@ void HotKeyDispatch::addCommands(const Actions& actions) {
 }
 
 HotKeyDispatch::~HotKeyDispatch() {
+    unregisterHotKeys();
+}
+
+void HotKeyDispatch::unregisterHotKeys() {
     for (const auto& [command, hotKey] : hotKeys_) inputService_.unregisterHotKey(hotKey);
+    hotKeys_.clear();
     // An empty hot key takes the system's place for it away.
     static_cast<void>(inputService_.registerSystemHotKey(SystemQuickSearchId, {}, [] {}));
 }

@@ -3,6 +3,7 @@
 // Owned by the composition; belongs to the tap thread.
 #pragma once
 
+#include <cstdint>
 #include <functional>
 #include <optional>
 #include <string>
@@ -15,6 +16,9 @@
 #include "platform/UserDefaults.h"
 
 namespace plume {
+
+// Hot keys that do something in a window, or with one.
+enum class HotKeyForWindow : std::uint8_t { MakeSnippetFromClipboard, MakeSnippetFromSelection };
 
 class HotKeyDispatch {
   public:
@@ -46,6 +50,8 @@ class HotKeyDispatch {
     // Registers the hot keys of these settings in place of the previous ones. What the system refuses is an error that
     // says why; the others are registered all the same.
     Result<void> registerHotKeys(const UserDefaults& settings);
+    // None is registered any more.
+    void unregisterHotKeys();
     // The settings that hold a hot key for which there is nothing to do here.
     std::vector<std::string_view> hotKeysWithoutAction(const UserDefaults& settings) const;
 
