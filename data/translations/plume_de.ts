@@ -1,0 +1,1861 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="de_DE" sourcelanguage="en_US">
+<context>
+    <name>AdvancedPage</name>
+    <message>
+        <source>Every setting by its name, as “plume settings” shows it. Values are JSON; those that you have set are bold. Press F2 to change one.</source>
+        <translation>Alle Einstellungen mit ihrem Namen, wie „plume settings“ sie zeigt. Werte sind JSON; selbst gesetzte sind fett. F2 ändert einen Wert.</translation>
+    </message>
+    <message>
+        <source>All settings</source>
+        <translation>Alle Einstellungen</translation>
+    </message>
+    <message>
+        <source>Filter settings</source>
+        <translation>Einstellungen filtern</translation>
+    </message>
+    <message>
+        <source>&amp;Change…</source>
+        <translation>Ä&amp;ndern…</translation>
+    </message>
+    <message>
+        <source>&amp;Use Default</source>
+        <translation>&amp;Standard verwenden</translation>
+    </message>
+    <message>
+        <source>&amp;Show Diagnostics</source>
+        <translation>&amp;Diagnose anzeigen</translation>
+    </message>
+</context>
+<context>
+    <name>Application</name>
+    <message>
+        <source>There is already one or more instance(s) of Plume running.</source>
+        <translation>Plume läuft bereits.</translation>
+    </message>
+    <message>
+        <source>This instance will exit and bring other instances to front.</source>
+        <translation>Dieses Programm wird beendet und das bereits laufende nach vorn geholt.</translation>
+    </message>
+</context>
+<context>
+    <name>ApplicationServices</name>
+    <message>
+        <source>1 snippet was imported.</source>
+        <translation>1 Snippet wurde importiert.</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n snippets were imported.</source>
+        <translation>
+            <numerusform>%n Snippet wurde importiert.</numerusform>
+            <numerusform>%n Snippets wurden importiert.</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
+    <name>ApplicationsPage</name>
+    <message>
+        <source>Plume knows how many programs want to be typed to. Add a program where texts arrive damaged, or not at all.</source>
+        <translation>Plume weiß von vielen Programmen, wie Texte bei ihnen ankommen. Kommen sie in einem Programm beschädigt an oder gar nicht, lässt es sich hier hinzufügen.</translation>
+    </message>
+    <message>
+        <source>Programs</source>
+        <translation>Programme</translation>
+    </message>
+    <message>
+        <source>How texts are inserted in the chosen program</source>
+        <translation>Wie Texte im gewählten Programm eingesetzt werden</translation>
+    </message>
+    <message>
+        <source>Filter programs</source>
+        <translation>Programme filtern</translation>
+    </message>
+    <message>
+        <source>Change as &amp;Mine</source>
+        <translation>Als &amp;eigene übernehmen</translation>
+    </message>
+    <message>
+        <source>Makes a row of your own that begins as this one of Plume’s.</source>
+        <translation>Legt eine eigene Zeile an, die wie diese von Plume beginnt.</translation>
+    </message>
+    <message>
+        <source>Remo&amp;ve</source>
+        <translation>Entfe&amp;rnen</translation>
+    </message>
+    <message>
+        <source>Program</source>
+        <translation>Programm</translation>
+    </message>
+    <message>
+        <source>Identifier</source>
+        <translation>Kennung</translation>
+    </message>
+    <message>
+        <source>Row of</source>
+        <translation>Herkunft</translation>
+    </message>
+    <message>
+        <source>Kind</source>
+        <translation>Art</translation>
+    </message>
+    <message>
+        <source>Yours</source>
+        <translation>Eigene</translation>
+    </message>
+    <message>
+        <source>Plume</source>
+        <translation>Plume</translation>
+    </message>
+    <message>
+        <source>Automatic</source>
+        <translation>Automatisch</translation>
+    </message>
+    <message>
+        <source>Typed</source>
+        <translation>Getippt</translation>
+    </message>
+    <message>
+        <source>Pasted</source>
+        <translation>Eingefügt</translation>
+    </message>
+    <message>
+        <source>&amp;Insert texts:</source>
+        <translation>Texte ein&amp;setzen:</translation>
+    </message>
+    <message>
+        <source>As usual</source>
+        <translation>Wie üblich</translation>
+    </message>
+    <message>
+        <source>&amp;Keys that paste:</source>
+        <translation>&amp;Tasten zum Einfügen:</translation>
+    </message>
+    <message>
+        <source>Pause &amp;before pasting:</source>
+        <translation>Pause &amp;vor dem Einfügen:</translation>
+    </message>
+    <message>
+        <source>Pause &amp;after pasting:</source>
+        <translation>Pause &amp;nach dem Einfügen:</translation>
+    </message>
+    <message>
+        <source>Pause after &amp;erasing:</source>
+        <translation>Pause nach dem &amp;Löschen:</translation>
+    </message>
+    <message>
+        <source>Try it: click in the program and type an abbreviation. Changes hold at once.</source>
+        <translation>Zum Ausprobieren ins Programm klicken und ein Kürzel tippen. Änderungen gelten sofort.</translation>
+    </message>
+    <message>
+        <source> seconds</source>
+        <translation> Sekunden</translation>
+    </message>
+</context>
+<context>
+    <name>BackupsPage</name>
+    <message>
+        <source>Backups</source>
+        <translation>Sicherungen</translation>
+    </message>
+    <message>
+        <source>Folder of backups</source>
+        <translation>Ordner der Sicherungen</translation>
+    </message>
+    <message>
+        <source>F&amp;older:</source>
+        <translation>&amp;Ordner:</translation>
+    </message>
+    <message>
+        <source> backup</source>
+        <translation> Sicherung</translation>
+    </message>
+    <message numerus="yes">
+        <source> backups</source>
+        <translation>
+            <numerusform> Sicherung</numerusform>
+            <numerusform> Sicherungen</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>&amp;Keep:</source>
+        <translation>&amp;Behalten:</translation>
+    </message>
+    <message>
+        <source>The oldest go when there are more.</source>
+        <translation>Sind es mehr, werden die ältesten gelöscht.</translation>
+    </message>
+    <message>
+        <source>All backups</source>
+        <translation>Alle Sicherungen</translation>
+    </message>
+    <message>
+        <source>Never</source>
+        <translation>Nie</translation>
+    </message>
+    <message>
+        <source>Every hour</source>
+        <translation>Stündlich</translation>
+    </message>
+    <message>
+        <source>Every day</source>
+        <translation>Täglich</translation>
+    </message>
+    <message>
+        <source>Every week</source>
+        <translation>Wöchentlich</translation>
+    </message>
+    <message>
+        <source>Every 30 days</source>
+        <translation>Alle 30 Tage</translation>
+    </message>
+    <message>
+        <source>Back &amp;up:</source>
+        <translation>&amp;Sichern:</translation>
+    </message>
+    <message>
+        <source>&amp;Back Up Now</source>
+        <translation>&amp;Jetzt sichern</translation>
+    </message>
+    <message>
+        <source>&amp;Restore…</source>
+        <translation>Wiederherst&amp;ellen…</translation>
+    </message>
+    <message>
+        <source>Back Up Now, Restore</source>
+        <translation>Jetzt sichern, wiederherstellen</translation>
+    </message>
+    <message>
+        <source>No backup was made. %1</source>
+        <translation>Es wurde nichts gesichert. %1</translation>
+    </message>
+    <message>
+        <source>Written: %1</source>
+        <translation>Geschrieben: %1</translation>
+    </message>
+    <message>
+        <source>There is no backup in this folder yet.</source>
+        <translation>In diesem Ordner ist noch keine Sicherung.</translation>
+    </message>
+    <message>
+        <source>There is 1 backup.</source>
+        <translation>Es gibt 1 Sicherung.</translation>
+    </message>
+    <message numerus="yes">
+        <source>There are %n backups.</source>
+        <translation>
+            <numerusform>Es gibt %n Sicherung.</numerusform>
+            <numerusform>Es gibt %n Sicherungen.</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>The newest was made %1.</source>
+        <translation>Die neueste ist vom %1.</translation>
+    </message>
+    <message>
+        <source>Sync</source>
+        <translation>Abgleich</translation>
+    </message>
+    <message>
+        <source>Keep the library in &amp;step with other computers</source>
+        <translation>Bibliothek mit anderen &amp;Computern abgleichen</translation>
+    </message>
+    <message>
+        <source>By a file in a folder that these computers share.</source>
+        <translation>Über eine Datei in einem Ordner, den diese Computer teilen.</translation>
+    </message>
+    <message>
+        <source>Shared folder</source>
+        <translation>Gemeinsamer Ordner</translation>
+    </message>
+    <message>
+        <source>Shared &amp;folder:</source>
+        <translation>&amp;Gemeinsamer Ordner:</translation>
+    </message>
+    <message>
+        <source>Some settings &amp;go along</source>
+        <translation>Einige Einstellungen &amp;mitnehmen</translation>
+    </message>
+    <message>
+        <source>Those of the pages Typing and clipboard, and Correction.</source>
+        <translation>Die der Seiten „Tippen und Zwischenablage“ und „Korrektur“.</translation>
+    </message>
+    <message>
+        <source>Nothing is kept in step yet: choose a folder that exists.</source>
+        <translation>Noch wird nichts abgeglichen: bitte einen vorhandenen Ordner wählen.</translation>
+    </message>
+</context>
+<context>
+    <name>CorrectionPage</name>
+    <message>
+        <source>Sentences</source>
+        <translation>Sätze</translation>
+    </message>
+    <message>
+        <source>Begin every &amp;sentence with a capital</source>
+        <translation>Jeden &amp;Satz groß beginnen</translation>
+    </message>
+    <message>
+        <source>&amp;No sentence ends with:</source>
+        <translation>&amp;Kein Satzende nach:</translation>
+    </message>
+    <message>
+        <source>One in each line.</source>
+        <translation>Ein Eintrag pro Zeile.</translation>
+    </message>
+    <message>
+        <source>Words</source>
+        <translation>Wörter</translation>
+    </message>
+    <message>
+        <source>Correct &amp;two capitals at the start of a word</source>
+        <translation>&amp;Zwei Großbuchstaben am Wortanfang korrigieren</translation>
+    </message>
+    <message>
+        <source>&amp;Leave these words:</source>
+        <translation>&amp;Außer diesen Wörtern:</translation>
+    </message>
+    <message>
+        <source>Where</source>
+        <translation>Wo</translation>
+    </message>
+    <message>
+        <source>&amp;Correct:</source>
+        <translation>K&amp;orrigieren:</translation>
+    </message>
+    <message>
+        <source>&amp;Keyboard layouts:</source>
+        <translation>&amp;Tastaturbelegungen:</translation>
+    </message>
+    <message>
+        <source>With all layouts</source>
+        <translation>Bei allen Belegungen</translation>
+    </message>
+    <message>
+        <source>With all layouts except those below</source>
+        <translation>Bei allen Belegungen außer den folgenden</translation>
+    </message>
+    <message>
+        <source>Only with the layouts below</source>
+        <translation>Nur bei den folgenden Belegungen</translation>
+    </message>
+    <message>
+        <source>Layo&amp;uts:</source>
+        <translation>&amp;Belegungen:</translation>
+    </message>
+    <message>
+        <source>One in each line, like “us”, “de(nodeadkeys)” or “ibus:libpinyin”.</source>
+        <translation>Ein Eintrag pro Zeile, etwa „us“, „de(nodeadkeys)“ oder „ibus:libpinyin“.</translation>
+    </message>
+</context>
+<context>
+    <name>DecisionWords</name>
+    <message>
+        <source>expanded</source>
+        <translation>ersetzt</translation>
+    </message>
+    <message>
+        <source>expanded in %1</source>
+        <translation>in %1 ersetzt</translation>
+    </message>
+    <message>
+        <source>offered in a list, as one of several that match</source>
+        <translation>in einer Liste angeboten, als eines von mehreren, die passen</translation>
+    </message>
+    <message>
+        <source>its content could not be expanded</source>
+        <translation>sein Inhalt ließ sich nicht einsetzen</translation>
+    </message>
+    <message>
+        <source>the group is not meant for a program that Plume cannot name</source>
+        <translation>die Gruppe gilt nicht für ein Programm, das Plume nicht erkennt</translation>
+    </message>
+    <message>
+        <source>the group is not meant for %1</source>
+        <translation>die Gruppe gilt nicht für %1</translation>
+    </message>
+    <message>
+        <source>the group is not meant for this keyboard layout or input method</source>
+        <translation>die Gruppe gilt nicht für diese Tastaturbelegung oder Eingabemethode</translation>
+    </message>
+    <message>
+        <source>its capital and small letters were typed differently</source>
+        <translation>Groß- und Kleinbuchstaben wurden anders getippt</translation>
+    </message>
+    <message>
+        <source>the group does not expand after the key that followed</source>
+        <translation>die Gruppe ersetzt nicht nach der Taste, die folgte</translation>
+    </message>
+    <message>
+        <source>Plume was switched off</source>
+        <translation>Plume wurde ausgeschaltet</translation>
+    </message>
+    <message>
+        <source>Plume was switched on</source>
+        <translation>Plume wurde eingeschaltet</translation>
+    </message>
+    <message>
+        <source>a password field or another program kept the keyboard to itself</source>
+        <translation>ein Passwortfeld oder ein anderes Programm hat die Tastatur für sich behalten</translation>
+    </message>
+    <message>
+        <source>Plume could hear the keyboard again</source>
+        <translation>Plume konnte die Tastatur wieder hören</translation>
+    </message>
+    <message>
+        <source>no space or other delimiter stood before it</source>
+        <translation>davor stand kein Leerzeichen oder anderes Trennzeichen</translation>
+    </message>
+    <message>
+        <source>no space or new line stood before it</source>
+        <translation>davor stand kein Leerzeichen und keine neue Zeile</translation>
+    </message>
+    <message>
+        <source>no number stood before it</source>
+        <translation>davor stand keine Zahl</translation>
+    </message>
+    <message>
+        <source>part of its prefix stood before it once more</source>
+        <translation>davor stand ein Teil seines Präfixes noch einmal</translation>
+    </message>
+    <message>
+        <source>the group wants something else before it</source>
+        <translation>die Gruppe verlangt davor etwas anderes</translation>
+    </message>
+    <message>
+        <source>“%1”</source>
+        <translation>„%1“</translation>
+    </message>
+    <message>
+        <source>“%1” (group %2)</source>
+        <translation>„%1“ (Gruppe %2)</translation>
+    </message>
+    <message>
+        <source>%1 was %2.</source>
+        <extracomment>%1 is an abbreviation, %2 for example &quot;expanded in xterm&quot;</extracomment>
+        <translation>Das Kürzel %1 wurde %2.</translation>
+    </message>
+    <message>
+        <source>%1.</source>
+        <translation>%1.</translation>
+    </message>
+    <message>
+        <source>%1 did not expand: %2.</source>
+        <extracomment>%1 is an abbreviation, %2 for example &quot;the group is not meant for xterm&quot;</extracomment>
+        <translation>Das Kürzel %1 wurde nicht ersetzt: %2.</translation>
+    </message>
+    <message>
+        <source>Choose from the list, or give each snippet an abbreviation of its own.</source>
+        <translation>Aus der Liste wählen oder jedem Snippet ein eigenes Kürzel geben.</translation>
+    </message>
+    <message>
+        <source>Have a look at the snippet’s content. What was wrong with it may have been reported.</source>
+        <translation>Den Inhalt des Snippets prüfen. Was daran nicht stimmt, steht vielleicht in den Meldungen.</translation>
+    </message>
+    <message>
+        <source>Change the list of programs in the group’s settings.</source>
+        <translation>Die Liste der Programme in den Einstellungen der Gruppe ändern.</translation>
+    </message>
+    <message>
+        <source>Change to another keyboard layout, or change the list of them in the group’s settings.</source>
+        <translation>Zu einer anderen Tastaturbelegung wechseln oder ihre Liste in den Einstellungen der Gruppe ändern.</translation>
+    </message>
+    <message>
+        <source>Type it where that fits, or change in the group’s settings what must stand before an abbreviation.</source>
+        <translation>Das Kürzel dort tippen, wo es passt, oder in den Einstellungen der Gruppe ändern, was vor einem Kürzel stehen muss.</translation>
+    </message>
+    <message>
+        <source>Type it as it is written here, or let the snippet ignore case.</source>
+        <translation>Das Kürzel so tippen, wie es hier steht, oder das Snippet Groß- und Kleinschreibung ignorieren lassen.</translation>
+    </message>
+    <message>
+        <source>Type one of the group’s own delimiters, or add this one to them in the group’s settings.</source>
+        <translation>Eines der Trennzeichen der Gruppe tippen oder dieses in den Einstellungen der Gruppe hinzufügen.</translation>
+    </message>
+    <message>
+        <source>Nothing expands until you switch Plume on in the menu of its icon.</source>
+        <translation>Nichts wird ersetzt, bis Plume im Menü seines Symbols wieder eingeschaltet wird.</translation>
+    </message>
+    <message>
+        <source>Nothing expands until you leave the field, or the other program lets the keyboard go.</source>
+        <translation>Nichts wird ersetzt, bis das Feld verlassen ist oder das andere Programm die Tastatur freigibt.</translation>
+    </message>
+</context>
+<context>
+    <name>ExpansionPage</name>
+    <message>
+        <source>Capitals</source>
+        <translation>Großbuchstaben</translation>
+    </message>
+    <message>
+        <source>Mixed &amp;case gives every word a capital</source>
+        <translation>Bei &amp;gemischter Schreibweise jedes Wort groß beginnen</translation>
+    </message>
+    <message>
+        <source>Where a text adapts to how its abbreviation is typed: “bRb” gives every word a capital. Without this only one that ends with a capital does, like “bRB”.</source>
+        <translation>Wo sich ein Text der Schreibweise seines Kürzels anpasst, beginnt bei „bRb“ jedes Wort groß. Sonst bewirkt das nur ein Kürzel, das mit einem Großbuchstaben endet, wie „bRB“.</translation>
+    </message>
+    <message>
+        <source>Typing</source>
+        <translation>Tippen</translation>
+    </message>
+    <message>
+        <source>A mouse click &amp;ends the abbreviation</source>
+        <translation>Ein &amp;Mausklick beendet das Kürzel</translation>
+    </message>
+    <message>
+        <source>What was typed before a click and what is typed after it are then never one abbreviation.</source>
+        <translation>Was vor und was nach einem Klick getippt wird, ist dann nie ein und dasselbe Kürzel.</translation>
+    </message>
+    <message>
+        <source>Passwords</source>
+        <translation>Passwörter</translation>
+    </message>
+    <message>
+        <source>Let programs tell which fields are for &amp;passwords</source>
+        <translation>&amp;Passwortfelder von Programmen melden lassen</translation>
+    </message>
+    <message>
+        <source>Plume is deaf in these fields. Browsers and some other programs tell it only while the desktop’s accessibility is on, which this switches on when Plume starts. It costs these programs some time and memory.</source>
+        <translation>In diesen Feldern hört Plume nicht zu. Browser und einige andere Programme melden sie nur, solange die Barrierefreiheit der Arbeitsumgebung eingeschaltet ist; das übernimmt Plume dann beim Start. Diese Programme kostet das etwas Zeit und Speicher.</translation>
+    </message>
+</context>
+<context>
+    <name>GeneralPage</name>
+    <message>
+        <source>Plume</source>
+        <translation>Plume</translation>
+    </message>
+    <message>
+        <source>&amp;Expand abbreviations</source>
+        <translation>Kürzel &amp;ersetzen</translation>
+    </message>
+    <message>
+        <source>Show the &amp;icon in the panel</source>
+        <translation>Symbol in der &amp;Leiste anzeigen</translation>
+    </message>
+    <message>
+        <source>Its menu leads to everything that Plume can do.</source>
+        <translation>Sein Menü führt zu allem, was Plume kann.</translation>
+    </message>
+    <message>
+        <source>Sound</source>
+        <translation>Ton</translation>
+    </message>
+    <message>
+        <source>&amp;Play a sound with every expansion</source>
+        <translation>Bei jeder Ersetzung einen &amp;Ton abspielen</translation>
+    </message>
+    <message>
+        <source>Text</source>
+        <translation>Text</translation>
+    </message>
+    <message>
+        <source> point</source>
+        <translation> Punkt</translation>
+    </message>
+    <message numerus="yes">
+        <source> points</source>
+        <translation>
+            <numerusform> Punkt</numerusform>
+            <numerusform> Punkt</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>&amp;Larger text in lists:</source>
+        <translation>&amp;Größere Schrift in Listen:</translation>
+    </message>
+    <message>
+        <source>How much larger than usual lists and menus are written.</source>
+        <translation>Um wie viel größer als üblich Listen und Menüs geschrieben sind.</translation>
+    </message>
+    <message>
+        <source>&amp;Start Plume when I log in</source>
+        <translation>Plume beim An&amp;melden starten</translation>
+    </message>
+    <message>
+        <source>This could not be kept. %1</source>
+        <translation>Das ließ sich nicht speichern. %1</translation>
+    </message>
+    <message>
+        <source>&amp;Test</source>
+        <translation>&amp;Anhören</translation>
+    </message>
+    <message>
+        <source>Test the sound</source>
+        <translation>Ton anhören</translation>
+    </message>
+    <message>
+        <source>So&amp;und:</source>
+        <translation>T&amp;on:</translation>
+    </message>
+    <message>
+        <source>&amp;Font of new snippets:</source>
+        <translation>&amp;Schrift neuer Snippets:</translation>
+    </message>
+    <message>
+        <source>%1, %2 points…</source>
+        <translation>%1, %2 Punkt…</translation>
+    </message>
+    <message>
+        <source>Font of new snippets: %1</source>
+        <translation>Schrift neuer Snippets: %1</translation>
+    </message>
+    <message>
+        <source>Font of New Snippets</source>
+        <translation>Schrift neuer Snippets</translation>
+    </message>
+</context>
+<context>
+    <name>HotKeysPage</name>
+    <message>
+        <source>Switch expansion on and off</source>
+        <translation>Ersetzen ein- und ausschalten</translation>
+    </message>
+    <message>
+        <source>Expand the abbreviation just typed</source>
+        <translation>Eben getipptes Kürzel ersetzen</translation>
+    </message>
+    <message>
+        <source>Undo the last expansion</source>
+        <translation>Letzte Ersetzung zurücknehmen</translation>
+    </message>
+    <message>
+        <source>The key that caused it comes back too.</source>
+        <translation>Auch die Taste, die sie ausgelöst hat, kommt zurück.</translation>
+    </message>
+    <message>
+        <source>Undo without that key</source>
+        <translation>Zurücknehmen ohne diese Taste</translation>
+    </message>
+    <message>
+        <source>Only the abbreviation comes back.</source>
+        <translation>Nur das Kürzel kommt zurück.</translation>
+    </message>
+    <message>
+        <source>Suggest abbreviations</source>
+        <translation>Kürzel vorschlagen</translation>
+    </message>
+    <message>
+        <source>Quick search</source>
+        <translation>Schnellsuche</translation>
+    </message>
+    <message>
+        <source>Quick search, asked of the desktop</source>
+        <translation>Schnellsuche über den Desktop</translation>
+    </message>
+    <message>
+        <source>Works also where Plume does not hear the keys.</source>
+        <translation>Geht auch dort, wo Plume die Tasten nicht hört.</translation>
+    </message>
+    <message>
+        <source>Open the snippets window</source>
+        <translation>Snippet-Fenster öffnen</translation>
+    </message>
+    <message>
+        <source>Open the snippet used last</source>
+        <translation>Zuletzt benutztes Snippet öffnen</translation>
+    </message>
+    <message>
+        <source>New snippet from the selection</source>
+        <translation>Neues Snippet aus der Auswahl</translation>
+    </message>
+    <message>
+        <source>New snippet from the clipboard</source>
+        <translation>Neues Snippet aus der Zwischenablage</translation>
+    </message>
+    <message>
+        <source>Click a field, or press Space in it, and then the keys that you want.</source>
+        <translation>Ein Feld anklicken oder darin die Leertaste drücken, dann die gewünschten Tasten.</translation>
+    </message>
+    <message>
+        <source>Expanding</source>
+        <translation>Ersetzen</translation>
+    </message>
+    <message>
+        <source>Finding snippets</source>
+        <translation>Snippets finden</translation>
+    </message>
+    <message>
+        <source>Making and changing snippets</source>
+        <translation>Snippets anlegen und ändern</translation>
+    </message>
+</context>
+<context>
+    <name>ImportExportPage</name>
+    <message>
+        <source>Import</source>
+        <translation>Import</translation>
+    </message>
+    <message>
+        <source>&amp;Import a File…</source>
+        <translation>Datei &amp;importieren…</translation>
+    </message>
+    <message>
+        <source>Snippets of Plume or of another program are added to yours.</source>
+        <translation>Snippets von Plume oder aus einem anderen Programm kommen zu den eigenen hinzu.</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Export</translation>
+    </message>
+    <message>
+        <source>&amp;Export the Library…</source>
+        <translation>Bibliothek &amp;exportieren…</translation>
+    </message>
+    <message>
+        <source>All snippets go into one file, for another computer or another program.</source>
+        <translation>Alle Snippets kommen in eine Datei, für einen anderen Computer oder ein anderes Programm.</translation>
+    </message>
+</context>
+<context>
+    <name>MenuTexts</name>
+    <message>
+        <source>Empty snippet</source>
+        <translation>Leeres Snippet</translation>
+    </message>
+    <message>
+        <source>%1 — %2</source>
+        <extracomment>%1 is an abbreviation, %2 what it stands for.</extracomment>
+        <translation>%1 – %2</translation>
+    </message>
+</context>
+<context>
+    <name>SearchPage</name>
+    <message>
+        <source>Lists at the caret</source>
+        <translation>Listen an der Schreibmarke</translation>
+    </message>
+    <message>
+        <source>&amp;Key held to pick with a digit:</source>
+        <translation>&amp;Taste zum Wählen per Ziffer:</translation>
+    </message>
+    <message>
+        <source>None</source>
+        <translation>Keine</translation>
+    </message>
+    <message>
+        <source>Shift</source>
+        <translation>Umschalt</translation>
+    </message>
+    <message>
+        <source>Control</source>
+        <translation>Strg</translation>
+    </message>
+    <message>
+        <source>Alt</source>
+        <translation>Alt</translation>
+    </message>
+    <message>
+        <source>Super</source>
+        <translation>Super</translation>
+    </message>
+    <message>
+        <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held.</source>
+        <translation>In Vorschlägen und in der Schnellsuche wählen die Ziffern 1 bis 9 ein Snippet, solange diese Taste gedrückt ist.</translation>
+    </message>
+    <message>
+        <source>Quick search looks in</source>
+        <translation>Die Schnellsuche durchsucht</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviations</source>
+        <translation>&amp;Kürzel</translation>
+    </message>
+    <message>
+        <source>&amp;Contents</source>
+        <translation>&amp;Inhalte</translation>
+    </message>
+    <message>
+        <source>&amp;Labels</source>
+        <translation>&amp;Bezeichnungen</translation>
+    </message>
+    <message>
+        <source>&amp;Wildcards in quick search</source>
+        <translation>&amp;Platzhalter in der Schnellsuche</translation>
+    </message>
+    <message>
+        <source>* stands for any text, and ? for any character.</source>
+        <translation>* steht für beliebigen Text und ? für ein beliebiges Zeichen.</translation>
+    </message>
+    <message>
+        <source>The snippets window looks in</source>
+        <translation>Das Snippet-Fenster durchsucht</translation>
+    </message>
+    <message>
+        <source>A&amp;bbreviations</source>
+        <translation>Kü&amp;rzel</translation>
+    </message>
+    <message>
+        <source>C&amp;ontents</source>
+        <translation>In&amp;halte</translation>
+    </message>
+    <message>
+        <source>Lab&amp;els</source>
+        <translation>Be&amp;zeichnungen</translation>
+    </message>
+    <message>
+        <source>At least one is needed.</source>
+        <translation>Eines davon muss gewählt bleiben.</translation>
+    </message>
+</context>
+<context>
+    <name>TypingPage</name>
+    <message>
+        <source>Pasting</source>
+        <translation>Einfügen</translation>
+    </message>
+    <message>
+        <source>&amp;Paste texts instead of typing them</source>
+        <translation>Texte einfügen statt &amp;tippen</translation>
+    </message>
+    <message>
+        <source>Pasting is faster; typing leaves the clipboard alone.</source>
+        <translation>Einfügen ist schneller; Tippen lässt die Zwischenablage in Ruhe.</translation>
+    </message>
+    <message>
+        <source>P&amp;aste:</source>
+        <translation>&amp;Einfügen:</translation>
+    </message>
+    <message>
+        <source>Long texts</source>
+        <translation>Lange Texte</translation>
+    </message>
+    <message>
+        <source>Paste &amp;long texts everywhere</source>
+        <translation>&amp;Lange Texte überall einfügen</translation>
+    </message>
+    <message>
+        <source> character</source>
+        <translation> Zeichen</translation>
+    </message>
+    <message numerus="yes">
+        <source> characters</source>
+        <translation>
+            <numerusform> Zeichen</numerusform>
+            <numerusform> Zeichen</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Long &amp;from:</source>
+        <translation>Lang &amp;ab:</translation>
+    </message>
+    <message>
+        <source>What you copied</source>
+        <translation>Kopiertes</translation>
+    </message>
+    <message>
+        <source>&amp;Give back what was copied after a paste</source>
+        <translation>Nach dem Einfügen das &amp;Kopierte zurückgeben</translation>
+    </message>
+    <message>
+        <source>Give it back af&amp;ter:</source>
+        <translation>&amp;Zurückgeben nach:</translation>
+    </message>
+    <message>
+        <source>Programs that paste slowly need more.</source>
+        <translation>Programme, die langsam einfügen, brauchen mehr.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::AboutWindow</name>
+    <message>
+        <source>Library</source>
+        <translation>Bibliothek</translation>
+    </message>
+    <message>
+        <source>License</source>
+        <translation>Lizenz</translation>
+    </message>
+    <message>
+        <source>Libraries that Plume uses</source>
+        <translation>Bibliotheken, die Plume benutzt</translation>
+    </message>
+    <message>
+        <source>About Plume</source>
+        <translation>Über Plume</translation>
+    </message>
+    <message>
+        <source>Version %1</source>
+        <translation>Version %1</translation>
+    </message>
+    <message>
+        <source>Version</source>
+        <translation>Version</translation>
+    </message>
+    <message>
+        <source>Plume replaces the short abbreviations that you type by the texts that they stand for, in every program.</source>
+        <translation>Plume ersetzt getippte Kürzel durch die Texte, für die sie stehen, in jedem Programm.</translation>
+    </message>
+    <message>
+        <source>Plume is free software under the Apache License 2.0; its file LICENSE has the whole text.</source>
+        <translation>Plume ist freie Software unter der Apache-Lizenz 2.0; die Datei LICENSE enthält den vollen Wortlaut.</translation>
+    </message>
+    <message>
+        <source>Built with these &amp;libraries:</source>
+        <translation>Erstellt mit diesen &amp;Bibliotheken:</translation>
+    </message>
+    <message>
+        <source>&amp;Close</source>
+        <translation>&amp;Schließen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ApplicationList</name>
+    <message>
+        <source>Remove</source>
+        <translation>Entfernen</translation>
+    </message>
+    <message>
+        <source>%1 is in the list already.</source>
+        <translation>%1 steht schon in der Liste.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DecisionsWindow</name>
+    <message>
+        <source>Why Didn&apos;t It Expand?</source>
+        <translation>Warum wurde nichts ersetzt?</translation>
+    </message>
+    <message>
+        <source>What became of the abbreviations that you typed last, the newest first. Plume remembers twenty of them until it ends, and nothing else of what you type.</source>
+        <translation>Was aus den zuletzt getippten Kürzeln geworden ist, das neueste zuerst. Plume merkt sich zwanzig davon, bis es endet, und sonst nichts von dem, was getippt wird.</translation>
+    </message>
+    <message>
+        <source>Abbreviations that you typed last</source>
+        <translation>Zuletzt getippte Kürzel</translation>
+    </message>
+    <message>
+        <source>Time</source>
+        <translation>Zeit</translation>
+    </message>
+    <message>
+        <source>Abbreviation</source>
+        <translation>Kürzel</translation>
+    </message>
+    <message>
+        <source>Group</source>
+        <translation>Gruppe</translation>
+    </message>
+    <message>
+        <source>What happened</source>
+        <translation>Was geschah</translation>
+    </message>
+    <message>
+        <source>Nothing to tell yet. Type an abbreviation in any program and come back: what became of it stands here then.</source>
+        <translation>Noch gibt es nichts zu berichten. Was aus einem Kürzel geworden ist, das in einem Programm getippt wurde, steht danach hier.</translation>
+    </message>
+    <message>
+        <source>&amp;Forget These</source>
+        <translation>&amp;Vergessen</translation>
+    </message>
+    <message>
+        <source>&amp;Refresh</source>
+        <translation>&amp;Aktualisieren</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DiagnosticWindow</name>
+    <message>
+        <source>Plume Diagnostics</source>
+        <translation>Diagnose von Plume</translation>
+    </message>
+    <message>
+        <source>Report</source>
+        <translation>Bericht</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Kopieren</translation>
+    </message>
+    <message>
+        <source>&amp;Save…</source>
+        <translation>&amp;Speichern…</translation>
+    </message>
+    <message>
+        <source>This report says how Plume is doing. It holds none of your snippets and nothing that you typed.</source>
+        <translation>Dieser Bericht sagt, wie es Plume geht. Er enthält keine Snippets und nichts Getipptes.</translation>
+    </message>
+    <message>
+        <source>The report is on the clipboard.</source>
+        <translation>Der Bericht ist in der Zwischenablage.</translation>
+    </message>
+    <message>
+        <source>Save Report</source>
+        <translation>Bericht speichern</translation>
+    </message>
+    <message>
+        <source>Text files (*.txt)</source>
+        <translation>Textdateien (*.txt)</translation>
+    </message>
+    <message>
+        <source>Plume Report.txt</source>
+        <translation>Plume-Bericht.txt</translation>
+    </message>
+    <message>
+        <source>The report was saved.</source>
+        <translation>Der Bericht wurde gespeichert.</translation>
+    </message>
+    <message>
+        <source>The report was not saved</source>
+        <translation>Der Bericht wurde nicht gespeichert</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FilePanels</name>
+    <message>
+        <source>The snippets were not exported</source>
+        <translation>Die Snippets wurden nicht exportiert</translation>
+    </message>
+    <message>
+        <source>%1: snippets can be written to files that end with .plume, .csv or .json.</source>
+        <translation>%1: Snippets lassen sich in Dateien schreiben, die auf .plume, .csv oder .json enden.</translation>
+    </message>
+    <message>
+        <source>Import Snippets</source>
+        <translation>Snippets importieren</translation>
+    </message>
+    <message>
+        <source>Snippets of Plume and other programs (%1)</source>
+        <translation>Snippets von Plume und anderen Programmen (%1)</translation>
+    </message>
+    <message>
+        <source>All files (*)</source>
+        <translation>Alle Dateien (*)</translation>
+    </message>
+    <message>
+        <source>Choose</source>
+        <translation>Auswählen</translation>
+    </message>
+    <message>
+        <source>Plume library (*.plume)</source>
+        <translation>Plume-Bibliothek (*.plume)</translation>
+    </message>
+    <message>
+        <source>Comma-separated values (*.csv)</source>
+        <translation>Kommagetrennte Werte (*.csv)</translation>
+    </message>
+    <message>
+        <source>Readable library (*.json)</source>
+        <translation>Lesbare Bibliothek (*.json)</translation>
+    </message>
+    <message>
+        <source>Export Snippets</source>
+        <translation>Snippets exportieren</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Exportieren</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Meine Snippets</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FileUseQuestion</name>
+    <message>
+        <source>Restore / Import data from %@</source>
+        <translation>Daten aus %@ wiederherstellen oder importieren</translation>
+    </message>
+    <message>
+        <source>Restoring will replace all current snippets with snippets from the selected file.<byte value="xd"/>
+<byte value="xd"/>
+Importing will add file&apos;s snippets to current snippets.</source>
+        <translation>Wiederherstellen ersetzt alle jetzigen Snippets durch die der gewählten Datei.<byte value="xd"/>
+<byte value="xd"/>
+Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Importieren</translation>
+    </message>
+    <message>
+        <source>Restore</source>
+        <translation>Wiederherstellen</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Abbrechen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FolderChoice</name>
+    <message>
+        <source>Default Directory</source>
+        <translation>Standardordner</translation>
+    </message>
+    <message>
+        <source>Other Folder…</source>
+        <translation>Anderer Ordner…</translation>
+    </message>
+    <message>
+        <source>Choose a folder</source>
+        <translation>Ordner wählen</translation>
+    </message>
+    <message>
+        <source>Another folder</source>
+        <translation>Anderer Ordner</translation>
+    </message>
+    <message>
+        <source>Choose a Folder</source>
+        <translation>Ordner wählen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::HotKeyRecorder</name>
+    <message>
+        <source>Ctrl</source>
+        <translation>Strg</translation>
+    </message>
+    <message>
+        <source>Alt</source>
+        <translation>Alt</translation>
+    </message>
+    <message>
+        <source>Shift</source>
+        <translation>Umschalt</translation>
+    </message>
+    <message>
+        <source>Super</source>
+        <translation>Super</translation>
+    </message>
+    <message>
+        <source>Key %1</source>
+        <translation>Taste %1</translation>
+    </message>
+    <message>
+        <source>Clear</source>
+        <translation>Löschen</translation>
+    </message>
+    <message>
+        <source>Nothing was heard. Plume may not hear the keyboard at the moment.</source>
+        <translation>Es war nichts zu hören. Vielleicht hört Plume die Tastatur gerade nicht.</translation>
+    </message>
+    <message>
+        <source>Clear the hot key: %1</source>
+        <translation>Tastenkürzel löschen: %1</translation>
+    </message>
+    <message>
+        <source>%1 would be typed all the time. Hold Ctrl, Alt or Super with it.</source>
+        <translation>%1 würde ständig getippt. Bitte Strg, Alt oder Super dazu halten.</translation>
+    </message>
+    <message>
+        <source>%1 is the hot key of “%2” already.</source>
+        <translation>%1 ist schon das Tastenkürzel für „%2“.</translation>
+    </message>
+    <message>
+        <source>Press keys… Escape leaves it as it is</source>
+        <translation>Tasten drücken… Esc bricht ab</translation>
+    </message>
+    <message>
+        <source>None</source>
+        <translation>Keines</translation>
+    </message>
+</context>
+<context>
+    <name>plume::InitalSyncWindowController</name>
+    <message>
+        <source>Synchronize Snippets</source>
+        <translation>Snippets abgleichen</translation>
+    </message>
+    <message>
+        <source>Use the snippets in “%@” on this computer</source>
+        <translation>Die Snippets in „%@“ auf diesem Computer verwenden</translation>
+    </message>
+    <message>
+        <source>Replace the snippets in “%@” by those of this computer</source>
+        <translation>Die Snippets in „%@“ durch die dieses Computers ersetzen</translation>
+    </message>
+    <message>
+        <source>The folder “%@” holds snippets already</source>
+        <translation>Der Ordner „%@“ enthält schon Snippets</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>&amp;Abbrechen</translation>
+    </message>
+    <message>
+        <source>Which snippets do you want to keep?</source>
+        <translation>Welche Snippets sollen bleiben?</translation>
+    </message>
+    <message>
+        <source>The snippets that are replaced are not lost: Plume writes a backup of them first.</source>
+        <translation>Die ersetzten Snippets gehen nicht verloren: Plume sichert sie zuvor.</translation>
+    </message>
+    <message>
+        <source>&amp;Use Folder’s Snippets</source>
+        <translation>Snippets des Ordners &amp;verwenden</translation>
+    </message>
+    <message>
+        <source>&amp;Replace Folder’s Snippets</source>
+        <translation>Snippets des Ordners &amp;ersetzen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::Messages</name>
+    <message>
+        <source>OK</source>
+        <translation>OK</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Abbrechen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::NewSnippetWindow</name>
+    <message>
+        <source>New Snippet</source>
+        <translation>Neues Snippet</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Meine Snippets</translation>
+    </message>
+    <message>
+        <source>Add &amp;Snippet</source>
+        <translation>Snippet &amp;hinzufügen</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>&amp;Abbrechen</translation>
+    </message>
+    <message>
+        <source>Optional: a name for lists</source>
+        <translation>Optional: ein Name für Listen</translation>
+    </message>
+    <message>
+        <source>About the abbreviation</source>
+        <translation>Zum Kürzel</translation>
+    </message>
+    <message>
+        <source>&amp;Group:</source>
+        <translation>&amp;Gruppe:</translation>
+    </message>
+    <message>
+        <source>Na&amp;me of group:</source>
+        <translation>&amp;Name der Gruppe:</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviation:</source>
+        <translation>&amp;Kürzel:</translation>
+    </message>
+    <message>
+        <source>&amp;Label:</source>
+        <translation>&amp;Bezeichnung:</translation>
+    </message>
+    <message>
+        <source>&amp;Text:</source>
+        <translation>&amp;Text:</translation>
+    </message>
+    <message>
+        <source>Untitled group</source>
+        <translation>Unbenannte Gruppe</translation>
+    </message>
+    <message>
+        <source>New Group…</source>
+        <translation>Neue Gruppe…</translation>
+    </message>
+    <message>
+        <source>Without an abbreviation it can only be chosen from lists.</source>
+        <translation>Ohne Kürzel lässt es sich nur aus Listen wählen.</translation>
+    </message>
+    <message>
+        <source>The group has this abbreviation already. Both will be kept.</source>
+        <translation>Die Gruppe hat es schon. Beide bleiben erhalten.</translation>
+    </message>
+    <message>
+        <source>Do you want to throw this snippet away?</source>
+        <translation>Dieses Snippet verwerfen?</translation>
+    </message>
+    <message>
+        <source>It was not added to your snippets yet.</source>
+        <translation>Es wurde noch nicht zu den Snippets hinzugefügt.</translation>
+    </message>
+    <message>
+        <source>Throw Away</source>
+        <translation>Verwerfen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PreferencesPage</name>
+    <message>
+        <source>This could not be kept. %1</source>
+        <translation>Das ließ sich nicht speichern. %1</translation>
+    </message>
+    <message>
+        <source>Another value (%1)</source>
+        <translation>Anderer Wert (%1)</translation>
+    </message>
+    <message>
+        <source> seconds</source>
+        <translation> Sekunden</translation>
+    </message>
+    <message>
+        <source>In all programs</source>
+        <translation>In allen Programmen</translation>
+    </message>
+    <message>
+        <source>In all programs except those below</source>
+        <translation>In allen Programmen außer den folgenden</translation>
+    </message>
+    <message>
+        <source>Only in the programs below</source>
+        <translation>Nur in den folgenden Programmen</translation>
+    </message>
+    <message>
+        <source>Programs</source>
+        <translation>Programme</translation>
+    </message>
+    <message>
+        <source>Enabled</source>
+        <translation>Eingeschlossen</translation>
+    </message>
+    <message>
+        <source>Ignored</source>
+        <translation>Ausgenommen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PreferencesWindow</name>
+    <message>
+        <source>Preferences</source>
+        <translation>Einstellungen</translation>
+    </message>
+    <message>
+        <source>General</source>
+        <translation>Allgemein</translation>
+    </message>
+    <message>
+        <source>Expansion</source>
+        <translation>Ersetzen</translation>
+    </message>
+    <message>
+        <source>Suggestions and search</source>
+        <translation>Vorschläge und Suche</translation>
+    </message>
+    <message>
+        <source>Typing and clipboard</source>
+        <translation>Tippen und Zwischenablage</translation>
+    </message>
+    <message>
+        <source>Correction</source>
+        <translation>Korrektur</translation>
+    </message>
+    <message>
+        <source>Hot keys</source>
+        <translation>Tastenkürzel</translation>
+    </message>
+    <message>
+        <source>Applications</source>
+        <translation>Programme</translation>
+    </message>
+    <message>
+        <source>Backups and sync</source>
+        <translation>Sicherung und Abgleich</translation>
+    </message>
+    <message>
+        <source>Import and export</source>
+        <translation>Import und Export</translation>
+    </message>
+    <message>
+        <source>Advanced</source>
+        <translation>Erweitert</translation>
+    </message>
+    <message>
+        <source>Search settings</source>
+        <translation>Einstellungen suchen</translation>
+    </message>
+    <message>
+        <source>Pages</source>
+        <translation>Seiten</translation>
+    </message>
+    <message>
+        <source>Settings that were found</source>
+        <translation>Gefundene Einstellungen</translation>
+    </message>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Nichts gefunden.</translation>
+    </message>
+    <message>
+        <source>What went wrong</source>
+        <translation>Was schiefging</translation>
+    </message>
+    <message>
+        <source>Hide</source>
+        <translation>Ausblenden</translation>
+    </message>
+    <message>
+        <source>Restore &amp;Defaults</source>
+        <translation>Standardwerte &amp;wiederherstellen</translation>
+    </message>
+    <message>
+        <source>Restore the defaults of the page “%1”?</source>
+        <translation>Die Standardwerte der Seite „%1“ wiederherstellen?</translation>
+    </message>
+    <message>
+        <source>What you have set on this page is forgotten. Other pages stay as they are.</source>
+        <translation>Was auf dieser Seite eingestellt wurde, wird vergessen. Andere Seiten bleiben, wie sie sind.</translation>
+    </message>
+    <message>
+        <source>&amp;Restore Defaults</source>
+        <translation>Standardwerte &amp;wiederherstellen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ProgramAdder</name>
+    <message>
+        <source>Add</source>
+        <translation>Hinzufügen</translation>
+    </message>
+    <message>
+        <source>Add a program</source>
+        <translation>Programm hinzufügen</translation>
+    </message>
+    <message>
+        <source>&amp;Running Program…</source>
+        <translation>&amp;Laufendes Programm…</translation>
+    </message>
+    <message>
+        <source>&amp;Installed Program…</source>
+        <translation>&amp;Installiertes Programm…</translation>
+    </message>
+    <message>
+        <source>&amp;Point at a Window…</source>
+        <translation>Auf ein &amp;Fenster zeigen…</translation>
+    </message>
+    <message>
+        <source>&amp;Type an Identifier…</source>
+        <translation>&amp;Kennung eingeben…</translation>
+    </message>
+    <message>
+        <source>Running Programs</source>
+        <translation>Laufende Programme</translation>
+    </message>
+    <message>
+        <source>Installed Programs</source>
+        <translation>Installierte Programme</translation>
+    </message>
+    <message>
+        <source>Click in a window of the program within 20 seconds.</source>
+        <translation>Bitte innerhalb von 20 Sekunden in ein Fenster des Programms klicken.</translation>
+    </message>
+    <message>
+        <source>No window of another program was clicked.</source>
+        <translation>Es wurde kein Fenster eines anderen Programms angeklickt.</translation>
+    </message>
+    <message>
+        <source>Add a Program</source>
+        <translation>Programm hinzufügen</translation>
+    </message>
+    <message>
+        <source>Identifier of the program: the name of its desktop file without “.desktop”, or its window class</source>
+        <translation>Kennung des Programms: der Name seiner Desktop-Datei ohne „.desktop“ oder seine Fensterklasse</translation>
+    </message>
+    <message>
+        <source>&amp;Add Program</source>
+        <translation>&amp;Programm hinzufügen</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>&amp;Abbrechen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ProgramChooser</name>
+    <message>
+        <source>No programs are there to choose from.</source>
+        <translation>Es gibt keine Programme zur Auswahl.</translation>
+    </message>
+    <message>
+        <source>Program</source>
+        <translation>Programm</translation>
+    </message>
+    <message>
+        <source>Identifier</source>
+        <translation>Kennung</translation>
+    </message>
+    <message>
+        <source>Filter</source>
+        <translation>Filtern</translation>
+    </message>
+    <message>
+        <source>Programs</source>
+        <translation>Programme</translation>
+    </message>
+    <message>
+        <source>&amp;Add Program</source>
+        <translation>&amp;Programm hinzufügen</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>&amp;Abbrechen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PromptWindow</name>
+    <message>
+        <source>Plume</source>
+        <translation>Plume</translation>
+    </message>
+    <message>
+        <source>Plume cannot expand abbreviations yet</source>
+        <translation>Plume kann noch keine Kürzel ersetzen</translation>
+    </message>
+    <message>
+        <source>Put this right, then choose “Check Again”. You can also continue and do it later: until then Plume runs, but abbreviations may stay as you type them.</source>
+        <translation>Bitte beheben und dann „Erneut prüfen“ wählen. Das geht auch später: bis dahin läuft Plume, aber Kürzel bleiben vielleicht so stehen, wie sie getippt wurden.</translation>
+    </message>
+    <message>
+        <source>Check &amp;Again</source>
+        <translation>&amp;Erneut prüfen</translation>
+    </message>
+    <message>
+        <source>&amp;Continue Anyway</source>
+        <translation>&amp;Trotzdem fortfahren</translation>
+    </message>
+    <message>
+        <source>What is missing</source>
+        <translation>Was fehlt</translation>
+    </message>
+    <message>
+        <source>Looked again at %1: it is not right yet. You can also continue and put it right later.</source>
+        <translation>Um %1 erneut geprüft: es stimmt noch nicht. Fortfahren geht trotzdem, beheben auch später.</translation>
+    </message>
+    <message>
+        <source>Plume is ready</source>
+        <translation>Plume ist bereit</translation>
+    </message>
+    <message>
+        <source>All that was missing is there now.</source>
+        <translation>Alles, was fehlte, ist jetzt da.</translation>
+    </message>
+    <message>
+        <source>&amp;Close</source>
+        <translation>&amp;Schließen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ReportsWindow</name>
+    <message numerus="yes">
+        <source>%1 (%n times)</source>
+        <translation>
+            <numerusform>%1 (%n-mal)</numerusform>
+            <numerusform>%1 (%n-mal)</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Recent Reports</source>
+        <translation>Neueste Meldungen</translation>
+    </message>
+    <message>
+        <source>Plume has had nothing to report.</source>
+        <translation>Plume hatte nichts zu melden.</translation>
+    </message>
+    <message>
+        <source>Time</source>
+        <translation>Zeit</translation>
+    </message>
+    <message>
+        <source>Report</source>
+        <translation>Meldung</translation>
+    </message>
+    <message>
+        <source>What you can do</source>
+        <translation>Was zu tun ist</translation>
+    </message>
+    <message>
+        <source>Reports, newest first</source>
+        <translation>Meldungen, neueste zuerst</translation>
+    </message>
+    <message>
+        <source>&amp;Copy All</source>
+        <translation>Alle &amp;kopieren</translation>
+    </message>
+    <message>
+        <source>C&amp;lear</source>
+        <translation>&amp;Leeren</translation>
+    </message>
+</context>
+<context>
+    <name>plume::RestoreDataWindowController</name>
+    <message>
+        <source>%1, %2</source>
+        <translation>%1, %2</translation>
+    </message>
+    <message>
+        <source>Restore</source>
+        <translation>Wiederherstellen</translation>
+    </message>
+    <message>
+        <source>&amp;Restore Backup</source>
+        <translation>Sicherung &amp;wiederherstellen</translation>
+    </message>
+    <message>
+        <source>Backups, newest first</source>
+        <translation>Sicherungen, neueste zuerst</translation>
+    </message>
+    <message>
+        <source>&amp;Backups of your snippets:</source>
+        <translation>&amp;Sicherungen der Snippets:</translation>
+    </message>
+    <message>
+        <source>Choose &amp;File…</source>
+        <translation>&amp;Datei wählen…</translation>
+    </message>
+    <message>
+        <source>Your snippets can be put back to what they were when a backup was made. What you have now is saved first.</source>
+        <translation>Die Snippets lassen sich auf den Stand einer Sicherung zurücksetzen. Was jetzt da ist, wird zuvor gesichert.</translation>
+    </message>
+    <message>
+        <source>There is no backup in %1 yet.</source>
+        <translation>In %1 ist noch keine Sicherung.</translation>
+    </message>
+    <message>
+        <source>Select a .plume file to restore</source>
+        <translation>Eine .plume-Datei zum Wiederherstellen wählen</translation>
+    </message>
+    <message>
+        <source>Plume libraries (*.plume)</source>
+        <translation>Plume-Bibliotheken (*.plume)</translation>
+    </message>
+    <message>
+        <source>Your 1 snippet is replaced by what this backup holds:</source>
+        <translation>1 Snippet wird durch den Inhalt dieser Sicherung ersetzt:</translation>
+    </message>
+    <message numerus="yes">
+        <source>Your %n snippets are replaced by what this backup holds:</source>
+        <translation>
+            <numerusform>%n Snippet wird durch den Inhalt dieser Sicherung ersetzt:</numerusform>
+            <numerusform>%n Snippets werden durch den Inhalt dieser Sicherung ersetzt:</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Do you want to restore this backup?</source>
+        <translation>Diese Sicherung wiederherstellen?</translation>
+    </message>
+    <message>
+        <source>Plume writes a backup of what you have now first.</source>
+        <translation>Plume sichert zuvor, was jetzt da ist.</translation>
+    </message>
+    <message>
+        <source>Replace My Snippets</source>
+        <translation>Meine Snippets ersetzen</translation>
+    </message>
+    <message>
+        <source>Error when restoring backup</source>
+        <translation>Die Sicherung wurde nicht wiederhergestellt</translation>
+    </message>
+    <message>
+        <source>Your snippets were restored</source>
+        <translation>Die Snippets wurden wiederhergestellt</translation>
+    </message>
+    <message>
+        <source>What you had before is in this backup: %1</source>
+        <translation>Was vorher da war, ist in dieser Sicherung: %1</translation>
+    </message>
+    <message>
+        <source>The selected backup file does not exist.</source>
+        <translation>Die gewählte Sicherung ist nicht vorhanden.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SettingsModel</name>
+    <message>
+        <source>Setting</source>
+        <translation>Einstellung</translation>
+    </message>
+    <message>
+        <source>Value</source>
+        <translation>Wert</translation>
+    </message>
+    <message>
+        <source>Default</source>
+        <translation>Standard</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SnippetRowsMenu</name>
+    <message>
+        <source>%1 … %2</source>
+        <extracomment>The first and the last of a range of snippets.</extracomment>
+        <translation>%1 … %2</translation>
+    </message>
+</context>
+<context>
+    <name>plume::StatusMenu</name>
+    <message>
+        <source>Untitled group</source>
+        <translation>Unbenannte Gruppe</translation>
+    </message>
+    <message>
+        <source>&amp;Quit Plume</source>
+        <translation>&amp;Plume beenden</translation>
+    </message>
+    <message>
+        <source>&amp;Enabled</source>
+        <translation>&amp;Eingeschaltet</translation>
+    </message>
+    <message>
+        <source>&amp;Listen to the Keyboard Again</source>
+        <translation>&amp;Wieder auf die Tastatur hören</translation>
+    </message>
+    <message>
+        <source>&amp;New Snippet…</source>
+        <translation>&amp;Neues Snippet…</translation>
+    </message>
+    <message>
+        <source>New Snippet from &amp;Clipboard…</source>
+        <translation>Neues Snippet aus der &amp;Zwischenablage…</translation>
+    </message>
+    <message>
+        <source>New Snippet from &amp;Selection…</source>
+        <translation>Neues Snippet aus der &amp;Auswahl…</translation>
+    </message>
+    <message>
+        <source>Searc&amp;h Snippets…</source>
+        <translation>Snippets &amp;suchen…</translation>
+    </message>
+    <message>
+        <source>E&amp;dit Snippets…</source>
+        <translation>Snippets &amp;bearbeiten…</translation>
+    </message>
+    <message>
+        <source>&amp;Preferences…</source>
+        <translation>E&amp;instellungen…</translation>
+    </message>
+    <message>
+        <source>Help and &amp;Tools</source>
+        <translation>&amp;Hilfe und Werkzeuge</translation>
+    </message>
+    <message>
+        <source>&amp;Why Didn&apos;t It Expand?</source>
+        <translation>&amp;Warum wurde nichts ersetzt?</translation>
+    </message>
+    <message>
+        <source>&amp;Reports</source>
+        <translation>&amp;Meldungen</translation>
+    </message>
+    <message>
+        <source>&amp;Diagnostics…</source>
+        <translation>&amp;Diagnose…</translation>
+    </message>
+    <message>
+        <source>W&amp;elcome…</source>
+        <translation>W&amp;illkommen…</translation>
+    </message>
+    <message>
+        <source>&amp;About Plume</source>
+        <translation>Ü&amp;ber Plume</translation>
+    </message>
+    <message>
+        <source>Li&amp;brary</source>
+        <translation>Biblio&amp;thek</translation>
+    </message>
+    <message>
+        <source>&amp;Import…</source>
+        <translation>&amp;Importieren…</translation>
+    </message>
+    <message>
+        <source>&amp;Export…</source>
+        <translation>&amp;Exportieren…</translation>
+    </message>
+    <message>
+        <source>&amp;Restore…</source>
+        <translation>&amp;Wiederherstellen…</translation>
+    </message>
+</context>
+<context>
+    <name>plume::TrayIcon</name>
+    <message>
+        <source>Plume: off</source>
+        <translation>Plume: aus</translation>
+    </message>
+    <message>
+        <source>Plume: does not hear the keyboard</source>
+        <translation>Plume: hört die Tastatur nicht</translation>
+    </message>
+    <message>
+        <source>Plume: on</source>
+        <translation>Plume: ein</translation>
+    </message>
+</context>
+<context>
+    <name>plume::WelcomeWindow</name>
+    <message>
+        <source>Welcome to Plume</source>
+        <translation>Willkommen bei Plume</translation>
+    </message>
+    <message>
+        <source>&amp;Get Started</source>
+        <translation>&amp;Los geht’s</translation>
+    </message>
+    <message>
+        <source>Plume keeps texts that you write often as snippets, each with a short abbreviation. Type the abbreviation in any program, and Plume puts the text in its place. Your snippets stay on this computer.</source>
+        <translation>Plume bewahrt oft geschriebene Texte als Snippets auf, jedes mit einem kurzen Kürzel. Wird das Kürzel in einem beliebigen Programm getippt, setzt Plume den Text an seine Stelle. Die Snippets bleiben auf diesem Computer.</translation>
+    </message>
+    <message>
+        <source>Try it</source>
+        <translation>Ausprobieren</translation>
+    </message>
+    <message>
+        <source>&amp;Type here:</source>
+        <translation>&amp;Hier tippen:</translation>
+    </message>
+    <message>
+        <source>Not tried yet</source>
+        <translation>Noch nicht ausprobiert</translation>
+    </message>
+    <message>
+        <source>becomes “%1”</source>
+        <translation>wird zu „%1“</translation>
+    </message>
+    <message>
+        <source>Done</source>
+        <translation>Geschafft</translation>
+    </message>
+    <message>
+        <source>That is all there is to it.</source>
+        <translation>Das ist schon alles.</translation>
+    </message>
+    <message>
+        <source>Bring your snippets along</source>
+        <translation>Snippets mitbringen</translation>
+    </message>
+    <message>
+        <source>Snippets of other programs were found. Importing leaves them as they are.</source>
+        <translation>Snippets anderer Programme wurden gefunden. Beim Importieren bleiben sie dort, wie sie sind.</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Importieren</translation>
+    </message>
+    <message>
+        <source>Import %1</source>
+        <translation>%1 importieren</translation>
+    </message>
+    <message>
+        <source>Imported</source>
+        <translation>Importiert</translation>
+    </message>
+    <message>
+        <source>&amp;Start Plume when I log in</source>
+        <translation>Plume beim An&amp;melden starten</translation>
+    </message>
+    <message>
+        <source>Your desktop has no place for Plume’s icon. To reach Plume, run “plume” again, or use its hot keys.</source>
+        <translation>Diese Arbeitsumgebung hat keinen Platz für das Symbol von Plume. Zu Plume führen ein erneuter Aufruf von „plume“ und die Tastenkürzel.</translation>
+    </message>
+    <message>
+        <source>This could not be changed</source>
+        <translation>Das ließ sich nicht ändern</translation>
+    </message>
+    <message>
+        <source>and a space become “%1”</source>
+        <extracomment>What stands before it is an abbreviation; %1 is its text.</extracomment>
+        <translation>und ein Leerzeichen werden zu „%1“</translation>
+    </message>
+</context>
+</TS>

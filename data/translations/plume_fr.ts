@@ -1,0 +1,1861 @@
+<?xml version="1.0" encoding="utf-8"?>
+<!DOCTYPE TS>
+<TS version="2.1" language="fr_FR" sourcelanguage="en_US">
+<context>
+    <name>AdvancedPage</name>
+    <message>
+        <source>Every setting by its name, as “plume settings” shows it. Values are JSON; those that you have set are bold. Press F2 to change one.</source>
+        <translation>Tous les réglages par leur nom, comme les montre «&#x202f;plume settings&#x202f;». Les valeurs sont en JSON&#x202f;; les vôtres sont en gras. F2 modifie une valeur.</translation>
+    </message>
+    <message>
+        <source>All settings</source>
+        <translation>Tous les réglages</translation>
+    </message>
+    <message>
+        <source>Filter settings</source>
+        <translation>Filtrer les réglages</translation>
+    </message>
+    <message>
+        <source>&amp;Change…</source>
+        <translation>&amp;Modifier…</translation>
+    </message>
+    <message>
+        <source>&amp;Use Default</source>
+        <translation>Valeur par &amp;défaut</translation>
+    </message>
+    <message>
+        <source>&amp;Show Diagnostics</source>
+        <translation>&amp;Afficher le diagnostic</translation>
+    </message>
+</context>
+<context>
+    <name>Application</name>
+    <message>
+        <source>There is already one or more instance(s) of Plume running.</source>
+        <translation>Plume est déjà en cours d’exécution.</translation>
+    </message>
+    <message>
+        <source>This instance will exit and bring other instances to front.</source>
+        <translation>Ce programme se ferme et celui qui fonctionne déjà passe au premier plan.</translation>
+    </message>
+</context>
+<context>
+    <name>ApplicationServices</name>
+    <message>
+        <source>1 snippet was imported.</source>
+        <translation>1 extrait a été importé.</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n snippets were imported.</source>
+        <translation>
+            <numerusform>%n extrait a été importé.</numerusform>
+            <numerusform>%n extraits ont été importés.</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
+    <name>ApplicationsPage</name>
+    <message>
+        <source>Plume knows how many programs want to be typed to. Add a program where texts arrive damaged, or not at all.</source>
+        <translation>Plume sait comment écrire dans de nombreux programmes. Ajoutez ici un programme où les textes arrivent abîmés, ou n’arrivent pas.</translation>
+    </message>
+    <message>
+        <source>Programs</source>
+        <translation>Programmes</translation>
+    </message>
+    <message>
+        <source>How texts are inserted in the chosen program</source>
+        <translation>Comment les textes sont insérés dans le programme choisi</translation>
+    </message>
+    <message>
+        <source>Filter programs</source>
+        <translation>Filtrer les programmes</translation>
+    </message>
+    <message>
+        <source>Change as &amp;Mine</source>
+        <translation>&amp;Personnaliser</translation>
+    </message>
+    <message>
+        <source>Makes a row of your own that begins as this one of Plume’s.</source>
+        <translation>Crée votre propre ligne, qui part de celle de Plume.</translation>
+    </message>
+    <message>
+        <source>Remo&amp;ve</source>
+        <translation>&amp;Supprimer</translation>
+    </message>
+    <message>
+        <source>Program</source>
+        <translation>Programme</translation>
+    </message>
+    <message>
+        <source>Identifier</source>
+        <translation>Identifiant</translation>
+    </message>
+    <message>
+        <source>Row of</source>
+        <translation>Origine</translation>
+    </message>
+    <message>
+        <source>Kind</source>
+        <translation>Type</translation>
+    </message>
+    <message>
+        <source>Yours</source>
+        <translation>Personnelle</translation>
+    </message>
+    <message>
+        <source>Plume</source>
+        <translation>Plume</translation>
+    </message>
+    <message>
+        <source>Automatic</source>
+        <translation>Automatique</translation>
+    </message>
+    <message>
+        <source>Typed</source>
+        <translation>Par la frappe</translation>
+    </message>
+    <message>
+        <source>Pasted</source>
+        <translation>Par collage</translation>
+    </message>
+    <message>
+        <source>&amp;Insert texts:</source>
+        <translation>&amp;Insertion des textes&#x202f;:</translation>
+    </message>
+    <message>
+        <source>As usual</source>
+        <translation>Habituelles</translation>
+    </message>
+    <message>
+        <source>&amp;Keys that paste:</source>
+        <translation>&amp;Touches pour coller&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Pause &amp;before pasting:</source>
+        <translation>Pause a&amp;vant de coller&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Pause &amp;after pasting:</source>
+        <translation>Pause &amp;après avoir collé&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Pause after &amp;erasing:</source>
+        <translation>Pause après avoir &amp;effacé&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Try it: click in the program and type an abbreviation. Changes hold at once.</source>
+        <translation>Pour essayer, cliquez dans le programme et tapez une abréviation. Les changements s’appliquent aussitôt.</translation>
+    </message>
+    <message>
+        <source> seconds</source>
+        <translation> s</translation>
+    </message>
+</context>
+<context>
+    <name>BackupsPage</name>
+    <message>
+        <source>Backups</source>
+        <translation>Sauvegardes</translation>
+    </message>
+    <message>
+        <source>Folder of backups</source>
+        <translation>Dossier des sauvegardes</translation>
+    </message>
+    <message>
+        <source>F&amp;older:</source>
+        <translation>&amp;Dossier&#x202f;:</translation>
+    </message>
+    <message>
+        <source> backup</source>
+        <translation> sauvegarde</translation>
+    </message>
+    <message numerus="yes">
+        <source> backups</source>
+        <translation>
+            <numerusform> sauvegarde</numerusform>
+            <numerusform> sauvegardes</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>&amp;Keep:</source>
+        <translation>&amp;Conserver&#x202f;:</translation>
+    </message>
+    <message>
+        <source>The oldest go when there are more.</source>
+        <translation>Au-delà, les plus anciennes sont supprimées.</translation>
+    </message>
+    <message>
+        <source>All backups</source>
+        <translation>Toutes les sauvegardes</translation>
+    </message>
+    <message>
+        <source>Never</source>
+        <translation>Jamais</translation>
+    </message>
+    <message>
+        <source>Every hour</source>
+        <translation>Toutes les heures</translation>
+    </message>
+    <message>
+        <source>Every day</source>
+        <translation>Tous les jours</translation>
+    </message>
+    <message>
+        <source>Every week</source>
+        <translation>Toutes les semaines</translation>
+    </message>
+    <message>
+        <source>Every 30 days</source>
+        <translation>Tous les 30 jours</translation>
+    </message>
+    <message>
+        <source>Back &amp;up:</source>
+        <translation>&amp;Sauvegarder&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Back Up Now</source>
+        <translation>Sauvegarder &amp;maintenant</translation>
+    </message>
+    <message>
+        <source>&amp;Restore…</source>
+        <translation>Res&amp;taurer…</translation>
+    </message>
+    <message>
+        <source>Back Up Now, Restore</source>
+        <translation>Sauvegarder maintenant, restaurer</translation>
+    </message>
+    <message>
+        <source>No backup was made. %1</source>
+        <translation>Aucune sauvegarde n’a été faite. %1</translation>
+    </message>
+    <message>
+        <source>Written: %1</source>
+        <translation>Sauvegarde écrite&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>There is no backup in this folder yet.</source>
+        <translation>Il n’y a pas encore de sauvegarde dans ce dossier.</translation>
+    </message>
+    <message>
+        <source>There is 1 backup.</source>
+        <translation>Il y a 1 sauvegarde.</translation>
+    </message>
+    <message numerus="yes">
+        <source>There are %n backups.</source>
+        <translation>
+            <numerusform>Il y a %n sauvegarde.</numerusform>
+            <numerusform>Il y a %n sauvegardes.</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>The newest was made %1.</source>
+        <translation>La plus récente date du %1.</translation>
+    </message>
+    <message>
+        <source>Sync</source>
+        <translation>Synchronisation</translation>
+    </message>
+    <message>
+        <source>Keep the library in &amp;step with other computers</source>
+        <translation>Synchroniser la &amp;bibliothèque avec d’autres ordinateurs</translation>
+    </message>
+    <message>
+        <source>By a file in a folder that these computers share.</source>
+        <translation>Par un fichier dans un dossier que ces ordinateurs partagent.</translation>
+    </message>
+    <message>
+        <source>Shared folder</source>
+        <translation>Dossier partagé</translation>
+    </message>
+    <message>
+        <source>Shared &amp;folder:</source>
+        <translation>Dossier &amp;partagé&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Some settings &amp;go along</source>
+        <translation>&amp;Inclure certains réglages</translation>
+    </message>
+    <message>
+        <source>Those of the pages Typing and clipboard, and Correction.</source>
+        <translation>Ceux des pages «&#x202f;Saisie et presse-papiers&#x202f;» et «&#x202f;Correction&#x202f;».</translation>
+    </message>
+    <message>
+        <source>Nothing is kept in step yet: choose a folder that exists.</source>
+        <translation>Rien n’est encore synchronisé&#x202f;: choisissez un dossier qui existe.</translation>
+    </message>
+</context>
+<context>
+    <name>CorrectionPage</name>
+    <message>
+        <source>Sentences</source>
+        <translation>Phrases</translation>
+    </message>
+    <message>
+        <source>Begin every &amp;sentence with a capital</source>
+        <translation>Commencer chaque phrase par une &amp;majuscule</translation>
+    </message>
+    <message>
+        <source>&amp;No sentence ends with:</source>
+        <translation>Pas de &amp;fin de phrase après&#x202f;:</translation>
+    </message>
+    <message>
+        <source>One in each line.</source>
+        <translation>Une entrée par ligne.</translation>
+    </message>
+    <message>
+        <source>Words</source>
+        <translation>Mots</translation>
+    </message>
+    <message>
+        <source>Correct &amp;two capitals at the start of a word</source>
+        <translation>Corriger &amp;deux majuscules en début de mot</translation>
+    </message>
+    <message>
+        <source>&amp;Leave these words:</source>
+        <translation>&amp;Laisser ces mots&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Where</source>
+        <translation>Où</translation>
+    </message>
+    <message>
+        <source>&amp;Correct:</source>
+        <translation>&amp;Corriger&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Keyboard layouts:</source>
+        <translation>Di&amp;spositions de clavier&#x202f;:</translation>
+    </message>
+    <message>
+        <source>With all layouts</source>
+        <translation>Avec toutes les dispositions</translation>
+    </message>
+    <message>
+        <source>With all layouts except those below</source>
+        <translation>Avec toutes les dispositions sauf celles-ci</translation>
+    </message>
+    <message>
+        <source>Only with the layouts below</source>
+        <translation>Seulement avec les dispositions ci-dessous</translation>
+    </message>
+    <message>
+        <source>Layo&amp;uts:</source>
+        <translation>Disposi&amp;tions&#x202f;:</translation>
+    </message>
+    <message>
+        <source>One in each line, like “us”, “de(nodeadkeys)” or “ibus:libpinyin”.</source>
+        <translation>Une entrée par ligne, comme «&#x202f;us&#x202f;», «&#x202f;de(nodeadkeys)&#x202f;» ou «&#x202f;ibus:libpinyin&#x202f;».</translation>
+    </message>
+</context>
+<context>
+    <name>DecisionWords</name>
+    <message>
+        <source>expanded</source>
+        <translation>développée</translation>
+    </message>
+    <message>
+        <source>expanded in %1</source>
+        <translation>développée dans %1</translation>
+    </message>
+    <message>
+        <source>offered in a list, as one of several that match</source>
+        <translation>proposée dans une liste, parmi plusieurs qui conviennent</translation>
+    </message>
+    <message>
+        <source>its content could not be expanded</source>
+        <translation>son contenu n’a pas pu être développé</translation>
+    </message>
+    <message>
+        <source>the group is not meant for a program that Plume cannot name</source>
+        <translation>le groupe n’est pas prévu pour un programme que Plume ne reconnaît pas</translation>
+    </message>
+    <message>
+        <source>the group is not meant for %1</source>
+        <translation>le groupe n’est pas prévu pour %1</translation>
+    </message>
+    <message>
+        <source>the group is not meant for this keyboard layout or input method</source>
+        <translation>le groupe n’est pas prévu pour cette disposition de clavier ou cette méthode de saisie</translation>
+    </message>
+    <message>
+        <source>its capital and small letters were typed differently</source>
+        <translation>ses majuscules et minuscules ont été tapées autrement</translation>
+    </message>
+    <message>
+        <source>the group does not expand after the key that followed</source>
+        <translation>le groupe ne développe pas après la touche qui a suivi</translation>
+    </message>
+    <message>
+        <source>Plume was switched off</source>
+        <translation>Plume a été désactivé</translation>
+    </message>
+    <message>
+        <source>Plume was switched on</source>
+        <translation>Plume a été activé</translation>
+    </message>
+    <message>
+        <source>a password field or another program kept the keyboard to itself</source>
+        <translation>un champ de mot de passe ou un autre programme a gardé le clavier pour lui</translation>
+    </message>
+    <message>
+        <source>Plume could hear the keyboard again</source>
+        <translation>Plume a pu entendre de nouveau le clavier</translation>
+    </message>
+    <message>
+        <source>no space or other delimiter stood before it</source>
+        <translation>aucune espace ni autre séparateur ne la précédait</translation>
+    </message>
+    <message>
+        <source>no space or new line stood before it</source>
+        <translation>aucune espace ni nouvelle ligne ne la précédait</translation>
+    </message>
+    <message>
+        <source>no number stood before it</source>
+        <translation>aucun nombre ne la précédait</translation>
+    </message>
+    <message>
+        <source>part of its prefix stood before it once more</source>
+        <translation>une partie de son préfixe la précédait une fois de plus</translation>
+    </message>
+    <message>
+        <source>the group wants something else before it</source>
+        <translation>le groupe demande autre chose devant elle</translation>
+    </message>
+    <message>
+        <source>“%1”</source>
+        <translation>«&#x202f;%1&#x202f;»</translation>
+    </message>
+    <message>
+        <source>“%1” (group %2)</source>
+        <translation>«&#x202f;%1&#x202f;» (groupe %2)</translation>
+    </message>
+    <message>
+        <source>%1 was %2.</source>
+        <extracomment>%1 is an abbreviation, %2 for example &quot;expanded in xterm&quot;</extracomment>
+        <translation>L’abréviation %1 a été %2.</translation>
+    </message>
+    <message>
+        <source>%1.</source>
+        <translation>%1.</translation>
+    </message>
+    <message>
+        <source>%1 did not expand: %2.</source>
+        <extracomment>%1 is an abbreviation, %2 for example &quot;the group is not meant for xterm&quot;</extracomment>
+        <translation>L’abréviation %1 n’a pas été développée&#x202f;: %2.</translation>
+    </message>
+    <message>
+        <source>Choose from the list, or give each snippet an abbreviation of its own.</source>
+        <translation>Choisissez dans la liste, ou donnez à chaque extrait sa propre abréviation.</translation>
+    </message>
+    <message>
+        <source>Have a look at the snippet’s content. What was wrong with it may have been reported.</source>
+        <translation>Regardez le contenu de l’extrait. Les rapports disent peut-être ce qui ne va pas.</translation>
+    </message>
+    <message>
+        <source>Change the list of programs in the group’s settings.</source>
+        <translation>Modifiez la liste des programmes dans les réglages du groupe.</translation>
+    </message>
+    <message>
+        <source>Change to another keyboard layout, or change the list of them in the group’s settings.</source>
+        <translation>Passez à une autre disposition de clavier, ou modifiez leur liste dans les réglages du groupe.</translation>
+    </message>
+    <message>
+        <source>Type it where that fits, or change in the group’s settings what must stand before an abbreviation.</source>
+        <translation>Tapez-la là où cela convient, ou modifiez dans les réglages du groupe ce qui doit précéder une abréviation.</translation>
+    </message>
+    <message>
+        <source>Type it as it is written here, or let the snippet ignore case.</source>
+        <translation>Tapez-la comme elle est écrite ici, ou laissez l’extrait ignorer la casse.</translation>
+    </message>
+    <message>
+        <source>Type one of the group’s own delimiters, or add this one to them in the group’s settings.</source>
+        <translation>Tapez un des séparateurs du groupe, ou ajoutez celui-ci dans les réglages du groupe.</translation>
+    </message>
+    <message>
+        <source>Nothing expands until you switch Plume on in the menu of its icon.</source>
+        <translation>Rien n’est développé tant que Plume n’est pas réactivé dans le menu de son icône.</translation>
+    </message>
+    <message>
+        <source>Nothing expands until you leave the field, or the other program lets the keyboard go.</source>
+        <translation>Rien n’est développé tant que vous n’avez pas quitté le champ, ou que l’autre programme n’a pas libéré le clavier.</translation>
+    </message>
+</context>
+<context>
+    <name>ExpansionPage</name>
+    <message>
+        <source>Capitals</source>
+        <translation>Majuscules</translation>
+    </message>
+    <message>
+        <source>Mixed &amp;case gives every word a capital</source>
+        <translation>La &amp;casse mixte met une majuscule à chaque mot</translation>
+    </message>
+    <message>
+        <source>Where a text adapts to how its abbreviation is typed: “bRb” gives every word a capital. Without this only one that ends with a capital does, like “bRB”.</source>
+        <translation>Là où un texte s’adapte à la frappe de son abréviation, «&#x202f;bRb&#x202f;» met une majuscule à chaque mot. Sinon, seule une abréviation qui finit par une majuscule le fait, comme «&#x202f;bRB&#x202f;».</translation>
+    </message>
+    <message>
+        <source>Typing</source>
+        <translation>Saisie</translation>
+    </message>
+    <message>
+        <source>A mouse click &amp;ends the abbreviation</source>
+        <translation>Un clic de souris &amp;termine l’abréviation</translation>
+    </message>
+    <message>
+        <source>What was typed before a click and what is typed after it are then never one abbreviation.</source>
+        <translation>Ce qui est tapé avant un clic et ce qui est tapé après ne forment alors jamais une même abréviation.</translation>
+    </message>
+    <message>
+        <source>Passwords</source>
+        <translation>Mots de passe</translation>
+    </message>
+    <message>
+        <source>Let programs tell which fields are for &amp;passwords</source>
+        <translation>Laisser les programmes signaler les champs de &amp;mot de passe</translation>
+    </message>
+    <message>
+        <source>Plume is deaf in these fields. Browsers and some other programs tell it only while the desktop’s accessibility is on, which this switches on when Plume starts. It costs these programs some time and memory.</source>
+        <translation>Plume n’écoute pas dans ces champs. Les navigateurs et quelques autres programmes ne les signalent que si l’accessibilité du bureau est activée, ce que Plume fait alors à son lancement. Cela coûte à ces programmes un peu de temps et de mémoire.</translation>
+    </message>
+</context>
+<context>
+    <name>GeneralPage</name>
+    <message>
+        <source>Plume</source>
+        <translation>Plume</translation>
+    </message>
+    <message>
+        <source>&amp;Expand abbreviations</source>
+        <translation>&amp;Développer les abréviations</translation>
+    </message>
+    <message>
+        <source>Show the &amp;icon in the panel</source>
+        <translation>Afficher l’&amp;icône dans le tableau de bord</translation>
+    </message>
+    <message>
+        <source>Its menu leads to everything that Plume can do.</source>
+        <translation>Son menu mène à tout ce que Plume sait faire.</translation>
+    </message>
+    <message>
+        <source>Sound</source>
+        <translation>Son</translation>
+    </message>
+    <message>
+        <source>&amp;Play a sound with every expansion</source>
+        <translation>&amp;Jouer un son à chaque développement</translation>
+    </message>
+    <message>
+        <source>Text</source>
+        <translation>Texte</translation>
+    </message>
+    <message>
+        <source> point</source>
+        <translation> point</translation>
+    </message>
+    <message numerus="yes">
+        <source> points</source>
+        <translation>
+            <numerusform> point</numerusform>
+            <numerusform> points</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>&amp;Larger text in lists:</source>
+        <translation>&amp;Texte plus grand dans les listes&#x202f;:</translation>
+    </message>
+    <message>
+        <source>How much larger than usual lists and menus are written.</source>
+        <translation>De combien agrandir le texte des listes et des menus.</translation>
+    </message>
+    <message>
+        <source>&amp;Start Plume when I log in</source>
+        <translation>Lancer Plume à l’&amp;ouverture de session</translation>
+    </message>
+    <message>
+        <source>This could not be kept. %1</source>
+        <translation>Cela n’a pas pu être enregistré. %1</translation>
+    </message>
+    <message>
+        <source>&amp;Test</source>
+        <translation>É&amp;couter</translation>
+    </message>
+    <message>
+        <source>Test the sound</source>
+        <translation>Écouter le son</translation>
+    </message>
+    <message>
+        <source>So&amp;und:</source>
+        <translation>&amp;Son&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Font of new snippets:</source>
+        <translation>&amp;Police des nouveaux extraits&#x202f;:</translation>
+    </message>
+    <message>
+        <source>%1, %2 points…</source>
+        <translation>%1, %2 points…</translation>
+    </message>
+    <message>
+        <source>Font of new snippets: %1</source>
+        <translation>Police des nouveaux extraits&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>Font of New Snippets</source>
+        <translation>Police des nouveaux extraits</translation>
+    </message>
+</context>
+<context>
+    <name>HotKeysPage</name>
+    <message>
+        <source>Switch expansion on and off</source>
+        <translation>Activer ou non le développement</translation>
+    </message>
+    <message>
+        <source>Expand the abbreviation just typed</source>
+        <translation>Développer l’abréviation tapée</translation>
+    </message>
+    <message>
+        <source>Undo the last expansion</source>
+        <translation>Annuler le dernier développement</translation>
+    </message>
+    <message>
+        <source>The key that caused it comes back too.</source>
+        <translation>La touche qui l’a déclenché revient aussi.</translation>
+    </message>
+    <message>
+        <source>Undo without that key</source>
+        <translation>Annuler sans cette touche</translation>
+    </message>
+    <message>
+        <source>Only the abbreviation comes back.</source>
+        <translation>Seule l’abréviation revient.</translation>
+    </message>
+    <message>
+        <source>Suggest abbreviations</source>
+        <translation>Suggérer des abréviations</translation>
+    </message>
+    <message>
+        <source>Quick search</source>
+        <translation>Recherche rapide</translation>
+    </message>
+    <message>
+        <source>Quick search, asked of the desktop</source>
+        <translation>Recherche rapide, par le bureau</translation>
+    </message>
+    <message>
+        <source>Works also where Plume does not hear the keys.</source>
+        <translation>Marche aussi là où Plume n’entend pas les touches.</translation>
+    </message>
+    <message>
+        <source>Open the snippets window</source>
+        <translation>Ouvrir la fenêtre des extraits</translation>
+    </message>
+    <message>
+        <source>Open the snippet used last</source>
+        <translation>Ouvrir le dernier extrait utilisé</translation>
+    </message>
+    <message>
+        <source>New snippet from the selection</source>
+        <translation>Nouvel extrait de la sélection</translation>
+    </message>
+    <message>
+        <source>New snippet from the clipboard</source>
+        <translation>Nouvel extrait du presse-papiers</translation>
+    </message>
+    <message>
+        <source>Click a field, or press Space in it, and then the keys that you want.</source>
+        <translation>Cliquez dans un champ, ou appuyez-y sur Espace, puis tapez les touches voulues.</translation>
+    </message>
+    <message>
+        <source>Expanding</source>
+        <translation>Développement</translation>
+    </message>
+    <message>
+        <source>Finding snippets</source>
+        <translation>Trouver des extraits</translation>
+    </message>
+    <message>
+        <source>Making and changing snippets</source>
+        <translation>Créer et modifier des extraits</translation>
+    </message>
+</context>
+<context>
+    <name>ImportExportPage</name>
+    <message>
+        <source>Import</source>
+        <translation>Import</translation>
+    </message>
+    <message>
+        <source>&amp;Import a File…</source>
+        <translation>&amp;Importer un fichier…</translation>
+    </message>
+    <message>
+        <source>Snippets of Plume or of another program are added to yours.</source>
+        <translation>Des extraits de Plume ou d’un autre programme s’ajoutent aux vôtres.</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Export</translation>
+    </message>
+    <message>
+        <source>&amp;Export the Library…</source>
+        <translation>&amp;Exporter la bibliothèque…</translation>
+    </message>
+    <message>
+        <source>All snippets go into one file, for another computer or another program.</source>
+        <translation>Tous les extraits vont dans un fichier, pour un autre ordinateur ou un autre programme.</translation>
+    </message>
+</context>
+<context>
+    <name>MenuTexts</name>
+    <message>
+        <source>Empty snippet</source>
+        <translation>Extrait vide</translation>
+    </message>
+    <message>
+        <source>%1 — %2</source>
+        <extracomment>%1 is an abbreviation, %2 what it stands for.</extracomment>
+        <translation>%1 — %2</translation>
+    </message>
+</context>
+<context>
+    <name>SearchPage</name>
+    <message>
+        <source>Lists at the caret</source>
+        <translation>Listes au point d’insertion</translation>
+    </message>
+    <message>
+        <source>&amp;Key held to pick with a digit:</source>
+        <translation>&amp;Touche pour choisir par chiffre&#x202f;:</translation>
+    </message>
+    <message>
+        <source>None</source>
+        <translation>Aucune</translation>
+    </message>
+    <message>
+        <source>Shift</source>
+        <translation>Maj</translation>
+    </message>
+    <message>
+        <source>Control</source>
+        <translation>Ctrl</translation>
+    </message>
+    <message>
+        <source>Alt</source>
+        <translation>Alt</translation>
+    </message>
+    <message>
+        <source>Super</source>
+        <translation>Super</translation>
+    </message>
+    <message>
+        <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held.</source>
+        <translation>Dans les suggestions et la recherche rapide, les chiffres de 1 à 9 choisissent un extrait tant que cette touche est enfoncée.</translation>
+    </message>
+    <message>
+        <source>Quick search looks in</source>
+        <translation>La recherche rapide porte sur</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviations</source>
+        <translation>Les &amp;abréviations</translation>
+    </message>
+    <message>
+        <source>&amp;Contents</source>
+        <translation>Les &amp;contenus</translation>
+    </message>
+    <message>
+        <source>&amp;Labels</source>
+        <translation>Les &amp;libellés</translation>
+    </message>
+    <message>
+        <source>&amp;Wildcards in quick search</source>
+        <translation>&amp;Jokers dans la recherche rapide</translation>
+    </message>
+    <message>
+        <source>* stands for any text, and ? for any character.</source>
+        <translation>* remplace tout texte et&#x202f;? tout caractère.</translation>
+    </message>
+    <message>
+        <source>The snippets window looks in</source>
+        <translation>Dans la fenêtre des extraits, la recherche porte sur</translation>
+    </message>
+    <message>
+        <source>A&amp;bbreviations</source>
+        <translation>Les a&amp;bréviations</translation>
+    </message>
+    <message>
+        <source>C&amp;ontents</source>
+        <translation>Les c&amp;ontenus</translation>
+    </message>
+    <message>
+        <source>Lab&amp;els</source>
+        <translation>Les l&amp;ibellés</translation>
+    </message>
+    <message>
+        <source>At least one is needed.</source>
+        <translation>Il en faut au moins un.</translation>
+    </message>
+</context>
+<context>
+    <name>TypingPage</name>
+    <message>
+        <source>Pasting</source>
+        <translation>Collage</translation>
+    </message>
+    <message>
+        <source>&amp;Paste texts instead of typing them</source>
+        <translation>&amp;Coller les textes au lieu de les taper</translation>
+    </message>
+    <message>
+        <source>Pasting is faster; typing leaves the clipboard alone.</source>
+        <translation>Coller est plus rapide&#x202f;; taper ne touche pas au presse-papiers.</translation>
+    </message>
+    <message>
+        <source>P&amp;aste:</source>
+        <translation>C&amp;oller&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Long texts</source>
+        <translation>Textes longs</translation>
+    </message>
+    <message>
+        <source>Paste &amp;long texts everywhere</source>
+        <translation>Coller les textes &amp;longs partout</translation>
+    </message>
+    <message>
+        <source> character</source>
+        <translation> caractère</translation>
+    </message>
+    <message numerus="yes">
+        <source> characters</source>
+        <translation>
+            <numerusform> caractère</numerusform>
+            <numerusform> caractères</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Long &amp;from:</source>
+        <translation>Long à &amp;partir de&#x202f;:</translation>
+    </message>
+    <message>
+        <source>What you copied</source>
+        <translation>Ce que vous avez copié</translation>
+    </message>
+    <message>
+        <source>&amp;Give back what was copied after a paste</source>
+        <translation>Re&amp;mettre après un collage ce qui était copié</translation>
+    </message>
+    <message>
+        <source>Give it back af&amp;ter:</source>
+        <translation>Le remettre &amp;après&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Programs that paste slowly need more.</source>
+        <translation>Les programmes qui collent lentement en demandent plus.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::AboutWindow</name>
+    <message>
+        <source>Library</source>
+        <translation>Bibliothèque</translation>
+    </message>
+    <message>
+        <source>License</source>
+        <translation>Licence</translation>
+    </message>
+    <message>
+        <source>Libraries that Plume uses</source>
+        <translation>Bibliothèques que Plume utilise</translation>
+    </message>
+    <message>
+        <source>About Plume</source>
+        <translation>À propos de Plume</translation>
+    </message>
+    <message>
+        <source>Version %1</source>
+        <translation>Version %1</translation>
+    </message>
+    <message>
+        <source>Version</source>
+        <translation>Version</translation>
+    </message>
+    <message>
+        <source>Plume replaces the short abbreviations that you type by the texts that they stand for, in every program.</source>
+        <translation>Plume remplace les abréviations que vous tapez par les textes qu’elles représentent, dans tous les programmes.</translation>
+    </message>
+    <message>
+        <source>Plume is free software under the Apache License 2.0; its file LICENSE has the whole text.</source>
+        <translation>Plume est un logiciel libre sous la licence Apache 2.0&#x202f;; son fichier LICENSE en contient le texte complet.</translation>
+    </message>
+    <message>
+        <source>Built with these &amp;libraries:</source>
+        <translation>Construit avec ces &amp;bibliothèques&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Close</source>
+        <translation>&amp;Fermer</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ApplicationList</name>
+    <message>
+        <source>Remove</source>
+        <translation>Supprimer</translation>
+    </message>
+    <message>
+        <source>%1 is in the list already.</source>
+        <translation>%1 est déjà dans la liste.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DecisionsWindow</name>
+    <message>
+        <source>Why Didn&apos;t It Expand?</source>
+        <translation>Pourquoi ne s’est-il rien passé&#x202f;?</translation>
+    </message>
+    <message>
+        <source>What became of the abbreviations that you typed last, the newest first. Plume remembers twenty of them until it ends, and nothing else of what you type.</source>
+        <translation>Ce que sont devenues les dernières abréviations tapées, la plus récente d’abord. Plume en retient vingt jusqu’à sa fermeture, et rien d’autre de ce que vous tapez.</translation>
+    </message>
+    <message>
+        <source>Abbreviations that you typed last</source>
+        <translation>Dernières abréviations tapées</translation>
+    </message>
+    <message>
+        <source>Time</source>
+        <translation>Heure</translation>
+    </message>
+    <message>
+        <source>Abbreviation</source>
+        <translation>Abréviation</translation>
+    </message>
+    <message>
+        <source>Group</source>
+        <translation>Groupe</translation>
+    </message>
+    <message>
+        <source>What happened</source>
+        <translation>Ce qui s’est passé</translation>
+    </message>
+    <message>
+        <source>Nothing to tell yet. Type an abbreviation in any program and come back: what became of it stands here then.</source>
+        <translation>Rien à raconter pour l’instant. Tapez une abréviation dans un programme et revenez&#x202f;: ce qu’elle est devenue s’affichera ici.</translation>
+    </message>
+    <message>
+        <source>&amp;Forget These</source>
+        <translation>&amp;Oublier</translation>
+    </message>
+    <message>
+        <source>&amp;Refresh</source>
+        <translation>&amp;Actualiser</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DiagnosticWindow</name>
+    <message>
+        <source>Plume Diagnostics</source>
+        <translation>Diagnostic de Plume</translation>
+    </message>
+    <message>
+        <source>Report</source>
+        <translation>Rapport</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Copier</translation>
+    </message>
+    <message>
+        <source>&amp;Save…</source>
+        <translation>&amp;Enregistrer…</translation>
+    </message>
+    <message>
+        <source>This report says how Plume is doing. It holds none of your snippets and nothing that you typed.</source>
+        <translation>Ce rapport dit comment va Plume. Il ne contient aucun de vos extraits et rien de ce que vous avez tapé.</translation>
+    </message>
+    <message>
+        <source>The report is on the clipboard.</source>
+        <translation>Le rapport est dans le presse-papiers.</translation>
+    </message>
+    <message>
+        <source>Save Report</source>
+        <translation>Enregistrer le rapport</translation>
+    </message>
+    <message>
+        <source>Text files (*.txt)</source>
+        <translation>Fichiers texte (*.txt)</translation>
+    </message>
+    <message>
+        <source>Plume Report.txt</source>
+        <translation>Rapport de Plume.txt</translation>
+    </message>
+    <message>
+        <source>The report was saved.</source>
+        <translation>Le rapport a été enregistré.</translation>
+    </message>
+    <message>
+        <source>The report was not saved</source>
+        <translation>Le rapport n’a pas été enregistré</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FilePanels</name>
+    <message>
+        <source>The snippets were not exported</source>
+        <translation>Les extraits n’ont pas été exportés</translation>
+    </message>
+    <message>
+        <source>%1: snippets can be written to files that end with .plume, .csv or .json.</source>
+        <translation>%1&#x202f;: les extraits peuvent être écrits dans des fichiers qui finissent par .plume, .csv ou .json.</translation>
+    </message>
+    <message>
+        <source>Import Snippets</source>
+        <translation>Importer des extraits</translation>
+    </message>
+    <message>
+        <source>Snippets of Plume and other programs (%1)</source>
+        <translation>Extraits de Plume et d’autres programmes (%1)</translation>
+    </message>
+    <message>
+        <source>All files (*)</source>
+        <translation>Tous les fichiers (*)</translation>
+    </message>
+    <message>
+        <source>Choose</source>
+        <translation>Choisir</translation>
+    </message>
+    <message>
+        <source>Plume library (*.plume)</source>
+        <translation>Bibliothèque de Plume (*.plume)</translation>
+    </message>
+    <message>
+        <source>Comma-separated values (*.csv)</source>
+        <translation>Valeurs séparées par des virgules (*.csv)</translation>
+    </message>
+    <message>
+        <source>Readable library (*.json)</source>
+        <translation>Bibliothèque lisible (*.json)</translation>
+    </message>
+    <message>
+        <source>Export Snippets</source>
+        <translation>Exporter les extraits</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Exporter</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Mes extraits</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FileUseQuestion</name>
+    <message>
+        <source>Restore / Import data from %@</source>
+        <translation>Restaurer ou importer les données de %@</translation>
+    </message>
+    <message>
+        <source>Restoring will replace all current snippets with snippets from the selected file.<byte value="xd"/>
+<byte value="xd"/>
+Importing will add file&apos;s snippets to current snippets.</source>
+        <translation>Restaurer remplace tous les extraits actuels par ceux du fichier choisi.<byte value="xd"/>
+<byte value="xd"/>
+Importer ajoute les extraits du fichier aux extraits actuels.</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Importer</translation>
+    </message>
+    <message>
+        <source>Restore</source>
+        <translation>Restaurer</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Annuler</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FolderChoice</name>
+    <message>
+        <source>Default Directory</source>
+        <translation>Dossier par défaut</translation>
+    </message>
+    <message>
+        <source>Other Folder…</source>
+        <translation>Autre dossier…</translation>
+    </message>
+    <message>
+        <source>Choose a folder</source>
+        <translation>Choisir un dossier</translation>
+    </message>
+    <message>
+        <source>Another folder</source>
+        <translation>Autre dossier</translation>
+    </message>
+    <message>
+        <source>Choose a Folder</source>
+        <translation>Choisir un dossier</translation>
+    </message>
+</context>
+<context>
+    <name>plume::HotKeyRecorder</name>
+    <message>
+        <source>Ctrl</source>
+        <translation>Ctrl</translation>
+    </message>
+    <message>
+        <source>Alt</source>
+        <translation>Alt</translation>
+    </message>
+    <message>
+        <source>Shift</source>
+        <translation>Maj</translation>
+    </message>
+    <message>
+        <source>Super</source>
+        <translation>Super</translation>
+    </message>
+    <message>
+        <source>Key %1</source>
+        <translation>Touche %1</translation>
+    </message>
+    <message>
+        <source>Clear</source>
+        <translation>Effacer</translation>
+    </message>
+    <message>
+        <source>Nothing was heard. Plume may not hear the keyboard at the moment.</source>
+        <translation>Rien n’a été entendu. Plume n’entend peut-être pas le clavier en ce moment.</translation>
+    </message>
+    <message>
+        <source>Clear the hot key: %1</source>
+        <translation>Effacer le raccourci clavier&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>%1 would be typed all the time. Hold Ctrl, Alt or Super with it.</source>
+        <translation>%1 serait tapé sans cesse. Ajoutez Ctrl, Alt ou Super.</translation>
+    </message>
+    <message>
+        <source>%1 is the hot key of “%2” already.</source>
+        <translation>%1 est déjà le raccourci clavier de «&#x202f;%2&#x202f;».</translation>
+    </message>
+    <message>
+        <source>Press keys… Escape leaves it as it is</source>
+        <translation>Touches… Échap pour annuler</translation>
+    </message>
+    <message>
+        <source>None</source>
+        <translation>Aucun</translation>
+    </message>
+</context>
+<context>
+    <name>plume::InitalSyncWindowController</name>
+    <message>
+        <source>Synchronize Snippets</source>
+        <translation>Synchroniser les extraits</translation>
+    </message>
+    <message>
+        <source>Use the snippets in “%@” on this computer</source>
+        <translation>Utiliser les extraits de «&#x202f;%@&#x202f;» sur cet ordinateur</translation>
+    </message>
+    <message>
+        <source>Replace the snippets in “%@” by those of this computer</source>
+        <translation>Remplacer les extraits de «&#x202f;%@&#x202f;» par ceux de cet ordinateur</translation>
+    </message>
+    <message>
+        <source>The folder “%@” holds snippets already</source>
+        <translation>Le dossier «&#x202f;%@&#x202f;» contient déjà des extraits</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>A&amp;nnuler</translation>
+    </message>
+    <message>
+        <source>Which snippets do you want to keep?</source>
+        <translation>Quels extraits voulez-vous garder&#x202f;?</translation>
+    </message>
+    <message>
+        <source>The snippets that are replaced are not lost: Plume writes a backup of them first.</source>
+        <translation>Les extraits remplacés ne sont pas perdus&#x202f;: Plume les sauvegarde d’abord.</translation>
+    </message>
+    <message>
+        <source>&amp;Use Folder’s Snippets</source>
+        <translation>&amp;Utiliser les extraits du dossier</translation>
+    </message>
+    <message>
+        <source>&amp;Replace Folder’s Snippets</source>
+        <translation>&amp;Remplacer les extraits du dossier</translation>
+    </message>
+</context>
+<context>
+    <name>plume::Messages</name>
+    <message>
+        <source>OK</source>
+        <translation>OK</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Annuler</translation>
+    </message>
+</context>
+<context>
+    <name>plume::NewSnippetWindow</name>
+    <message>
+        <source>New Snippet</source>
+        <translation>Nouvel extrait</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Mes extraits</translation>
+    </message>
+    <message>
+        <source>Add &amp;Snippet</source>
+        <translation>Ajouter l’&amp;extrait</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>An&amp;nuler</translation>
+    </message>
+    <message>
+        <source>Optional: a name for lists</source>
+        <translation>Facultatif&#x202f;: un nom pour les listes</translation>
+    </message>
+    <message>
+        <source>About the abbreviation</source>
+        <translation>Au sujet de l’abréviation</translation>
+    </message>
+    <message>
+        <source>&amp;Group:</source>
+        <translation>&amp;Groupe&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Na&amp;me of group:</source>
+        <translation>No&amp;m du groupe&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviation:</source>
+        <translation>&amp;Abréviation&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Label:</source>
+        <translation>&amp;Libellé&#x202f;:</translation>
+    </message>
+    <message>
+        <source>&amp;Text:</source>
+        <translation>&amp;Texte&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Untitled group</source>
+        <translation>Groupe sans nom</translation>
+    </message>
+    <message>
+        <source>New Group…</source>
+        <translation>Nouveau groupe…</translation>
+    </message>
+    <message>
+        <source>Without an abbreviation it can only be chosen from lists.</source>
+        <translation>Sans abréviation, seules les listes y mènent.</translation>
+    </message>
+    <message>
+        <source>The group has this abbreviation already. Both will be kept.</source>
+        <translation>Déjà dans ce groupe. Les deux seront gardées.</translation>
+    </message>
+    <message>
+        <source>Do you want to throw this snippet away?</source>
+        <translation>Voulez-vous abandonner cet extrait&#x202f;?</translation>
+    </message>
+    <message>
+        <source>It was not added to your snippets yet.</source>
+        <translation>Il n’a pas encore été ajouté à vos extraits.</translation>
+    </message>
+    <message>
+        <source>Throw Away</source>
+        <translation>Abandonner</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PreferencesPage</name>
+    <message>
+        <source>This could not be kept. %1</source>
+        <translation>Cela n’a pas pu être enregistré. %1</translation>
+    </message>
+    <message>
+        <source>Another value (%1)</source>
+        <translation>Autre valeur (%1)</translation>
+    </message>
+    <message>
+        <source> seconds</source>
+        <translation> s</translation>
+    </message>
+    <message>
+        <source>In all programs</source>
+        <translation>Dans tous les programmes</translation>
+    </message>
+    <message>
+        <source>In all programs except those below</source>
+        <translation>Dans tous les programmes sauf ceux-ci</translation>
+    </message>
+    <message>
+        <source>Only in the programs below</source>
+        <translation>Seulement dans les programmes ci-dessous</translation>
+    </message>
+    <message>
+        <source>Programs</source>
+        <translation>Programmes</translation>
+    </message>
+    <message>
+        <source>Enabled</source>
+        <translation>Inclus</translation>
+    </message>
+    <message>
+        <source>Ignored</source>
+        <translation>Exclus</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PreferencesWindow</name>
+    <message>
+        <source>Preferences</source>
+        <translation>Préférences</translation>
+    </message>
+    <message>
+        <source>General</source>
+        <translation>Général</translation>
+    </message>
+    <message>
+        <source>Expansion</source>
+        <translation>Développement</translation>
+    </message>
+    <message>
+        <source>Suggestions and search</source>
+        <translation>Suggestions et recherche</translation>
+    </message>
+    <message>
+        <source>Typing and clipboard</source>
+        <translation>Saisie et presse-papiers</translation>
+    </message>
+    <message>
+        <source>Correction</source>
+        <translation>Correction</translation>
+    </message>
+    <message>
+        <source>Hot keys</source>
+        <translation>Raccourcis clavier</translation>
+    </message>
+    <message>
+        <source>Applications</source>
+        <translation>Programmes</translation>
+    </message>
+    <message>
+        <source>Backups and sync</source>
+        <translation>Sauvegardes et synchro</translation>
+    </message>
+    <message>
+        <source>Import and export</source>
+        <translation>Import et export</translation>
+    </message>
+    <message>
+        <source>Advanced</source>
+        <translation>Avancé</translation>
+    </message>
+    <message>
+        <source>Search settings</source>
+        <translation>Rechercher un réglage</translation>
+    </message>
+    <message>
+        <source>Pages</source>
+        <translation>Pages</translation>
+    </message>
+    <message>
+        <source>Settings that were found</source>
+        <translation>Réglages trouvés</translation>
+    </message>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Rien n’a été trouvé.</translation>
+    </message>
+    <message>
+        <source>What went wrong</source>
+        <translation>Ce qui n’a pas marché</translation>
+    </message>
+    <message>
+        <source>Hide</source>
+        <translation>Masquer</translation>
+    </message>
+    <message>
+        <source>Restore &amp;Defaults</source>
+        <translation>&amp;Rétablir les valeurs par défaut</translation>
+    </message>
+    <message>
+        <source>Restore the defaults of the page “%1”?</source>
+        <translation>Rétablir les valeurs par défaut de la page «&#x202f;%1&#x202f;»&#x202f;?</translation>
+    </message>
+    <message>
+        <source>What you have set on this page is forgotten. Other pages stay as they are.</source>
+        <translation>Ce que vous avez réglé sur cette page est oublié. Les autres pages restent comme elles sont.</translation>
+    </message>
+    <message>
+        <source>&amp;Restore Defaults</source>
+        <translation>&amp;Rétablir les valeurs par défaut</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ProgramAdder</name>
+    <message>
+        <source>Add</source>
+        <translation>Ajouter</translation>
+    </message>
+    <message>
+        <source>Add a program</source>
+        <translation>Ajouter un programme</translation>
+    </message>
+    <message>
+        <source>&amp;Running Program…</source>
+        <translation>Programme en &amp;cours…</translation>
+    </message>
+    <message>
+        <source>&amp;Installed Program…</source>
+        <translation>Programme &amp;installé…</translation>
+    </message>
+    <message>
+        <source>&amp;Point at a Window…</source>
+        <translation>&amp;Désigner une fenêtre…</translation>
+    </message>
+    <message>
+        <source>&amp;Type an Identifier…</source>
+        <translation>&amp;Saisir un identifiant…</translation>
+    </message>
+    <message>
+        <source>Running Programs</source>
+        <translation>Programmes en cours</translation>
+    </message>
+    <message>
+        <source>Installed Programs</source>
+        <translation>Programmes installés</translation>
+    </message>
+    <message>
+        <source>Click in a window of the program within 20 seconds.</source>
+        <translation>Cliquez dans une fenêtre du programme d’ici 20 secondes.</translation>
+    </message>
+    <message>
+        <source>No window of another program was clicked.</source>
+        <translation>Aucune fenêtre d’un autre programme n’a été cliquée.</translation>
+    </message>
+    <message>
+        <source>Add a Program</source>
+        <translation>Ajouter un programme</translation>
+    </message>
+    <message>
+        <source>Identifier of the program: the name of its desktop file without “.desktop”, or its window class</source>
+        <translation>Identifiant du programme&#x202f;: le nom de son fichier desktop sans «&#x202f;.desktop&#x202f;», ou sa classe de fenêtre</translation>
+    </message>
+    <message>
+        <source>&amp;Add Program</source>
+        <translation>&amp;Ajouter le programme</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>A&amp;nnuler</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ProgramChooser</name>
+    <message>
+        <source>No programs are there to choose from.</source>
+        <translation>Il n’y a aucun programme à choisir.</translation>
+    </message>
+    <message>
+        <source>Program</source>
+        <translation>Programme</translation>
+    </message>
+    <message>
+        <source>Identifier</source>
+        <translation>Identifiant</translation>
+    </message>
+    <message>
+        <source>Filter</source>
+        <translation>Filtrer</translation>
+    </message>
+    <message>
+        <source>Programs</source>
+        <translation>Programmes</translation>
+    </message>
+    <message>
+        <source>&amp;Add Program</source>
+        <translation>&amp;Ajouter le programme</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>A&amp;nnuler</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PromptWindow</name>
+    <message>
+        <source>Plume</source>
+        <translation>Plume</translation>
+    </message>
+    <message>
+        <source>Plume cannot expand abbreviations yet</source>
+        <translation>Plume ne peut pas encore développer les abréviations</translation>
+    </message>
+    <message>
+        <source>Put this right, then choose “Check Again”. You can also continue and do it later: until then Plume runs, but abbreviations may stay as you type them.</source>
+        <translation>Réglez cela, puis choisissez «&#x202f;Vérifier à nouveau&#x202f;». Vous pouvez aussi continuer et le faire plus tard&#x202f;: d’ici là Plume fonctionne, mais les abréviations restent peut-être telles que vous les tapez.</translation>
+    </message>
+    <message>
+        <source>Check &amp;Again</source>
+        <translation>&amp;Vérifier à nouveau</translation>
+    </message>
+    <message>
+        <source>&amp;Continue Anyway</source>
+        <translation>&amp;Continuer quand même</translation>
+    </message>
+    <message>
+        <source>What is missing</source>
+        <translation>Ce qui manque</translation>
+    </message>
+    <message>
+        <source>Looked again at %1: it is not right yet. You can also continue and put it right later.</source>
+        <translation>Vérifié à nouveau à %1&#x202f;: ce n’est pas encore réglé. Vous pouvez aussi continuer et régler cela plus tard.</translation>
+    </message>
+    <message>
+        <source>Plume is ready</source>
+        <translation>Plume est prêt</translation>
+    </message>
+    <message>
+        <source>All that was missing is there now.</source>
+        <translation>Tout ce qui manquait est là maintenant.</translation>
+    </message>
+    <message>
+        <source>&amp;Close</source>
+        <translation>&amp;Fermer</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ReportsWindow</name>
+    <message numerus="yes">
+        <source>%1 (%n times)</source>
+        <translation>
+            <numerusform>%1 (%n fois)</numerusform>
+            <numerusform>%1 (%n fois)</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Recent Reports</source>
+        <translation>Rapports récents</translation>
+    </message>
+    <message>
+        <source>Plume has had nothing to report.</source>
+        <translation>Plume n’a rien eu à signaler.</translation>
+    </message>
+    <message>
+        <source>Time</source>
+        <translation>Heure</translation>
+    </message>
+    <message>
+        <source>Report</source>
+        <translation>Rapport</translation>
+    </message>
+    <message>
+        <source>What you can do</source>
+        <translation>Ce que vous pouvez faire</translation>
+    </message>
+    <message>
+        <source>Reports, newest first</source>
+        <translation>Rapports, le plus récent d’abord</translation>
+    </message>
+    <message>
+        <source>&amp;Copy All</source>
+        <translation>&amp;Tout copier</translation>
+    </message>
+    <message>
+        <source>C&amp;lear</source>
+        <translation>&amp;Effacer</translation>
+    </message>
+</context>
+<context>
+    <name>plume::RestoreDataWindowController</name>
+    <message>
+        <source>%1, %2</source>
+        <translation>%1, %2</translation>
+    </message>
+    <message>
+        <source>Restore</source>
+        <translation>Restaurer</translation>
+    </message>
+    <message>
+        <source>&amp;Restore Backup</source>
+        <translation>&amp;Restaurer la sauvegarde</translation>
+    </message>
+    <message>
+        <source>Backups, newest first</source>
+        <translation>Sauvegardes, la plus récente d’abord</translation>
+    </message>
+    <message>
+        <source>&amp;Backups of your snippets:</source>
+        <translation>&amp;Sauvegardes de vos extraits&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Choose &amp;File…</source>
+        <translation>Choisir un &amp;fichier…</translation>
+    </message>
+    <message>
+        <source>Your snippets can be put back to what they were when a backup was made. What you have now is saved first.</source>
+        <translation>Vos extraits peuvent redevenir ce qu’ils étaient lors d’une sauvegarde. Ce que vous avez maintenant est d’abord sauvegardé.</translation>
+    </message>
+    <message>
+        <source>There is no backup in %1 yet.</source>
+        <translation>Il n’y a pas encore de sauvegarde dans %1.</translation>
+    </message>
+    <message>
+        <source>Select a .plume file to restore</source>
+        <translation>Choisir un fichier .plume à restaurer</translation>
+    </message>
+    <message>
+        <source>Plume libraries (*.plume)</source>
+        <translation>Bibliothèques de Plume (*.plume)</translation>
+    </message>
+    <message>
+        <source>Your 1 snippet is replaced by what this backup holds:</source>
+        <translation>Votre unique extrait est remplacé par le contenu de cette sauvegarde&#x202f;:</translation>
+    </message>
+    <message numerus="yes">
+        <source>Your %n snippets are replaced by what this backup holds:</source>
+        <translation>
+            <numerusform>Votre %n extrait est remplacé par le contenu de cette sauvegarde&#x202f;:</numerusform>
+            <numerusform>Vos %n extraits sont remplacés par le contenu de cette sauvegarde&#x202f;:</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Do you want to restore this backup?</source>
+        <translation>Voulez-vous restaurer cette sauvegarde&#x202f;?</translation>
+    </message>
+    <message>
+        <source>Plume writes a backup of what you have now first.</source>
+        <translation>Plume sauvegarde d’abord ce que vous avez maintenant.</translation>
+    </message>
+    <message>
+        <source>Replace My Snippets</source>
+        <translation>Remplacer mes extraits</translation>
+    </message>
+    <message>
+        <source>Error when restoring backup</source>
+        <translation>La sauvegarde n’a pas été restaurée</translation>
+    </message>
+    <message>
+        <source>Your snippets were restored</source>
+        <translation>Vos extraits ont été restaurés</translation>
+    </message>
+    <message>
+        <source>What you had before is in this backup: %1</source>
+        <translation>Ce que vous aviez avant est dans cette sauvegarde&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>The selected backup file does not exist.</source>
+        <translation>Le fichier de sauvegarde choisi n’existe pas.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SettingsModel</name>
+    <message>
+        <source>Setting</source>
+        <translation>Réglage</translation>
+    </message>
+    <message>
+        <source>Value</source>
+        <translation>Valeur</translation>
+    </message>
+    <message>
+        <source>Default</source>
+        <translation>Par défaut</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SnippetRowsMenu</name>
+    <message>
+        <source>%1 … %2</source>
+        <extracomment>The first and the last of a range of snippets.</extracomment>
+        <translation>%1 … %2</translation>
+    </message>
+</context>
+<context>
+    <name>plume::StatusMenu</name>
+    <message>
+        <source>Untitled group</source>
+        <translation>Groupe sans nom</translation>
+    </message>
+    <message>
+        <source>&amp;Quit Plume</source>
+        <translation>&amp;Quitter Plume</translation>
+    </message>
+    <message>
+        <source>&amp;Enabled</source>
+        <translation>&amp;Activé</translation>
+    </message>
+    <message>
+        <source>&amp;Listen to the Keyboard Again</source>
+        <translation>&amp;Réécouter le clavier</translation>
+    </message>
+    <message>
+        <source>&amp;New Snippet…</source>
+        <translation>&amp;Nouvel extrait…</translation>
+    </message>
+    <message>
+        <source>New Snippet from &amp;Clipboard…</source>
+        <translation>Nouvel extrait du &amp;presse-papiers…</translation>
+    </message>
+    <message>
+        <source>New Snippet from &amp;Selection…</source>
+        <translation>Nouvel extrait de la &amp;sélection…</translation>
+    </message>
+    <message>
+        <source>Searc&amp;h Snippets…</source>
+        <translation>Rec&amp;hercher des extraits…</translation>
+    </message>
+    <message>
+        <source>E&amp;dit Snippets…</source>
+        <translation>&amp;Modifier les extraits…</translation>
+    </message>
+    <message>
+        <source>&amp;Preferences…</source>
+        <translation>Pré&amp;férences…</translation>
+    </message>
+    <message>
+        <source>Help and &amp;Tools</source>
+        <translation>Aide et &amp;outils</translation>
+    </message>
+    <message>
+        <source>&amp;Why Didn&apos;t It Expand?</source>
+        <translation>&amp;Pourquoi ne s’est-il rien passé&#x202f;?</translation>
+    </message>
+    <message>
+        <source>&amp;Reports</source>
+        <translation>&amp;Rapports</translation>
+    </message>
+    <message>
+        <source>&amp;Diagnostics…</source>
+        <translation>&amp;Diagnostic…</translation>
+    </message>
+    <message>
+        <source>W&amp;elcome…</source>
+        <translation>&amp;Bienvenue…</translation>
+    </message>
+    <message>
+        <source>&amp;About Plume</source>
+        <translation>À propos de P&amp;lume</translation>
+    </message>
+    <message>
+        <source>Li&amp;brary</source>
+        <translation>&amp;Bibliothèque</translation>
+    </message>
+    <message>
+        <source>&amp;Import…</source>
+        <translation>&amp;Importer…</translation>
+    </message>
+    <message>
+        <source>&amp;Export…</source>
+        <translation>&amp;Exporter…</translation>
+    </message>
+    <message>
+        <source>&amp;Restore…</source>
+        <translation>&amp;Restaurer…</translation>
+    </message>
+</context>
+<context>
+    <name>plume::TrayIcon</name>
+    <message>
+        <source>Plume: off</source>
+        <translation>Plume&#x202f;: désactivé</translation>
+    </message>
+    <message>
+        <source>Plume: does not hear the keyboard</source>
+        <translation>Plume : n’entend pas le clavier</translation>
+    </message>
+    <message>
+        <source>Plume: on</source>
+        <translation>Plume&#x202f;: activé</translation>
+    </message>
+</context>
+<context>
+    <name>plume::WelcomeWindow</name>
+    <message>
+        <source>Welcome to Plume</source>
+        <translation>Bienvenue dans Plume</translation>
+    </message>
+    <message>
+        <source>&amp;Get Started</source>
+        <translation>&amp;C’est parti</translation>
+    </message>
+    <message>
+        <source>Plume keeps texts that you write often as snippets, each with a short abbreviation. Type the abbreviation in any program, and Plume puts the text in its place. Your snippets stay on this computer.</source>
+        <translation>Plume garde les textes que vous écrivez souvent sous forme d’extraits, chacun avec une courte abréviation. Tapez l’abréviation dans n’importe quel programme, et Plume met le texte à sa place. Vos extraits restent sur cet ordinateur.</translation>
+    </message>
+    <message>
+        <source>Try it</source>
+        <translation>Essayez</translation>
+    </message>
+    <message>
+        <source>&amp;Type here:</source>
+        <translation>&amp;Tapez ici&#x202f;:</translation>
+    </message>
+    <message>
+        <source>Not tried yet</source>
+        <translation>Pas encore essayé</translation>
+    </message>
+    <message>
+        <source>becomes “%1”</source>
+        <translation>devient «&#x202f;%1&#x202f;»</translation>
+    </message>
+    <message>
+        <source>Done</source>
+        <translation>Fait</translation>
+    </message>
+    <message>
+        <source>That is all there is to it.</source>
+        <translation>C’est tout.</translation>
+    </message>
+    <message>
+        <source>Bring your snippets along</source>
+        <translation>Apportez vos extraits</translation>
+    </message>
+    <message>
+        <source>Snippets of other programs were found. Importing leaves them as they are.</source>
+        <translation>Des extraits d’autres programmes ont été trouvés. L’import les laisse tels quels.</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Importer</translation>
+    </message>
+    <message>
+        <source>Import %1</source>
+        <translation>Importer %1</translation>
+    </message>
+    <message>
+        <source>Imported</source>
+        <translation>Importé</translation>
+    </message>
+    <message>
+        <source>&amp;Start Plume when I log in</source>
+        <translation>Lancer Plume à l’&amp;ouverture de session</translation>
+    </message>
+    <message>
+        <source>Your desktop has no place for Plume’s icon. To reach Plume, run “plume” again, or use its hot keys.</source>
+        <translation>Votre bureau n’a pas de place pour l’icône de Plume. Pour accéder à Plume, relancez «&#x202f;plume&#x202f;», ou utilisez ses raccourcis clavier.</translation>
+    </message>
+    <message>
+        <source>This could not be changed</source>
+        <translation>Cela n’a pas pu être changé</translation>
+    </message>
+    <message>
+        <source>and a space become “%1”</source>
+        <extracomment>What stands before it is an abbreviation; %1 is its text.</extracomment>
+        <translation>et une espace deviennent « %1 »</translation>
+    </message>
+</context>
+</TS>
