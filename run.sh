@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Builds Plume and starts it.
-#   ./run.sh          where there is a display: with the sample library, until Ctrl+C; elsewhere: the demonstration
+#   ./run.sh          where there is a display: with its icon and windows, until Ctrl+C; elsewhere: the demonstration
 #   ./run.sh demo     the demonstration: a private X server with real programs, in which Plume expands what is typed
 #   ./run.sh ARGS...  the program with these arguments, such as: ./run.sh doctor
 set -euo pipefail
@@ -23,13 +23,12 @@ need_packages "${BUILD_PACKAGES[@]}"
 build run
 if [ $# -eq 0 ]; then
     cat <<'TEXT'
-Plume is starting with its sample library. In any program, type for instance
+Plume is starting. In any program, type for instance
     btw and a space     by the way
     ;date               the date of today
     ;sig                a signature
     ;->                 an arrow
-"build/run/bin/plume list" shows all of it; Ctrl+C here ends Plume.
+"build/run/bin/plume list" shows all of it; its icon is in the panel; Ctrl+C here ends it.
 TEXT
-    set -- run
 fi
 exec build/run/bin/plume "$@"

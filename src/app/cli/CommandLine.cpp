@@ -48,15 +48,32 @@ constexpr std::array Forms = {
                 "Check what Plume needs of this desktop, and say what to do about what is missing"},
     CommandForm{Command::Simulate, "simulate", "plume simulate FILE... [--case NAME]",
                 "Play scenarios of typing on a simulated desktop and compare what comes out"},
+    CommandForm{Command::Show, "show", "plume show [WINDOW]", "Show a window of the Plume that runs"},
+    CommandForm{Command::Open, "open", "plume open FILE...", "Have the Plume that runs import or restore a file"},
+    CommandForm{Command::Toggle, "toggle", "plume toggle", "Switch expansion off, or on again"},
+    CommandForm{Command::QuickSearch, "quick-search", "plume quick-search", "Search for a snippet and send it"},
+    CommandForm{Command::Suggest, "suggest", "plume suggest", "Suggest snippets for what was typed last"},
+    CommandForm{Command::Undo, "undo", "plume undo", "Take the last expansion back"},
+    CommandForm{Command::ExpandTyped, "expand-typed", "plume expand-typed", "Expand what was typed last"},
+    CommandForm{Command::Status, "status", "plume status [--json]", "Tell what the Plume that runs is doing"},
+    CommandForm{Command::Quit, "quit", "plume quit", "End the Plume that runs"},
 };
+
+const std::vector<std::string> Windows{"main",      "preferences", "new-snippet",       "new-from-clipboard",
+                                       "decisions", "reports",     "diagnostics",       "restore",
+                                       "welcome",   "about",       "new-from-selection"};
 
 constexpr const char* GeneralForm =
     "plume "
-    "run|list|search|expand|add|remove|edit|import|export|convert|backup|backups|restore|settings|doctor|simulate ...";
+    "run|list|search|expand|add|remove|edit|import|export|convert|backup|backups|restore|settings|doctor|simulate|show|"
+    "open|"
+    "toggle|quick-search|suggest|undo|expand-typed|status|quit ...";
 
 constexpr const char* Examples = R"(
 Examples:
-  plume run                         expand your snippets in every program
+  plume                             start Plume, or show the one that runs
+  plume run                         expand your snippets in every program, without windows
+  plume toggle                      switch expansion off and on: for a shortcut of your desktop
   plume run --library mine.json     expand the snippets of this file, also when it changes
   plume list                        what there is to type
   plume search arrow                find a snippet
@@ -79,7 +96,7 @@ class Parser {
         app_.set_version_flag("--version", std::string("plume ") + Version, "Print the version");
         app_.set_help_flag("-h,--help", "Print this help");
         app_.footer(Examples);
-        app_.require_subcommand(1);
+        app_.require_subcommand(0, 1);
         for (const CommandForm& form : Forms) addCommand(form);
     }
 
@@ -93,7 +110,7 @@ class Parser {
         } catch (const CLI::ParseError& mistake) {
             return refusal(mistake);
         }
-        result_.command = formInUse()->command;
+        if (const CommandForm* form = formInUse()) result_.command = form->command;
         return result_;
     }
 
@@ -150,10 +167,17 @@ class Parser {
             case Command::Restore:
                 command->add_option("FILE", result_.files, "A backup, or latest")->required()->expected(1);
                 break;
-            case Command::Edit:
-            case Command::Backup:
-            case Command::Backups:
-            case Command::Doctor:
+            case Command::Show:
+                command->add_option("WINDOW", result_.text, "Which one; the main window where nothing is said")
+                    ->check(CLI::IsMember(Windows));
+                break;
+            case Command::Open:
+                command->add_option("FILE", result_.files, "Libraries")->required();
+                break;
+            case Command::Status:
+                command->add_flag("--json", result_.json, "For programs to read");
+                break;
+            default:
                 break;
         }
     }

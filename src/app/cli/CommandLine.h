@@ -19,6 +19,7 @@ inline constexpr int MissingSystem = 3;  // the desktop lacks what a text expand
 }  // namespace ExitStatus
 
 enum class Command {
+    Application,  // no command: the program with its icon and windows
     Run,
     List,
     Search,
@@ -34,22 +35,33 @@ enum class Command {
     Restore,
     Settings,
     Doctor,
-    Simulate
+    Simulate,
+    // For the Plume that runs.
+    Show,
+    Open,
+    Toggle,
+    QuickSearch,
+    Suggest,
+    Undo,
+    ExpandTyped,
+    Status,
+    Quit
 };
 
 struct CommandLine {
-    Command command = Command::Run;
+    Command command = Command::Application;
     std::optional<std::string> library;     // for Run, List, Search and Expand
     std::optional<std::string> settings;    // for Run
     std::vector<std::string> files;         // what is read or written
     std::optional<std::string> onlyCase;    // for Simulate
     SettingsRequest request;                // for Settings
-    std::string text;                       // what to search for, or the abbreviation
+    std::string text;                       // what to search for, the abbreviation, or the window to show
     std::string content;                    // for Add
     std::optional<std::string> group;       // for Add and Export
     std::optional<std::string> label;       // for Add
     bool withPreferences = false;           // for Export
     bool textExpanderPlaceholders = false;  // for Import and Convert
+    bool json = false;                      // for Status
 };
 
 // Nothing is left to do but to print this and to end.

@@ -3,6 +3,9 @@
 #include <xcb/xinput.h>
 #include <xcb/xtest.h>
 
+#include <QCoreApplication>
+#include <QDBusConnection>
+#include <QDBusConnectionInterface>
 #include <algorithm>
 #include <array>
 #include <chrono>
@@ -110,6 +113,7 @@ class Examination {
         examineAccessibility();
         if (session_) examinePasswordFields();
         examineInputMethods();
+        if (session_) examineIcon();
         examineSounds();
         examineWatchdog();
         examineScripts();
@@ -227,6 +231,25 @@ class Examination {
                      " is running: while an engine of it turns keys into other text (Japanese, Chinese, "
                      "Korean), Plume hears the keys, not the text; switch Plume off meanwhile.");
         }
+    }
+
+    // Where it is missing, the command line and hot keys lead to everything.
+    void examineIcon() {
+        XcbConnection& connection = session_->connection();
+        const auto cookie = xcb_get_selection_owner(connection.get(), connection.atom("_NET_SYSTEM_TRAY_S0"));
+        const XcbOwned<xcb_get_selection_owner_reply_t> tray(
+            xcb_get_selection_owner_reply(connection.get(), cookie, nullptr));
+        if (tray && tray->owner != XCB_WINDOW_NONE) return good("icon", "the desktop has a tray for it");
+        int count = 0;
+        const QCoreApplication application(count, nullptr);
+        const QDBusConnection bus = QDBusConnection::sessionBus();
+        if (bus.isConnected() && bus.interface()->isServiceRegistered("org.kde.StatusNotifierWatcher")) {
+            return good("icon", "the desktop's panel has a place for it");
+        }
+        warn(
+            "icon",
+            "the desktop has no place for it now; run plume again, or plume show preferences, to reach the windows. On "
+            "GNOME an extension for AppIndicator icons adds one.");
     }
 
     void examineSounds() {

@@ -12,6 +12,7 @@
 #include "app/cli/UserLibrary.h"
 #include "library/EditedLibrary.h"
 #include "library/LibraryFile.h"
+#include "ports/posix/PollRunLoop.h"
 
 namespace plume {
 

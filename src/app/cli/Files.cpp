@@ -66,4 +66,8 @@ std::filesystem::path soundFolder() {
     return dataFolder() / "sounds";
 }
 
+std::filesystem::path translationFolder() {
+    return dataFolder() / "translations";
+}
+
 }  // namespace plume

@@ -20,6 +20,8 @@ std::filesystem::path backupFolder();
 std::filesystem::path dataFolder();
 // Plume's own sounds, of which some may be missing.
 std::filesystem::path soundFolder();
+// The texts of windows in other languages, of which some may be missing.
+std::filesystem::path translationFolder();
 // Where this program lies; empty when the system does not tell.
 std::filesystem::path programFolder();
 

@@ -62,12 +62,20 @@ std::string holderOf(int file) {
     return process > 0 ? " (process " + std::to_string(process) + ")" : "";
 }
 
+Result<std::string> pathWithEnding(const std::string& display, const char* ending) {
+    Result<std::string> where = folder();
+    if (!where) return where;
+    return where.value() + "/plume-" + keyOf(display.empty() ? environment("DISPLAY") : display) + ending;
+}
+
 }  // namespace
 
 Result<std::string> InstanceLock::pathFor(const std::string& display) {
-    Result<std::string> where = folder();
-    if (!where) return where;
-    return where.value() + "/plume-" + keyOf(display.empty() ? environment("DISPLAY") : display) + ".lock";
+    return pathWithEnding(display, ".lock");
+}
+
+Result<std::string> InstanceLock::socketPathFor(const std::string& display) {
+    return pathWithEnding(display, ".socket");
 }
 
 Result<InstanceLock> InstanceLock::take(const std::string& display) {

@@ -21,6 +21,8 @@ class InstanceLock {
 
     // Where the lock file of a display lies; screens of one display share it.
     static Result<std::string> pathFor(const std::string& display);
+    // Where who has the lock can be reached: see app/session/CommandSocket.h.
+    static Result<std::string> socketPathFor(const std::string& display);
 
   private:
     explicit InstanceLock(FileDescriptor file) : file_(std::move(file)) {}

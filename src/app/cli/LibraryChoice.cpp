@@ -5,6 +5,7 @@
 
 #include "app/cli/UserLibrary.h"
 #include "import/Importers.h"
+#include "ports/posix/PollRunLoop.h"
 
 namespace plume {
 

@@ -3,23 +3,21 @@
 #include <sys/signalfd.h>
 
 #include <atomic>
-#include <csignal>
 #include <filesystem>
 #include <memory>
-#include <mutex>
 #include <ostream>
 #include <thread>
 #include <utility>
 
-#include "app/Composition.h"
+#include "app/Expansion.h"
 #include "app/cli/CommandLine.h"
 #include "app/cli/Files.h"
 #include "app/cli/InstanceLock.h"
 #include "app/cli/RunSources.h"
-#include "app/linux/LinuxApplications.h"
+#include "app/cli/Session.h"
+#include "app/cli/Voice.h"
 #include "app/linux/LinuxPort.h"
 #include "app/linux/PasswordFieldConsent.h"
-#include "library/MemoryUserDefaults.h"
 #include "library/SettingsFile.h"
 
 namespace plume {
@@ -40,38 +38,21 @@ Result<std::shared_ptr<const UserDefaults>> readSettings(const std::optional<std
     return SettingsFile::read(text.value(), *named);
 }
 
-// Writes sentences for the user, from any thread.
-class Voice {
+class Run final : private ExpansionListener {
   public:
-    explicit Voice(std::ostream& stream) : stream_(stream) {}
-    void say(const std::string& sentence) {
-        const std::lock_guard lock(mutex_);
-        stream_ << "plume: " << sentence << std::endl;
-    }
-
-  private:
-    std::mutex mutex_;
-    std::ostream& stream_;
-};
-
-// The signals that end the program, as a descriptor. Made before other threads are, so that none of them gets one.
-FileDescriptor endSignals() {
-    sigset_t signals;
-    sigemptyset(&signals);
-    for (const int number : {SIGINT, SIGTERM, SIGHUP}) sigaddset(&signals, number);
-    pthread_sigmask(SIG_BLOCK, &signals, nullptr);
-    // A program that went away while it was written to is no reason to end.
-    (void)std::signal(SIGPIPE, SIG_IGN);
-    return FileDescriptor(signalfd(-1, &signals, SFD_CLOEXEC | SFD_NONBLOCK));
-}
-
-class Run {
-  public:
-    Run(LinuxPort& port, RunSources& sources, std::ostream& output, Voice& voice)
-        : port_(port), sources_(sources), output_(output), voice_(voice) {}
+    Run(PollRunLoop& loop, LinuxPort& port, RunSources& sources, std::ostream& output, Voice& voice)
+        : loop_(loop),
+          port_(port),
+          sources_(sources),
+          output_(output),
+          voice_(voice),
+          expansion_({.ports = port.ports(),
+                      .applications = installedApplications(voice),
+                      .log = [&voice](const std::string& line) { voice.say(line); },
+                      .listener = *this}) {}
 
     int untilAskedToEnd(int signals) {
-        const Subscription source = port_.mainLoop().addSource(signals, [this, signals] {
+        const Subscription source = loop_.addSource(signals, [this, signals] {
             signalfd_siginfo signal{};
             if (read(signals, &signal, sizeof signal) == sizeof signal) end(ExitStatus::Success);
         });
@@ -80,18 +61,18 @@ class Run {
             voice_.say("The X server is gone.");
             end(ExitStatus::Failure);
         });
-        PasswordFieldConsent consent(
-            {port_.accessibility(), port_.ports().notices, port_.mainLoop(), sources_.userDefaults(),
-             [this](const std::string& sentence) { voice_.say(sentence); }, sources_.writableSettings()});
+        PasswordFieldConsent consent({port_.accessibility(), port_.ports().notices, loop_, sources_.userDefaults(),
+                                      [this](const std::string& sentence) { voice_.say(sentence); },
+                                      sources_.writableSettings()});
         consent.begin();
-        const std::string description = sources_.description();
-        std::thread tapThread([this, description, update = libraryUpdate(), settings = sources_.settings()] {
-            settings_.registerDefaults(settings);
-            if (update) library_.apply(*update);
-            expand(description);
+        begin();
+        std::thread tapThread([this] {
+            port_.tapLoop().run();
+            port_.leave();
         });
-        port_.mainLoop().run();
-        port_.tapLoop().stop();
+        loop_.run();
+        expansion_.end();
+        port_.tapLoop().perform([this] { port_.tapLoop().stop(); });
         tapThread.join();
         return status_;
     }
@@ -99,118 +80,60 @@ class Run {
   private:
     void end(int status) {
         status_ = status;
-        port_.mainLoop().stop();
+        loop_.stop();
     }
 
-    // The tap thread.
-    void expand(const std::string& description) {
-        {
-            Composition composition(port_.ports(), environment());
-            composition.setSnippetGroups(library_.groups());
-            composition.loadPreferences();
-            MacInputService& service = composition.inputService();
-            port_.mainLoop().perform([this, &service] {
-                service_ = &service;
-                keyboardGivenUp_ = service.keyboardTapGivenUpEvent.addObserver(this, &Run::keyboardLost);
-            });
-            port_.mainLoop().perform([this, &composition] { feed(composition); });
-            composition.start();
-            // What happens to the keyboard during a sleep, nobody hears.
-            port_.setSleepListener([this, &composition](bool sleeps) {
-                port_.tapLoop().perform([&composition] { composition.engine().clear(); });
-                sleeps ? composition.stop() : composition.inputService().enableEvents();
-            });
-            // After the start, which waits in the loop, too.
-            port_.tapLoop().perform([this, &service, &description] { tellWhetherStarted(service, description); });
-            port_.tapLoop().run();
-        }
-        port_.leave();
-    }
-
-    // The main thread, from which what changes goes to the tap thread as records of its own.
-    void feed(Composition& composition) {
+    void begin() {
+        expansion_.begin(sources_.libraryUpdate(), sources_.settings());
         sources_.begin(
-            [this, &composition] {
-                auto update = libraryUpdate();
-                if (!update) return;
-                port_.tapLoop().perform([this, &composition, update = std::move(update)]() mutable {
-                    library_.apply(*update);
-                    composition.setSnippetGroups(library_.groups());
-                    // What went out is freed where nobody waits for a key.
-                    port_.mainLoop().perform([freed = std::move(update)] {});
-                });
+            [this] {
+                if (auto update = sources_.libraryUpdate()) expansion_.setLibrary(*std::move(update));
             },
-            [this, &composition] {
-                port_.tapLoop().perform([this, &composition, settings = sources_.settings()] {
-                    settings_.registerDefaults(settings);
-                    composition.loadPreferences();
-                });
-            });
+            [this] { expansion_.loadPreferences(sources_.settings()); });
+        expansion_.start();
+        // What happens to the keyboard during a sleep, nobody hears.
+        port_.setSleepListener(
+            [this](bool sleeps) { sleeps ? expansion_.disableEvents() : expansion_.enableEvents(); });
+        // After the start, which hears the keys from the loop, too.
+        expansion_.ask([this](AutoText&) {
+            port_.tapLoop().perform([this] { loop_.perform([this] { tellWhetherStarted(); }); });
+        });
     }
 
-    std::shared_ptr<LibraryUpdate> libraryUpdate() {
-        auto update = sources_.libraryUpdate();
-        return update ? std::make_shared<LibraryUpdate>(*std::move(update)) : nullptr;
-    }
-
-    void tellWhetherStarted(const MacInputService& service, const std::string& description) {
-        // What is missing was told already.
-        if (!service.evenTapCreated()) return end(ExitStatus::MissingSystem);
-        output_ << "Plume is ready: " << description << ". Ctrl+C ends it." << std::endl;
-    }
-
-    Composition::Environment environment() {
-        const auto say = [this](const std::string& sentence) { voice_.say(sentence); };
-        return {.settings = settings_,
-                .report = say,
-                .log = say,
-                .timeZone = {},
-                .locale = {},
-                .makeFieldsEditor = {},
-                .makeSuggestionController = {},
-                .makeQuickSearchController = {},
-                .suggest = {},
-                .vmHelper = nullptr,
-                .applications = applications(),
-                .enabledChanged = [this](bool enabled) {
-                    port_.mainLoop().perform([this, enabled] { keepEnabled(enabled); });
-                }};
+    void tellWhetherStarted() {
+        expansion_.examine([this](const Expansion::Findings& findings) {
+            // What is missing was told already.
+            if (!findings.evenTapCreated) return end(ExitStatus::MissingSystem);
+            output_ << "Plume is ready: " << sources_.description() << ". Ctrl+C ends it." << std::endl;
+        });
     }
 
     // Or the next change of any setting would undo what the hot key did.
-    void keepEnabled(bool enabled) {
+    void enabledChanged(bool enabled) override {
         WritableUserDefaults* settings = sources_.writableSettings();
         if (!settings) return;
         if (const auto kept = settings->setObject("IsEnabled", enabled); !kept) voice_.say(kept.error().message);
     }
 
-    std::shared_ptr<const ApplicationTable> applications() {
-        const auto file = dataFolder() / "applications.json";
-        const LinuxApplications read = readLinuxApplications(readWholeFile(file), file.string());
-        if (read.problem) {
-            voice_.say(read.problem->message);
-            voice_.say("In place of that file, the table of applications counts that Plume was built with.");
-        }
-        return read.table;
-    }
-
-    void keyboardLost(KeyboardTapGivenUp& /*event*/) {
-        const auto listenAgain = [this] { port_.tapLoop().perform([this] { service_->tryTapAgain(); }); };
+    void keyboardTapGivenUp() override {
         port_.ports().notices.show({"Plume does not listen",
                                     "Listening to the keyboard was ended three times within a minute, because Plume "
                                     "did not answer in time. It is tried again in a minute.",
-                                    {{"Listen now", listenAgain}}});
+                                    {{"Listen now", [this] { expansion_.tryTapAgain(); }}}});
     }
 
+    void reported(const std::string& sentence) override { voice_.say(sentence); }
+    void snippetUsed(const Uuid& /*snippet*/) override {}
+    void secureInputChanged() override {}
+    void hotKeyPressed(HotKeyForWindow /*hotKey*/) override {}
+
+    PollRunLoop& loop_;
     LinuxPort& port_;
-    RunSources& sources_;          // of the main thread
-    MemoryUserDefaults settings_;  // of the tap thread
-    FedLibrary library_;           // of the tap thread
+    RunSources& sources_;
     std::ostream& output_;
     Voice& voice_;
     std::atomic<int> status_ = ExitStatus::Success;
-    MacInputService* service_ = nullptr;  // of the tap thread, as long as its loop runs
-    Subscription keyboardGivenUp_;        // of the main thread, like the event
+    Expansion expansion_;
 };
 
 }  // namespace
@@ -229,18 +152,18 @@ int runInSession(const std::optional<std::string>& libraryFile, const std::optio
     if (!settings) return refuse(settings.error(), ExitStatus::WrongInput);
 
     const FileDescriptor signals = endSignals();
-    const auto port = LinuxPort::open({}, soundFolder());
+    PollRunLoop loop;
+    const auto port = LinuxPort::open(loop, {}, soundFolder());
     if (!port) return refuse(port.error(), ExitStatus::MissingSystem);
     const Result<InstanceLock> lock = InstanceLock::take({});
     if (!lock) return refuse(lock.error(), ExitStatus::Failure);
-    const auto sources =
-        RunSources::open({file.value().get(), settings.value(), port.value()->mainLoop(), port.value()->ports().notices,
-                          [&voice](const std::string& sentence) { voice.say(sentence); }});
+    const auto sources = RunSources::open({file.value().get(), settings.value(), loop, port.value()->ports().notices,
+                                           [&voice](const std::string& sentence) { voice.say(sentence); }});
     if (!sources) return refuse(sources.error(), ExitStatus::Failure);
     if (const auto watched = port.value()->startWatchdog(); !watched) {
         return refuse(watched.error(), ExitStatus::MissingSystem);
     }
-    return Run(*port.value(), *sources.value(), output, voice).untilAskedToEnd(signals.get());
+    return Run(loop, *port.value(), *sources.value(), output, voice).untilAskedToEnd(signals.get());
 }
 
 }  // namespace plume

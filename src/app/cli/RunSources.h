@@ -22,7 +22,7 @@ class RunSources {
     struct Options {
         FollowedLibrary* file = nullptr;                   // null: the user's library
         std::shared_ptr<const UserDefaults> fileSettings;  // null: the user's settings
-        PollRunLoop& loop;
+        DescriptorLoop& loop;
         Notices& notices;
         std::function<void(const std::string& sentence)> report;
     };

@@ -1,20 +1,30 @@
 // The commands that change the user's library, or bring it into other files and back.
 #pragma once
 
+#include <filesystem>
 #include <iosfwd>
 
 #include "app/cli/CommandLine.h"
+#include "library/DataManager.h"
+#include "platform/Files.h"
 
 namespace plume {
 
-// Each writes what it did to `output`, what went wrong to `error`, and returns the exit status.
-int addSnippet(const CommandLine& line, std::ostream& output, std::ostream& error);
-int removeSnippet(const CommandLine& line, std::ostream& output, std::ostream& error);
-int importFiles(const CommandLine& line, std::ostream& output, std::ostream& error);
-int exportLibrary(const CommandLine& line, std::ostream& output, std::ostream& error);
-int makeBackup(std::ostream& output, std::ostream& error);
-int listBackups(std::ostream& output, std::ostream& error);
-int restoreBackup(const CommandLine& line, std::ostream& output, std::ostream& error);
+// What a command works on. All of it outlives the command.
+struct StoreCommandContext {
+    DataManager& manager;
+    Files& files;
+    std::filesystem::path folder;  // what relative paths start from
+    std::ostream& output;          // what was done
+    std::ostream& error;           // what went wrong
+};
+
+// Whether performOnLibrary() knows the command.
+bool isStoreCommand(Command command);
+// On the thread of the library's owner. Returns the exit status.
+int performOnLibrary(const CommandLine& line, const StoreCommandContext& context);
+// The same on the user's library, opened for this.
+int performOnUsersLibrary(const CommandLine& line, std::ostream& output, std::ostream& error);
 // Works on files alone.
 int convertFile(const CommandLine& line, std::ostream& output, std::ostream& error);
 

@@ -41,15 +41,25 @@ Result<SqliteStore::Opened> openUserStore(FileWatcher& watcher) {
 }
 
 Result<std::unique_ptr<UserLibrary>> UserLibrary::open(Options options) {
+    auto opened = openSettings(std::move(options));
+    if (!opened) return opened;
+    if (const auto loaded = opened.value()->load(); !loaded) return loaded.error();
+    return opened;
+}
+
+Result<std::unique_ptr<UserLibrary>> UserLibrary::openSettings(Options options) {
     std::unique_ptr<UserLibrary> library(new UserLibrary(options.loop));
     auto opened = openUserStore(library->watcher_);
     if (!opened) return opened.error();
     for (const std::string& problem : opened.value().problems) options.report(problem);
     library->store_ = std::move(opened.value().store);
+    library->storeWasDamaged_ = opened.value().damagedFile.has_value();
     library->manager_ = std::make_unique<DataManager>(library->dependencies(options));
-    const auto loaded = library->manager_->loadAutoTextData(opened.value().damagedFile.has_value());
-    if (!loaded) return loaded.error();
     return library;
+}
+
+Result<void> UserLibrary::load() {
+    return manager_->loadAutoTextData(storeWasDamaged_);
 }
 
 DataManager::Dependencies UserLibrary::dependencies(const Options& options) {
@@ -70,7 +80,7 @@ DataManager::Dependencies UserLibrary::dependencies(const Options& options) {
             .inBackground = options.inBackground,
             .loadPreferences = options.loadPreferences,
             .offerBackup = offer,
-            .askFirst = {}};
+            .askFirst = options.askFirst};
 }
 
 }  // namespace plume

@@ -42,8 +42,9 @@ bool maySetOff(KeyCode keyCode, EventFlags flags) {
 
 }  // namespace
 
-Result<std::unique_ptr<LinuxPort>> LinuxPort::open(const std::string& display, const std::filesystem::path& ownSounds) {
-    std::unique_ptr<LinuxPort> port(new LinuxPort(ownSounds));
+Result<std::unique_ptr<LinuxPort>> LinuxPort::open(DescriptorLoop& mainLoop, const std::string& display,
+                                                   const std::filesystem::path& ownSounds) {
+    std::unique_ptr<LinuxPort> port(new LinuxPort(mainLoop, ownSounds));
     if (const auto begun = port->begin(display); !begun) return begun.error();
     return port;
 }

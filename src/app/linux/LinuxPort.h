@@ -1,5 +1,5 @@
 // Everything that Plume uses of a Linux desktop with X11: the ports, in the order in which they need each other, and
-// the run loops of the two threads.
+// the run loop of the thread that hears the keys.
 //
 // Owned by whoever runs the program. Opened before either loop runs; then the ports belong to the thread that runs the
 // tap loop, but for secure input, which belongs to the one that runs the main loop. Destroyed when neither runs any
@@ -42,7 +42,8 @@ class LinuxPort {
   public:
     // An empty display means $DISPLAY; `ownSounds` is the folder with Plume's sounds, if there is one. The error says
     // what the desktop lacks, and what to install or to switch on.
-    static Result<std::unique_ptr<LinuxPort>> open(const std::string& display,
+    // The main thread's loop outlives the port.
+    static Result<std::unique_ptr<LinuxPort>> open(DescriptorLoop& mainLoop, const std::string& display,
                                                    const std::filesystem::path& ownSounds = {});
     // The watchdog, without which the keyboard must not be taken. On the tap thread, or before its loop runs.
     Result<void> startWatchdog();
@@ -52,7 +53,7 @@ class LinuxPort {
     Composition::Ports ports();
     AtspiAccessibility& accessibility() { return accessibility_; }
     PollRunLoop& tapLoop() { return tapLoop_; }
-    PollRunLoop& mainLoop() { return mainLoop_; }
+    DescriptorLoop& mainLoop() { return mainLoop_; }
 
     // Told, on the main thread, what a desktop without notices cannot show. Before the loops run.
     void setCannotShowNotice(DesktopNotices::CannotShow cannotShow) { notices_.setCannotShow(std::move(cannotShow)); }
@@ -60,13 +61,16 @@ class LinuxPort {
     void setSleepListener(SystemSleep::Listener listener) {
         sleep_ = std::make_unique<SystemSleep>(mainLoop_, std::move(listener));
     }
+    // Asked on the main thread: whether a menu of the program's own is open, and holds the keyboard.
+    void setKeyboardHeldByUs(std::function<bool()> heldByUs) { secureInput_->setHeldByUs(std::move(heldByUs)); }
     // Called once, on the tap thread, when the X server is gone.
     void setServerGone(std::function<void()> listener) { session_->serverGone = std::move(listener); }
     // Last of all, on the tap thread, when its loop has ended: what Plume offers on the clipboard stays there.
     void leave() { pasteboard_->handOver(); }
 
   private:
-    explicit LinuxPort(const std::filesystem::path& ownSounds) : sounds_(ownSounds) {}
+    LinuxPort(DescriptorLoop& mainLoop, const std::filesystem::path& ownSounds)
+        : mainLoop_(mainLoop), sounds_(ownSounds) {}
     Result<void> begin(const std::string& display);
     Result<void> openKeyboard(const std::string& display);
     Result<void> openDesktop(const std::string& display);
@@ -77,7 +81,7 @@ class LinuxPort {
     void focusMayHaveMoved();
     void userMovesFocus(FocusMover mover);
 
-    PollRunLoop mainLoop_;
+    DescriptorLoop& mainLoop_;
     PollRunLoop tapLoop_;
     PosixProcessLauncher processLauncher_;
     CanberraSounds sounds_;

@@ -24,7 +24,6 @@ TEST(Arguments, ThatAreWrongAreToldInOneLineWithTheRightForm) {
         const char* says;
         const char* rightForm;
     } cases[] = {
-        {{}, "there is no command", "plume run|list|search|expand|add|"},
         {{"exapnd", ";date"}, "exapnd", "plume run|list|search|expand|add|"},
         {{"--verbose"}, "--verbose", "plume run|list|search|expand|add|"},
         {{"run", "--librari", "x"}, "--librari", "plume run [--library FILE.json|FILE.csv]"},

@@ -1,0 +1,44 @@
+// What the windows and the icon ask of the running program.
+//
+// On the main thread; all that is referred to outlives it, and it outlives the windows.
+#pragma once
+
+#include <QCoreApplication>
+#include <memory>
+
+#include "app/AppDelegate.h"
+#include "app/cli/Autostart.h"
+#include "app/cli/UserLibrary.h"
+#include "app/preferences/PreferencesServices.h"
+#include "app/status/StatusMenuServices.h"
+#include "app/windows/DecisionsWindow.h"
+#include "app/windows/WelcomeServices.h"
+#include "platform/Sounds.h"
+
+namespace plume {
+
+class ApplicationServices {
+    Q_DECLARE_TR_FUNCTIONS(ApplicationServices)
+  public:
+    struct Dependencies {
+        AppDelegate& delegate;
+        UserLibrary& library;
+        Files& files;
+        Sounds& sounds;
+    };
+
+    explicit ApplicationServices(Dependencies dependencies) : around_(dependencies), autostart_(dependencies.files) {}
+
+    StatusMenuServices statusMenu() const;
+    PreferencesServices preferences();
+    DecisionsWindow::Services decisions() const;
+    WelcomeServices welcome();
+
+  private:
+    Result<std::string> importFound(const std::filesystem::path& path);
+
+    const Dependencies around_;
+    Autostart autostart_;
+};
+
+}  // namespace plume
