@@ -14,6 +14,13 @@ namespace {
 
 using Seconds = std::chrono::duration<double>;
 
+constexpr Milliseconds StartBound(20'000);
+
+// Built next to the test program.
+std::string builtPlume() {
+    return std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume";
+}
+
 std::filesystem::path writeFile(const std::filesystem::path& file, const std::string& content) {
     std::ofstream(file) << content;
     return file;
@@ -42,7 +49,6 @@ void apply(const TextChange& change, std::u32string& text) {
 
 PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const std::string& settings,
                            Accessibility accessibility) {
-    const auto program = std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume";
     std::vector<std::string> arguments{"/usr/bin/env"};
     if (accessibility == Accessibility::Missing) {
         // The session's bus is also found in the folder of the session.
@@ -51,21 +57,56 @@ PlumeProgram::PlumeProgram(DesktopRig& rig, const std::string& library, const st
         std::filesystem::permissions(folder, std::filesystem::perms::owner_all);
         arguments.insert(arguments.end(), {"-u", "DBUS_SESSION_BUS_ADDRESS", "XDG_RUNTIME_DIR=" + folder.string()});
     }
-    arguments.insert(arguments.end(), {program, "run"});
+    arguments.insert(arguments.end(), {builtPlume(), "run"});
     if (!settings.empty()) {
         arguments.insert(arguments.end(), {"--settings", writeFile(rig.directory() / "settings.json", settings)});
     }
     if (!library.empty()) {
         arguments.insert(arguments.end(), {"--library", writeFile(rig.directory() / "library.json", library)});
     }
+    start(rig, arguments, [this] { return process_->logTail().find("Plume is ready") != std::string::npos; });
+}
+
+std::unique_ptr<PlumeProgram> PlumeProgram::startApplication(DesktopRig& rig, const Environment& also) {
+    std::vector<std::string> arguments{"/usr/bin/env"};
+    arguments.insert(arguments.end(), also.begin(), also.end());
+    arguments.push_back(builtPlume());
+    std::unique_ptr<PlumeProgram> program(new PlumeProgram);
+    program->start(rig, arguments, [&rig] { return runPlume(rig, {"status"}).status == 0; });
+    return program;
+}
+
+void PlumeProgram::start(DesktopRig& rig, const std::vector<std::string>& arguments,
+                         const std::function<bool()>& isReady) {
     const auto started = std::chrono::steady_clock::now();
     process_ = rig.session().start(arguments, "plume");
-    const Deadline deadline(Milliseconds(20'000));
-    while (process_->logTail().find("Plume is ready") == std::string::npos) {
+    const Deadline deadline(StartBound);
+    while (!isReady()) {
         if (deadline.passed() || !process_->isRunning()) throw RigError("plume did not start: " + process_->logTail());
         poll(nullptr, 0, 1);
     }
     secondsToReady_ = Seconds(std::chrono::steady_clock::now() - started).count();
+}
+
+CommandOutcome runPlume(DesktopRig& rig, std::vector<std::string> arguments) {
+    arguments.insert(arguments.begin(), builtPlume());
+    const auto process = rig.session().start(arguments, "plume");
+    const auto status = process->waitForExit(StartBound);
+    if (!status) throw RigError("plume does not end: " + process->logTail());
+    return {*status, process->logTail()};
+}
+
+bool becomes(DesktopRig& rig, TargetProgram& target, const std::string& typed, const std::string& expected,
+             Milliseconds within) {
+    target.clear();
+    rig.keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
+    rig.keyboard().type(typed);
+    return target.awaitText(expected, within) == expected;
+}
+
+bool soonBecomes(DesktopRig& rig, TargetProgram& target, const std::string& typed, const std::string& expected) {
+    constexpr Milliseconds Once(2'000);
+    return waitUntil([&] { return becomes(rig, target, typed, expected, Once); });
 }
 
 namespace {

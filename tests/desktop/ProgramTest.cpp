@@ -15,10 +15,6 @@ namespace plume::rig {
 
 namespace {
 
-std::string plumeProgram() {
-    return (std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume").string();
-}
-
 // What people keep in a library, in short.
 constexpr const char* Library = R"json([
   { "name": "At once", "abbreviationPrefix": ";", "expandAfter": 2, "expandTrigger": 0, "items": [
@@ -55,15 +51,10 @@ class Program : public testing::Test {
 
     static bool becomes(TargetProgram& target, const std::string& typed, const std::string& expected,
                         Milliseconds within = Bound) {
-        target.clear();
-        rig_->keyboard().tap(Key::Home);  // what is typed next stands at the start, for Plume, too
-        rig_->keyboard().type(typed);
-        return target.awaitText(expected, within) == expected;
+        return rig::becomes(*rig_, target, typed, expected, within);
     }
-
-    // Plume may not know yet that another program has come to the front, or may not have started yet.
     static bool soonBecomes(TargetProgram& target, const std::string& typed, const std::string& expected) {
-        return waitUntil([&] { return becomes(target, typed, expected, Milliseconds(2'000)); }, Bound);
+        return rig::soonBecomes(*rig_, target, typed, expected);
     }
 
     static inline std::unique_ptr<DesktopRig> rig_;
@@ -157,9 +148,8 @@ TEST_F(Program, AsksOnceWhetherProgramsMayTellAboutPasswordFields) {
     ASSERT_TRUE(waitUntil(isAsked, Bound)) << log();
     board.press("Password fields in browsers", "Not now");
     const auto isKept = [&] {
-        const auto setting =
-            rig_->session().start({plumeProgram(), "settings", "LetProgramsTellPasswordFields"}, "plume");
-        return setting->waitForExit(Bound) == 0 && setting->logTail().find("false") != std::string::npos;
+        const auto setting = runPlume(*rig_, {"settings", "LetProgramsTellPasswordFields"});
+        return setting.status == 0 && setting.said.find("false") != std::string::npos;
     };
     EXPECT_TRUE(waitUntil(isKept, Bound)) << log();
     start(Library, "{}");
@@ -242,10 +232,10 @@ TEST_F(Program, EndsInTheMiddleOfAScript) {
 }
 
 TEST_F(Program, RunsOncePerDisplay) {
-    const auto second = rig_->session().start({plumeProgram(), "run"}, "plume");
-    EXPECT_EQ(second->waitForExit(Bound), 1);
-    EXPECT_NE(second->logTail().find("already running"), std::string::npos) << second->logTail();
-    EXPECT_NE(second->logTail().find(std::to_string(plume_->process().pid())), std::string::npos) << second->logTail();
+    const auto second = runPlume(*rig_, {"run"});
+    EXPECT_EQ(second.status, 1);
+    EXPECT_NE(second.said.find("already running"), std::string::npos) << second.said;
+    EXPECT_NE(second.said.find(std::to_string(plume_->process().pid())), std::string::npos) << second.said;
     EXPECT_TRUE(plume_->process().isRunning());
 }
 
@@ -267,15 +257,15 @@ TEST_F(Program, FollowsTheFileOfItsLibrary) {
 TEST_F(Program, TakesOverWhatOthersChangeInTheUsersLibrary) {
     start("");
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
-    const auto add = rig_->session().start({plumeProgram(), "add", "omw;", "on my way"}, "plume");
-    ASSERT_EQ(add->waitForExit(Bound), 0) << add->logTail();
+    const auto add = runPlume(*rig_, {"add", "omw;", "on my way"});
+    ASSERT_EQ(add.status, 0) << add.said;
     EXPECT_TRUE(soonBecomes(*target, "x omw;", "x on my way")) << log();
 }
 
 TEST_F(Program, StaysSwitchedOffWhateverElseIsSet) {
     const auto set = [&](const std::string& key, const std::string& value) {
-        const auto command = rig_->session().start({plumeProgram(), "settings", key, value}, "plume");
-        ASSERT_EQ(command->waitForExit(Bound), 0) << command->logTail();
+        const auto command = runPlume(*rig_, {"settings", key, value});
+        ASSERT_EQ(command.status, 0) << command.said;
     };
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     set("switchHotKey", "120");  // F2
@@ -291,18 +281,16 @@ TEST_F(Program, StaysSwitchedOffWhateverElseIsSet) {
 }
 
 TEST_F(Program, DoctorFindsAllThatIsNeededHere) {
-    const auto doctor = rig_->session().start({plumeProgram(), "doctor"}, "doctor");
-    EXPECT_EQ(doctor->waitForExit(Milliseconds(5'000)), 0) << doctor->logTail();
-    EXPECT_EQ(doctor->logTail().find("MISSING"), std::string::npos) << doctor->logTail();
-    EXPECT_NE(doctor->logTail().find("already running"), std::string::npos) << doctor->logTail();
+    const auto doctor = runPlume(*rig_, {"doctor"});
+    EXPECT_EQ(doctor.status, 0) << doctor.said;
+    EXPECT_EQ(doctor.said.find("MISSING"), std::string::npos) << doctor.said;
+    EXPECT_NE(doctor.said.find("already running"), std::string::npos) << doctor.said;
 }
 
 TEST_F(Program, DoctorNamesProgramsThatTellNothingOfTheirPasswordFields) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     const auto doctorSays = [&](const std::string& words) {
-        const auto doctor = rig_->session().start({plumeProgram(), "doctor"}, "doctor");
-        doctor->waitForExit(Milliseconds(5'000));
-        return doctor->logTail().find(words) != std::string::npos;
+        return runPlume(*rig_, {"doctor"}).said.find(words) != std::string::npos;
     };
     EXPECT_TRUE(waitUntil([&] { return doctorSays("every program that has a window"); }, Bound));
     // The window passes for one of this program, which is on no bus.

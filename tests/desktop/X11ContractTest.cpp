@@ -38,7 +38,7 @@ struct Desktop {
     Desktop() {
         rig.session().join();
         notices = std::make_unique<NoticeBoard>();
-        auto opened = LinuxPort::open(rig.server().display());
+        auto opened = LinuxPort::open(mainLoop, rig.server().display());
         if (!opened) throw RigError(opened.error().message);
         port = std::move(opened).value();
     }
@@ -47,6 +47,7 @@ struct Desktop {
     std::unique_ptr<TargetProgram> second = rig.startTarget(TargetKind::GtkTextView);
     std::unique_ptr<TargetProgram> first = rig.startTarget(TargetKind::GtkTextView);
     std::unique_ptr<NoticeBoard> notices;
+    PollRunLoop mainLoop;
     std::unique_ptr<LinuxPort> port;
 };
 
@@ -122,8 +123,8 @@ class X11Desk final : public ContractDesk {
         do {
             const Timer look = loop.performAfterDelay(Step, [&loop] { loop.stop(); });
             loop.run();
-            desktop_.port->mainLoop().perform([this] { desktop_.port->mainLoop().stop(); });
-            desktop_.port->mainLoop().run();
+            desktop_.mainLoop.perform([this] { desktop_.mainLoop.stop(); });
+            desktop_.mainLoop.run();
             if (condition()) return true;
         } while (!deadline.passed());
         return false;

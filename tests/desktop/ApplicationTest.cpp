@@ -1,0 +1,363 @@
+// The application on a whole desktop, as people use it: its windows, its icon, and what it is told from elsewhere while
+// it runs.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <span>
+#include <string>
+
+#include "testing/rig/BusService.h"
+#include "testing/rig/Deadline.h"
+#include "testing/rig/PlumeProgram.h"
+#include "testing/rig/ScreenReader.h"
+#include "testing/rig/XcbReply.h"
+
+namespace plume::rig {
+
+namespace {
+
+constexpr const char* Library = R"json([
+  { "name": "Greetings", "abbreviationPrefix": ";", "expandAfter": 2, "expandTrigger": 0, "items": [
+      { "abbreviation": "sig", "content": "Kind regards, Jo" } ] }
+])json";
+
+constexpr Milliseconds Bound(10'000);
+
+bool contains(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
+
+// Each test has a desktop and a home of its own.
+class ApplicationTest : public testing::Test {
+  protected:
+    void SetUp() override { rig_.session().join(); }
+
+    // As somebody who has this library for a while already: nobody is welcomed.
+    void keepLibrary() {
+        const auto folder = rig_.directory() / "home/.config/plume";
+        std::filesystem::create_directories(folder);
+        std::ofstream(folder / "library.json") << Library;
+        ASSERT_EQ(runPlume(rig_, {"list"}).status, 0);
+        ASSERT_EQ(runPlume(rig_, {"settings", "PlayFeedbackSound", "false"}).status, 0);
+    }
+    void start(const Environment& also = {}) { plume_ = PlumeProgram::startApplication(rig_, also); }
+    std::string log() const { return plume_->process().logTail(); }
+
+    std::string command(const std::vector<std::string>& arguments) {
+        const CommandOutcome outcome = runPlume(rig_, arguments);
+        EXPECT_EQ(outcome.status, 0) << outcome.said;
+        return outcome.said;
+    }
+    bool stateHas(const std::string& part) { return contains(command({"status", "--json"}), part); }
+
+    // The window that has the focus is one whose title begins like this.
+    bool hasFocus(const std::string& title) {
+        XClient& client = rig_.client();
+        const xcb_window_t active = client.activeWindow();
+        return active != XCB_WINDOW_NONE && client.property(active, "_NET_WM_NAME").starts_with(title);
+    }
+    bool comesToFront(const std::string& title) {
+        return waitUntil([&] { return hasFocus(title); }, Bound);
+    }
+
+    // Clicks on what is called like this in a window of Plume.
+    bool click(const std::string& name) {
+        const pid_t process = plume_->process().pid();
+        const auto isSteady = [&, last = std::optional<Rectangle>()]() mutable {
+            const auto before = std::exchange(last, reader().place(process, name));
+            return last && last == before;
+        };
+        if (!waitUntil(isSteady, Bound)) return false;
+        const Rectangle place = *reader().place(process, name);
+        rig_.click(static_cast<int>(place.origin.x + place.size.width / 2),
+                   static_cast<int>(place.origin.y + place.size.height / 2));
+        return true;
+    }
+    ScreenReader& reader() {
+        if (!reader_) reader_ = std::make_unique<ScreenReader>();
+        return *reader_;
+    }
+
+    void expectAtOnce(TargetProgram& target, const std::string& typed, const std::string& expected) {
+        EXPECT_TRUE(becomes(rig_, target, typed, expected)) << expected << " is " << target.text() << '\n' << log();
+    }
+    void expectSoon(TargetProgram& target, const std::string& typed, const std::string& expected) {
+        EXPECT_TRUE(soonBecomes(rig_, target, typed, expected)) << expected << " is " << target.text() << '\n' << log();
+    }
+
+    DesktopRig rig_;
+    std::unique_ptr<PlumeProgram> plume_;
+
+  private:
+    std::unique_ptr<ScreenReader> reader_;
+};
+
+// ---- Start and end ----
+
+TEST_F(ApplicationTest, WelcomesWhoeverIsNewAndExpandsInThatWindow) {
+    start();
+    ASSERT_TRUE(comesToFront("Welcome to Plume")) << log();
+    const auto tries = [&] {
+        rig_.keyboard().chord({Key::LeftControl}, U'a');
+        rig_.keyboard().type("btw ");
+        return waitUntil([&] { return reader().text(plume_->process().pid(), "Type here:") == "by the way "; },
+                         Milliseconds(1'000));
+    };
+    EXPECT_TRUE(waitUntil(tries, Bound)) << log();
+    const auto target = rig_.startTarget(TargetKind::QtTextEdit);
+    expectSoon(*target, "x btw ", "x by the way ");
+    EXPECT_TRUE(stateHas("\"enabled\": true"));
+    plume_ = nullptr;
+    start();
+    expectSoon(*target, "x btw ", "x by the way ");
+    EXPECT_TRUE(hasFocus(nameOf(target->kind()))) << "nobody is welcomed twice";
+}
+
+TEST_F(ApplicationTest, EndsAtOnceAndKeepsWhatWasAddedLast) {
+    keepLibrary();
+    const auto end = [&](bool byCommand) {
+        byCommand ? static_cast<void>(command({"quit"})) : static_cast<void>(kill(plume_->process().pid(), SIGTERM));
+        EXPECT_EQ(plume_->process().waitForExit(Milliseconds(1'000)), 0) << log();
+    };
+    for (const bool byCommand : {true, false}) {
+        start();
+        const std::string abbreviation = byCommand ? "one;" : "two;";
+        command({"add", abbreviation, "kept " + abbreviation});
+        end(byCommand);
+        EXPECT_EQ(command({"expand", abbreviation}), "kept " + abbreviation + "\n");
+    }
+    EXPECT_EQ(runPlume(rig_, {"status"}).status, 1);
+}
+
+TEST_F(ApplicationTest, ASecondStartShowsTheFirst) {
+    keepLibrary();
+    start();
+    const auto target = rig_.startTarget(TargetKind::GtkTextView);
+    for (int times = 0; times < 2; ++times) {
+        EXPECT_EQ(runPlume(rig_, {}).status, 0);
+        EXPECT_TRUE(comesToFront("Preferences")) << times << log();
+        target->activate();
+    }
+    EXPECT_TRUE(plume_->process().isRunning());
+    expectSoon(*target, "x ;sig", "x Kind regards, Jo");
+}
+
+// ---- Commands ----
+
+TEST_F(ApplicationTest, CommandsHoldFromTheNextKeyOn) {
+    keepLibrary();
+    start();
+    const auto target = rig_.startTarget(TargetKind::GtkTextView);
+    expectSoon(*target, "x ;sig", "x Kind regards, Jo");
+    EXPECT_EQ(command({"toggle"}), "off\n");
+    expectAtOnce(*target, "x ;sig.", "x ;sig.");
+    EXPECT_EQ(command({"toggle"}), "on\n");
+    expectAtOnce(*target, "x ;sig", "x Kind regards, Jo");
+
+    command({"add", "omw;", "on my way"});
+    expectAtOnce(*target, "x omw;", "x on my way");
+    command({"remove", "omw;"});
+    expectAtOnce(*target, "x omw;.", "x omw;.");
+
+    const auto file = rig_.directory() / "more.csv";
+    std::ofstream(file) << "brb;,be right back,\n";
+    EXPECT_TRUE(contains(command({"import", file}), "1 snippet"));
+    expectAtOnce(*target, "x brb;", "x be right back");
+}
+
+TEST_F(ApplicationTest, AHotKeySetElsewhereWorksAtOnce) {
+    keepLibrary();
+    start();
+    const auto target = rig_.startTarget(TargetKind::GtkTextView);
+    expectSoon(*target, "x ;sig", "x Kind regards, Jo");
+    command({"settings", "switchHotKey", "120"});  // F2
+    const auto switchesOff = [&] {
+        rig_.keyboard().tap(Key::F2);
+        return waitUntil([&] { return stateHas("\"enabled\": false"); }, Milliseconds(1'000));
+    };
+    ASSERT_TRUE(waitUntil(switchesOff, Bound)) << log();
+    expectAtOnce(*target, "x ;sig.", "x ;sig.");
+    rig_.keyboard().tap(Key::F2);
+    expectAtOnce(*target, "x ;sig", "x Kind regards, Jo");
+}
+
+// ---- Session bus ----
+
+class ApplicationOnBusTest : public ApplicationTest {
+  protected:
+    static constexpr BusAddress Launcher{"org.plume.Plume", "/org/plume/Plume", "org.freedesktop.Application"};
+    static constexpr BusAddress Plume{"org.plume.Plume", "/org/plume/Plume", "org.plume.Plume"};
+
+    BusAnswer call(const BusMessage& message) {
+        if (!bus_) bus_ = openBus(sessionBusAddress());
+        BusAnswer answer(BusMessage(dbus_connection_send_with_reply_and_block(
+            bus_.get(), message.get(), static_cast<int>(Bound.count()), nullptr)));
+        EXPECT_TRUE(answer) << log();
+        return answer;
+    }
+    // As launchers call an action: without parameters.
+    static BusMessage activation(const std::string& action) {
+        BusMessage call = newCall(Launcher, "ActivateAction", {action});
+        DBusMessageIter values;
+        DBusMessageIter none;
+        dbus_message_iter_init_append(call.get(), &values);
+        for (const char* type : {"v", "{sv}"}) {
+            dbus_message_iter_open_container(&values, DBUS_TYPE_ARRAY, type, &none);
+            dbus_message_iter_close_container(&values, &none);
+        }
+        return call;
+    }
+
+  private:
+    BusConnection bus_;
+};
+
+TEST_F(ApplicationOnBusTest, LaunchersAndScriptsReachIt) {
+    keepLibrary();
+    start();
+    call(activation("toggle"));
+    const auto state = call(newCall(Plume, "State")).values().string().value_or("");
+    EXPECT_TRUE(contains(state, "\"enabled\": false")) << state;
+    EXPECT_EQ(call(newCall(Plume, "Version")).values().string().value_or("") + "\n", command({"--version"}));
+
+    const auto file = rig_.directory() / "more snippets.csv";
+    std::ofstream(file) << "brb;,be right back,\n";
+    const std::string uri = "file://" + rig_.directory().string() + "/more%20snippets.csv";
+    call(newCall(Launcher, "Open", {std::vector<std::string>{uri}, BusNoOptions{}}));
+    ASSERT_TRUE(comesToFront("Restore / Import data from more snippets.csv")) << log();
+    ASSERT_TRUE(click("Import"));
+    EXPECT_TRUE(waitUntil([&] { return stateHas("\"snippets\": 2"); }, Bound)) << log();
+    call(newCall(Launcher, "Activate", {BusNoOptions{}}));
+    EXPECT_TRUE(comesToFront("Preferences")) << log();
+}
+
+// ---- Preferences ----
+
+TEST_F(ApplicationTest, RecordsAHotKeyThatNoWindowGets) {
+    keepLibrary();
+    start();
+    const auto target = rig_.startTarget(TargetKind::GtkTextView);
+    expectSoon(*target, "x ;sig", "x Kind regards, Jo");
+    command({"show", "preferences"});
+    ASSERT_TRUE(comesToFront("Preferences")) << log();
+    ASSERT_TRUE(click("Hot keys"));
+    const auto records = [&] {
+        if (!click("Switch expansion on and off")) return false;
+        // The window would be closed by it.
+        rig_.keyboard().chord({Key::LeftControl}, U'w');
+        return waitUntil(
+            [&] { return reader().text(plume_->process().pid(), "Switch expansion on and off") == "Ctrl+W"; },
+            Milliseconds(1'000));
+    };
+    ASSERT_TRUE(waitUntil(records, Bound)) << log();
+    EXPECT_TRUE(hasFocus("Preferences"));
+    target->activate();
+    EXPECT_EQ(target->text(), "x Kind regards, Jo");
+    expectSoon(*target, "x ;sig", "x Kind regards, Jo");
+    rig_.keyboard().chord({Key::LeftControl}, U'w');
+    expectAtOnce(*target, "x ;sig.", "x ;sig.");
+}
+
+// ---- The desktop around it ----
+
+TEST_F(ApplicationTest, HearsNothingWhileTheMachineSleeps) {
+    keepLibrary();
+    BusService manager(sessionBusAddress(), "org.freedesktop.login1", [](DBusMessage*) { return nullptr; });
+    start({"DBUS_SYSTEM_BUS_ADDRESS=" + sessionBusAddress()});
+    const auto target = rig_.startTarget(TargetKind::GtkTextView);
+    expectSoon(*target, "x ;sig", "x Kind regards, Jo");
+    // Again and again, as Plume may not listen yet.
+    const auto holdsWhen = [&](dbus_bool_t sleeps, const std::string& expected) {
+        const BusMessage signal(
+            dbus_message_new_signal("/org/freedesktop/login1", "org.freedesktop.login1.Manager", "PrepareForSleep"));
+        dbus_message_append_args(signal.get(), DBUS_TYPE_BOOLEAN, &sleeps, DBUS_TYPE_INVALID);
+        return waitUntil(
+            [&] {
+                manager.send(signal);
+                return rig::becomes(rig_, *target, "x ;sig.", expected, Milliseconds(1'000));
+            },
+            Bound);
+    };
+    EXPECT_TRUE(holdsWhen(TRUE, "x ;sig.")) << log();
+    EXPECT_TRUE(holdsWhen(FALSE, "x Kind regards, Jo.")) << log();
+}
+
+class ApplicationInTrayTest : public ApplicationTest {
+  protected:
+    void SetUp() override {
+        ApplicationTest::SetUp();
+        keepLibrary();
+        start();
+        target_ = rig_.startTarget(TargetKind::GtkTextView);
+    }
+
+    void startTray() { tray_ = rig_.session().start({"trayer", "--widthtype", "request"}, "trayer"); }
+    bool iconIs(bool shown) {
+        const std::string expected = shown ? "\"icon\": true" : "\"icon\": false";
+        return waitUntil([&] { return stateHas(expected); }, Bound);
+    }
+
+    // Plume's icon is the only one.
+    void clickOnIcon() {
+        XClient& client = rig_.client();
+        for (const xcb_window_t window : client.managedWindows()) {
+            if (client.property(window, "_NET_WM_NAME") != "panel") continue;
+            const XClient::Place place = client.placeOf(window);
+            return rig_.click(place.x + place.width / 2, place.y + place.height / 2);
+        }
+        ADD_FAILURE() << "there is no tray";
+    }
+
+    bool menusAre(int count) {
+        return waitUntil([&] { return shownMenus() == count; }, Bound);
+    }
+
+    std::unique_ptr<TargetProgram> target_;
+    std::unique_ptr<ChildProcess> tray_;
+
+  private:
+    // Windows that the window manager has nothing to do with.
+    std::ptrdiff_t shownMenus() {
+        XClient& client = rig_.client();
+        auto* connection = client.connection();
+        const auto tree = own(xcb_query_tree_reply(connection, xcb_query_tree(connection, client.root()), nullptr));
+        const std::span windows(xcb_query_tree_children(tree.get()), tree->children_len);
+        return std::ranges::count_if(windows, [&](xcb_window_t window) {
+            const auto cookie = xcb_get_window_attributes(connection, window);
+            const auto attributes = own(xcb_get_window_attributes_reply(connection, cookie, nullptr));
+            const bool isShown = attributes && attributes->map_state == XCB_MAP_STATE_VIEWABLE;
+            return isShown && client.property(window, "WM_CLASS").starts_with("plume");
+        });
+    }
+};
+
+TEST_F(ApplicationInTrayTest, OutlivesTheTrayAndFindsTheNext) {
+    for (int trays = 0; trays < 2; ++trays) {
+        startTray();
+        ASSERT_TRUE(iconIs(true)) << log();
+        ASSERT_EQ(kill(tray_->pid(), SIGKILL), 0);
+        EXPECT_TRUE(iconIs(false)) << log();
+        expectSoon(*target_, "x ;sig", "x Kind regards, Jo");
+    }
+}
+
+TEST_F(ApplicationInTrayTest, SendsASnippetFromTheMenuIntoTheProgramInFront) {
+    startTray();
+    ASSERT_TRUE(iconIs(true)) << log();
+    target_->activate();
+    clickOnIcon();
+    ASSERT_TRUE(menusAre(1)) << log();
+    // The menu itself holds the keyboard, and Plume looks every three seconds whether somebody does.
+    EXPECT_FALSE(waitUntil([&] { return stateHas("\"secureInput\": true"); }, Milliseconds(3'500)));
+    for (const Key key : {Key::Down, Key::Down, Key::Right}) rig_.keyboard().tap(key);
+    EXPECT_TRUE(menusAre(2)) << log();
+    rig_.keyboard().tap(Key::Return);
+    EXPECT_EQ(target_->awaitText("Kind regards, Jo"), "Kind regards, Jo") << log();
+    EXPECT_TRUE(menusAre(0));
+}
+
+}  // namespace
+
+}  // namespace plume::rig
