@@ -1,0 +1,28 @@
+#!/bin/bash
+# Takes the pictures of docs/windows.md anew: tools/pictures.sh BUILD
+set -euo pipefail
+
+build=$1
+documents=$(cd "$(dirname "$0")/../docs/pictures" && pwd)
+PLUME_PICTURES=$(mktemp -d)
+export PLUME_PICTURES
+trap 'rm -rf "$PLUME_PICTURES"' EXIT
+
+for tests in windows preferences status; do
+    LC_ALL=C.UTF-8 "$build/bin/plume_${tests}_tests" --gtest_brief=1
+done
+
+while read -r taken name; do
+    cp "$PLUME_PICTURES/$taken.png" "$documents/$name.png"
+done <<PICTURES
+Welcome welcome
+General preferences-general
+HotKeys preferences-hot-keys
+Applications-own preferences-applications
+Typing-dark preferences-dark
+Decisions decisions
+Restore restore
+Diagnostic diagnostics
+status-menu-light menu
+status-icons icons
+PICTURES
