@@ -278,6 +278,8 @@ void AppDelegate::hotKeyPressed(HotKeyForWindow hotKey) {
             return makeSnippetFromClipboard();
         case HotKeyForWindow::MakeSnippetFromSelection:
             return makeSnippetFromSelection();
+        case HotKeyForWindow::OpenMainWindow:
+            return windows_.showMacrosWindow(false);
     }
 }
 

@@ -109,6 +109,7 @@ HotKeyDispatch::Actions Composition::hotKeyActions() {
     if (const auto& toWindow = environment_.hotKeyForWindow) {
         actions.makeSnippetFromClipboard = [&toWindow] { toWindow(HotKeyForWindow::MakeSnippetFromClipboard); };
         actions.makeSnippetFromSelection = [&toWindow] { toWindow(HotKeyForWindow::MakeSnippetFromSelection); };
+        actions.openMainWindow = [&toWindow] { toWindow(HotKeyForWindow::OpenMainWindow); };
     }
     return actions;
 }
@@ -120,11 +121,14 @@ Composition::~Composition() {
 
 void Composition::loadPreferences() {
     const UserDefaults& settings = environment_.settings;
-    engine_->setEnabled(settings.boolForKey("IsEnabled"));
+    // Only a switch takes away what was typed so far: settings come back here when the user is typing on.
+    const bool isEnabled = settings.boolForKey("IsEnabled");
+    if (isEnabled != engine_->enabled()) engine_->setEnabled(isEnabled);
     applyTo(engine_->correction(), settings);
     engine_->sender().setPlayFeedbackSound(settings.boolForKey("PlayFeedbackSound"));
     engine_->sender().setFeedbackSound(toUtf8(settings.stringForKey("FeedbackSound").value_or(u"")));
     engine_->setSnippetSelectorKeyModifier(settings.integerForKey("SnippetSelectorKeyModifier"));
+    engine_->setSnippetAdaptToAbbreviationCaseOption(settings.integerForKey("SnippetAdaptToAbbreviationCaseOption"));
     applyTo(*inputService_, settings);
     const std::string rows = toUtf8(settings.stringForKey(OwnApplications).value_or(u""));
     if (const auto read = inputService_->setOwnApplicationRows(rows, OwnApplications); !read) {

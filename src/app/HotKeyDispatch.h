@@ -18,7 +18,7 @@
 namespace plume {
 
 // Hot keys that do something in a window, or with one.
-enum class HotKeyForWindow : std::uint8_t { MakeSnippetFromClipboard, MakeSnippetFromSelection };
+enum class HotKeyForWindow : std::uint8_t { MakeSnippetFromClipboard, MakeSnippetFromSelection, OpenMainWindow };
 
 class HotKeyDispatch {
   public:

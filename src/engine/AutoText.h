@@ -84,6 +84,9 @@ class AutoText {
     const Groups& snippetGroups() const { return snippetGroups_; }
     // How content is adapted to the case in which its abbreviation was typed.
     std::int64_t snippetAdaptToAbbreviationCaseOption() const { return snippetAdaptToAbbreviationCaseOption_; }
+    void setSnippetAdaptToAbbreviationCaseOption(std::int64_t option) {
+        snippetAdaptToAbbreviationCaseOption_ = option;
+    }
     // Kept until the next key.
     const std::optional<UndoInformation>& undoInfo() const { return undoInfo_; }
 

@@ -215,6 +215,17 @@ TEST_F(RunningApplicationTest, SwitchesExpansionFromMenuHotKeyAndSettingsAlike) 
     EXPECT_EQ(typed(u";a"), u";ax;a");
 }
 
+// Whoever switches expansion on types at once, while the setting is still being written.
+TEST_F(RunningApplicationTest, KeepsWhatWasTypedWhenASettingChanges) {
+    start();
+    machine_.add(u";sig", u"Regards");
+    settle();
+    EXPECT_EQ(typed(u";si"), u";si");
+    machine_.settings.set("PlayFeedbackSound", false);
+    settle();
+    EXPECT_EQ(typed(u"g"), u"Regards");
+}
+
 TEST_F(RunningApplicationTest, ShowsTheIconAsTheSettingSays) {
     machine_.settings.set("ShowStatusIcon", false);
     start();
@@ -253,6 +264,15 @@ TEST_F(RunningApplicationTest, SendsAChosenSnippetOnceNoMenuHoldsTheKeyboard) {
     pass(2);
     EXPECT_EQ(desktop_.front()->field().text(), u"Regards");
     EXPECT_THAT(reports_.reports().back().sentence, HasSubstr("not sent"));
+}
+
+TEST_F(RunningApplicationTest, ShowsTheMainWindowAtItsHotKey) {
+    start();
+    machine_.settings.set("openMainWindowHotKey", std::int64_t{8589934630});  // Control+J
+    settle();
+    desktop_.pressAndRelease(KeyCode::J, KeyModifier::Control);
+    settle();
+    EXPECT_THAT(windows_.shown, ElementsAre("main"));
 }
 
 TEST_F(RunningApplicationTest, MakesSnippetsFromTheClipboardAndTheSelection) {
