@@ -60,7 +60,7 @@ void Snippet::readContent(const KeyedDecoder& coder) {
         if (rich) {
             setRichTextContent(std::move(rich).value());
         } else {
-            unreadContent_ = std::move(*data);
+            unreadContent_ = std::make_shared<const ArchivedData>(std::move(*data));
         }
     }
 }
@@ -200,10 +200,12 @@ std::shared_ptr<Snippet> Snippet::snapshot() const {
 bool Snippet::isSameRecordAs(const Snippet& other) const {
     const auto record = [](const Snippet& snippet) {
         return std::tie(snippet.uuid_, snippet.abbreviation_, snippet.caseSensitivity_, snippet.contentType_,
-                        snippet.richTextContent_, snippet.unreadContent_, snippet.label_, snippet.note_,
-                        snippet.dateCreated_, snippet.dateModified_, snippet.lastTimeUsed_);
+                        snippet.richTextContent_, snippet.label_, snippet.note_, snippet.dateCreated_,
+                        snippet.dateModified_, snippet.lastTimeUsed_);
     };
-    return record(*this) == record(other);
+    const bool sameUnread = unreadContent_ && other.unreadContent_ ? *unreadContent_ == *other.unreadContent_
+                                                                   : unreadContent_ == other.unreadContent_;
+    return sameUnread && record(*this) == record(other);
 }
 
 void Snippet::encodeWithCoder(KeyedEncoder& coder) const {

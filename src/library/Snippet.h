@@ -112,15 +112,15 @@ class Snippet final : public KeyedCodable {
     ArchivedContent archivedContent() const;
 
     std::optional<Uuid> uuid_;
-    std::uint64_t revision_ = 0;
     bool initialized_ = false;
+    std::uint64_t revision_ = 0;
     Text abbreviation_;
     std::uint64_t abbreviationHash_ = EmptySuffixHash;
     CaseSensitivity caseSensitivity_ = CaseSensitivity::CaseSensitive;
     ContentType contentType_ = ContentType::PlainText;
     std::optional<AttributedString> richTextContent_;
     // Archived bytes that could not be read, written back until the snippet is given a content.
-    std::optional<ArchivedData> unreadContent_;
+    std::shared_ptr<const ArchivedData> unreadContent_;
     Text label_;
     std::optional<Date> dateCreated_;
     std::optional<Date> dateModified_;

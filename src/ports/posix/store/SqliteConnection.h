@@ -40,6 +40,9 @@ class SqliteConnection {
     // What is in the file stays as it is when the connection ends.
     void leaveAsItIs() const;
 
+    // Gives the memory back that pages of the file are kept in: a library is read once, and written seldom.
+    void freePages() const { sqlite3_db_release_memory(handle()); }
+
     const std::filesystem::path& file() const { return file_; }
     sqlite3* handle() const { return database_.get(); }
 

@@ -34,6 +34,7 @@ Result<LibraryStorage::Stored> SqliteLibraryStorage::load() {
             throw;
         }
         connection_.run("COMMIT");
+        connection_.freePages();
         return stored;
     });
 }
@@ -97,6 +98,7 @@ LibraryStorage::Written SqliteLibraryStorage::save(std::string_view archive, Gen
             .step();
         SqliteStatement(saving_, "DELETE FROM journal WHERE generation <= ?").bind(1, basedOn).step();
     });
+    saving_.freePages();
     if (saved && std::holds_alternative<Generation>(saved.value())) {
         const std::lock_guard lock(mutex_);
         savedUpTo_ = basedOn;
