@@ -20,7 +20,8 @@ namespace {
 
 constexpr const char* Library = R"json([
   { "name": "Greetings", "abbreviationPrefix": ";", "expandAfter": 2, "expandTrigger": 0, "items": [
-      { "abbreviation": "sig", "content": "Kind regards, Jo" } ] }
+      { "abbreviation": "sig", "content": "Kind regards, Jo" },
+      { "abbreviation": "brb", "content": "be right back", "caseSensitivity": 2 } ] }
 ])json";
 
 constexpr Milliseconds Bound(10'000);
@@ -131,6 +132,16 @@ TEST_F(ApplicationTest, EndsAtOnceAndKeepsWhatWasAddedLast) {
     EXPECT_EQ(runPlume(rig_, {"status"}).status, 1);
 }
 
+// As where a desktop ends without a word.
+TEST_F(ApplicationTest, EndsWithTheDisplayAndKeepsWhatWasAddedLast) {
+    keepLibrary();
+    start();
+    command({"add", "last;", "kept"});
+    rig_.server().crash();
+    EXPECT_EQ(plume_->process().waitForExit(Milliseconds(5'000)), 1) << log();
+    EXPECT_EQ(command({"expand", "last;"}), "kept\n");
+}
+
 TEST_F(ApplicationTest, ASecondStartShowsTheFirst) {
     keepLibrary();
     start();
@@ -228,12 +239,90 @@ TEST_F(ApplicationOnBusTest, LaunchersAndScriptsReachIt) {
     call(newCall(Launcher, "Open", {std::vector<std::string>{uri}, BusNoOptions{}}));
     ASSERT_TRUE(comesToFront("Restore / Import data from more snippets.csv")) << log();
     ASSERT_TRUE(click("Import"));
-    EXPECT_TRUE(waitUntil([&] { return stateHas("\"snippets\": 2"); }, Bound)) << log();
+    EXPECT_TRUE(waitUntil([&] { return stateHas("\"snippets\": 3"); }, Bound)) << log();
     call(newCall(Launcher, "Activate", {BusNoOptions{}}));
     EXPECT_TRUE(comesToFront("Preferences")) << log();
 }
 
 // ---- Preferences ----
+
+class ApplicationSettingsTest : public ApplicationTest {
+  protected:
+    void SetUp() override {
+        ApplicationTest::SetUp();
+        keepLibrary();
+        start();
+        target_ = rig_.startTarget(TargetKind::GtkTextView);
+        expectSoon(*target_, "x ;sig", "x Kind regards, Jo");
+    }
+
+    // Clicks on these names on a page of the preferences, one after another, and goes back to the program.
+    void change(const std::string& page, const std::vector<std::string>& controls) {
+        command({"show", "preferences"});
+        ASSERT_TRUE(comesToFront("Preferences")) << log();
+        ASSERT_TRUE(click(page)) << page;
+        for (const std::string& control : controls) ASSERT_TRUE(click(control)) << control;
+        target_->activate();
+    }
+
+    std::unique_ptr<TargetProgram> target_;
+};
+
+TEST_F(ApplicationSettingsTest, AreInForceForWhatIsTypedNext) {
+    const struct {
+        const char* page;
+        const char* control;
+        const char* typed;
+        const char* before;
+        const char* after;
+    } settings[] = {
+        {"Correction", "Correct two capitals at the start of a word", "HEllo ", "HEllo ", "Hello "},
+        {"Correction", "Begin every sentence with a capital", "1 one. two ", "1 one. two ", "1 one. Two "},
+        {"Expansion", "Mixed case gives every word a capital", ";bRb", "be right back", "Be Right Back"},
+        {"General", "Expand abbreviations", "1 ;sig.", "1 Kind regards, Jo.", "1 ;sig."},
+        {"General", "Expand abbreviations", "1 ;sig.", "1 ;sig.", "1 Kind regards, Jo."},
+    };
+    for (const auto& setting : settings) {
+        SCOPED_TRACE(setting.control);
+        expectAtOnce(*target_, setting.typed, setting.before);
+        change(setting.page, {setting.control});
+        expectSoon(*target_, setting.typed, setting.after);
+    }
+}
+
+TEST_F(ApplicationSettingsTest, SayWhetherTextsArePastedAndTheClipboardComesBack) {
+    // What was pasted stays on the clipboard then.
+    const auto isOnClipboard = [&] {
+        expectAtOnce(*target_, "x ;sig", "x Kind regards, Jo");
+        rig_.keyboard().chord({Key::LeftControl}, U'v');
+        const std::string both = "x Kind regards, JoKind regards, Jo";
+        return target_->awaitText(both, Milliseconds(1'000)) == both;
+    };
+    EXPECT_FALSE(isOnClipboard());
+    change("Typing and clipboard", {"Paste texts instead of typing them", "Give back what was copied after a paste"});
+    EXPECT_TRUE(waitUntil(isOnClipboard, Bound)) << log();
+}
+
+TEST_F(ApplicationSettingsTest, SayWhetherAClickEndsTheAbbreviation) {
+    const auto expandsAroundClick = [&] {
+        becomes(rig_, *target_, "x ;si", "x ;si");
+        const XClient::Place place = rig_.client().placeOf(target_->window());
+        rig_.click(place.x + place.width / 2, place.y + place.height / 2);
+        rig_.keyboard().type("g");
+        return target_->awaitText("x Kind regards, Jo", Milliseconds(1'000)) == "x Kind regards, Jo";
+    };
+    EXPECT_FALSE(expandsAroundClick()) << target_->text();
+    change("Expansion", {"A mouse click ends the abbreviation"});
+    EXPECT_TRUE(waitUntil(expandsAroundClick, Bound)) << target_->text();
+}
+
+TEST_F(ApplicationSettingsTest, StartAtTheNextLogin) {
+    const auto entry = rig_.directory() / "home/.config/autostart/org.plume.Plume.desktop";
+    for (const bool starts : {true, false}) {
+        change("General", {"Start Plume when I log in"});
+        EXPECT_TRUE(waitUntil([&] { return std::filesystem::exists(entry) == starts; }, Bound)) << starts;
+    }
+}
 
 TEST_F(ApplicationTest, RecordsAHotKeyThatNoWindowGets) {
     keepLibrary();
@@ -310,8 +399,8 @@ class ApplicationInTrayTest : public ApplicationTest {
         ADD_FAILURE() << "there is no tray";
     }
 
-    bool menusAre(int count) {
-        return waitUntil([&] { return shownMenus() == count; }, Bound);
+    bool menusAre(int count, Milliseconds within = Bound) {
+        return waitUntil([&] { return shownMenus() == count; }, within);
     }
 
     std::unique_ptr<TargetProgram> target_;
@@ -347,8 +436,12 @@ TEST_F(ApplicationInTrayTest, SendsASnippetFromTheMenuIntoTheProgramInFront) {
     startTray();
     ASSERT_TRUE(iconIs(true)) << log();
     target_->activate();
-    clickOnIcon();
-    ASSERT_TRUE(menusAre(1)) << log();
+    // The tray may still be making room for it.
+    const auto opens = [&] {
+        clickOnIcon();
+        return menusAre(1, Milliseconds(2'000));
+    };
+    ASSERT_TRUE(waitUntil(opens, Bound)) << log();
     // The menu itself holds the keyboard, and Plume looks every three seconds whether somebody does.
     EXPECT_FALSE(waitUntil([&] { return stateHas("\"secureInput\": true"); }, Milliseconds(3'500)));
     for (const Key key : {Key::Down, Key::Down, Key::Right}) rig_.keyboard().tap(key);
