@@ -21,6 +21,7 @@
 #include "library/DataManager.h"
 #include "library/KnownSettings.h"
 #include "ports/posix/InotifyFileWatcher.h"
+#include "ports/posix/PollRunLoop.h"
 #include "ports/posix/PosixFiles.h"
 #include "ports/posix/store/SqliteStore.h"
 #include "testing/rig/Deadline.h"

@@ -6,7 +6,9 @@ target_compile_options(plume_options INTERFACE
   -Wimplicit-fallthrough $<$<BOOL:${PLUME_WERROR}>:-Werror>
   # GCC 12 raises false alarms when it optimises: overlapping copies in plain string concatenation (its bug 105651), and
   # unset members in variants that hold strings. Clang's builds and the sanitizers keep watch over both.
-  $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict> $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
+  $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict> $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
+  # GCC takes a source that is compiled together with others for a header of theirs.
+  $<$<AND:$<CXX_COMPILER_ID:GNU>,$<BOOL:${CMAKE_UNITY_BUILD}>>:-Wno-subobject-linkage>)
 if(PLUME_SANITIZE)
   target_compile_options(plume_options INTERFACE
     -fsanitize=${PLUME_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
@@ -20,6 +22,13 @@ function(plume_add_library name)
   add_library(${name} STATIC ${LIB_SOURCES})
   target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/src)
   target_link_libraries(${name} PUBLIC ${LIB_SEES} PRIVATE plume_options)
+endfunction()
+
+# plume_compile_alone(<files…>)
+# Where the sources of a folder are compiled several at a time (CMAKE_UNITY_BUILD, which saves most of the time that headers
+# take), these are not: a name of theirs means something else in another file of the folder.
+function(plume_compile_alone)
+  set_source_files_properties(${ARGN} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
 endfunction()
 
 # For the sources of tests: what they test is optimised as the build says, they themselves are compiled in half the time.

@@ -1,16 +1,20 @@
 #!/usr/bin/env bash
 # Runs clang-tidy on the .cpp files of the change, and through them on the headers that they include.
-# What the build folder does not build (in build/default, benchmarks and fuzzers) is left out.
+# What the build folder does not build (in build/tidy, benchmarks and fuzzers) is left out.
 #   tools/tidy_change.sh [BRANCH]
 # The change is what came since HEAD left BRANCH (origin/main when none is named). When that is HEAD itself, it is what came
 # since the newest commit older than PLUME_TIDY_SINCE ("4 hours ago"), and every file when there is no such commit.
 # A large change would take too long: of more than PLUME_TIDY_FILES (40) files, those with the most new lines are checked.
-# PLUME_TIDY_BUILD (build/default) is a build folder with compile commands.
+# PLUME_TIDY_BUILD is a build folder with the commands that compile each source by itself; when none is named, build/tidy
+# is made.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 most=${PLUME_TIDY_FILES:-40}
-build=${PLUME_TIDY_BUILD:-build/default}
+build=${PLUME_TIDY_BUILD:-build/tidy}
 sources=('src/*.cpp' 'testing/*.cpp' 'tests/*.cpp' 'bench/*.cpp')
+if [ -z "${PLUME_TIDY_BUILD:-}" ]; then
+    cmake --preset tidy >/dev/null
+fi
 [ -f "$build/compile_commands.json" ] || { echo "$build is no build folder: build there first" >&2; exit 2; }
 root=$(sed -n 's/^CMAKE_HOME_DIRECTORY:INTERNAL=//p' "$build/CMakeCache.txt")
 

@@ -280,7 +280,7 @@ int runApplication(int argc, char** argv, std::ostream& error) {
     QApplication::setQuitOnLastWindowClosed(false);
     installTranslations(application, translationFolder());
     QApplication::setWindowIcon(applicationIcon());
-    followColorScheme(application);
+    const auto colorScheme = followColorScheme();
     QtRunLoop loop;
     const Result<InstanceLock> lock = InstanceLock::take({});
     if (!lock) return refuseSecondInstance(lock.error(), voice);

@@ -1,11 +1,6 @@
 #include "app/qt/ColorScheme.h"
 
 #include <QApplication>
-#include <QDBusConnection>
-#include <QDBusMessage>
-#include <QDBusPendingCallWatcher>
-#include <QDBusPendingReply>
-#include <QDBusVariant>
 #include <QPalette>
 #include <QStyle>
 
@@ -14,13 +9,6 @@
 namespace plume {
 
 namespace {
-
-constexpr const char* Portal = "org.freedesktop.portal.Desktop";
-constexpr const char* PortalPath = "/org/freedesktop/portal/desktop";
-constexpr const char* Settings = "org.freedesktop.portal.Settings";
-constexpr const char* Appearance = "org.freedesktop.appearance";
-constexpr const char* Key = "color-scheme";
-constexpr uint Dark = 1;
 
 // Texts that step back, or cannot be used now, can still be read.
 void setFaint(QPalette& palette, const QColor& help, const QColor& disabled) {
@@ -59,50 +47,19 @@ QPalette darkPalette() {
     return palette;
 }
 
-// The portal's value is a variant, which one of its two operations wraps into another.
-void take(QVariant value) {
-    while (value.canConvert<QDBusVariant>()) value = value.value<QDBusVariant>().variant();
-    setColorScheme(value.toUInt() == Dark);
-}
-
-class PortalListener final : public QObject {
-    Q_OBJECT
-  public:
-    using QObject::QObject;
-
-    void begin() {
-        QDBusConnection bus = QDBusConnection::sessionBus();
-        if (!bus.isConnected()) return;
-        bus.connect(Portal, PortalPath, Settings, "SettingChanged", this,
-                    SLOT(changed(QString, QString, QDBusVariant)));
-        QDBusMessage question = QDBusMessage::createMethodCall(Portal, PortalPath, Settings, "Read");
-        question << Appearance << Key;
-        auto* answer = new QDBusPendingCallWatcher(bus.asyncCall(question), this);
-        connect(answer, &QDBusPendingCallWatcher::finished, this, [](QDBusPendingCallWatcher* done) {
-            const QDBusPendingReply<QDBusVariant> reply = *done;
-            if (reply.isValid()) take(QVariant::fromValue(reply.value()));
-            done->deleteLater();
-        });
-    }
-
-  public Q_SLOTS:
-    void changed(const QString& group, const QString& key, const QDBusVariant& value) {
-        if (group == Appearance && key == Key) take(QVariant::fromValue(value));
-    }
-};
-
 }  // namespace
 
+// The application owns its style, which the analyzer does not know.
+// NOLINTBEGIN(clang-analyzer-cplusplus.NewDeleteLeaks)
 void setColorScheme(bool isDark) {
     if (!qobject_cast<WindowStyle*>(QApplication::style())) QApplication::setStyle(new WindowStyle);
     QApplication::setPalette(isDark ? darkPalette() : lightPalette());
 }
+// NOLINTEND(clang-analyzer-cplusplus.NewDeleteLeaks)
 
-void followColorScheme(QApplication& application) {
+std::unique_ptr<ColorSchemePortal> followColorScheme() {
     setColorScheme(qEnvironmentVariable("GTK_THEME").endsWith("dark", Qt::CaseInsensitive));
-    (new PortalListener(&application))->begin();
+    return std::make_unique<ColorSchemePortal>(setColorScheme);
 }
 
 }  // namespace plume
-
-#include "ColorScheme.moc"
