@@ -107,6 +107,36 @@ def check(path, expected):
     yield from shared_mnemonics(messages)
 
 
+STRING = r'"(?:[^"\\\n]|\\.)*"'
+
+
+def strings_in(root):
+    """The strings of the sources, pieces that stand behind each other as one."""
+    for path in (root / "src").rglob("*.cpp"):
+        if path.name != "Sentences.cpp":
+            for strings in re.findall(rf"{STRING}(?:\s*{STRING})*", path.read_text(encoding="utf-8")):
+                yield "".join(piece[1:-1] for piece in re.findall(STRING, strings)).replace('\\"', '"')
+
+
+def is_said(words, strings):
+    """Whether the words stand in one string, or go on from the end of one at the start of another."""
+    if any(words in string for string in strings):
+        return True
+    return any(
+        any(string.endswith(words[:end]) for string in strings)
+        and any(string.startswith(words[end:]) for string in strings)
+        for end in range(1, len(words))
+    )
+
+
+def unknown_sentences(root, expected):
+    """Those that windows would know, but that nobody says any more."""
+    strings = list(strings_in(root))
+    for context, source, *_ in sorted(expected):
+        if context == "Sentences" and not all(is_said(words, strings) for words in re.split(r"%\d", source)):
+            yield f"Sentences.cpp: nobody says '{source}'"
+
+
 def main():
     parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
     parser.add_argument("--lupdate", default="lupdate")
@@ -115,6 +145,7 @@ def main():
     expected = texts_in_sources(root, arguments.lupdate)
     files = sorted((root / "data" / "translations").glob("plume_*.ts"))
     faults = [f"{path.name}: {fault}" for path in files for fault in check(path, expected)]
+    faults += unknown_sentences(root, expected)
     print("\n".join(faults) or f"{len(expected)} texts in {len(files)} languages.")
     return 1 if faults or not files else 0
 

@@ -800,6 +800,237 @@
     </message>
 </context>
 <context>
+    <name>Sentences</name>
+    <message>
+        <source>Plume is not working: it cannot hear the keyboard.</source>
+        <translation>Plume arbeitet nicht: Es kann die Tastatur nicht hören.</translation>
+    </message>
+    <message>
+        <source>%1 takes keys, too. When letters get lost or come twice, end one of the two.</source>
+        <translation>%1 nimmt ebenfalls Tasten entgegen. Wenn Buchstaben verloren gehen oder doppelt kommen, eines der beiden Programme beenden.</translation>
+    </message>
+    <message>
+        <source>Listening to the keyboard was ended three times within a minute, because Plume did not answer in time. It is tried again in a minute.</source>
+        <translation>Das Mithören der Tastatur wurde dreimal innerhalb einer Minute beendet, weil Plume nicht rechtzeitig geantwortet hat. In einer Minute wird es wieder versucht.</translation>
+    </message>
+    <message>
+        <source>Plume does not listen</source>
+        <translation>Plume hört nicht zu</translation>
+    </message>
+    <message>
+        <source>Listen now</source>
+        <translation>Jetzt zuhören</translation>
+    </message>
+    <message>
+        <source>Show Reports</source>
+        <translation>Meldungen zeigen</translation>
+    </message>
+    <message>
+        <source>The snippet was not sent: another program holds the keyboard, or a password is asked for.</source>
+        <translation>Das Snippet wurde nicht gesendet: Ein anderes Programm hält die Tastatur fest, oder es wird nach einem Passwort gefragt.</translation>
+    </message>
+    <message>
+        <source>Another hot key of Plume&apos;s has this combination already.</source>
+        <translation>Eine andere Tastenkombination von Plume ist schon so belegt.</translation>
+    </message>
+    <message>
+        <source>Another program has this combination as its hot key already: choose another.</source>
+        <translation>Ein anderes Programm verwendet diese Tastenkombination schon: eine andere wählen.</translation>
+    </message>
+    <message>
+        <source>The keyboard has no key with code %1 for the hot key.</source>
+        <translation>Die Tastatur hat keine Taste mit dem Code %1 für die Tastenkombination.</translation>
+    </message>
+    <message>
+        <source>The keyboard &quot;%1&quot; of display &quot;%2&quot; is held by another program, perhaps another Plume or key tool: end that program.</source>
+        <translation>Die Tastatur „%1“ des Bildschirms „%2“ wird von einem anderen Programm festgehalten, vielleicht von einem anderen Plume oder einem Tastenwerkzeug: dieses Programm beenden.</translation>
+    </message>
+    <message>
+        <source>The X server &quot;%1&quot; lacks the XFIXES extension, which Plume needs to follow the clipboard: switch it on.</source>
+        <translation>Dem X-Server „%1“ fehlt die Erweiterung XFIXES, mit der Plume der Zwischenablage folgt: sie einschalten.</translation>
+    </message>
+    <message>
+        <source>The keyboard layout of the X display &quot;%1&quot; cannot be read: Plume needs an X server with the XKB extension.</source>
+        <translation>Die Tastaturbelegung des X-Bildschirms „%1“ kann nicht gelesen werden: Plume braucht einen X-Server mit der Erweiterung XKB.</translation>
+    </message>
+    <message>
+        <source>The X server of display &quot;%1&quot; lacks an XTEST keyboard on the main keyboard: was it removed with xinput?</source>
+        <translation>Dem X-Server des Bildschirms „%1“ fehlt eine XTEST-Tastatur an der Haupttastatur: Wurde sie mit xinput entfernt?</translation>
+    </message>
+    <message>
+        <source>The X server of display &quot;%1&quot; lacks %2</source>
+        <translation>Dem X-Server des Bildschirms „%1“ fehlt: %2</translation>
+    </message>
+    <message>
+        <source>Password fields in browsers</source>
+        <translation>Passwortfelder in Browsern</translation>
+    </message>
+    <message>
+        <source>Browsers and Qt programs tell Plume which field takes a password only while the desktop&apos;s accessibility is on, which makes them a little slower; until then Plume hears passwords that are typed there. %1</source>
+        <translation>Browser und Qt-Programme sagen Plume nur, welches Feld ein Passwort aufnimmt, solange die Barrierefreiheit des Desktops eingeschaltet ist, was sie ein wenig langsamer macht; bis dahin hört Plume Passwörter mit, die dort getippt werden. %1</translation>
+    </message>
+    <message>
+        <source>Your answer is kept; &quot;plume settings %1&quot; shows it.</source>
+        <translation>Die Antwort wird gemerkt; „plume settings %1“ zeigt sie.</translation>
+    </message>
+    <message>
+        <source>Switch on</source>
+        <translation>Einschalten</translation>
+    </message>
+    <message>
+        <source>Not now</source>
+        <translation>Nicht jetzt</translation>
+    </message>
+    <message>
+        <source>Programs tell about their password fields now; Chromium has to be started again. %1</source>
+        <translation>Programme melden ihre Passwortfelder jetzt; Chromium muss neu gestartet werden. %1</translation>
+    </message>
+    <message>
+        <source>The answer is not kept: %1</source>
+        <translation>Die Antwort wird nicht gemerkt: %1</translation>
+    </message>
+    <message>
+        <source>%1 is %2 from now on.</source>
+        <translation>%1 ist von jetzt an %2.</translation>
+    </message>
+    <message>
+        <source>Several snippets match &quot;%1&quot;, and there is no list here to choose from.</source>
+        <translation>Mehrere Snippets passen zu „%1“, und es gibt hier keine Liste zum Auswählen.</translation>
+    </message>
+    <message>
+        <source>The snippet &quot;%1&quot; has fields to fill in, and there is no form here to do it.</source>
+        <translation>Das Snippet „%1“ hat Felder zum Ausfüllen, und es gibt hier kein Formular dafür.</translation>
+    </message>
+    <message>
+        <source>The snippet &quot;%1&quot; is not expanded, because its content never ends or is too long; check whether snippets include each other.</source>
+        <translation>Das Snippet „%1“ wird nicht eingesetzt, weil sein Inhalt nie endet oder zu lang ist; prüfen, ob Snippets einander enthalten.</translation>
+    </message>
+    <message>
+        <source>AppleScript snippets cannot run on this system: there is no %1.</source>
+        <translation>Snippets in AppleScript können auf diesem System nicht laufen: Es gibt kein %1.</translation>
+    </message>
+    <message>
+        <source>A script was ended because it wrote more than %1 million characters.</source>
+        <translation>Ein Skript wurde beendet, weil es mehr als %1 Millionen Zeichen schrieb.</translation>
+    </message>
+    <message>
+        <source>A script could not be run: the system gives no further thread.</source>
+        <translation>Ein Skript konnte nicht laufen: Das System gibt keinen weiteren Thread her.</translation>
+    </message>
+    <message>
+        <source>A script could not be run: %1.</source>
+        <translation>Ein Skript konnte nicht laufen: %1.</translation>
+    </message>
+    <message>
+        <source>Your library cannot be opened.</source>
+        <translation>Die Bibliothek lässt sich nicht öffnen.</translation>
+    </message>
+    <message>
+        <source>The library could not be exported.</source>
+        <translation>Die Bibliothek konnte nicht exportiert werden.</translation>
+    </message>
+    <message>
+        <source>The file could not be restored.</source>
+        <translation>Die Datei konnte nicht wiederhergestellt werden.</translation>
+    </message>
+    <message>
+        <source>The file could not be imported.</source>
+        <translation>Die Datei konnte nicht importiert werden.</translation>
+    </message>
+    <message>
+        <source>The library was damaged</source>
+        <translation>Die Bibliothek war beschädigt</translation>
+    </message>
+    <message>
+        <source>The library was damaged, and there is no backup of it.</source>
+        <translation>Die Bibliothek war beschädigt, und es gibt keine Sicherung von ihr.</translation>
+    </message>
+    <message>
+        <source>The library was damaged. The newest backup is %1. What could not be read is kept beside it.</source>
+        <translation>Die Bibliothek war beschädigt. Die neueste Sicherung ist %1. Was nicht zu lesen war, liegt daneben.</translation>
+    </message>
+    <message>
+        <source>Restore</source>
+        <translation>Wiederherstellen</translation>
+    </message>
+    <message>
+        <source>The library cannot be read: %1. It is kept in %2.</source>
+        <translation>Die Bibliothek kann nicht gelesen werden: %1. Sie liegt in %2.</translation>
+    </message>
+    <message>
+        <source>The last changes of the library cannot be read: %1</source>
+        <translation>Die letzten Änderungen der Bibliothek können nicht gelesen werden: %1</translation>
+    </message>
+    <message>
+        <source>No backup was made: %1</source>
+        <translation>Es wurde keine Sicherung angelegt: %1</translation>
+    </message>
+    <message>
+        <source>An old backup stays: %1</source>
+        <translation>Eine alte Sicherung bleibt: %1</translation>
+    </message>
+    <message>
+        <source>nothing was replaced, because the library of now cannot be kept: %1</source>
+        <translation>nichts wurde ersetzt, weil die jetzige Bibliothek nicht aufgehoben werden kann: %1</translation>
+    </message>
+    <message>
+        <source>The sync folder %1 is not there; the library is sent when it comes.</source>
+        <translation>Der Abgleichordner %1 ist nicht da; die Bibliothek wird gesendet, sobald er kommt.</translation>
+    </message>
+    <message>
+        <source>Another machine had changed the library meanwhile; its version is kept in %1.</source>
+        <translation>Ein anderer Rechner hatte die Bibliothek inzwischen geändert; seine Fassung liegt in %1.</translation>
+    </message>
+    <message>
+        <source>The library was replaced by another machine&apos;s. What it held, with changes that were not sent yet, is in %1.</source>
+        <translation>Die Bibliothek wurde durch die eines anderen Rechners ersetzt. Was sie enthielt, auch Änderungen, die noch nicht gesendet waren, liegt in %1.</translation>
+    </message>
+    <message>
+        <source>The library is not sent, because the other one in the sync folder cannot be kept: %1</source>
+        <translation>Die Bibliothek wird nicht gesendet, weil die andere im Abgleichordner nicht aufgehoben werden kann: %1</translation>
+    </message>
+    <message>
+        <source>The library in the sync folder is not taken over, because this machine&apos;s cannot be kept: %1</source>
+        <translation>Die Bibliothek im Abgleichordner wird nicht übernommen, weil die dieses Rechners nicht aufgehoben werden kann: %1</translation>
+    </message>
+    <message>
+        <source>The library in the sync folder cannot be read and is left alone: %1</source>
+        <translation>Die Bibliothek im Abgleichordner kann nicht gelesen werden und bleibt, wie sie ist: %1</translation>
+    </message>
+    <message>
+        <source>The library was not sent to the sync folder: another machine writes it all the time</source>
+        <translation>Die Bibliothek wurde nicht in den Abgleichordner gesendet: Ein anderer Rechner schreibt sie unablässig</translation>
+    </message>
+    <message>
+        <source>The library was not sent to the sync folder: %1</source>
+        <translation>Die Bibliothek wurde nicht in den Abgleichordner gesendet: %1</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read: %2</source>
+        <translation>%1 kann nicht gelesen werden: %2</translation>
+    </message>
+    <message>
+        <source>%1 cannot be written: %2</source>
+        <translation>%1 kann nicht geschrieben werden: %2</translation>
+    </message>
+    <message>
+        <source>%1 cannot be used: %2</source>
+        <translation>%1 kann nicht benutzt werden: %2</translation>
+    </message>
+    <message>
+        <source>A script was ended because it ran longer than %1.</source>
+        <translation>Ein Skript wurde beendet, weil es länger als %1 lief.</translation>
+    </message>
+    <message>
+        <source>1 second</source>
+        <translation>1 Sekunde</translation>
+    </message>
+    <message>
+        <source>%1 seconds</source>
+        <translation>%1 Sekunden</translation>
+    </message>
+</context>
+<context>
     <name>TypingPage</name>
     <message>
         <source>Pasting</source>

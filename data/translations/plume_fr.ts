@@ -800,6 +800,237 @@
     </message>
 </context>
 <context>
+    <name>Sentences</name>
+    <message>
+        <source>Plume is not working: it cannot hear the keyboard.</source>
+        <translation>Plume ne fonctionne pas&#x202f;: il n’entend pas le clavier.</translation>
+    </message>
+    <message>
+        <source>%1 takes keys, too. When letters get lost or come twice, end one of the two.</source>
+        <translation>%1 prend aussi des touches. Si des lettres se perdent ou viennent deux fois, quittez l’un des deux.</translation>
+    </message>
+    <message>
+        <source>Listening to the keyboard was ended three times within a minute, because Plume did not answer in time. It is tried again in a minute.</source>
+        <translation>L’écoute du clavier a été interrompue trois fois en une minute, parce que Plume n’a pas répondu à temps. Elle reprendra dans une minute.</translation>
+    </message>
+    <message>
+        <source>Plume does not listen</source>
+        <translation>Plume n’écoute pas</translation>
+    </message>
+    <message>
+        <source>Listen now</source>
+        <translation>Écouter maintenant</translation>
+    </message>
+    <message>
+        <source>Show Reports</source>
+        <translation>Montrer les rapports</translation>
+    </message>
+    <message>
+        <source>The snippet was not sent: another program holds the keyboard, or a password is asked for.</source>
+        <translation>L’extrait n’a pas été envoyé&#x202f;: un autre programme tient le clavier, ou un mot de passe est demandé.</translation>
+    </message>
+    <message>
+        <source>Another hot key of Plume&apos;s has this combination already.</source>
+        <translation>Un autre raccourci de Plume a déjà cette combinaison.</translation>
+    </message>
+    <message>
+        <source>Another program has this combination as its hot key already: choose another.</source>
+        <translation>Un autre programme a déjà cette combinaison pour raccourci&#x202f;: choisissez-en une autre.</translation>
+    </message>
+    <message>
+        <source>The keyboard has no key with code %1 for the hot key.</source>
+        <translation>Le clavier n’a pas de touche de code %1 pour le raccourci.</translation>
+    </message>
+    <message>
+        <source>The keyboard &quot;%1&quot; of display &quot;%2&quot; is held by another program, perhaps another Plume or key tool: end that program.</source>
+        <translation>Le clavier «&#x202f;%1&#x202f;» de l’affichage «&#x202f;%2&#x202f;» est tenu par un autre programme, peut-être un autre Plume ou un outil de clavier&#x202f;: quittez ce programme.</translation>
+    </message>
+    <message>
+        <source>The X server &quot;%1&quot; lacks the XFIXES extension, which Plume needs to follow the clipboard: switch it on.</source>
+        <translation>Il manque au serveur X «&#x202f;%1&#x202f;» l’extension XFIXES, par laquelle Plume suit le presse-papiers&#x202f;: activez-la.</translation>
+    </message>
+    <message>
+        <source>The keyboard layout of the X display &quot;%1&quot; cannot be read: Plume needs an X server with the XKB extension.</source>
+        <translation>La disposition du clavier de l’affichage X «&#x202f;%1&#x202f;» est illisible&#x202f;: Plume a besoin d’un serveur X avec l’extension XKB.</translation>
+    </message>
+    <message>
+        <source>The X server of display &quot;%1&quot; lacks an XTEST keyboard on the main keyboard: was it removed with xinput?</source>
+        <translation>Il manque au serveur X de l’affichage «&#x202f;%1&#x202f;» un clavier XTEST sur le clavier principal&#x202f;: a-t-il été retiré avec xinput&#x202f;?</translation>
+    </message>
+    <message>
+        <source>The X server of display &quot;%1&quot; lacks %2</source>
+        <translation>Il manque au serveur X de l’affichage «&#x202f;%1&#x202f;»&#x202f;: %2</translation>
+    </message>
+    <message>
+        <source>Password fields in browsers</source>
+        <translation>Champs de mot de passe des navigateurs</translation>
+    </message>
+    <message>
+        <source>Browsers and Qt programs tell Plume which field takes a password only while the desktop&apos;s accessibility is on, which makes them a little slower; until then Plume hears passwords that are typed there. %1</source>
+        <translation>Les navigateurs et les programmes Qt ne disent à Plume quel champ prend un mot de passe que si l’accessibilité du bureau est activée, ce qui les ralentit un peu&#x202f;; d’ici là, Plume entend les mots de passe qui y sont tapés. %1</translation>
+    </message>
+    <message>
+        <source>Your answer is kept; &quot;plume settings %1&quot; shows it.</source>
+        <translation>Votre réponse est gardée&#x202f;; «&#x202f;plume settings %1&#x202f;» la montre.</translation>
+    </message>
+    <message>
+        <source>Switch on</source>
+        <translation>Activer</translation>
+    </message>
+    <message>
+        <source>Not now</source>
+        <translation>Pas maintenant</translation>
+    </message>
+    <message>
+        <source>Programs tell about their password fields now; Chromium has to be started again. %1</source>
+        <translation>Les programmes annoncent maintenant leurs champs de mot de passe&#x202f;; Chromium doit être redémarré. %1</translation>
+    </message>
+    <message>
+        <source>The answer is not kept: %1</source>
+        <translation>La réponse n’est pas gardée&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>%1 is %2 from now on.</source>
+        <translation>%1 vaut %2 à partir de maintenant.</translation>
+    </message>
+    <message>
+        <source>Several snippets match &quot;%1&quot;, and there is no list here to choose from.</source>
+        <translation>Plusieurs extraits répondent à «&#x202f;%1&#x202f;», et il n’y a pas ici de liste pour choisir.</translation>
+    </message>
+    <message>
+        <source>The snippet &quot;%1&quot; has fields to fill in, and there is no form here to do it.</source>
+        <translation>L’extrait «&#x202f;%1&#x202f;» a des champs à remplir, et il n’y a pas ici de formulaire pour cela.</translation>
+    </message>
+    <message>
+        <source>The snippet &quot;%1&quot; is not expanded, because its content never ends or is too long; check whether snippets include each other.</source>
+        <translation>L’extrait «&#x202f;%1&#x202f;» n’est pas développé, parce que son contenu ne finit jamais ou est trop long&#x202f;; vérifiez si des extraits s’incluent l’un l’autre.</translation>
+    </message>
+    <message>
+        <source>AppleScript snippets cannot run on this system: there is no %1.</source>
+        <translation>Les extraits en AppleScript ne peuvent pas fonctionner sur ce système&#x202f;: il n’y a pas de %1.</translation>
+    </message>
+    <message>
+        <source>A script was ended because it wrote more than %1 million characters.</source>
+        <translation>Un script a été arrêté parce qu’il écrivait plus de %1 millions de caractères.</translation>
+    </message>
+    <message>
+        <source>A script could not be run: the system gives no further thread.</source>
+        <translation>Un script n’a pas pu être lancé&#x202f;: le système n’accorde pas d’autre fil d’exécution.</translation>
+    </message>
+    <message>
+        <source>A script could not be run: %1.</source>
+        <translation>Un script n’a pas pu être lancé&#x202f;: %1.</translation>
+    </message>
+    <message>
+        <source>Your library cannot be opened.</source>
+        <translation>Votre bibliothèque ne peut pas être ouverte.</translation>
+    </message>
+    <message>
+        <source>The library could not be exported.</source>
+        <translation>La bibliothèque n’a pas pu être exportée.</translation>
+    </message>
+    <message>
+        <source>The file could not be restored.</source>
+        <translation>Le fichier n’a pas pu être restauré.</translation>
+    </message>
+    <message>
+        <source>The file could not be imported.</source>
+        <translation>Le fichier n’a pas pu être importé.</translation>
+    </message>
+    <message>
+        <source>The library was damaged</source>
+        <translation>La bibliothèque était endommagée</translation>
+    </message>
+    <message>
+        <source>The library was damaged, and there is no backup of it.</source>
+        <translation>La bibliothèque était endommagée, et il n’y en a pas de sauvegarde.</translation>
+    </message>
+    <message>
+        <source>The library was damaged. The newest backup is %1. What could not be read is kept beside it.</source>
+        <translation>La bibliothèque était endommagée. La sauvegarde la plus récente est %1. Ce qui n’a pas pu être lu est gardé à côté.</translation>
+    </message>
+    <message>
+        <source>Restore</source>
+        <translation>Restaurer</translation>
+    </message>
+    <message>
+        <source>The library cannot be read: %1. It is kept in %2.</source>
+        <translation>La bibliothèque ne peut pas être lue&#x202f;: %1. Elle est gardée dans %2.</translation>
+    </message>
+    <message>
+        <source>The last changes of the library cannot be read: %1</source>
+        <translation>Les derniers changements de la bibliothèque ne peuvent pas être lus&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>No backup was made: %1</source>
+        <translation>Aucune sauvegarde n’a été faite&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>An old backup stays: %1</source>
+        <translation>Une ancienne sauvegarde reste&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>nothing was replaced, because the library of now cannot be kept: %1</source>
+        <translation>rien n’a été remplacé, parce que la bibliothèque actuelle ne peut pas être gardée&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>The sync folder %1 is not there; the library is sent when it comes.</source>
+        <translation>Le dossier de synchronisation %1 n’est pas là&#x202f;; la bibliothèque sera envoyée quand il viendra.</translation>
+    </message>
+    <message>
+        <source>Another machine had changed the library meanwhile; its version is kept in %1.</source>
+        <translation>Une autre machine avait changé la bibliothèque entre-temps&#x202f;; sa version est gardée dans %1.</translation>
+    </message>
+    <message>
+        <source>The library was replaced by another machine&apos;s. What it held, with changes that were not sent yet, is in %1.</source>
+        <translation>La bibliothèque a été remplacée par celle d’une autre machine. Ce qu’elle contenait, avec les changements pas encore envoyés, est dans %1.</translation>
+    </message>
+    <message>
+        <source>The library is not sent, because the other one in the sync folder cannot be kept: %1</source>
+        <translation>La bibliothèque n’est pas envoyée, parce que l’autre, dans le dossier de synchronisation, ne peut pas être gardée&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>The library in the sync folder is not taken over, because this machine&apos;s cannot be kept: %1</source>
+        <translation>La bibliothèque du dossier de synchronisation n’est pas reprise, parce que celle de cette machine ne peut pas être gardée&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>The library in the sync folder cannot be read and is left alone: %1</source>
+        <translation>La bibliothèque du dossier de synchronisation ne peut pas être lue et reste telle quelle&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>The library was not sent to the sync folder: another machine writes it all the time</source>
+        <translation>La bibliothèque n’a pas été envoyée au dossier de synchronisation&#x202f;: une autre machine l’écrit sans cesse</translation>
+    </message>
+    <message>
+        <source>The library was not sent to the sync folder: %1</source>
+        <translation>La bibliothèque n’a pas été envoyée au dossier de synchronisation&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>%1 cannot be read: %2</source>
+        <translation>%1 ne peut pas être lu&#x202f;: %2</translation>
+    </message>
+    <message>
+        <source>%1 cannot be written: %2</source>
+        <translation>%1 ne peut pas être écrit&#x202f;: %2</translation>
+    </message>
+    <message>
+        <source>%1 cannot be used: %2</source>
+        <translation>%1 ne peut pas être utilisé&#x202f;: %2</translation>
+    </message>
+    <message>
+        <source>A script was ended because it ran longer than %1.</source>
+        <translation>Un script a été arrêté parce qu’il durait plus de %1.</translation>
+    </message>
+    <message>
+        <source>1 second</source>
+        <translation>1 seconde</translation>
+    </message>
+    <message>
+        <source>%1 seconds</source>
+        <translation>%1 secondes</translation>
+    </message>
+</context>
+<context>
     <name>TypingPage</name>
     <message>
         <source>Pasting</source>
@@ -1775,7 +2006,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Plume: does not hear the keyboard</source>
-        <translation>Plume : n’entend pas le clavier</translation>
+        <translation>Plume&#x202f;: n’entend pas le clavier</translation>
     </message>
     <message>
         <source>Plume: on</source>
@@ -1855,7 +2086,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>and a space become “%1”</source>
         <extracomment>What stands before it is an abbreviation; %1 is its text.</extracomment>
-        <translation>et une espace deviennent « %1 »</translation>
+        <translation>et une espace deviennent «&#x202f;%1&#x202f;»</translation>
     </message>
 </context>
 </TS>

@@ -21,10 +21,6 @@ constexpr int MenuPolls = 50;
 // By itself the keyboard is tried again this long after it was given up; a moment more for that to be done.
 constexpr double ListenAgainDelay = 61;
 
-bool isSyncSetting(const std::string& key) {
-    return key == "SyncEnabled" || key == "SyncDirectory" || key == "SyncDirectoryType";
-}
-
 // Where windows stand concerns nobody else.
 bool isPlaceOfWindow(const std::string& key) {
     return key.starts_with("WindowPlace.");
@@ -151,7 +147,7 @@ void AppDelegate::userDefaultsChanged(UserDefaultsChange& change) {
     if (std::ranges::all_of(change.keys, isPlaceOfWindow)) return;
     loadPreferences();
     // The settings window tells by itself, once the user has chosen, and is asked which library is to be kept.
-    const bool syncChanged = change.byAnotherProcess && std::ranges::any_of(change.keys, isSyncSetting);
+    const bool syncChanged = change.byAnotherProcess && std::ranges::any_of(change.keys, LibrarySync::isFolderSetting);
     if (syncChanged) manager_.sync().loadSyncPreferences(false);
 }
 

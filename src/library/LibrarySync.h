@@ -10,6 +10,7 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <unordered_set>
 
 #include "library/LibraryArchive.h"
@@ -23,6 +24,11 @@ namespace plume {
 
 class LibrarySync {
   public:
+    // Whether it says if, and in which folder, the library is kept in step.
+    static bool isFolderSetting(std::string_view key) {
+        return key == "SyncEnabled" || key == "SyncDirectory" || key == "SyncDirectoryType";
+    }
+
     struct Dependencies {
         WritableUserDefaults& settings;
         Files& files;

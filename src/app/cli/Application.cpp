@@ -33,6 +33,7 @@
 #include "app/preferences/PreferencesWindow.h"
 #include "app/qt/ColorScheme.h"
 #include "app/qt/QtRunLoop.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Translations.h"
 #include "app/session/SessionService.h"
 #include "app/status/StatusIcons.h"
@@ -173,6 +174,7 @@ void Application::openSession() {
 
 void Application::begin() {
     port_.setCannotShowNotice([this](const std::string& body) { voice_.say(body); });
+    port_.setNoticeWords([](const std::string& text) { return inUsersLanguage(text).toStdString(); });
     port_.setServerGone([this] {
         loop_.perform([this] {
             voice_.say("The X server is gone.");

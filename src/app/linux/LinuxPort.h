@@ -57,6 +57,8 @@ class LinuxPort {
 
     // Told, on the main thread, what a desktop without notices cannot show. Before the loops run.
     void setCannotShowNotice(DesktopNotices::CannotShow cannotShow) { notices_.setCannotShow(std::move(cannotShow)); }
+    // What notices say in place of a text. Before the loops run.
+    void setNoticeWords(DesktopNotices::Words words) { notices_.setWords(std::move(words)); }
     // Told, on the main thread, when the machine goes to sleep and when it has woken up.
     void setSleepListener(SystemSleep::Listener listener) {
         sleep_ = std::make_unique<SystemSleep>(mainLoop_, std::move(listener));

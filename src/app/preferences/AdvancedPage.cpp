@@ -9,6 +9,7 @@
 
 #include "app/preferences/PreferencesPages.h"
 #include "app/preferences/SettingsModel.h"
+#include "library/LibrarySync.h"
 
 namespace plume {
 
@@ -24,7 +25,7 @@ class AdvancedPage final : public PreferencesPage {
             tr("Every setting by its name, as “plume settings” shows it. Values are JSON; those that you have set "
                "are bold. Press F2 to change one."));
         addFilling(tr("All settings"), makeList());
-        connect(model_, &SettingsModel::told, this, [this](const QString& reason) { complain(reason); });
+        connect(model_, &SettingsModel::told, this, &AdvancedPage::settingTold);
     }
 
     void follow(const Keys& keys) override {
@@ -84,6 +85,11 @@ class AdvancedPage final : public PreferencesPage {
         connect(diagnostics, &QPushButton::clicked, this, [this] { services().showDiagnostics(); });
         updateButton();
         return row;
+    }
+
+    void settingTold(const QString& key, const QString& reason) {
+        complain(reason);
+        if (reason.isEmpty() && LibrarySync::isFolderSetting(key.toStdString())) services().syncSettingsChanged();
     }
 
     // Negative: none.

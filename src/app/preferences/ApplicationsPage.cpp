@@ -18,6 +18,7 @@
 #include "app/preferences/PreferencesPages.h"
 #include "app/preferences/ProgramAdder.h"
 #include "app/preferences/SettingControls.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "app/qt/WheelGuard.h"
 #include "input/delivery/ApplicationTable.h"
@@ -115,7 +116,7 @@ class ApplicationsPage final : public PreferencesPage {
         rows_ = read ? read.value() : OwnApplicationRows();
         // What cannot be read is not written over.
         add_->setEnabled(read.ok());
-        tell(read ? QString() : QString::fromStdString(read.error().message));
+        tell(read ? QString() : inUsersLanguage(read.error().message));
         model_->clear();
         model_->setHorizontalHeaderLabels({tr("Program"), tr("Identifier"), tr("Row of"), tr("Kind")});
         for (const std::string& name : rows_.names()) addRow(name, tr("Yours"), {});
@@ -241,7 +242,7 @@ class ApplicationsPage final : public PreferencesPage {
             table && !text.empty() ? table.value().readRows(text, Setting) : Result<ApplicationRows>(ApplicationRows());
         if (!read) {
             showRows();
-            tell(QString::fromStdString(read.error().message));
+            tell(inUsersLanguage(read.error().message));
             return false;
         }
         const bool kept = text.empty() ? giveUp(Setting) : write(Setting, fromUtf8(text));

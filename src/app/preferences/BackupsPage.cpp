@@ -14,6 +14,7 @@
 #include "app/preferences/FolderChoice.h"
 #include "app/preferences/PreferencesPages.h"
 #include "app/preferences/SettingControls.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "app/qt/WheelGuard.h"
 
@@ -107,8 +108,7 @@ class BackupsPage final : public PreferencesPage {
     void backUp() {
         const auto written = services().dataManager.backups().backup();
         countBackups();
-        if (!written)
-            return complain(tr("No backup was made. %1").arg(QString::fromStdString(written.error().message)));
+        if (!written) return complain(tr("No backup was made. %1").arg(inUsersLanguage(written.error().message)));
         complain({});
         const QString name = QString::fromStdString(written.value().filename().string());
         backupCount_->setText(tr("Written: %1").arg(name) + u'\n' + backupCount_->text());

@@ -9,6 +9,7 @@
 #include "Foundation/Strings.h"
 #include "app/preferences/PreferencesPages.h"
 #include "app/preferences/SettingControls.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "app/qt/WheelGuard.h"
 
@@ -48,8 +49,7 @@ class GeneralPage final : public PreferencesPage {
         box->setChecked(services().startsAtLogin && services().startsAtLogin());
         connect(box, &QCheckBox::toggled, this, [this, box](bool on) {
             const auto done = services().setStartsAtLogin(on);
-            complain(done ? QString()
-                          : tr("This could not be kept. %1").arg(QString::fromStdString(done.error().message)));
+            complain(done ? QString() : tr("This could not be kept. %1").arg(inUsersLanguage(done.error().message)));
             const QSignalBlocker quiet(box);
             box->setChecked(services().startsAtLogin());
         });

@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <array>
 
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 
 namespace plume {
@@ -200,7 +201,7 @@ void HotKeyRecorder::askDesktop(const GeneralHotKey& hotKey) {
     const QPointer<HotKeyRecorder> self(this);
     services_.tryHotKey(hotKey, [self, hotKey, turn = turn_](const Result<void>& answer) {
         if (!self || self->turn_ != turn) return;
-        if (!answer) return self->tell(QString::fromStdString(answer.error().message));
+        if (!answer) return self->tell(inUsersLanguage(answer.error().message));
         self->take(hotKey);
     });
 }

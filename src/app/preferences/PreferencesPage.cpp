@@ -16,6 +16,7 @@
 #include "app/preferences/ApplicationList.h"
 #include "app/preferences/SettingControls.h"
 #include "app/qt/Labels.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "app/qt/WheelGuard.h"
 #include "library/PLFunctionAvailability.h"
@@ -75,16 +76,14 @@ void PreferencesPage::showAgain(std::string_view key) {
 
 bool PreferencesPage::write(std::string_view key, PropertyList value) {
     const auto written = settings().setObject(key, std::move(value));
-    complain(written ? QString()
-                     : tr("This could not be kept. %1").arg(QString::fromStdString(written.error().message)));
+    complain(written ? QString() : tr("This could not be kept. %1").arg(inUsersLanguage(written.error().message)));
     if (!written) showAgain(key);
     return written.ok();
 }
 
 bool PreferencesPage::giveUp(std::string_view key) {
     const auto removed = settings().removeObject(key);
-    complain(removed ? QString()
-                     : tr("This could not be kept. %1").arg(QString::fromStdString(removed.error().message)));
+    complain(removed ? QString() : tr("This could not be kept. %1").arg(inUsersLanguage(removed.error().message)));
     if (!removed) showAgain(key);
     return removed.ok();
 }

@@ -3,6 +3,7 @@
 #include <QFont>
 #include <algorithm>
 
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "library/KnownSettings.h"
 #include "library/SettingValues.h"
@@ -79,7 +80,8 @@ bool SettingsModel::setData(const QModelIndex& index, const QVariant& value, int
     auto read = settingFromText(setting, text.toStdString());
     const Result<void> done =
         read ? settings_.setObject(setting.name, std::move(read).value()) : Result<void>(read.error());
-    Q_EMIT told(done ? QString() : QString::fromStdString(done.error().message));
+    Q_EMIT told(QLatin1String(setting.name.data(), static_cast<qsizetype>(setting.name.size())),
+                done ? QString() : inUsersLanguage(done.error().message));
     return done.ok();
 }
 
@@ -89,8 +91,10 @@ bool SettingsModel::isOwn(int row) const {
 }
 
 void SettingsModel::restoreDefault(int row) {
-    const auto removed = settings_.removeObject(settingAt(row).name);
-    Q_EMIT told(removed ? QString() : QString::fromStdString(removed.error().message));
+    const KnownSetting& setting = settingAt(row);
+    const auto removed = settings_.removeObject(setting.name);
+    Q_EMIT told(QLatin1String(setting.name.data(), static_cast<qsizetype>(setting.name.size())),
+                removed ? QString() : inUsersLanguage(removed.error().message));
 }
 
 void SettingsModel::follow() {

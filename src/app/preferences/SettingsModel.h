@@ -32,8 +32,8 @@ class SettingsModel final : public QAbstractTableModel {
     void follow();
 
   Q_SIGNALS:
-    // Why something was not changed; an empty text: it was.
-    void told(const QString& reason);
+    // Why the setting was not changed; an empty text: it was.
+    void told(const QString& key, const QString& reason);
 
   private:
     QString valueText(int row) const;

@@ -6,12 +6,12 @@
 #include <QLocale>
 #include <QPushButton>
 #include <QTime>
-#include <QTimer>
 #include <QVBoxLayout>
 #include <chrono>
 #include <utility>
 
 #include "app/qt/Labels.h"
+#include "app/qt/Sentences.h"
 
 namespace plume {
 
@@ -27,7 +27,7 @@ PromptWindow::PromptWindow(const Error& missing, std::function<Result<void>()> c
       checkAgain_(std::move(checkAgain)),
       closed_(std::move(closed)),
       heading_(makeHeading(tr("Plume cannot expand abbreviations yet"))),
-      missing_(makeTextLabel(QString::fromStdString(missing.message))),
+      missing_(makeTextLabel(inUsersLanguage(missing.message))),
       advice_(makeTextLabel(tr("Put this right, then choose “Check Again”. You can also continue and do it later: "
                                "until then Plume runs, but abbreviations may stay as you type them."))),
       checkButton_(new QPushButton(tr("Check &Again"))),
@@ -36,6 +36,8 @@ PromptWindow::PromptWindow(const Error& missing, std::function<Result<void>()> c
     missing_->setAccessibleName(tr("What is missing"));
     connect(checkButton_, &QPushButton::clicked, this, &PromptWindow::check);
     connect(closeButton_, &QPushButton::clicked, this, &QWidget::close);
+    closeTimer_.setSingleShot(true);
+    connect(&closeTimer_, &QTimer::timeout, this, &QWidget::close);
     checkButton_->setDefault(true);
     auto* buttons = new QDialogButtonBox;
     buttons->addButton(checkButton_, QDialogButtonBox::AcceptRole);
@@ -54,7 +56,7 @@ PromptWindow::PromptWindow(const Error& missing, std::function<Result<void>()> c
 void PromptWindow::check() {
     const auto result = checkAgain_();
     if (result) return showThatAllIsWell();
-    missing_->setText(QString::fromStdString(result.error().message));
+    missing_->setText(inUsersLanguage(result.error().message));
     // The sentence may be the same as before: the time says that somebody has looked.
     advice_->setText(tr("Looked again at %1: it is not right yet. You can also continue and put it right later.")
                          .arg(QLocale().toString(QTime::currentTime(), QStringLiteral("HH:mm:ss"))));
@@ -67,7 +69,7 @@ void PromptWindow::showThatAllIsWell() {
     checkButton_->hide();
     closeButton_->setText(tr("&Close"));
     closeButton_->setFocus();
-    QTimer::singleShot(TimeToRead, this, &QWidget::close);
+    closeTimer_.start(TimeToRead);
 }
 
 void PromptWindow::closeEvent(QCloseEvent* event) {

@@ -3,6 +3,7 @@
 // On the main thread; owns itself, and is gone when it is closed.
 #pragma once
 
+#include <QTimer>
 #include <functional>
 
 #include "Foundation/Result.h"
@@ -33,6 +34,7 @@ class PromptWindow final : public SmallWindow {
     QLabel* advice_;
     QPushButton* checkButton_;
     QPushButton* closeButton_;
+    QTimer closeTimer_;  // once everything is there
 };
 
 }  // namespace plume

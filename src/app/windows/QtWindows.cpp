@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "app/qt/Messages.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "app/windows/AboutWindow.h"
 #include "app/windows/DiagnosticWindow.h"
@@ -111,7 +112,7 @@ void QtWindows::askForFirstSync(const std::string& folderName, std::function<voi
 }
 
 void QtWindows::tell(const std::u16string& message, const std::u16string& details) {
-    own(plume::tell(nullptr, toQString(message), toQString(details)));
+    own(plume::tell(nullptr, inUsersLanguage(toQString(message)), inUsersLanguage(toQString(details))));
 }
 
 bool QtWindows::hasVisibleWindow() const {

@@ -17,6 +17,7 @@
 #include <chrono>
 
 #include "app/qt/Labels.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/WindowPlaces.h"
 
 namespace plume {
@@ -73,7 +74,7 @@ QString timeOf(const LoggedReport& report) {
 }
 
 QString sentenceOf(const LoggedReport& report) {
-    QString sentence = QString::fromStdString(report.sentence);
+    QString sentence = inUsersLanguage(report.sentence);
     if (report.count == 1) return sentence;
     return ReportsWindow::tr("%1 (%n times)", "", static_cast<int>(report.count)).arg(sentence);
 }
@@ -170,7 +171,7 @@ void ReportsWindow::addRow(const LoggedReport& report) {
     row.front()->setData(number, NumberRole);
     model_->appendRow(row);
     if (report.action.label.empty()) return;
-    auto* button = new QPushButton(QString::fromStdString(report.action.label));
+    auto* button = new QPushButton(inUsersLanguage(report.action.label));
     button->setAutoDefault(false);
     button->setProperty("number", number);
     connect(button, &QPushButton::clicked, this, [this, number = report.number] { runAction(number); });

@@ -16,6 +16,7 @@
 
 #include "app/qt/Labels.h"
 #include "app/qt/Messages.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/WindowPlaces.h"
 #include "library/FileNameTime.h"
 
@@ -159,7 +160,7 @@ void RestoreDataWindowController::restore(const Files::Path& path) {
     if (!checkExists(path)) return;
     const auto before = manager_.restoreFile(path);
     if (!before) {
-        tell(this, tr("Error when restoring backup"), QString::fromStdString(before.error().message));
+        tell(this, tr("Error when restoring backup"), inUsersLanguage(before.error().message));
         return;
     }
     tell(nullptr, tr("Your snippets were restored"),

@@ -18,6 +18,7 @@
 
 #include "app/qt/Labels.h"
 #include "app/qt/Messages.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 #include "app/qt/WindowPlaces.h"
 
@@ -180,7 +181,7 @@ void WelcomeWindow::addFoundLibrary(QGridLayout& grid, const WelcomeServices::Fo
         button->setEnabled(false);
         services_.import(library, [this, button = QPointer(button), outcome](const Result<std::string>& told) {
             if (!button) return;
-            outcome->setText(QString::fromStdString(told ? told.value() : told.error().message));
+            outcome->setText(inUsersLanguage(told ? told.value() : told.error().message));
             outcome->show();
             // A second time only when the first one failed: everything would be there twice.
             button->setEnabled(!told);
@@ -220,7 +221,7 @@ void WelcomeWindow::setStartsAtLogin(bool starts) {
     if (done) return;
     const QSignalBlocker silence(startsAtLogin_);
     startsAtLogin_->setChecked(!starts);
-    tell(this, tr("This could not be changed"), QString::fromStdString(done.error().message));
+    tell(this, tr("This could not be changed"), inUsersLanguage(done.error().message));
 }
 
 }  // namespace plume

@@ -131,6 +131,11 @@ void DesktopNotices::setCannotShow(CannotShow cannotShow) {
 }
 
 void DesktopNotices::show(Notice notice) {
+    if (words_) {
+        notice.title = words_(notice.title);
+        notice.body = words_(notice.body);
+        for (Notice::Button& button : notice.buttons) button.label = words_(button.label);
+    }
     thread_->show(std::move(notice));
 }
 

@@ -6,6 +6,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "platform/Notices.h"
 #include "platform/RunLoop.h"
@@ -19,6 +20,7 @@ class DesktopNotices final : public Notices {
   public:
     // Told the body of what the desktop cannot show, on the main thread.
     using CannotShow = std::function<void(const std::string& body)>;
+    using Words = std::function<std::string(const std::string& text)>;
 
     // The loop outlives it.
     explicit DesktopNotices(RunLoop& mainLoop);
@@ -26,9 +28,12 @@ class DesktopNotices final : public Notices {
 
     // Before the first notice.
     void setCannotShow(CannotShow cannotShow);
+    // What is shown in place of a title, a body and a button; asked on the main thread. Before the first notice.
+    void setWords(Words words) { words_ = std::move(words); }
     void show(Notice notice) override;
 
   private:
+    Words words_;
     BusThread<NoticeSession> thread_;
 };
 

@@ -323,6 +323,10 @@ TEST_F(PreferencesPagesTest, EverySettingCanBeWrittenAsText) {
     QTest::mouseClick(withText<QPushButton>(window(), "Use Default"), Qt::LeftButton);
     EXPECT_FALSE(settings.hasKey("UseClipboardApplications"));
     EXPECT_EQ(value.data().toString(), "");
+    EXPECT_EQ(syncChanges, 0);
+    named<QLineEdit>(window(), "Filter settings")->setText("SyncDirectoryType");
+    EXPECT_TRUE(view->model()->setData(view->model()->index(0, 1), "1"));
+    EXPECT_EQ(syncChanges, 1);
 }
 
 }  // namespace
