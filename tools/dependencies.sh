@@ -34,4 +34,4 @@ build() {
 # What the desktop tests are built with and run: a real X server, a window manager, programs to type into.
 DESKTOP_PACKAGES=(pkg-config xserver-xorg-dev libxcb1-dev libxcb-xinput-dev libxkbcommon-dev libpng-dev libgtk-3-dev
     nlohmann-json3-dev xserver-xorg-core xserver-xorg-video-dummy x11-xkb-utils xkb-data
-    openbox trayer dbus-daemon at-spi2-core xterm xfonts-base fonts-dejavu-core)
+    openbox xfwm4 trayer x11-xserver-utils dbus-daemon at-spi2-core xterm xfonts-base fonts-dejavu-core)

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -66,11 +67,22 @@ class UIElement {
     virtual bool selectsNothing() const { return false; }
 };
 
+// Where the user types, as the program in front tells it: what has the focus, the caret in it, and the window. What is
+// not told is nothing.
+struct FocusedPlaces {
+    std::optional<Rectangle> caret;  // may have no width
+    std::optional<Rectangle> element;
+    std::optional<Rectangle> window;
+};
+
 class Accessibility {
   public:
     virtual ~Accessibility() = default;
     // The element that stands for the application in front, or nothing.
     virtual std::shared_ptr<UIElement> frontApplicationElement() const = 0;
+    // Asks for the places without waiting for them: `told` is called once, at once or on any thread, or never when the
+    // program hangs.
+    virtual void askForFocusedPlaces(std::function<void(const FocusedPlaces&)> told) const = 0;
     // Height of the main screen, for turning rectangles over.
     virtual double mainScreenHeight() const = 0;
 };

@@ -7,6 +7,8 @@
 #include <string>
 #include <vector>
 
+#include "platform/Accessibility.h"
+
 namespace plume {
 
 // Names a process for as long as the session lives; 0/0 names none.
@@ -40,6 +42,13 @@ class ProcessManager {
     virtual std::optional<ProcessSerialNumber> frontProcess() const = 0;
     // Which of its windows has the keyboard: another number, another window; 0 when the port does not tell.
     virtual std::uint32_t frontWindow() const { return 0; }
+    // Where that window stands, in the pixels of the screen from its top left, without its frame; nothing when that is
+    // not known. Asks the system.
+    virtual std::optional<Rectangle> frontWindowBounds() const { return std::nullopt; }
+    // Asks for this window, as frontWindow() names it, to get the keyboard; that may take a moment, or never happen.
+    virtual void activateWindow(std::uint32_t window) = 0;
+    // Whether a key that is pressed now would arrive in this window. Asks the system, and is no question for a key.
+    virtual bool keysArriveIn(std::uint32_t window) const = 0;
     // Nothing when the process is gone or is no application.
     virtual std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const = 0;
     // Those that have windows, without Plume itself; none when the port cannot tell. May take milliseconds.

@@ -16,9 +16,9 @@ bool tryTimes(int times, const Attempt& attempt) {
 
 }  // namespace
 
-DesktopRig::DesktopRig(const XServer::Options& options)
+DesktopRig::DesktopRig(const XServer::Options& options, WindowManager manager)
     : server_(directory_, options, privateEnvironment(directory_)),
-      session_(directory_, server_),
+      session_(directory_, server_, manager),
       client_(server_.display()),
       keyboard_(server_.keyboardSocket(), options),
       pointer_(server_.pointerSocket(), options) {}

@@ -18,7 +18,7 @@ namespace plume::rig {
 // no rights, and works as root, too. One thread, which must live as long as the rig does. Everything throws RigError.
 class DesktopRig {
   public:
-    explicit DesktopRig(const XServer::Options& options = {});
+    explicit DesktopRig(const XServer::Options& options = {}, WindowManager manager = WindowManager::Openbox);
 
     XServer& server() { return server_; }
     DesktopSession& session() { return session_; }

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
+#include <fstream>
 
 #include "testing/rig/ReportPipe.h"
 
@@ -16,6 +17,15 @@ constexpr Milliseconds StartBound{10'000};
 // sanitizers report.
 constexpr const char* Inherited[] = {"PATH",         "LD_LIBRARY_PATH", "TZ",           "TMPDIR",
                                      "ASAN_OPTIONS", "UBSAN_OPTIONS",   "TSAN_OPTIONS", "LSAN_OPTIONS"};
+
+std::filesystem::path writePointerFocus(const PrivateDirectory& directory) {
+    std::filesystem::path file = directory.path() / "openbox.xml";
+    std::ofstream(file) << R"(<openbox_config xmlns="http://openbox.org/3.4/rc">
+  <focus><followMouse>yes</followMouse><focusNew>yes</focusNew></focus>
+</openbox_config>
+)";
+    return file;
+}
 
 }  // namespace
 
@@ -41,13 +51,13 @@ Environment privateEnvironment(const PrivateDirectory& directory) {
     return environment;
 }
 
-DesktopSession::DesktopSession(const PrivateDirectory& directory, const XServer& server)
+DesktopSession::DesktopSession(const PrivateDirectory& directory, const XServer& server, WindowManager manager)
     : directory_(directory), environment_(privateEnvironment(directory)) {
     environment_.push_back("DISPLAY=" + server.display());
     XClient client(server.display());
     startBus();
     startAccessibility(client);
-    startWindowManager(client);
+    startWindowManager(client, manager);
 }
 
 void DesktopSession::join() const {
@@ -82,14 +92,21 @@ void DesktopSession::startAccessibility(XClient& client) {
     });
 }
 
-void DesktopSession::startWindowManager(XClient& client) {
-    windowManager_ = startProgram(requireProgram("openbox", "openbox"), {"--sm-disable"});
-    client.await("the start of openbox", StartBound, [&] {
-        if (!windowManager_->isRunning()) throw RigError("openbox has ended:\n" + windowManager_->logTail());
+void DesktopSession::startWindowManager(XClient& client, WindowManager manager) {
+    const std::string program = manager == WindowManager::Xfwm4 ? "xfwm4" : "openbox";
+    const std::string name = manager == WindowManager::Xfwm4 ? "Xfwm4" : "Openbox";
+    std::vector<std::string> arguments{"--sm-disable"};
+    if (manager == WindowManager::Xfwm4) arguments = {"--sm-client-disable", "--compositor=off"};
+    if (manager == WindowManager::OpenboxFollowingPointer) {
+        arguments.insert(arguments.end(), {"--config-file", writePointerFocus(directory_)});
+    }
+    windowManager_ = startProgram(requireProgram(program, program), arguments);
+    client.await("the start of " + program, StartBound, [&] {
+        if (!windowManager_->isRunning()) throw RigError(program + " has ended:\n" + windowManager_->logTail());
         const std::string bytes = client.property(client.root(), "_NET_SUPPORTING_WM_CHECK");
         xcb_window_t window = XCB_WINDOW_NONE;
         if (bytes.size() >= sizeof window) std::memcpy(&window, bytes.data(), sizeof window);
-        return window != XCB_WINDOW_NONE && client.property(window, "_NET_WM_NAME") == "Openbox";
+        return window != XCB_WINDOW_NONE && client.property(window, "_NET_WM_NAME") == name;
     });
     awaitManaging(client);
 }

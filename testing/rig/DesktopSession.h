@@ -15,11 +15,15 @@ namespace plume::rig {
 // runtime folder inside `directory`, and no setting of whoever runs the test.
 Environment privateEnvironment(const PrivateDirectory& directory);
 
-// A desktop on a display: a private D-Bus session, the accessibility bus on it, and openbox as window manager.
+// The second one gives the keyboard to the window under the pointer.
+enum class WindowManager { Openbox, OpenboxFollowingPointer, Xfwm4 };
+
+// A desktop on a display: a private D-Bus session, the accessibility bus on it, and a window manager.
 class DesktopSession {
   public:
     // Ready when the constructor returns; throws RigError. The directory and the server outlive the session.
-    DesktopSession(const PrivateDirectory& directory, const XServer& server);
+    DesktopSession(const PrivateDirectory& directory, const XServer& server,
+                   WindowManager manager = WindowManager::Openbox);
 
     // For the programs of this desktop.
     const Environment& environment() const { return environment_; }
@@ -33,7 +37,7 @@ class DesktopSession {
   private:
     void startBus();
     void startAccessibility(XClient& client);
-    void startWindowManager(XClient& client);
+    void startWindowManager(XClient& client, WindowManager manager);
     static void awaitManaging(XClient& client);
     std::unique_ptr<ChildProcess> startProgram(const std::filesystem::path& program, std::vector<std::string> arguments,
                                                const std::vector<int>& keptDescriptors = {});

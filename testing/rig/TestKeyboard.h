@@ -22,6 +22,7 @@ enum class Key {
     LeftAlt = 64,
     CapsLock = 66,
     F2 = 68,
+    F3 = 69,
     AltGr = 108,
     Home = 110,
     Up = 111,

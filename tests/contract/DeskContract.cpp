@@ -33,6 +33,23 @@ TEST_P(ProcessManagerContract, BringsAProgramBackToTheFront) {
     EXPECT_TRUE(desk_->runUntil([&] { return processes.frontProcess() == first; }));
 }
 
+TEST_P(ProcessManagerContract, GivesTheKeyboardBackToAWindow) {
+    ProcessManager& processes = desk_->processManager();
+    const std::uint32_t first = processes.frontWindow();
+    ASSERT_NE(first, 0U);
+    EXPECT_TRUE(desk_->runUntil([&] { return processes.keysArriveIn(first); }));
+    desk_->activate(Program::Second);
+    ASSERT_TRUE(desk_->runUntil([&] { return processes.frontWindow() != first; }));
+    EXPECT_FALSE(processes.keysArriveIn(first));
+    processes.activateWindow(first);
+    EXPECT_TRUE(desk_->runUntil([&] { return processes.keysArriveIn(first); }));
+    // A window that is not there gets none, and takes none away.
+    processes.activateWindow(first + 77'777);
+    EXPECT_FALSE(processes.keysArriveIn(first + 77'777));
+    EXPECT_TRUE(desk_->runUntil([&] { return processes.keysArriveIn(first); }));
+    EXPECT_FALSE(processes.keysArriveIn(0));
+}
+
 TEST_P(ProcessManagerContract, KnowsNothingOfProcessesThatAreNone) {
     ProcessManager& processes = desk_->processManager();
     EXPECT_EQ(processes.runningApplication({}).has_value(), false);

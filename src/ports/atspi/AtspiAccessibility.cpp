@@ -35,6 +35,10 @@ std::shared_ptr<UIElement> AtspiAccessibility::frontApplicationElement() const {
     return thread_->focus().isKnown() ? std::make_shared<AtspiApplicationElement>(thread_.session()) : nullptr;
 }
 
+void AtspiAccessibility::askForFocusedPlaces(std::function<void(const FocusedPlaces&)> told) const {
+    thread_->askForPlaces(std::move(told));
+}
+
 void AtspiAccessibility::setFrontProcess(pid_t process) {
     thread_->tracker().setFrontProcess(process);
 }

@@ -50,6 +50,7 @@ class AtspiAccessibility final : public Accessibility {
     // and its AXFocusedUIElement is what has the focus when it is asked for. An element belongs to the thread that it
     // was made for.
     std::shared_ptr<UIElement> frontApplicationElement() const override;
+    void askForFocusedPlaces(std::function<void(const FocusedPlaces&)> told) const override;
     double mainScreenHeight() const override { return screenHeight_; }
     // In the pixels in which programs tell of their places. From any thread.
     void setMainScreenHeight(double height) { screenHeight_ = height; }

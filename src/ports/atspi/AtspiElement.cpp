@@ -9,19 +9,7 @@ namespace plume {
 
 namespace {
 
-constexpr int DeepestPart = 100;
 constexpr int MostChildren = 200;
-
-// The window: the part right below the program, for which a toolkit may have a part or none.
-AtspiPart topLevelOf(AtspiBus& bus, AtspiPart part) {
-    for (int depth = 0; depth < DeepestPart; ++depth) {
-        AtspiPart parent = parentOf(bus, part);
-        if (!parent) return {};
-        if (roleNumberOf(bus, parent) == AtspiRole::Application) return part;
-        part = std::move(parent);
-    }
-    return {};
-}
 
 std::optional<std::u16string> textFrom(std::u16string_view text) {
     return text.empty() ? std::nullopt : std::optional<std::u16string>(text);

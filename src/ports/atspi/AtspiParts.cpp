@@ -85,6 +85,17 @@ AtspiPart parentOf(AtspiBus& bus, const AtspiPart& part) {
     return partIn(answer.values().inside().inside());
 }
 
+AtspiPart topLevelOf(AtspiBus& bus, AtspiPart part) {
+    constexpr int DeepestPart = 100;
+    for (int depth = 0; depth < DeepestPart; ++depth) {
+        AtspiPart parent = parentOf(bus, part);
+        if (!parent) return {};
+        if (roleNumberOf(bus, parent) == AtspiRole::Application) return part;
+        part = std::move(parent);
+    }
+    return {};
+}
+
 std::vector<AtspiPart> childrenOf(AtspiBus& bus, const AtspiPart& part, std::int32_t most) {
     std::vector<AtspiPart> children;
     const BusAnswer counted = bus.property(part, AccessibleInterface, "ChildCount");

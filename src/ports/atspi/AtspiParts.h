@@ -77,6 +77,8 @@ std::optional<AtspiStates> statesOf(AtspiBus& bus, const AtspiPart& part);
 bool hasState(AtspiBus& bus, const AtspiPart& part, AtspiState state);
 std::optional<AtspiRole> roleNumberOf(AtspiBus& bus, const AtspiPart& part);
 AtspiPart parentOf(AtspiBus& bus, const AtspiPart& part);
+// The window: the part right below the program, for which a toolkit may have a part or none.
+AtspiPart topLevelOf(AtspiBus& bus, AtspiPart part);
 std::vector<AtspiPart> childrenOf(AtspiBus& bus, const AtspiPart& part, std::int32_t most);
 
 // "AXUnknown" for a role that Plume has no use for.

@@ -1,6 +1,7 @@
 #include "ports/atspi/AtspiSession.h"
 
 #include "ports/atspi/AtspiParts.h"
+#include "ports/atspi/AtspiPlaces.h"
 
 namespace plume {
 
@@ -77,6 +78,18 @@ AtspiSession::AtspiSession() : tracker_(queue_.loop(), bus_, [this] { return con
 std::optional<AtspiFocused> AtspiSession::askForFocus() {
     if (auto told = focus().justTold()) return told;
     return queue_.ask<AtspiFocused>([this] { return std::optional(tracker_.focusedNow()); });
+}
+
+void AtspiSession::askForPlaces(std::function<void(const FocusedPlaces&)> told) {
+    queue_.loop().perform([this, told = std::move(told)] {
+        if (!queue_.isOpen()) return told({});
+        bus_.begin(QuestionBound);
+        const AtspiFocused focused = tracker_.focusedNow();
+        bus_.begin(QuestionBound);
+        const FocusedPlaces places = placesOf(bus_, focused);
+        // A thread that was left behind has nobody to tell any more.
+        if (!queue_.hasEnded()) told(places);
+    });
 }
 
 void AtspiSession::switchOn() {

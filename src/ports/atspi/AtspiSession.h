@@ -37,6 +37,7 @@ class AtspiQueue {
   public:
     // ---- On the accessibility thread ----
     PollRunLoop& loop() { return loop_; }
+    bool hasEnded() const { return ended_; }
     // Runs what is posted until end().
     void run() { loop_.run(); }
     // Whether questions are passed on. At first they stay unanswered.
@@ -98,6 +99,8 @@ class AtspiSession {
     }
     // What has the focus at this moment.
     std::optional<AtspiFocused> askForFocus();
+    // Where it is; nobody waits. Told on the accessibility thread, or not when that hangs.
+    void askForPlaces(std::function<void(const FocusedPlaces&)> told);
 
     // From any thread.
     void switchOn();

@@ -87,4 +87,22 @@ std::optional<Rectangle> SimulatedUIElement::rectangleForRange(std::string_view 
     return answer<Rectangle>(name, range);
 }
 
+void SimulatedAccessibility::askForFocusedPlaces(std::function<void(const FocusedPlaces&)> told) const {
+    const auto placeOf = [](const UIElement& element) -> std::optional<Rectangle> {
+        const auto origin = element.pointAttribute("AXPosition");
+        const auto size = element.sizeAttribute("AXSize");
+        return origin && size ? std::optional(Rectangle{*origin, *size}) : std::nullopt;
+    };
+    FocusedPlaces places;
+    const auto application = frontApplicationElement();
+    if (const auto focused = application ? application->elementAttribute("AXFocusedUIElement") : nullptr) {
+        const auto selected = focused->rangeAttribute("AXSelectedTextRange");
+        if (selected) places.caret = focused->rectangleForRange("AXBoundsForRange", *selected);
+        places.element = placeOf(*focused);
+        const auto window = focused->elementAttribute("AXTopLevelUIElement");
+        if (window) places.window = placeOf(*window);
+    }
+    told(places);
+}
+
 }  // namespace plume

@@ -61,6 +61,8 @@ class SimulatedAccessibility final : public Accessibility {
     void setMainScreenHeight(double height) { screenHeight_ = height; }
 
     std::shared_ptr<UIElement> frontApplicationElement() const override { return source_ ? source_() : front_; }
+    // Those that the elements say when they are asked.
+    void askForFocusedPlaces(std::function<void(const FocusedPlaces&)> told) const override;
     double mainScreenHeight() const override { return screenHeight_; }
 
   private:

@@ -20,6 +20,11 @@ void SimulatedProcessManager::terminate(ProcessSerialNumber process) {
     if (front_ == process) front_.reset();
 }
 
+void SimulatedProcessManager::activateWindow(std::uint32_t window) {
+    const ProcessSerialNumber process{0, window};
+    if (followsActivation_ && running_.contains(process)) front_ = process;
+}
+
 std::optional<RunningApplication> SimulatedProcessManager::runningApplication(ProcessSerialNumber process) const {
     ++queries_;
     const auto found = running_.find(process);

@@ -273,7 +273,10 @@ std::vector<EventTapInformation> X11ProcessManager::eventTaps() const {
 
 void X11ProcessManager::bringToFront(ProcessSerialNumber process) {
     const xcb_window_t window = windowOf(process);
-    if (window == XCB_WINDOW_NONE) return;
+    if (window != XCB_WINDOW_NONE) activateWindow(window);
+}
+
+void X11ProcessManager::activateWindow(std::uint32_t window) {
     session_.collect();
     XcbConnection& connection = session_.connection();
     if (activeWindow() == XCB_WINDOW_NONE && manager_.window() == XCB_WINDOW_NONE) {
@@ -295,6 +298,29 @@ void X11ProcessManager::bringToFront(ProcessSerialNumber process) {
                        reinterpret_cast<const char*>(&message));
     }
     session_.flush();
+}
+
+// The window manager's word alone says little: it names a window active before the server gives it the keyboard. What
+// has the focus is that window or one inside it, so it is the same program's.
+bool X11ProcessManager::keysArriveIn(std::uint32_t window) const {
+    if (window == XCB_WINDOW_NONE || frontWindow() != window) return false;
+    const XcbOwned<xcb_get_input_focus_reply_t> reply(
+        xcb_get_input_focus_reply(session_.get(), xcb_get_input_focus(session_.get()), nullptr));
+    return reply && reply->focus > XCB_INPUT_FOCUS_POINTER_ROOT && clientOf(reply->focus) == clientOf(window);
+}
+
+std::optional<Rectangle> X11ProcessManager::frontWindowBounds() const {
+    const xcb_window_t window = frontWindow();
+    if (window == XCB_WINDOW_NONE) return std::nullopt;
+    xcb_connection_t* const server = session_.get();
+    const auto sizeAsked = xcb_get_geometry(server, window);
+    const auto placeAsked = xcb_translate_coordinates(server, window, session_.connection().root(), 0, 0);
+    const XcbOwned<xcb_get_geometry_reply_t> size(xcb_get_geometry_reply(server, sizeAsked, nullptr));
+    const XcbOwned<xcb_translate_coordinates_reply_t> place(
+        xcb_translate_coordinates_reply(server, placeAsked, nullptr));
+    if (!size || !place) return std::nullopt;
+    return Rectangle{{static_cast<double>(place->dst_x), static_cast<double>(place->dst_y)},
+                     {static_cast<double>(size->width), static_cast<double>(size->height)}};
 }
 
 std::vector<xcb_window_t> X11ProcessManager::windowsInStackingOrder() const {

@@ -30,6 +30,9 @@ class X11ProcessManager final : public ProcessManager {
     ProcessSerialNumber currentProcess() const override;
     std::optional<ProcessSerialNumber> frontProcess() const override;
     std::uint32_t frontWindow() const override;
+    std::optional<Rectangle> frontWindowBounds() const override;
+    void activateWindow(std::uint32_t window) override;
+    bool keysArriveIn(std::uint32_t window) const override;
     std::optional<RunningApplication> runningApplication(ProcessSerialNumber process) const override;
     std::vector<RunningApplication> runningApplications() const override;
     void bringToFront(ProcessSerialNumber process) override;
