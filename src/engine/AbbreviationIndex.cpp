@@ -56,7 +56,7 @@ bool overlapsItself(std::u16string_view text) {
     return false;
 }
 
-std::optional<AbbreviationIndex::Trigger> tableFor(ExpandTrigger trigger) {
+AbbreviationIndex::Trigger tableFor(ExpandTrigger trigger) {
     switch (trigger) {
         case ExpandTrigger::Immediately:
             return AbbreviationIndex::Trigger::Immediately;
@@ -68,7 +68,7 @@ std::optional<AbbreviationIndex::Trigger> tableFor(ExpandTrigger trigger) {
         case ExpandTrigger::Never:
             break;
     }
-    return std::nullopt;
+    return AbbreviationIndex::Trigger::Never;
 }
 
 }  // namespace
@@ -94,6 +94,7 @@ void AbbreviationIndex::setGroups(const Groups& groups) {
     std::size_t snippets = records_.size();
     for (const auto& group : groups) snippets += groups_.contains(group.get()) ? 0 : group->items().size();
     records_.reserve(snippets);
+    beginnings_.reserve(snippets, snippets);
     for (const auto& [group, order] : wanted) {
         if (!groups_.contains(group)) addGroup(groups[order]);
         groups_[group]->order = order;
@@ -102,6 +103,11 @@ void AbbreviationIndex::setGroups(const Groups& groups) {
 }
 
 AbbreviationIndex::IndexedGroup* AbbreviationIndex::find(SnippetGroup& group) {
+    const auto found = groups_.find(&group);
+    return found == groups_.end() ? nullptr : found->second.get();
+}
+
+const AbbreviationIndex::IndexedGroup* AbbreviationIndex::indexedGroup(const SnippetGroup& group) const {
     const auto found = groups_.find(&group);
     return found == groups_.end() ? nullptr : found->second.get();
 }
@@ -146,10 +152,8 @@ void AbbreviationIndex::itemsAdded(SnippetGroup& group, std::size_t first, std::
     IndexedGroup* indexed = find(group);
     if (!indexed) return;
     const auto& items = group.items();
-    if (indexed->table) {
-        SuffixTable& suffixes = tableOf(*indexed).suffixes;
-        suffixes.reserve(suffixes.size() + count, records_.size() + count);
-    }
+    SuffixTable& suffixes = tableOf(*indexed).suffixes;
+    suffixes.reserve(suffixes.size() + count, records_.size() + count);
     std::vector<std::uint32_t> added;
     added.reserve(count);
     for (std::size_t i = first; i < first + count; ++i) added.push_back(addRecord(*indexed, items[i], i));
@@ -169,7 +173,7 @@ void AbbreviationIndex::itemRemoved(SnippetGroup& group, Snippet& /*snippet*/, s
 void AbbreviationIndex::abbreviationChanged(SnippetGroup& group, Snippet& snippet,
                                             const std::optional<std::u16string>& previous) {
     IndexedGroup* indexed = find(group);
-    if (!indexed || !indexed->table) return;
+    if (!indexed) return;
     const std::uint32_t record = recordFiledUnder(*indexed, snippet, previous);
     if (record == SuffixTable::None) return;
     unfile(record);
@@ -187,7 +191,7 @@ std::uint32_t AbbreviationIndex::recordFiledUnder(IndexedGroup& group, const Sni
         return found == group.records.end() ? SuffixTable::None : *found;
     }
     const SuffixTable& suffixes = tableOf(group).suffixes;
-    std::uint32_t record = suffixes.first(keyOf(group, *abbreviation));
+    std::uint32_t record = suffixes.first(keyOf(prefixed(group, *abbreviation)));
     while (record != SuffixTable::None && !isIt(record)) record = suffixes.next(record);
     return record;
 }
@@ -216,35 +220,42 @@ void AbbreviationIndex::removeRecord(std::uint32_t index) {
     freeRecords_.push_back(index);
 }
 
-std::uint64_t AbbreviationIndex::keyOf(const IndexedGroup& group, std::u16string_view abbreviation) {
-    prefixed_.assign(group.prefix).append(abbreviation);
-    const std::size_t length = std::min(prefixed_.size(), LongestSuffix);
-    FoldedUnitsFromEnd units(prefixed_);
+std::uint64_t AbbreviationIndex::keyOf(std::u16string_view text) {
+    const std::size_t length = std::min(text.size(), LongestSuffix);
+    FoldedUnitsFromEnd units(text);
     std::uint64_t hash = EmptySuffixHash;
     for (std::size_t i = 0; i < length; ++i) hash = extendSuffixHash(hash, units.next());
     return mixedKey(hash, length);
 }
 
+const std::u16string& AbbreviationIndex::prefixed(const IndexedGroup& group, std::u16string_view abbreviation) {
+    return prefixed_.assign(group.prefix).append(abbreviation);
+}
+
 void AbbreviationIndex::file(std::uint32_t index) {
     Record& record = records_[index];
     const auto& abbreviation = record.snippet->abbreviation();
-    if (!record.group->table || !abbreviation || abbreviation->empty()) return;
-    record.length = record.group->prefix.size() + abbreviation->size();
+    if (!abbreviation || abbreviation->empty()) return;
+    const std::u16string& text = prefixed(*record.group, *abbreviation);
+    record.length = static_cast<std::uint32_t>(text.size());
+    longest_ = std::max(longest_, text.size());
 
     Table& table = tableOf(*record.group);
-    const std::size_t lengthIndex = std::min(record.length, LongestSuffix) - 1;
+    const std::size_t lengthIndex = std::min<std::size_t>(record.length, LongestSuffix) - 1;
     ++table.lengthCounts[lengthIndex];
     table.lengthsInUse |= std::uint64_t{1} << lengthIndex;
-    table.suffixes.add(index, keyOf(*record.group, *abbreviation));
+    table.suffixes.add(index, keyOf(text));
+    beginnings_.add(index, text);
 }
 
 void AbbreviationIndex::unfile(std::uint32_t index) {
     Record& record = records_[index];
     if (record.length == 0) return;
     Table& table = tableOf(*record.group);
-    const std::size_t lengthIndex = std::min(record.length, LongestSuffix) - 1;
+    const std::size_t lengthIndex = std::min<std::size_t>(record.length, LongestSuffix) - 1;
     if (--table.lengthCounts[lengthIndex] == 0) table.lengthsInUse &= ~(std::uint64_t{1} << lengthIndex);
     table.suffixes.remove(index);
+    beginnings_.remove(index);
     record.length = 0;
 }
 
@@ -260,12 +271,21 @@ void AbbreviationIndex::visitCandidates(Trigger trigger, std::u16string_view tex
         const std::uint64_t key = mixedKey(hash, length);
         if (!table.suffixes.mayContain(key)) continue;
         for (auto index = table.suffixes.first(key); index != SuffixTable::None; index = table.suffixes.next(index)) {
-            const Record& record = records_[index];
-            if (record.length > text.size()) continue;
-            if (record.group->ranksAreStale) refreshRanks(*record.group);
-            visitor.visit({record.group, &record.snippet, record.length, record.rank});
+            if (records_[index].length <= text.size()) show(index, visitor);
         }
     }
+}
+
+void AbbreviationIndex::visitBeginnings(std::u16string_view text, Visitor& visitor) const {
+    beginnings_.visit(text, [&](std::uint32_t index) {
+        if (records_[index].length >= text.size()) show(index, visitor);
+    });
+}
+
+void AbbreviationIndex::show(std::uint32_t record, Visitor& visitor) const {
+    const Record& shown = records_[record];
+    if (shown.group->ranksAreStale) refreshRanks(*shown.group);
+    visitor.visit({shown.group, &shown.snippet, shown.length, shown.rank});
 }
 
 void AbbreviationIndex::refreshRanks(const IndexedGroup& group) const {

@@ -66,12 +66,15 @@ void AutoText::setSnippetSelectorKeyModifier(std::int64_t modifier) {
 
 void AutoText::clear() {
     letters_.reset();
+    pauseWatch_.cancel();
     if (snippetSuggestionWindowVisible()) hideSnippetSuggestion();
     if (snippetQuickSearchWindowVisible()) snippetQuickSearchController_->close();
 }
 
 void AutoText::onSystemInputServiceInputContextChanged(InputContextChange& /*change*/) {
-    clear();
+    // The search window takes the keyboard itself: that is no reason to close it.
+    const bool isSearched = snippetQuickSearchWindowVisible() && dependencies_.inputService.isSameProcess();
+    isSearched ? letters_.reset() : clear();
 }
 
 void AutoText::onSystemInputServiceMouseDown(ZDMouseEventArgs& event) {

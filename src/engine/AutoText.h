@@ -35,9 +35,6 @@ class AutoText {
   public:
     using Match = SnippetMatcher::Match;
     using Groups = SnippetMatcher::Groups;
-    // The snippets of these groups that `letters`, which is not empty, may become, the best first. Called only when a
-    // list is shown or asked for, with the groups that admit the application in front.
-    using Suggest = std::function<SuggestionList(std::u16string_view letters, const Groups& groups)>;
 
     // What the engine works with; not owned, and outlives it.
     struct Dependencies {
@@ -55,7 +52,6 @@ class AutoText {
         FieldsEditor::Factory makeFieldsEditor = {};
         std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController = {};
         std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
-        Suggest suggest = {};  // empty: there is never anything to suggest
         // Told of each snippet that was sent. Empty: nobody is.
         std::function<void(const Snippet&)> snippetUsed = {};
     };
@@ -130,6 +126,8 @@ class AutoText {
     bool snippetSuggestionWindowVisible() const;
     // Offers what the buffer may become; for the hot key that does that.
     void suggestAbbreviations();
+    // The same without being asked, when the user pauses after two letters or more of something. Off at first.
+    void setSuggestsByItself(bool suggests);
     void refreshSuggestions();
     void showSnippetSuggestion();
     void hideSnippetSuggestion();
@@ -185,6 +183,10 @@ class AutoText {
     KeyDestination lastKeyDestination() const;
     void follow(const SnippetSender::Sent& sent);
 
+    Groups suggestingGroups() const;
+    void waitToSuggest();
+    void suggestAfterPause();
+    bool isEnoughToSuggestFor() const;
     void snippetSuggestionSuggestionSelected();
     void initSnippetQuickSearchController();
     void snippetQuickSearchSnippetSelectedAction();
@@ -206,6 +208,9 @@ class AutoText {
     std::unique_ptr<SuggestionController> snippetSuggestionController_;
     std::unique_ptr<QuickSearchController> snippetQuickSearchController_;
     Timer listOpening_;
+    bool suggestsByItself_ = false;
+    Timer pauseWatch_;       // looks whether the user pauses
+    double lastChange_ = 0;  // of the buffer by a key, in the run loop's time
     AutoCorrection correction_;
     SnippetSender sender_;
 };

@@ -11,6 +11,8 @@ std::vector<MatchDecision> AutoText::recentDecisions() const {
 
 void AutoText::noteSecureInput(bool began) {
     decisions_.add(began ? Outcome::SecureInputBegan : Outcome::SecureInputEnded);
+    // Nobody hears the keys that would pick from a list or close it.
+    if (began && snippetSuggestionWindowVisible()) clear();
 }
 
 void AutoText::noteSwitch() {

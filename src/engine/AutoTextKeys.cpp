@@ -53,7 +53,10 @@ void AutoText::processDelivered(ZDKeyEventArgs& event) {
     const std::u16string text = *std::exchange(event.s, std::u16string(1, event.c));
     letters_.append(std::u16string_view(text).substr(0, text.size() - 1));
     // What would be erased is not in front of the caret yet.
-    if (event.composing) return letters_.append(*event.s);
+    if (event.composing) {
+        pauseWatch_.cancel();
+        return letters_.append(*event.s);
+    }
     processNormalKeyDown(event);
 }
 
@@ -97,7 +100,9 @@ AutoText::Route AutoText::routeByKeyCode(ZDKeyEventArgs& event) {
 void AutoText::deleteLastLetter() {
     const bool wasEmpty = letters().empty();
     letters_.eraseLast();
-    if (!wasEmpty) refreshSnippetSuggestionController();
+    if (wasEmpty) return;
+    refreshSnippetSuggestionController();
+    waitToSuggest();
 }
 
 void AutoText::escapePressed(ZDKeyEventArgs& event) {
@@ -132,7 +137,10 @@ AutoText::Route AutoText::returnPressed(ZDKeyEventArgs& event) {
 AutoText::Route AutoText::spacePressed(const ZDKeyEventArgs& event) {
     if (dependencies_.inputService.keyModifier() != KeyModifier::Shift) return Route::Character;
     // Shift is the way to write an abbreviation out: the text is kept, nothing is looked for.
-    if (event.s) letters_.append(*event.s);
+    if (event.s) {
+        letters_.append(*event.s);
+        waitToSuggest();
+    }
     return Route::Done;
 }
 
@@ -225,6 +233,7 @@ void AutoText::offerMatches(std::vector<Match> matches) {
         return dependencies_.report("Several snippets match \"" + toUtf8(matches.front().second) +
                                     "\", and there is no list here to choose from.");
     }
+    suggestions_.reserve(matches.size());
     for (Match& match : matches) suggestions_.append(std::move(match.first), std::move(match.second));
     selectingSnippet_ = true;
     // Not from inside the callback: the application has to get the key first.
@@ -242,6 +251,7 @@ void AutoText::keyCompletedNothing(ZDKeyEventArgs& event) {
     } else {
         refreshSnippetSuggestionController();
     }
+    waitToSuggest();
 }
 
 void AutoText::sendCorrection(const AutoCorrection::Correction& correction, ZDKeyEventArgs& event) {

@@ -5,6 +5,13 @@
 
 namespace plume {
 
+namespace {
+constexpr std::size_t UsualSuggestions = 100;
+// One letter begins too much.
+constexpr std::size_t EnoughLetters = 2;
+constexpr double Pause = 0.4;  // seconds
+}  // namespace
+
 bool AutoText::snippetSuggestionWindowVisible() const {
     return snippetSuggestionController_ && snippetSuggestionController_->windowVisible();
 }
@@ -16,8 +23,14 @@ void AutoText::suggestAbbreviations() {
 
 void AutoText::refreshSuggestions() {
     suggestions_.clear();
-    if (letters().empty() || !dependencies_.suggest) return;
-    suggestions_ = dependencies_.suggest(letters(), filteredGroupsByApplication());
+    suggestions_.reserve(UsualSuggestions);
+    if (!letters().empty()) matcher_.findSuggestions(letters(), suggestingGroups(), suggestions_);
+}
+
+AutoText::Groups AutoText::suggestingGroups() const {
+    Groups groups = filteredGroupsByApplication();
+    std::erase_if(groups, [](const auto& group) { return !group->suggestAbbreviations(); });
+    return groups;
 }
 
 void AutoText::showSnippetSuggestion() {
@@ -33,7 +46,47 @@ void AutoText::showSnippetSuggestion() {
     snippetSuggestionController_->showWindowAtCaret();
 }
 
+void AutoText::setSuggestsByItself(bool suggests) {
+    suggestsByItself_ = suggests;
+    if (!suggests) pauseWatch_.cancel();
+}
+
+// One watch serves many keys: what a key costs is a look at the clock.
+void AutoText::waitToSuggest() {
+    if (!suggestsByItself_) return;
+    RunLoop& loop = dependencies_.inputService.runLoop();
+    lastChange_ = loop.now();
+    if (!pauseWatch_) pauseWatch_ = loop.performAfterDelay(Pause, [this] { suggestAfterPause(); });
+}
+
+void AutoText::suggestAfterPause() {
+    RunLoop& loop = dependencies_.inputService.runLoop();
+    pauseWatch_.cancel();
+    const double due = lastChange_ + Pause;
+    if (const double now = loop.now(); now < due) {
+        pauseWatch_ = loop.performAfterDelay(due - now, [this] { suggestAfterPause(); });
+        return;
+    }
+    if (selectingSnippet_ || snippetSuggestionWindowVisible() || snippetQuickSearchWindowVisible()) return;
+    refreshSuggestions();
+    if (isEnoughToSuggestFor()) {
+        showSnippetSuggestion();
+    } else {
+        suggestions_.clear();
+    }
+}
+
+bool AutoText::isEnoughToSuggestFor() const {
+    for (std::size_t i = 0; i < suggestions_.size(); ++i) {
+        const std::shared_ptr<SnippetGroup> group = suggestions_.suggestions[i]->parentGroup();
+        const std::size_t prefix = group ? group->abbreviationPrefix().value_or(u"").size() : 0;
+        if (suggestions_.suggestionFilters[i].size() >= prefix + EnoughLetters) return true;
+    }
+    return false;
+}
+
 void AutoText::hideSnippetSuggestion() {
+    pauseWatch_.cancel();
     selectingSnippet_ = false;
     if (snippetSuggestionController_) snippetSuggestionController_->close();
     suggestions_.clear();
@@ -101,7 +154,10 @@ void AutoText::initSnippetQuickSearchController() {
 
 void AutoText::snippetQuickSearchSnippetSelectedAction() {
     const std::shared_ptr<Snippet> snippet = snippetQuickSearchController_->selectedSnippet();
-    if (snippet) sendSnippetDirectly(snippet);
+    if (!snippet) return;
+    sender_.performOnceKeysAreTaken([this, snippet, typed = snippetQuickSearchController_->typedText()] {
+        sendSnippet(snippet, typed, SnippetTrigger::Direct);
+    });
 }
 
 }  // namespace plume

@@ -8,6 +8,8 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <optional>
+#include <string>
 #include <vector>
 
 #include "library/SnippetGroup.h"
@@ -31,6 +33,8 @@ class QuickSearchController {
 
     // Null when nothing is chosen.
     virtual std::shared_ptr<Snippet> selectedSnippet() const = 0;
+    // What the user had typed for it before the window came, and is erased when it is sent; nothing as a rule.
+    virtual const std::optional<std::u16string>& typedText() const = 0;
     // The snippet in this line of the results, null past their end.
     virtual std::shared_ptr<Snippet> snippetAtIndex(std::size_t index) const = 0;
 

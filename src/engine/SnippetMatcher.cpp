@@ -8,6 +8,7 @@
 
 #include "Foundation/Strings.h"
 #include "engine/AbbreviationIndex.h"
+#include "engine/SuggestionFinder.h"
 
 namespace plume {
 
@@ -194,6 +195,11 @@ std::vector<SnippetMatcher::Match> SnippetMatcher::findSnippetsInLetters(std::u1
     }
     if (!refusals.empty()) search.dropCoveredRefusals();
     return search.matchesInOrder();
+}
+
+void SnippetMatcher::findSuggestions(std::u16string_view letters, const Groups& groups,
+                                     SuggestionList& suggestions) const {
+    SuggestionFinder(*index_, groups).find(letters, suggestions);
 }
 
 const CharacterSet& SnippetMatcher::delimitersOf(const SnippetGroup& group) const {

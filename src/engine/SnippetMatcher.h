@@ -20,6 +20,7 @@
 namespace plume {
 
 class AbbreviationIndex;
+struct SuggestionList;
 
 class SnippetMatcher {
   public:
@@ -48,6 +49,10 @@ class SnippetMatcher {
     std::vector<Match> findSnippetsInLetters(std::u16string_view letters, char16_t trigger,
                                              std::u16string_view lettersWithoutSeparator,
                                              const KeyDestination& destination, Refusals& refusals) const;
+
+    // Appends what the end of the letters may become among the snippets of these groups, the best first
+    // (engine/SuggestionFinder.h).
+    void findSuggestions(std::u16string_view letters, const Groups& groups, SuggestionList& suggestions) const;
 
     // Whether what stands before `index` satisfies the group's expandAfter rule.
     bool checkGroup(const SnippetGroup& group, std::u16string_view text, std::size_t index) const;

@@ -27,6 +27,10 @@ struct SuggestionList {
     std::size_t size() const { return suggestions.size(); }
     bool isEmpty() const { return suggestions.empty(); }
 
+    void reserve(std::size_t count) {
+        suggestions.reserve(count);
+        suggestionFilters.reserve(count);
+    }
     void append(std::shared_ptr<Snippet> snippet, std::u16string filter) {
         suggestions.push_back(std::move(snippet));
         suggestionFilters.push_back(std::move(filter));
@@ -41,7 +45,7 @@ class SuggestionController {
   public:
     virtual ~SuggestionController() = default;
 
-    // The engine's own list, which outlives the controller and is read inside this call and reloadData only.
+    // The engine's own list, which outlives the controller. It is read on this thread while the window is visible.
     virtual void setSnippets(const SuggestionList& list) = 0;
     // Called, on the thread of the key events, when the user clicks an entry.
     virtual void setSuggestionSelectedAction(std::function<void()> action) = 0;

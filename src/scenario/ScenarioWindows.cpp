@@ -60,12 +60,14 @@ class SearchWindow final : public QuickSearchController {
     void showWindowAtTopRightCorner() override { visible_ = true; }
     void close() override { visible_ = false; }
     std::shared_ptr<Snippet> selectedSnippet() const override { return nullptr; }
+    const std::optional<std::u16string>& typedText() const override { return nothingTyped_; }
     std::shared_ptr<Snippet> snippetAtIndex(std::size_t /*index*/) const override { return nullptr; }
     bool windowVisible() const override { return visible_; }
     Rectangle windowFrame() const override { return SearchFrame; }
 
   private:
     bool visible_ = false;
+    const std::optional<std::u16string> nothingTyped_;
 };
 
 class Form final : public FieldsEditor {

@@ -7,8 +7,11 @@
 namespace plume {
 namespace {
 
-TEST(Allocation, KeysThatCompleteNothingAllocateNothing) {
+class Allocation : public ::testing::TestWithParam<bool> {};
+
+TEST_P(Allocation, IsNotNeededForKeysThatCompleteNothing) {
     EngineDesk desk;
+    desk.engine.setSuggestsByItself(GetParam());
     const auto group = desk.add({u"zz"}, ExpandTrigger::DelimiterSwallowed);
     for (char16_t c = u'a'; c <= u'z'; ++c) {
         group->addItem(std::make_shared<Snippet>(std::u16string(12, c), u"content"));
@@ -36,7 +39,9 @@ TEST(Allocation, KeysThatCompleteNothingAllocateNothing) {
     EXPECT_EQ(desk.engine.letters().size(), 2 * (typed.size() - 2)) << "every key was followed";
 }
 
-TEST(Allocation, AKnownProgramIsNamedWithoutAllocating) {
+INSTANTIATE_TEST_SUITE_P(SuggestingByItselfOrNot, Allocation, ::testing::Bool());
+
+TEST(AllocationForNames, IsNotNeededForAKnownProgram) {
     EngineDesk desk;
     const ProcessSerialNumber editor = desk.desktop.front()->process();
     desk.identifiers.getBundleIdentifier(editor);

@@ -29,9 +29,15 @@ class RecordedList final : public SuggestionController {
         ++window_.shownAtCaret;
     }
     void close() override { window_.visible = false; }
-    void nextSuggestion() override { ++window_.selected; }
-    void previousSuggestion() override { --window_.selected; }
-    std::size_t selectedSuggestionIndex() const override { return window_.selected; }
+    void nextSuggestion() override {
+        if (window_.selected + 1 < window_.entries.size()) ++window_.selected;
+    }
+    void previousSuggestion() override {
+        if (window_.selected > 0) --window_.selected;
+    }
+    std::size_t selectedSuggestionIndex() const override {
+        return window_.entries.empty() ? NotFound : window_.selected;
+    }
     bool windowVisible() const override { return window_.visible; }
     Rectangle windowFrame() const override { return window_.frame; }
 
@@ -51,6 +57,7 @@ class RecordedSearch final : public QuickSearchController {
     void showWindowAtTopRightCorner() override { show(true); }
     void close() override { window_.visible = false; }
     std::shared_ptr<Snippet> selectedSnippet() const override { return window_.selected; }
+    const std::optional<std::u16string>& typedText() const override { return window_.typedText; }
     std::shared_ptr<Snippet> snippetAtIndex(std::size_t index) const override {
         return index < window_.results.size() ? window_.results[index] : nullptr;
     }
@@ -64,17 +71,6 @@ class RecordedSearch final : public QuickSearchController {
     }
     SearchWindow& window_;
 };
-
-// Every snippet whose abbreviation starts with the whole buffer.
-SuggestionList whatStartsWith(std::u16string_view letters, const AutoText::Groups& groups) {
-    SuggestionList list;
-    for (const auto& group : groups) {
-        for (const auto& snippet : group->items()) {
-            if (snippet->abbreviation()->starts_with(letters)) list.append(snippet, std::u16string(letters));
-        }
-    }
-    return list;
-}
 
 }  // namespace
 
@@ -119,8 +115,7 @@ AutoText::Dependencies EngineDesk::dependencies() {
                     return std::make_unique<TestForm>(std::move(content), target, forms);
                 },
             .makeSuggestionController = [this] { return std::make_unique<RecordedList>(list); },
-            .makeQuickSearchController = [this] { return std::make_unique<RecordedSearch>(search); },
-            .suggest = whatStartsWith};
+            .makeQuickSearchController = [this] { return std::make_unique<RecordedSearch>(search); }};
 }
 
 std::shared_ptr<SnippetGroup> EngineDesk::add(const std::vector<std::u16string>& abbreviations, ExpandTrigger trigger) {

@@ -37,6 +37,7 @@ struct SearchWindow {
     std::size_t groupCount = 0;
     std::vector<std::shared_ptr<Snippet>> results;
     std::shared_ptr<Snippet> selected;
+    std::optional<std::u16string> typedText;
     Rectangle frame{{400, 100}, {200, 50}};
     std::function<void()> choose;
 };

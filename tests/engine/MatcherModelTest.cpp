@@ -6,6 +6,7 @@
 #include "Foundation/Strings.h"
 #include "engine/SnippetMatcher.h"
 #include "tests/engine/MatcherSupport.h"
+#include "tests/engine/RandomLibrary.h"
 
 namespace plume {
 namespace {
@@ -121,58 +122,6 @@ class NaiveMatcher {
     const Place& place_;
 };
 
-// Few characters, so that random typings complete random abbreviations often.
-const std::vector<std::u16string> Alphabet = {u"a",      u"A",      u"b",      u";",          u" ",
-                                              u"1",      u".",      u"\n",     u"\u00e9",     u"\u00c9",
-                                              u"\u03c3", u"\u03a3", u"\u03c2", u"\U00010400", u"\U00010428"};
-
-std::u16string randomText(int most, std::size_t letters = Alphabet.size()) {
-    std::u16string text;
-    const int length = *rc::gen::inRange(0, most + 1);
-    for (int i = 0; i < length; ++i) text += Alphabet[*rc::gen::inRange<std::size_t>(0, letters)];
-    return text;
-}
-
-void randomizeSettings(SnippetGroup& group) {
-    group.setExpandTrigger(static_cast<ExpandTrigger>(*rc::gen::element(0, 0, 0, 1, 2, 3, 4)));
-    group.setExpandAfter(static_cast<ExpandAfter>(*rc::gen::element(0, 1, 2, 2, 3)));
-    group.setAbbreviationPrefix(*rc::gen::element<std::u16string>(u"", u"", u";", u";;", u"aA", u"a;a", u"\u00e9"));
-    group.setDelimiters(*rc::gen::element<std::optional<CharacterSet>>(
-        std::nullopt, CharacterSet::withCharacters(u"b "), CharacterSet::withCharacters(u".")));
-    group.availability().availability = *rc::gen::element(0, 0, 0, 1, 2);
-    group.availability().applications = {{u"org.editor"}};
-    group.availability().inputMethodsOption = *rc::gen::element(0, 0, 0, 1, 2);
-    group.availability().inputMethods = {{u"US"}};
-}
-
-std::shared_ptr<Snippet> randomSnippet() {
-    const bool hasContent = *rc::gen::inRange(0, 10) > 0;
-    auto snippet = std::make_shared<Snippet>(randomText(3), hasContent ? Snippet::Text(u"content") : std::nullopt);
-    snippet->setCaseSensitivity(static_cast<CaseSensitivity>(*rc::gen::inRange(0, 3)));
-    return snippet;
-}
-
-void editLibrary(std::vector<std::shared_ptr<SnippetGroup>>& groups) {
-    if (groups.empty()) return;
-    const auto group = *rc::gen::elementOf(groups);
-    switch (*rc::gen::inRange(0, 5)) {
-        case 0:
-            randomizeSettings(*group);
-            break;
-        case 1:
-            group->insertItem(randomSnippet(), *rc::gen::inRange<std::size_t>(0, group->items().size() + 1));
-            break;
-        case 2:
-            if (!group->items().empty()) group->removeItem(*rc::gen::elementOf(group->items()));
-            break;
-        case 3:
-            if (!group->items().empty()) (*rc::gen::elementOf(group->items()))->setAbbreviation(randomText(3));
-            break;
-        default:
-            std::rotate(groups.begin(), groups.begin() + 1, groups.end());
-    }
-}
-
 // What somebody types next: an abbreviation and a delimiter, or anything.
 std::u16string plannedTyping(const std::vector<std::shared_ptr<SnippetGroup>>& groups) {
     const auto group = *rc::gen::elementOf(groups);
@@ -193,15 +142,8 @@ std::u16string nextKey(std::u16string& planned) {
 }
 
 RC_GTEST_PROP(MatcherModel, AgreesWithTheRules, ()) {
-    std::vector<std::shared_ptr<SnippetGroup>> groups;
+    SnippetMatcher::Groups groups = randomLibrary();
     SnippetMatcher matcher(testDelimiters());
-    const int groupCount = *rc::gen::inRange(1, 6);
-    for (int i = 0; i < groupCount; ++i) {
-        groups.push_back(SnippetGroup::make());
-        randomizeSettings(*groups.back());
-        const int snippets = *rc::gen::inRange(0, 12);
-        for (int j = 0; j < snippets; ++j) groups.back()->addItem(randomSnippet());
-    }
     matcher.setSnippetGroups(groups);
 
     // Sometimes a long buffer, and sometimes one full of prefixes that overlap themselves.
