@@ -751,10 +751,6 @@
         <translation>Super</translation>
     </message>
     <message>
-        <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held.</source>
-        <translation>In Vorschlägen und in der Schnellsuche wählen die Ziffern 1 bis 9 ein Snippet, solange diese Taste gedrückt ist.</translation>
-    </message>
-    <message>
         <source>Quick search looks in</source>
         <translation>Die Schnellsuche durchsucht</translation>
     </message>
@@ -797,6 +793,46 @@
     <message>
         <source>At least one is needed.</source>
         <translation>Eines davon muss gewählt bleiben.</translation>
+    </message>
+    <message>
+        <source>&amp;Suggest snippets while I type</source>
+        <translation>Snippets beim Tippen &amp;vorschlagen</translation>
+    </message>
+    <message>
+        <source>A list comes up by itself after a pause in an abbreviation of which two letters are typed. Return takes its selected snippet, Esc closes it.</source>
+        <translation>Nach einer Pause in einem Kürzel, von dem zwei Buchstaben getippt sind, erscheint von selbst eine Liste. Die Eingabetaste nimmt das ausgewählte Snippet, Esc schließt sie.</translation>
+    </message>
+    <message>
+        <source>Quick search</source>
+        <translation>Schnellsuche</translation>
+    </message>
+    <message>
+        <source>Be&amp;gin with the word before the caret</source>
+        <translation>&amp;Mit dem Wort vor der Schreibmarke beginnen</translation>
+    </message>
+    <message>
+        <source>The snippet that is chosen takes its place then.</source>
+        <translation>Das gewählte Snippet tritt dann an seine Stelle.</translation>
+    </message>
+    <message>
+        <source>Show often &amp;used snippets first</source>
+        <translation>&amp;Oft benutzte Snippets zuerst zeigen</translation>
+    </message>
+    <message>
+        <source>How often each snippet is used is kept on this computer, never what was searched for.</source>
+        <translation>Wie oft jedes Snippet benutzt wird, bleibt auf diesem Computer gespeichert; wonach gesucht wurde, nie.</translation>
+    </message>
+    <message>
+        <source>&amp;Forget How Often Snippets Were Used</source>
+        <translation>Ver&amp;gessen, wie oft Snippets benutzt wurden</translation>
+    </message>
+    <message>
+        <source>Forget How Often Snippets Were Used</source>
+        <translation>Vergessen, wie oft Snippets benutzt wurden</translation>
+    </message>
+    <message>
+        <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held, and 0 picks the tenth.</source>
+        <translation>In Vorschlägen und in der Schnellsuche wählen die Ziffern 1 bis 9 ein Snippet, solange diese Taste gedrückt ist, und 0 wählt das zehnte.</translation>
     </message>
 </context>
 <context>
@@ -1028,6 +1064,33 @@
     <message>
         <source>%1 seconds</source>
         <translation>%1 Sekunden</translation>
+    </message>
+    <message>
+        <source>The snippet was not sent: it is no longer in your library.</source>
+        <translation>Das Snippet wurde nicht gesendet: Es ist nicht mehr in der Bibliothek.</translation>
+    </message>
+    <message>
+        <source>The snippet was not sent: the window that it was for is gone, or does not take the keyboard.</source>
+        <translation>Das Snippet wurde nicht gesendet: Das Fenster, für das es war, ist fort oder nimmt die Tastatur nicht an.</translation>
+    </message>
+</context>
+<context>
+    <name>SnippetRow</name>
+    <message>
+        <source>Shift+%1</source>
+        <translation>Umschalt+%1</translation>
+    </message>
+    <message>
+        <source>Ctrl+%1</source>
+        <translation>Strg+%1</translation>
+    </message>
+    <message>
+        <source>Alt+%1</source>
+        <translation>Alt+%1</translation>
+    </message>
+    <message>
+        <source>Super+%1</source>
+        <translation>Super+%1</translation>
     </message>
 </context>
 <context>
@@ -1508,6 +1571,26 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
         <source>Throw Away</source>
         <translation>Verwerfen</translation>
     </message>
+    <message>
+        <source>Edit Snippet</source>
+        <translation>Snippet bearbeiten</translation>
+    </message>
+    <message>
+        <source>&amp;Save Changes</source>
+        <translation>Änderungen &amp;speichern</translation>
+    </message>
+    <message>
+        <source>Formatted text can be looked at here, and not be changed.</source>
+        <translation>Formatierter Text lässt sich hier ansehen, aber nicht ändern.</translation>
+    </message>
+    <message>
+        <source>Do you want to throw your changes away?</source>
+        <translation>Die Änderungen verwerfen?</translation>
+    </message>
+    <message>
+        <source>They were not saved yet.</source>
+        <translation>Sie wurden noch nicht gespeichert.</translation>
+    </message>
 </context>
 <context>
     <name>plume::PreferencesPage</name>
@@ -1769,6 +1852,64 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     </message>
 </context>
 <context>
+    <name>plume::QuickSearchModel</name>
+    <message>
+        <source>Similar</source>
+        <translation>Ähnlich</translation>
+    </message>
+</context>
+<context>
+    <name>plume::QuickSearchWindow</name>
+    <message>
+        <source>Quick Search</source>
+        <translation>Schnellsuche</translation>
+    </message>
+    <message>
+        <source>Return inserts, Ctrl+Return copies, Ctrl+E edits, Esc closes</source>
+        <translation>Eingabe setzt ein, Strg+Eingabe kopiert, Strg+E bearbeitet, Esc schließt</translation>
+    </message>
+    <message>
+        <source>Search snippets</source>
+        <translation>Snippets suchen</translation>
+    </message>
+    <message>
+        <source>Found snippets</source>
+        <translation>Gefundene Snippets</translation>
+    </message>
+    <message>
+        <source>Search in</source>
+        <translation>Suchen in</translation>
+    </message>
+    <message>
+        <source>What is searched</source>
+        <translation>Was durchsucht wird</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviations</source>
+        <translation>&amp;Kürzel</translation>
+    </message>
+    <message>
+        <source>&amp;Contents</source>
+        <translation>&amp;Inhalte</translation>
+    </message>
+    <message>
+        <source>&amp;Labels</source>
+        <translation>&amp;Bezeichnungen</translation>
+    </message>
+    <message>
+        <source>&amp;Wildcards</source>
+        <translation>&amp;Platzhalter</translation>
+    </message>
+    <message>
+        <source>You have no snippets yet.</source>
+        <translation>Noch keine Snippets.</translation>
+    </message>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Nichts gefunden.</translation>
+    </message>
+</context>
+<context>
     <name>plume::ReportsWindow</name>
     <message numerus="yes">
         <source>%1 (%n times)</source>
@@ -1908,6 +2049,17 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     </message>
 </context>
 <context>
+    <name>plume::SnippetPreview</name>
+    <message>
+        <source>Preview of the selected snippet</source>
+        <translation>Vorschau des ausgewählten Snippets</translation>
+    </message>
+    <message>
+        <source>A script: what it prints is inserted.</source>
+        <translation>Ein Skript: Seine Ausgabe wird eingesetzt.</translation>
+    </message>
+</context>
+<context>
     <name>plume::SnippetRowsMenu</name>
     <message>
         <source>%1 … %2</source>
@@ -1996,6 +2148,21 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>&amp;Restore…</source>
         <translation>&amp;Wiederherstellen…</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SuggestionWindow</name>
+    <message>
+        <source>Suggestions</source>
+        <translation>Vorschläge</translation>
+    </message>
+    <message>
+        <source>Suggested snippets</source>
+        <translation>Vorgeschlagene Snippets</translation>
+    </message>
+    <message>
+        <source>%1 to %2 of %3</source>
+        <translation>%1 bis %2 von %3</translation>
     </message>
 </context>
 <context>

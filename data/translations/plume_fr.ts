@@ -751,10 +751,6 @@
         <translation>Super</translation>
     </message>
     <message>
-        <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held.</source>
-        <translation>Dans les suggestions et la recherche rapide, les chiffres de 1 à 9 choisissent un extrait tant que cette touche est enfoncée.</translation>
-    </message>
-    <message>
         <source>Quick search looks in</source>
         <translation>La recherche rapide porte sur</translation>
     </message>
@@ -797,6 +793,46 @@
     <message>
         <source>At least one is needed.</source>
         <translation>Il en faut au moins un.</translation>
+    </message>
+    <message>
+        <source>&amp;Suggest snippets while I type</source>
+        <translation>&amp;Suggérer des extraits pendant la frappe</translation>
+    </message>
+    <message>
+        <source>A list comes up by itself after a pause in an abbreviation of which two letters are typed. Return takes its selected snippet, Esc closes it.</source>
+        <translation>Une liste apparaît d’elle-même après une pause dans une abréviation dont deux lettres sont tapées. Entrée prend l’extrait sélectionné, Échap la ferme.</translation>
+    </message>
+    <message>
+        <source>Quick search</source>
+        <translation>Recherche rapide</translation>
+    </message>
+    <message>
+        <source>Be&amp;gin with the word before the caret</source>
+        <translation>Commencer par le &amp;mot avant le point d’insertion</translation>
+    </message>
+    <message>
+        <source>The snippet that is chosen takes its place then.</source>
+        <translation>L’extrait choisi prend alors sa place.</translation>
+    </message>
+    <message>
+        <source>Show often &amp;used snippets first</source>
+        <translation>Afficher d’abord les &amp;extraits souvent utilisés</translation>
+    </message>
+    <message>
+        <source>How often each snippet is used is kept on this computer, never what was searched for.</source>
+        <translation>Le nombre d’utilisations de chaque extrait est gardé sur cet ordinateur, jamais ce qui a été cherché.</translation>
+    </message>
+    <message>
+        <source>&amp;Forget How Often Snippets Were Used</source>
+        <translation>O&amp;ublier combien de fois les extraits ont servi</translation>
+    </message>
+    <message>
+        <source>Forget How Often Snippets Were Used</source>
+        <translation>Oublier combien de fois les extraits ont servi</translation>
+    </message>
+    <message>
+        <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held, and 0 picks the tenth.</source>
+        <translation>Dans les suggestions et la recherche rapide, les chiffres de 1 à 9 choisissent un extrait tant que cette touche est enfoncée, et 0 le dixième.</translation>
     </message>
 </context>
 <context>
@@ -1028,6 +1064,33 @@
     <message>
         <source>%1 seconds</source>
         <translation>%1 secondes</translation>
+    </message>
+    <message>
+        <source>The snippet was not sent: it is no longer in your library.</source>
+        <translation>L’extrait n’a pas été envoyé&#x202f;: il n’est plus dans votre bibliothèque.</translation>
+    </message>
+    <message>
+        <source>The snippet was not sent: the window that it was for is gone, or does not take the keyboard.</source>
+        <translation>L’extrait n’a pas été envoyé&#x202f;: la fenêtre à laquelle il était destiné a disparu, ou ne prend pas le clavier.</translation>
+    </message>
+</context>
+<context>
+    <name>SnippetRow</name>
+    <message>
+        <source>Shift+%1</source>
+        <translation>Maj+%1</translation>
+    </message>
+    <message>
+        <source>Ctrl+%1</source>
+        <translation>Ctrl+%1</translation>
+    </message>
+    <message>
+        <source>Alt+%1</source>
+        <translation>Alt+%1</translation>
+    </message>
+    <message>
+        <source>Super+%1</source>
+        <translation>Super+%1</translation>
     </message>
 </context>
 <context>
@@ -1508,6 +1571,26 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
         <source>Throw Away</source>
         <translation>Abandonner</translation>
     </message>
+    <message>
+        <source>Edit Snippet</source>
+        <translation>Modifier l’extrait</translation>
+    </message>
+    <message>
+        <source>&amp;Save Changes</source>
+        <translation>Enregi&amp;strer</translation>
+    </message>
+    <message>
+        <source>Formatted text can be looked at here, and not be changed.</source>
+        <translation>Un texte mis en forme peut être consulté ici, mais pas modifié.</translation>
+    </message>
+    <message>
+        <source>Do you want to throw your changes away?</source>
+        <translation>Voulez-vous abandonner vos modifications&#x202f;?</translation>
+    </message>
+    <message>
+        <source>They were not saved yet.</source>
+        <translation>Elles n’ont pas encore été enregistrées.</translation>
+    </message>
 </context>
 <context>
     <name>plume::PreferencesPage</name>
@@ -1769,6 +1852,64 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
 </context>
 <context>
+    <name>plume::QuickSearchModel</name>
+    <message>
+        <source>Similar</source>
+        <translation>Approchants</translation>
+    </message>
+</context>
+<context>
+    <name>plume::QuickSearchWindow</name>
+    <message>
+        <source>Quick Search</source>
+        <translation>Recherche rapide</translation>
+    </message>
+    <message>
+        <source>Return inserts, Ctrl+Return copies, Ctrl+E edits, Esc closes</source>
+        <translation>Entrée insère, Ctrl+Entrée copie, Ctrl+E modifie, Échap ferme</translation>
+    </message>
+    <message>
+        <source>Search snippets</source>
+        <translation>Rechercher des extraits</translation>
+    </message>
+    <message>
+        <source>Found snippets</source>
+        <translation>Extraits trouvés</translation>
+    </message>
+    <message>
+        <source>Search in</source>
+        <translation>Chercher dans</translation>
+    </message>
+    <message>
+        <source>What is searched</source>
+        <translation>Ce qui est parcouru</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviations</source>
+        <translation>Les &amp;abréviations</translation>
+    </message>
+    <message>
+        <source>&amp;Contents</source>
+        <translation>Les &amp;contenus</translation>
+    </message>
+    <message>
+        <source>&amp;Labels</source>
+        <translation>Les &amp;libellés</translation>
+    </message>
+    <message>
+        <source>&amp;Wildcards</source>
+        <translation>Les &amp;jokers</translation>
+    </message>
+    <message>
+        <source>You have no snippets yet.</source>
+        <translation>Vous n’avez pas encore d’extraits.</translation>
+    </message>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Rien n’a été trouvé.</translation>
+    </message>
+</context>
+<context>
     <name>plume::ReportsWindow</name>
     <message numerus="yes">
         <source>%1 (%n times)</source>
@@ -1908,6 +2049,17 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
 </context>
 <context>
+    <name>plume::SnippetPreview</name>
+    <message>
+        <source>Preview of the selected snippet</source>
+        <translation>Aperçu de l’extrait sélectionné</translation>
+    </message>
+    <message>
+        <source>A script: what it prints is inserted.</source>
+        <translation>Un script&#x202f;: ce qu’il affiche est inséré.</translation>
+    </message>
+</context>
+<context>
     <name>plume::SnippetRowsMenu</name>
     <message>
         <source>%1 … %2</source>
@@ -1996,6 +2148,21 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>&amp;Restore…</source>
         <translation>&amp;Restaurer…</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SuggestionWindow</name>
+    <message>
+        <source>Suggestions</source>
+        <translation>Suggestions</translation>
+    </message>
+    <message>
+        <source>Suggested snippets</source>
+        <translation>Extraits suggérés</translation>
+    </message>
+    <message>
+        <source>%1 to %2 of %3</source>
+        <translation>%1 à %2 sur %3</translation>
     </message>
 </context>
 <context>

@@ -21,9 +21,9 @@ constexpr int MenuPolls = 50;
 // By itself the keyboard is tried again this long after it was given up; a moment more for that to be done.
 constexpr double ListenAgainDelay = 61;
 
-// Where windows stand concerns nobody else.
-bool isPlaceOfWindow(const std::string& key) {
-    return key.starts_with("WindowPlace.");
+// Where windows stand, and what was used how often, is kept with the settings and sets nothing.
+bool setsNothing(const std::string& key) {
+    return key.starts_with("WindowPlace.") || key == SnippetUses::Key;
 }
 
 }  // namespace
@@ -34,7 +34,9 @@ AppDelegate::AppDelegate(Dependencies dependencies)
                   .applications = around_.applications,
                   .log = around_.log,
                   .listener = *this,
-                  .hasWindows = true}),
+                  .hasWindows = true,
+                  .suggestionView = around_.suggestionView,
+                  .quickSearchView = around_.quickSearchView}),
       manager_(around_.dataManager),
       windows_(around_.windows) {}
 
@@ -109,6 +111,7 @@ void AppDelegate::applicationWillTerminate() {
     statusItem_ = nullptr;
     windows_.commitEdits();
     if (const auto saved = manager_.saveRest(); !saved) around_.log(saved.error().message);
+    if (const auto kept = around_.uses.write(); !kept) around_.log(kept.error().message);
 }
 
 void AppDelegate::applicationShouldHandleReopen() {
@@ -144,7 +147,7 @@ void AppDelegate::observeSettings() {
 
 void AppDelegate::userDefaultsChanged(UserDefaultsChange& change) {
     if (manager_.sync().updatingPreferences()) return;
-    if (std::ranges::all_of(change.keys, isPlaceOfWindow)) return;
+    if (std::ranges::all_of(change.keys, setsNothing)) return;
     loadPreferences();
     // The settings window tells by itself, once the user has chosen, and is asked which library is to be kept.
     const bool syncChanged = change.byAnotherProcess && std::ranges::any_of(change.keys, LibrarySync::isFolderSetting);
@@ -183,11 +186,9 @@ void AppDelegate::feedExpansion() {
 }
 
 void AppDelegate::snippetUsed(const Uuid& snippet) {
-    for (const auto& group : manager_.snippetGroups()) {
-        for (const auto& each : group->items()) {
-            if (each->uuid() == snippet) each->updateLastTimeUsed();
-        }
-    }
+    if (const auto used = snippetWithUuid(snippet)) used->updateLastTimeUsed();
+    around_.uses.note(snippet, currentDate());
+    lastUsedSnippet_ = snippet;
     if (!useTimer_) useTimer_ = around_.mainLoop.performAfterDelay(UseDelay, [this] { keepUse(); });
 }
 
@@ -195,6 +196,16 @@ void AppDelegate::snippetUsed(const Uuid& snippet) {
 void AppDelegate::keepUse() {
     useTimer_.cancel();
     if (const auto kept = manager_.writeJournal(); !kept) reported(kept.error().message);
+    around_.uses.dropAllBut(manager_.snippetGroups());
+    if (const auto kept = around_.uses.write(); !kept) reported(kept.error().message);
+}
+
+std::shared_ptr<Snippet> AppDelegate::snippetWithUuid(const Uuid& uuid) const {
+    for (const auto& group : manager_.snippetGroups()) {
+        const auto found = std::ranges::find(group->items(), std::optional(uuid), &Snippet::uuid);
+        if (found != group->items().end()) return *found;
+    }
+    return nullptr;
 }
 
 void AppDelegate::offerBackup(const std::optional<Path>& newestBackup) {
@@ -276,6 +287,8 @@ void AppDelegate::hotKeyPressed(HotKeyForWindow hotKey) {
             return makeSnippetFromSelection();
         case HotKeyForWindow::OpenMainWindow:
             return windows_.showMacrosWindow(false);
+        case HotKeyForWindow::OpenLastUsedSnippet:
+            return openLastUsedSnippet();
     }
 }
 
@@ -292,6 +305,16 @@ void AppDelegate::makeSnippetFromClipboard() {
 
 void AppDelegate::newDocument() {
     windows_.showNewSnippetWindow({});
+}
+
+void AppDelegate::editSnippet(const std::shared_ptr<Snippet>& snippet) {
+    windows_.showNewSnippetWindow({.content = {}, .edited = snippet});
+}
+
+// Of this run; without one the snippets are shown.
+void AppDelegate::openLastUsedSnippet() {
+    const auto snippet = lastUsedSnippet_ ? snippetWithUuid(*lastUsedSnippet_) : nullptr;
+    snippet ? editSnippet(snippet) : windows_.showMacrosWindow(false);
 }
 
 void AppDelegate::showPreferencesWindow(const std::string& page) {
@@ -348,13 +371,35 @@ void AppDelegate::sendOnceKeyboardIsFree(const std::shared_ptr<Snippet>& snippet
     }
     // Places are those of the library that the other thread has.
     feedExpansion();
+    if (const auto place = placeOf(snippet)) expansion_.sendSnippetDirectly(*place);
+}
+
+std::optional<Expansion::SnippetPlace> AppDelegate::placeOf(const std::shared_ptr<Snippet>& snippet) const {
     const SnippetGroups& groups = manager_.snippetGroups();
+    // A download may have put an equal one into its place.
+    const auto isIt = [&](const std::shared_ptr<Snippet>& each) {
+        return each == snippet || (snippet->uuid() && each->uuid() == snippet->uuid());
+    };
     for (std::size_t group = 0; group < groups.size(); ++group) {
         const auto& items = groups[group]->items();
-        const auto found = std::ranges::find(items, snippet);
+        const auto found = std::ranges::find_if(items, isIt);
         if (found == items.end()) continue;
-        return expansion_.sendSnippetDirectly({group, static_cast<std::size_t>(found - items.begin())});
+        return Expansion::SnippetPlace{group, static_cast<std::size_t>(found - items.begin())};
     }
+    return std::nullopt;
+}
+
+void AppDelegate::sendFoundSnippet(const std::shared_ptr<Snippet>& snippet) {
+    feedExpansion();
+    expansion_.sendFoundSnippet(placeOf(snippet));
+}
+
+void AppDelegate::setFoundSnippets(const std::vector<std::shared_ptr<Snippet>>& snippets) {
+    feedExpansion();
+    std::vector<std::optional<Expansion::SnippetPlace>> places;
+    places.reserve(snippets.size());
+    for (const auto& snippet : snippets) places.push_back(placeOf(snippet));
+    expansion_.setFoundSnippets(std::move(places));
 }
 
 // ---- The keyboard ----

@@ -19,6 +19,7 @@
 #include "app/StatusItem.h"
 #include "library/DataManager.h"
 #include "library/LibraryFeed.h"
+#include "library/SnippetUses.h"
 #include "platform/RunLoop.h"
 #include "platform/UserDefaults.h"
 
@@ -35,6 +36,10 @@ class AppDelegate final : private ExpansionListener {
         DataManager& dataManager;
         ApplicationWindows& windows;
         ReportLog& reports;
+        // See Expansion.
+        std::function<SuggestionView&()> suggestionView;
+        std::function<QuickSearchView&()> quickSearchView;
+        SnippetUses& uses;
         Composition::Ports ports;
         std::shared_ptr<const ApplicationTable> applications;
         std::function<void(const std::string& line)> log;
@@ -81,6 +86,8 @@ class AppDelegate final : private ExpansionListener {
     void makeSnippetFromSelection();
     void makeSnippetFromClipboard();
     void newDocument();
+    void editSnippet(const std::shared_ptr<Snippet>& snippet);
+    void openLastUsedSnippet();
     void showPreferencesWindow(const std::string& page = {});
     void showAboutWindow();
     void showWelcomeWindow();
@@ -90,9 +97,16 @@ class AppDelegate final : private ExpansionListener {
     void diagnostic();
     void undo() { expansion_.undo(); }
     void expandAtHotkey() { expansion_.expandAtHotkey(); }
+    void suggestAbbreviations() { expansion_.suggestAbbreviations(); }
+    void quickSearch() { expansion_.quickSearch(); }
+    void searchSnippets() { expansion_.quickSearchAtTopRightCorner(); }
     void tryKeyboardAgain();
     // Into the program that has the keyboard, as soon as no menu holds it.
     void sendSnippetDirectly(const std::shared_ptr<Snippet>& snippet);
+    // What was chosen in the quick-search window, which is gone: into the program that had the keyboard before it.
+    void sendFoundSnippet(const std::shared_ptr<Snippet>& snippet);
+    // What that window shows first.
+    void setFoundSnippets(const std::vector<std::shared_ptr<Snippet>>& snippets);
     void terminate() { around_.terminate(); }
 
     // ---- What it tells ----
@@ -134,6 +148,8 @@ class AppDelegate final : private ExpansionListener {
     void keepEnabled(bool enabled);
     void useFile(const Path& file, ApplicationWindows::FileUse use);
     void sendOnceKeyboardIsFree(const std::shared_ptr<Snippet>& snippet, int attemptsLeft);
+    std::optional<Expansion::SnippetPlace> placeOf(const std::shared_ptr<Snippet>& snippet) const;
+    std::shared_ptr<Snippet> snippetWithUuid(const Uuid& uuid) const;
 
     const Dependencies around_;
     Expansion expansion_;
@@ -142,6 +158,7 @@ class AppDelegate final : private ExpansionListener {
     std::function<Result<void>()> loadLibrary_;
     LibraryFeed feed_;
     std::unique_ptr<StatusItem> statusItem_;
+    std::optional<Uuid> lastUsedSnippet_;
     bool enabled_ = true;
     bool keyboardIsLost_ = false;
     bool uiLoaded_ = false;

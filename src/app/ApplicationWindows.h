@@ -15,11 +15,12 @@
 
 namespace plume {
 
-class SnippetGroup;
+class Snippet;
 
-// What a new snippet begins with, before the user has a look at it.
+// What a new snippet begins with, before the user has a look at it; or the one that is to be changed.
 struct SnippetDraft {
     std::u16string content = {};
+    std::shared_ptr<Snippet> edited = {};
 };
 
 class ApplicationWindows {

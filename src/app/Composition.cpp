@@ -83,7 +83,6 @@ void Composition::makeParts() {
         .makeFieldsEditor = environment_.makeFieldsEditor,
         .makeSuggestionController = environment_.makeSuggestionController,
         .makeQuickSearchController = environment_.makeQuickSearchController,
-        .suggest = environment_.suggest,
         .snippetUsed = environment_.snippetUsed,
     });
 
@@ -110,6 +109,7 @@ HotKeyDispatch::Actions Composition::hotKeyActions() {
         actions.makeSnippetFromClipboard = [&toWindow] { toWindow(HotKeyForWindow::MakeSnippetFromClipboard); };
         actions.makeSnippetFromSelection = [&toWindow] { toWindow(HotKeyForWindow::MakeSnippetFromSelection); };
         actions.openMainWindow = [&toWindow] { toWindow(HotKeyForWindow::OpenMainWindow); };
+        actions.openLastUsedSnippet = [&toWindow] { toWindow(HotKeyForWindow::OpenLastUsedSnippet); };
     }
     return actions;
 }
@@ -127,6 +127,7 @@ void Composition::loadPreferences() {
     applyTo(engine_->correction(), settings);
     engine_->sender().setPlayFeedbackSound(settings.boolForKey("PlayFeedbackSound"));
     engine_->sender().setFeedbackSound(toUtf8(settings.stringForKey("FeedbackSound").value_or(u"")));
+    engine_->setSuggestsByItself(settings.boolForKey("SuggestAutomatically"));
     engine_->setSnippetSelectorKeyModifier(settings.integerForKey("SnippetSelectorKeyModifier"));
     engine_->setSnippetAdaptToAbbreviationCaseOption(settings.integerForKey("SnippetAdaptToAbbreviationCaseOption"));
     applyTo(*inputService_, settings);

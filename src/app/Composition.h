@@ -57,7 +57,6 @@ class Composition {
         FieldsEditor::Factory makeFieldsEditor = {};
         std::function<std::unique_ptr<SuggestionController>()> makeSuggestionController = {};
         std::function<std::unique_ptr<QuickSearchController>()> makeQuickSearchController = {};
-        AutoText::Suggest suggest = {};
         VMHelperController* vmHelper = nullptr;
         // How the platform's applications are typed to; null: as the built-in table says.
         std::shared_ptr<const ApplicationTable> applications = {};

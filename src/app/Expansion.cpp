@@ -3,6 +3,7 @@
 #include <string>
 #include <utility>
 
+#include "Foundation/CharacterSet.h"
 #include "Foundation/Strings.h"
 
 namespace plume {
@@ -48,7 +49,52 @@ Composition::Environment Expansion::environment() {
             onMain([this, hotKey] { around_.listener.hotKeyPressed(hotKey); });
         };
     }
+    addLists(environment);
     return environment;
+}
+
+void Expansion::addLists(Composition::Environment& environment) {
+    if (around_.suggestionView) {
+        environment.makeSuggestionController = [this] {
+            const Composition::Ports& ports = around_.ports;
+            return std::make_unique<SuggestionBridge>(SuggestionBridge::Dependencies{
+                around_.suggestionView, ports.tapLoop, ports.mainLoop, ports.accessibility, ports.processManager,
+                [this] { tap_.composition->engine().clear(); }});
+        };
+    }
+    if (around_.quickSearchView) environment.makeQuickSearchController = [this] { return makeQuickSearch(); };
+}
+
+std::unique_ptr<QuickSearchController> Expansion::makeQuickSearch() {
+    const Composition::Ports& ports = around_.ports;
+    auto bridge = std::make_unique<QuickSearchBridge>(QuickSearchBridge::Dependencies{
+        .view = around_.quickSearchView,
+        .tapLoop = ports.tapLoop,
+        .mainLoop = ports.mainLoop,
+        .accessibility = ports.accessibility,
+        .processManager = ports.processManager,
+        .holdUserKeys = [this](double seconds) { return tap_.composition->inputService().holdUserKeys(seconds); },
+        .typedQuery = [this] { return typedQuery(); },
+        .report =
+            [this](const std::string& sentence) {
+                onMain([this, sentence] { around_.listener.reported(sentence); });
+            }});
+    tap_.quickSearch = bridge.get();
+    MacInputService& service = tap_.composition->inputService();
+    tap_.searchKeys = service.keyDownEvent.addObserver(bridge.get(), &QuickSearchBridge::keyPressed);
+    tap_.searchShortcuts =
+        service.unregisteredHotKeyPressedEvent.addObserver(bridge.get(), &QuickSearchBridge::shortcutPressed);
+    return bridge;
+}
+
+// The word that was begun, unless it is so long that nobody searches for it.
+std::u16string Expansion::typedQuery() const {
+    constexpr std::size_t Longest = 40;
+    if (!tap_.settings.boolForKey("SnippetQuickSearchBeginsWithTyped")) return {};
+    const std::u16string& letters = tap_.composition->engine().letters();
+    std::size_t start = letters.size();
+    while (start > 0 && !CharacterSet::whitespacesAndNewlines().contains(letters[start - 1])) --start;
+    return letters.size() - start <= Longest ? letters.substr(start) : std::u16string();
 }
 
 void Expansion::begin(std::optional<LibraryUpdate> library, PropertyList::Dictionary settings) {
@@ -107,6 +153,9 @@ void Expansion::end() {
     givenUpObserver_.end();
     around_.ports.tapLoop.perform([this] {
         tap_.frontWait.cancel();
+        tap_.quickSearch = nullptr;
+        tap_.searchKeys.end();
+        tap_.searchShortcuts.end();
         tap_.composition = nullptr;
     });
 }
@@ -168,6 +217,34 @@ void Expansion::undo() {
 
 void Expansion::expandAtHotkey() {
     onTap([](Composition& composition) { composition.engine().expandAtHotkey(); });
+}
+
+void Expansion::suggestAbbreviations() {
+    onTap([](Composition& composition) { composition.engine().suggestAbbreviations(); });
+}
+
+void Expansion::quickSearch() {
+    onTap([](Composition& composition) { composition.engine().quickSearch(); });
+}
+
+void Expansion::quickSearchAtTopRightCorner() {
+    onTap([](Composition& composition) { composition.engine().quickSearchAtTopRightCorner(); });
+}
+
+void Expansion::sendFoundSnippet(std::optional<SnippetPlace> place) {
+    onTap([this, place](Composition&) {
+        if (tap_.quickSearch) tap_.quickSearch->choose(place ? snippetAt(tap_.library.groups(), *place) : nullptr);
+    });
+}
+
+void Expansion::setFoundSnippets(std::vector<std::optional<SnippetPlace>> places) {
+    onTap([this, places = std::move(places)](Composition&) {
+        if (!tap_.quickSearch) return;
+        std::vector<std::shared_ptr<Snippet>> rows;
+        rows.reserve(places.size());
+        for (const auto& place : places) rows.push_back(place ? snippetAt(tap_.library.groups(), *place) : nullptr);
+        tap_.quickSearch->setFirstRows(std::move(rows));
+    });
 }
 
 void Expansion::beginRecordingHotKey(std::function<void(const GeneralHotKey&)> pressed) {

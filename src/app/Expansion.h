@@ -17,6 +17,8 @@
 
 #include "Foundation/Uuid.h"
 #include "app/Composition.h"
+#include "app/QuickSearchBridge.h"
+#include "app/SuggestionBridge.h"
 #include "library/LibraryFeed.h"
 #include "library/MemoryUserDefaults.h"
 
@@ -48,6 +50,9 @@ class Expansion {
         ExpansionListener& listener;
         // Whether there are windows for the hot keys that ask for one.
         bool hasWindows = false;
+        // The windows of the lists, which outlive both loops: called on the main thread. Empty: there are none.
+        std::function<SuggestionView&()> suggestionView = {};
+        std::function<QuickSearchView&()> quickSearchView = {};
     };
 
     // Names a snippet by where it stands in the library that was sent last.
@@ -95,6 +100,14 @@ class Expansion {
     void sendCopyCommand();
     void undo();
     void expandAtHotkey();
+    void suggestAbbreviations();
+    void quickSearch();
+    void quickSearchAtTopRightCorner();
+    // What was chosen in the quick-search window, which is gone: into the program that had the keyboard before.
+    // Nothing when it is not in the library any more.
+    void sendFoundSnippet(std::optional<SnippetPlace> place);
+    // What the window shows first now.
+    void setFoundSnippets(std::vector<std::optional<SnippetPlace>> places);
 
     // ---- Hot keys to be chosen ----
     // Keys go to `pressed` and nowhere else; modifiers alone when they are let go without a key.
@@ -133,11 +146,17 @@ class Expansion {
         MemoryUserDefaults settings;
         FedLibrary library;
         std::unique_ptr<Composition> composition;
+        QuickSearchBridge* quickSearch = nullptr;  // the engine's; null before it is first needed
+        Subscription searchKeys;
+        Subscription searchShortcuts;
         Timer frontWait;
     };
     using WhenFront = std::function<void(const std::optional<RunningApplication>&)>;
 
     Composition::Environment environment();
+    void addLists(Composition::Environment& environment);
+    std::unique_ptr<QuickSearchController> makeQuickSearch();
+    std::u16string typedQuery() const;
     void make(LibraryUpdate* library, const PropertyList::Dictionary& settings);
     // Calls on the tap thread, where the composition exists.
     void onTap(std::function<void(Composition&)> call);

@@ -18,7 +18,12 @@
 namespace plume {
 
 // Hot keys that do something in a window, or with one.
-enum class HotKeyForWindow : std::uint8_t { MakeSnippetFromClipboard, MakeSnippetFromSelection, OpenMainWindow };
+enum class HotKeyForWindow : std::uint8_t {
+    MakeSnippetFromClipboard,
+    MakeSnippetFromSelection,
+    OpenMainWindow,
+    OpenLastUsedSnippet
+};
 
 class HotKeyDispatch {
   public:

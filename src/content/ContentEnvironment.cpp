@@ -25,7 +25,7 @@ bool isNew(const std::string& sentence) {
 }  // namespace
 
 void ContentEnvironment::reportOnce(const std::string& sentence) const {
-    if (isNew(sentence)) report(sentence);
+    if (report && isNew(sentence)) report(sentence);
 }
 
 std::string quotedForReport(std::u16string_view text) {

@@ -19,7 +19,8 @@ struct ContentEnvironment {
     std::string locale;
     // Not owned; null: an empty clipboard.
     const PasteboardReader* pasteboard = nullptr;
-    // Tells the user that something in a snippet cannot work, in one sentence. Never null.
+    // Tells the user that something in a snippet cannot work, in one sentence; null: nobody is to
+    // know, as what is only looked at is not used yet.
     std::function<void(const std::string&)> report = [](const std::string&) {};
 
     // Reports the sentence unless it was reported lately, so that the user does not read it at every expansion: the

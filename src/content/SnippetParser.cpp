@@ -16,6 +16,7 @@ std::u16string nameOf(const Snippet& snippet) {
 }
 
 void reportEndless(const Snippet& snippet, const ContentEnvironment& environment) {
+    if (!environment.report) return;
     environment.report("The snippet \"" + toUtf8(nameOf(snippet)) +
                        "\" is not expanded, because its content never ends or is too long; check whether snippets "
                        "include each other.");

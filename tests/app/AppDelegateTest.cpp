@@ -26,7 +26,9 @@ class NotedWindows final : public ApplicationWindows {
   public:
     void showMacrosWindow(bool /*expandAll*/) override { shown.emplace_back("main"); }
     void showNewSnippetWindow(const SnippetDraft& draft) override {
-        shown.push_back("new snippet: " + toUtf8(draft.content));
+        const bool isNew = !draft.edited;
+        shown.push_back(isNew ? "new snippet: " + toUtf8(draft.content)
+                              : "edit " + toUtf8(draft.edited->abbreviation().value_or(u"")));
     }
     void showPreferencesWindow(const std::string& page) override { shown.push_back("preferences " + page); }
     void showAboutWindow() override { shown.emplace_back("about"); }
@@ -81,6 +83,17 @@ class NotedIcon final : public StatusItem {
 
   private:
     Icon& icon_;
+};
+
+// A search window that its user does everything with.
+class NotedSearch final : public QuickSearchView {
+  public:
+    void setEvents(Events events) override { told = std::move(events); }
+    void show(const QuickSearchOpening& /*opening*/) override { isVisible = true; }
+    void close() override { isVisible = false; }
+
+    Events told;
+    bool isVisible = false;
 };
 
 class RunningApplicationTest : public testing::Test {
@@ -143,11 +156,16 @@ class RunningApplicationTest : public testing::Test {
     std::vector<std::string> log_;
     int loaded_ = 0;
     bool ended_ = false;
+    SnippetUses uses_{machine_.settings};
+    NotedSearch search_;
     AppDelegate delegate_{{.mainLoop = world_.loop,
                            .settings = machine_.settings,
                            .dataManager = *machine_.manager,
                            .windows = windows_,
                            .reports = reports_,
+                           .suggestionView = {},
+                           .quickSearchView = [this]() -> QuickSearchView& { return search_; },
+                           .uses = uses_,
                            .ports = {desktop_.keyboardTap(), desktop_.mouseTap(), desktop_.poster(),
                                      desktop_.pasteboard(), desktop_.processManager(), desktop_.inputSources(),
                                      desktop_.accessibility(), desktop_.secureInput(), desktop_.systemHotKeys(),
@@ -422,6 +440,85 @@ TEST_F(RunningApplicationTest, SendsNothingForASnippetThatIsGone) {
     machine_.manager->snippetGroups().front()->removeItem(snippet);
     pass(0.1);
     EXPECT_EQ(desktop_.front()->field().text(), u"");
+}
+
+TEST_F(RunningApplicationTest, OpensTheSnippetThatWasUsedLast) {
+    machine_.settings.set("OpenLastUsedSnippetHotKey", std::int64_t{8589934630});  // Control+J
+    start();
+    machine_.add(u";one", u"1");
+    const auto two = machine_.add(u";two", u"2");
+    settle();
+    const auto press = [this] {
+        desktop_.pressAndRelease(KeyCode::J, KeyModifier::Control);
+        settle();
+        return windows_.shown.empty() ? std::string() : windows_.shown.back();
+    };
+    EXPECT_EQ(press(), "main") << "none was used in this run";
+    typed(u";one ;two ");
+    EXPECT_EQ(press(), "edit ;two");
+    machine_.manager->snippetGroups().front()->removeItem(two);
+    machine_.manager->notifyDataChanged();
+    EXPECT_EQ(press(), "main");
+}
+
+TEST_F(RunningApplicationTest, CountsUsesAndForgetsThoseOfSnippetsThatAreGone) {
+    start();
+    const auto one = machine_.add(u";one", u"1");
+    const auto two = machine_.add(u";two", u"2");
+    settle();
+    typed(u";one ;one ;two ");
+    EXPECT_GT(uses_.weight(*one->uuid(), currentDate()), uses_.weight(*two->uuid(), currentDate()));
+    machine_.manager->snippetGroups().front()->removeItem(two);
+    machine_.manager->notifyDataChanged();
+    settle();
+    typed(u";one ");
+    pass(60);
+    const SnippetUses later(machine_.settings);
+    EXPECT_EQ(later.weight(*one->uuid(), currentDate()), 1);
+    EXPECT_EQ(later.weight(*two->uuid(), currentDate()), 0);
+}
+
+TEST_F(RunningApplicationTest, SendsWhatWasFoundIntoTheProgramBefore) {
+    start();
+    const auto snippet = machine_.add(u";sig", u"Regards");
+    const auto other = machine_.add(u";other", u"Other");
+    settle();
+    const auto own = SimulatedProcessManager::windowOf(desktop_.processManager().currentProcess());
+    const auto open = [&] {
+        delegate_.quickSearch();
+        settle();
+        ASSERT_TRUE(search_.isVisible);
+        search_.told.shown(own);
+        pass(0.1);
+        ASSERT_EQ(desktop_.processManager().frontWindow(), own);
+    };
+    open();
+    delegate_.setFoundSnippets({snippet});
+    settle();
+    search_.isVisible = false;
+    delegate_.sendFoundSnippet(snippet);
+    pass(1);
+    EXPECT_EQ(desktop_.front()->field().text(), u"Regards");
+
+    // A download has put an equal one into its place.
+    open();
+    auto& group = *machine_.manager->snippetGroups().front();
+    const auto newer = std::make_shared<Snippet>(*other->uuid());
+    newer->setAbbreviation(u";other");
+    newer->setPlainTextContent(u", Ann");
+    group.removeItem(other);
+    group.addItem(newer);
+    machine_.manager->notifyDataChanged();
+    delegate_.sendFoundSnippet(other);
+    pass(1);
+    EXPECT_EQ(desktop_.front()->field().text(), u"Regards, Ann");
+
+    open();
+    group.removeItem(snippet);
+    delegate_.sendFoundSnippet(snippet);
+    pass(1);
+    EXPECT_EQ(desktop_.front()->field().text(), u"Regards, Ann");
+    EXPECT_THAT(reports_.reports().back().sentence, HasSubstr("no longer in your library"));
 }
 
 TEST_F(RunningApplicationTest, SavesWhatWasChangedLastWhenItEnds) {

@@ -35,6 +35,8 @@
 #include "app/qt/QtRunLoop.h"
 #include "app/qt/Sentences.h"
 #include "app/qt/Translations.h"
+#include "app/search/QuickSearchWindow.h"
+#include "app/search/SuggestionWindow.h"
 #include "app/session/SessionService.h"
 #include "app/status/StatusIcons.h"
 #include "app/status/TrayIcon.h"
@@ -67,6 +69,8 @@ class Application {
     void end(int status);
     void showPreferences(const std::string& page);
     void showDecisions();
+    SuggestionView& suggestionView();
+    QuickSearchView& quickSearchView();
 
     QtRunLoop& loop_;
     LinuxPort& port_;
@@ -74,8 +78,11 @@ class Application {
     PosixFiles files_;
     BackgroundWork background_;
     std::unique_ptr<UserLibrary> library_;
+    std::unique_ptr<SnippetUses> uses_;
     ReportLog reports_;
     std::unique_ptr<QtWindows> windows_;
+    std::unique_ptr<SuggestionWindow> suggestions_;
+    std::unique_ptr<QuickSearchWindow> quickSearch_;
     std::unique_ptr<AppDelegate> delegate_;
     std::unique_ptr<ApplicationServices> services_;
     std::unique_ptr<ApplicationCommands> commands_;
@@ -91,10 +98,11 @@ Result<void> Application::open() {
     auto library = openSettings();
     if (!library) return library.error();
     library_ = std::move(library).value();
+    uses_ = std::make_unique<SnippetUses>(library_->settings());
     windows_ = std::make_unique<QtWindows>(windowsDependencies());
     delegate_ = std::make_unique<AppDelegate>(delegateDependencies());
     services_ = std::make_unique<ApplicationServices>(
-        ApplicationServices::Dependencies{*delegate_, *library_, files_, port_.ports().sounds});
+        ApplicationServices::Dependencies{*delegate_, *library_, *uses_, files_, port_.ports().sounds});
     commands_ = std::make_unique<ApplicationCommands>(*delegate_, library_->manager(), files_);
     return {};
 }
@@ -132,6 +140,9 @@ AppDelegate::Dependencies Application::delegateDependencies() {
             .dataManager = library_->manager(),
             .windows = *windows_,
             .reports = reports_,
+            .suggestionView = [this]() -> SuggestionView& { return suggestionView(); },
+            .quickSearchView = [this]() -> QuickSearchView& { return quickSearchView(); },
+            .uses = *uses_,
             .ports = port_.ports(),
             .applications = installedApplications(voice_),
             .log = [this](const std::string& line) { voice_.say(line); },
@@ -153,6 +164,17 @@ void Application::showDecisions() {
     if (!decisions_ || decisions_->isHidden())
         decisions_ = new DecisionsWindow(services_->decisions(), library_->settings());
     bringToFront(*decisions_);
+}
+
+// Made when they are first needed: most of the time there is neither.
+SuggestionView& Application::suggestionView() {
+    if (!suggestions_) suggestions_ = std::make_unique<SuggestionWindow>();
+    return *suggestions_;
+}
+
+QuickSearchView& Application::quickSearchView() {
+    if (!quickSearch_) quickSearch_ = std::make_unique<QuickSearchWindow>(services_->quickSearch());
+    return *quickSearch_;
 }
 
 // Reachable before everything is there: whoever calls early is told so.
@@ -220,6 +242,8 @@ int Application::run(int signals) {
     background_.finish();
     delete preferences_;
     delete decisions_;
+    quickSearch_ = nullptr;
+    suggestions_ = nullptr;
     windows_ = nullptr;
     return status_;
 }

@@ -93,8 +93,11 @@ CommandReply ApplicationCommands::performHere(const CommandLine& line, const Com
             delegate_.terminate();
             return {};
         case Command::QuickSearch:
+            delegate_.quickSearch();
+            return {};
         case Command::Suggest:
-            return failed("this Plume has no window for that yet.");
+            delegate_.suggestAbbreviations();
+            return {};
         default:
             return failed("this is no command for the Plume that runs.");
     }

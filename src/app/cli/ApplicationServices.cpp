@@ -95,6 +95,7 @@ StatusMenuServices ApplicationServices::statusMenu() const {
     services.newSnippet = [&delegate] { delegate.newDocument(); };
     services.makeSnippetFromClipboard = [&delegate] { delegate.makeSnippetFromClipboard(); };
     services.makeSnippetFromSelection = [&delegate] { delegate.makeSnippetFromSelection(); };
+    services.searchSnippets = [&delegate] { delegate.searchSnippets(); };
     services.showPreferences = [&delegate] { delegate.showPreferencesWindow(); };
     services.showReports = [&delegate] { delegate.showReportsWindow(); };
     services.showDecisions = [&delegate] { delegate.showDecisionsWindow(); };
@@ -131,13 +132,26 @@ PreferencesServices ApplicationServices::preferences() {
             .exportLibrary = [&delegate] { delegate.saveDocumentTo(); },
             .restore = [&delegate] { delegate.showRestoreWindow(); },
             .syncSettingsChanged = [&manager] { manager.sync().loadSyncPreferences(true); },
-            .showDiagnostics = [&delegate] { delegate.diagnostic(); }};
+            .showDiagnostics = [&delegate] { delegate.diagnostic(); },
+            .forgetSnippetUses = [this] { return around_.uses.forget(); }};
 }
 
 DecisionsWindow::Services ApplicationServices::decisions() const {
     Expansion& expansion = around_.delegate.expansion();
     return {.ask = [&expansion](auto told) { expansion.recentDecisions(std::move(told)); },
             .forget = [&expansion] { expansion.ask([](AutoText& engine) { engine.forgetDecisions(); }); }};
+}
+
+QuickSearchServices ApplicationServices::quickSearch() {
+    AppDelegate& delegate = around_.delegate;
+    DataManager& manager = around_.library.manager();
+    return {.groups = [&manager]() -> const SnippetGroups& { return manager.snippetGroups(); },
+            .settings = around_.library.settings(),
+            .uses = &around_.uses,
+            .send = [&delegate](const std::shared_ptr<Snippet>& snippet) { delegate.sendFoundSnippet(snippet); },
+            .edit = [&delegate](const std::shared_ptr<Snippet>& snippet) { delegate.editSnippet(snippet); },
+            .setFirstRows = [&delegate](const auto& snippets) { delegate.setFoundSnippets(snippets); },
+            .readClipboard = [&delegate](auto told) { delegate.expansion().readClipboard(std::move(told)); }};
 }
 
 WelcomeServices ApplicationServices::welcome() {

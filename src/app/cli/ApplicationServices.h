@@ -10,6 +10,7 @@
 #include "app/cli/Autostart.h"
 #include "app/cli/UserLibrary.h"
 #include "app/preferences/PreferencesServices.h"
+#include "app/search/QuickSearchWindow.h"
 #include "app/status/StatusMenuServices.h"
 #include "app/windows/DecisionsWindow.h"
 #include "app/windows/WelcomeServices.h"
@@ -23,6 +24,7 @@ class ApplicationServices {
     struct Dependencies {
         AppDelegate& delegate;
         UserLibrary& library;
+        SnippetUses& uses;
         Files& files;
         Sounds& sounds;
     };
@@ -33,6 +35,7 @@ class ApplicationServices {
     PreferencesServices preferences();
     DecisionsWindow::Services decisions() const;
     WelcomeServices welcome();
+    QuickSearchServices quickSearch();
 
   private:
     Result<std::string> importFound(const std::filesystem::path& path);

@@ -21,9 +21,10 @@ struct CommandForm {
 constexpr std::array Forms = {
     CommandForm{Command::Run, "run", "plume run [--library FILE.json|FILE.csv] [--settings FILE.json]",
                 "Expand abbreviations in every program, until Ctrl+C"},
-    CommandForm{Command::List, "list", "plume list [--library FILE.json|FILE.csv]", "Show all snippets"},
-    CommandForm{Command::Search, "search", "plume search TEXT [--library FILE.json|FILE.csv]",
-                "Show the snippets whose abbreviation, label, content or note holds every word of TEXT"},
+    CommandForm{Command::List, "list", "plume list [--library FILE.json|FILE.csv] [--abbreviations]",
+                "Show all snippets"},
+    CommandForm{Command::Search, "search", "plume search TEXT [--library FILE.json|FILE.csv] [--json]",
+                "Show the snippets that hold every word of TEXT, the best first, and what is like them"},
     CommandForm{Command::Expand, "expand", "plume expand ABBREVIATION [--library FILE.json|FILE.csv]",
                 "Print what an abbreviation expands to; its scripts are run"},
     CommandForm{Command::Add, "add", "plume add ABBREVIATION TEXT [--group NAME] [--label TEXT]",
@@ -48,6 +49,8 @@ constexpr std::array Forms = {
                 "Check what Plume needs of this desktop, and say what to do about what is missing"},
     CommandForm{Command::Simulate, "simulate", "plume simulate FILE... [--case NAME]",
                 "Play scenarios of typing on a simulated desktop and compare what comes out"},
+    CommandForm{Command::Completion, "completion", "plume completion bash|zsh|fish",
+                "Print what makes a shell complete commands, options and abbreviations"},
     CommandForm{Command::Show, "show", "plume show [WINDOW]", "Show a window of the Plume that runs"},
     CommandForm{Command::Open, "open", "plume open FILE...", "Have the Plume that runs import or restore a file"},
     CommandForm{Command::Toggle, "toggle", "plume toggle", "Switch expansion off, or on again"},
@@ -65,8 +68,8 @@ const std::vector<std::string> Windows{"main",      "preferences", "new-snippet"
 
 constexpr const char* GeneralForm =
     "plume "
-    "run|list|search|expand|add|remove|edit|import|export|convert|backup|backups|restore|settings|doctor|simulate|show|"
-    "open|"
+    "run|list|search|expand|add|remove|edit|import|export|convert|backup|backups|restore|settings|doctor|simulate|"
+    "completion|show|open|"
     "toggle|quick-search|suggest|undo|expand-typed|status|quit ...";
 
 constexpr const char* Examples = R"(
@@ -82,6 +85,7 @@ Examples:
   plume add btw "by the way"        add a snippet
   plume import old.csv              take over the snippets of a file
   plume restore latest              go back to the newest backup
+  source <(plume completion bash)   complete abbreviations in this shell
   plume doctor                      why does nothing happen?
 
 Your library and settings are kept in $XDG_CONFIG_HOME/plume (or ~/.config/plume). The first command that needs the
@@ -114,6 +118,18 @@ class Parser {
         return result_;
     }
 
+    std::vector<CommandOutline> outlines() const {
+        std::vector<CommandOutline> outlines;
+        for (const CommandForm& form : Forms) {
+            CommandOutline outline{form.command, form.name, form.purpose, {}};
+            for (const CLI::Option* option : app_.get_subcommand(form.name)->get_options()) {
+                for (const std::string& name : option->get_lnames()) outline.options.push_back("--" + name);
+            }
+            outlines.push_back(std::move(outline));
+        }
+        return outlines;
+    }
+
   private:
     void addCommand(const CommandForm& form) {
         CLI::App* command = app_.add_subcommand(form.name, form.purpose);
@@ -125,10 +141,13 @@ class Parser {
                 break;
             case Command::List:
                 addLibrary(*command);
+                command->add_flag("--abbreviations", result_.onlyAbbreviations,
+                                  "Nothing but what is typed, one a line");
                 break;
             case Command::Search:
                 addLibrary(*command);
                 command->add_option("TEXT", result_.text, "What to look for")->required();
+                command->add_flag("--json", result_.json, "For programs to read");
                 break;
             case Command::Expand:
                 addLibrary(*command);
@@ -170,6 +189,11 @@ class Parser {
             case Command::Show:
                 command->add_option("WINDOW", result_.text, "Which one; the main window where nothing is said")
                     ->check(CLI::IsMember(Windows));
+                break;
+            case Command::Completion:
+                command->add_option("SHELL", result_.text, "Which shell")
+                    ->required()
+                    ->check(CLI::IsMember({"bash", "zsh", "fish"}));
                 break;
             case Command::Open:
                 command->add_option("FILE", result_.files, "Libraries")->required();
@@ -235,6 +259,14 @@ class Parser {
 
 std::variant<CommandLine, Farewell> parseCommandLine(int argc, const char* const* argv) {
     return Parser().parse(argc, argv);
+}
+
+std::vector<CommandOutline> commandOutlines() {
+    return Parser().outlines();
+}
+
+const std::vector<std::string>& shownWindows() {
+    return Windows;
 }
 
 }  // namespace plume

@@ -36,6 +36,7 @@ enum class Command {
     Settings,
     Doctor,
     Simulate,
+    Completion,
     // For the Plume that runs.
     Show,
     Open,
@@ -55,13 +56,14 @@ struct CommandLine {
     std::vector<std::string> files;         // what is read or written
     std::optional<std::string> onlyCase;    // for Simulate
     SettingsRequest request;                // for Settings
-    std::string text;                       // what to search for, the abbreviation, or the window to show
+    std::string text;                       // what to search for, the abbreviation, the window to show, or the shell
     std::string content;                    // for Add
     std::optional<std::string> group;       // for Add and Export
     std::optional<std::string> label;       // for Add
     bool withPreferences = false;           // for Export
     bool textExpanderPlaceholders = false;  // for Import and Convert
-    bool json = false;                      // for Status
+    bool json = false;                      // for Search and Status
+    bool onlyAbbreviations = false;         // for List
 };
 
 // Nothing is left to do but to print this and to end.
@@ -72,5 +74,16 @@ struct Farewell {
 };
 
 std::variant<CommandLine, Farewell> parseCommandLine(int argc, const char* const* argv);
+
+// A command as it can be written, for shells that complete it.
+struct CommandOutline {
+    Command command;
+    std::string name;
+    std::string purpose;
+    std::vector<std::string> options;  // "--json"
+};
+std::vector<CommandOutline> commandOutlines();
+// What `show` shows.
+const std::vector<std::string>& shownWindows();
 
 }  // namespace plume

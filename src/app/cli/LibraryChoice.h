@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "Foundation/Result.h"
+#include "library/MemoryUserDefaults.h"
 #include "library/SnippetGroup.h"
 
 namespace plume {
@@ -16,6 +17,8 @@ namespace plume {
 struct ChosenLibrary {
     std::vector<std::shared_ptr<SnippetGroup>> groups;
     std::filesystem::path file;
+    // Those that search goes by: the user's where the library is the user's, else what holds when nothing is set.
+    std::shared_ptr<MemoryUserDefaults> settings;
 };
 
 // The named file, of any kind that can be imported; without one the user's own library, for reading. A library that is

@@ -1,13 +1,13 @@
 #include "app/cli/LibraryCommands.h"
 
 #include <algorithm>
-#include <functional>
 #include <memory>
 #include <ostream>
 #include <utility>
 
 #include "Foundation/Strings.h"
 #include "app/cli/CommandLine.h"
+#include "app/cli/SnippetLine.h"
 #include "content/NestedScripts.h"
 #include "content/SnippetParser.h"
 #include "content/scripts/ShellScriptRunner.h"
@@ -17,8 +17,6 @@
 namespace plume {
 
 namespace {
-
-using Filter = std::function<bool(const Snippet&)>;
 
 // ---- Showing ----
 
@@ -38,61 +36,21 @@ std::string whenItExpands(const SnippetGroup& group) {
     return "";
 }
 
-// The first line, as much of it as suits a list.
-std::u16string beginning(const std::u16string& content) {
-    constexpr std::size_t Most = 60;
-    const std::u16string_view line = trimmed(std::u16string_view(content).substr(0, content.find(u'\n')));
-    if (line.size() <= Most && line.size() == trimmed(content).size()) return std::u16string(line);
-    std::size_t length = std::min(line.size(), Most);
-    const bool cutsPair = length < line.size() && (line[length] & 0xFC00) == 0xDC00;
-    if (cutsPair) --length;
-    return std::u16string(trimmed(line.substr(0, length))) + u" …";
-}
-
-std::string kindOf(const Snippet& snippet) {
-    if (snippet.isScript()) return "  [script]";
-    return snippet.contentType() == ContentType::RichText ? "  [rich text]" : "";
-}
-
-std::size_t codePoints(std::u16string_view text) {
-    return static_cast<std::size_t>(
-        std::count_if(text.begin(), text.end(), [](char16_t unit) { return (unit & 0xFC00) != 0xDC00; }));
-}
-
-void showSnippet(const Snippet& snippet, std::size_t width, std::ostream& output) {
-    const std::u16string abbreviation = snippet.abbreviationWithPrefix().value_or(u"");
-    const std::u16string label = snippet.label().value_or(u"");
-    output << "  " << toUtf8(abbreviation) << std::string(width - codePoints(abbreviation) + 2, ' ');
-    if (!label.empty()) output << toUtf8(label) << ": ";
-    output << toUtf8(beginning(snippet.plainTextContent().value_or(u""))) << kindOf(snippet) << '\n';
-}
-
-// The groups with those of their snippets that pass. How many did.
-std::size_t show(const ChosenLibrary& library, const Filter& passes, std::ostream& output) {
-    std::size_t count = 0;
+// One abbreviation a line: those that hold a line break themselves are left out.
+void listAbbreviations(const ChosenLibrary& library, std::ostream& output) {
     for (const auto& group : library.groups) {
-        std::vector<const Snippet*> shown;
-        std::size_t width = 0;
         for (const auto& snippet : group->items()) {
-            if (!passes(*snippet)) continue;
-            shown.push_back(snippet.get());
-            width = std::max(width, codePoints(snippet->abbreviationWithPrefix().value_or(u"")));
+            const std::u16string typed = snippet->abbreviationWithPrefix().value_or(u"");
+            if (!typed.empty() && typed.find_first_of(u"\r\n") == std::u16string::npos) output << toUtf8(typed) << '\n';
         }
-        if (shown.empty()) continue;
-        output << (count > 0 ? "\n" : "") << toUtf8(group->name().value_or(u"")) << " (" << whenItExpands(*group)
-               << ")\n";
-        for (const Snippet* snippet : shown) showSnippet(*snippet, width, output);
-        count += shown.size();
     }
-    return count;
 }
 
-bool holds(const Snippet& snippet, std::u16string_view word) {
-    for (const Snippet::Text& text :
-         {snippet.abbreviationWithPrefix(), snippet.label(), snippet.plainTextContent(), snippet.note()}) {
-        if (text && containsIgnoringCase(*text, word)) return true;
-    }
-    return false;
+void showGroup(const SnippetGroup& group, std::ostream& output) {
+    output << toUtf8(group.name().value_or(u"")) << " (" << whenItExpands(group) << ")\n";
+    std::size_t width = 0;
+    for (const auto& snippet : group.items()) width = std::max(width, typedWidth(*snippet));
+    for (const auto& snippet : group.items()) output << snippetLine(*snippet, width) << '\n';
 }
 
 // ---- Expanding ----
@@ -116,21 +74,18 @@ std::u16string runScripts(const Snippet& snippet, SnippetExpandedContent& conten
 
 }  // namespace
 
-int listSnippets(const ChosenLibrary& library, std::ostream& output) {
-    show(
-        library, [](const Snippet&) { return true; }, output);
+int listSnippets(const ChosenLibrary& library, bool onlyAbbreviations, std::ostream& output) {
+    if (onlyAbbreviations) {
+        listAbbreviations(library, output);
+        return ExitStatus::Success;
+    }
+    bool isFirst = true;
+    for (const auto& group : library.groups) {
+        if (group->items().empty()) continue;
+        if (!std::exchange(isFirst, false)) output << '\n';
+        showGroup(*group, output);
+    }
     return ExitStatus::Success;
-}
-
-int searchSnippets(const ChosenLibrary& library, const std::string& text, std::ostream& output, std::ostream& error) {
-    const std::vector<std::u16string> words = split(fromUtf8(text), u' ');
-    const auto holdsAll = [&](const Snippet& snippet) {
-        return std::all_of(words.begin(), words.end(),
-                           [&](const std::u16string& word) { return word.empty() || holds(snippet, word); });
-    };
-    if (show(library, holdsAll, output) > 0) return ExitStatus::Success;
-    error << "plume: no snippet in " << library.file.string() << " holds \"" << text << "\"\n";
-    return ExitStatus::Failure;
 }
 
 int expandSnippet(const ChosenLibrary& library, const std::string& abbreviation, std::ostream& output,

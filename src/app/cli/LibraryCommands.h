@@ -1,4 +1,4 @@
-// What can be asked of a library without a desktop: show it, search it, expand one snippet of it.
+// What can be asked of a library without a desktop: show it, expand one snippet of it.
 #pragma once
 
 #include <iosfwd>
@@ -9,8 +9,7 @@
 namespace plume {
 
 // Each writes what was asked for to `output`, what went wrong to `error`, and returns the exit status.
-int listSnippets(const ChosenLibrary& library, std::ostream& output);
-int searchSnippets(const ChosenLibrary& library, const std::string& text, std::ostream& output, std::ostream& error);
+int listSnippets(const ChosenLibrary& library, bool onlyAbbreviations, std::ostream& output);
 // Runs the scripts of the snippet. A snippet with fields to fill in is refused.
 int expandSnippet(const ChosenLibrary& library, const std::string& abbreviation, std::ostream& output,
                   std::ostream& error);

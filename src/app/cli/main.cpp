@@ -9,6 +9,7 @@
 #include "app/cli/Application.h"
 #include "app/cli/ApplicationCommands.h"
 #include "app/cli/CommandLine.h"
+#include "app/cli/Completion.h"
 #include "app/cli/Doctor.h"
 #include "app/cli/EditCommand.h"
 #include "app/cli/Files.h"
@@ -16,6 +17,7 @@
 #include "app/cli/LibraryChoice.h"
 #include "app/cli/LibraryCommands.h"
 #include "app/cli/RunCommand.h"
+#include "app/cli/SearchCommand.h"
 #include "app/cli/SettingsCommand.h"
 #include "app/cli/SimulateCommand.h"
 #include "app/cli/StoreCommands.h"
@@ -26,6 +28,7 @@ namespace {
 using plume::Command;
 using plume::CommandLine;
 using plume::ExitStatus::Failure;
+using plume::ExitStatus::Success;
 using plume::ExitStatus::WrongInput;
 
 int withLibrary(const CommandLine& line) {
@@ -37,9 +40,9 @@ int withLibrary(const CommandLine& line) {
     }
     switch (line.command) {
         case Command::List:
-            return listSnippets(library.value(), std::cout);
+            return listSnippets(library.value(), line.onlyAbbreviations, std::cout);
         case Command::Search:
-            return searchSnippets(library.value(), line.text, std::cout, std::cerr);
+            return searchSnippets(library.value(), line.text, line.json, std::cout, std::cerr);
         default:
             return expandSnippet(library.value(), line.text, std::cout, std::cerr);
     }
@@ -93,6 +96,9 @@ int run(int argc, char** argv) {
             return plume::convertFile(line, std::cout, std::cerr);
         case Command::Settings:
             return plume::runSettingsCommand(line.request, plume::configurationFolder(), std::cout, std::cerr);
+        case Command::Completion:
+            std::cout << plume::completionScript(line.text);
+            return Success;
         case Command::Doctor:
             return plume::examineDesktop(std::cout);
         case Command::Simulate:

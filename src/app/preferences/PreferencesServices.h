@@ -58,6 +58,7 @@ struct PreferencesServices {
     // To be called when the user has changed what synchronisation does.
     std::function<void()> syncSettingsChanged;
     std::function<void()> showDiagnostics;
+    std::function<Result<void>()> forgetSnippetUses;
 };
 
 }  // namespace plume

@@ -33,7 +33,8 @@ void LauncherAdaptor::Open(const QStringList& uris, const QVariantMap& /*platfor
 void LauncherAdaptor::ActivateAction(const QString& name, const QVariantList& /*parameters*/,
                                      const QVariantMap& /*platformData*/) {
     const std::string action = name.toStdString();
-    service_.perform(action == "toggle" ? std::vector<std::string>{action} : std::vector<std::string>{"show", action});
+    const bool isCommand = action == "toggle" || action == "quick-search";
+    service_.perform(isCommand ? std::vector<std::string>{action} : std::vector<std::string>{"show", action});
 }
 
 QString PlumeAdaptor::Import(const QStringList& files) {

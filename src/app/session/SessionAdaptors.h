@@ -21,7 +21,7 @@ class LauncherAdaptor final : public QDBusAbstractAdaptor {
 
     Q_SLOT void Activate(const QVariantMap& platformData);
     Q_SLOT void Open(const QStringList& uris, const QVariantMap& platformData);
-    // Those of the desktop file: "toggle", or a window to show.
+    // Those of the desktop file: "toggle", "quick-search", or a window to show.
     Q_SLOT void ActivateAction(const QString& name, const QVariantList& parameters, const QVariantMap& platformData);
 
   private:

@@ -1,4 +1,4 @@
-// Makes one snippet and puts it into the library.
+// Makes one snippet and puts it into the library, or changes one that is there.
 //
 // On the main thread; owns itself, and is gone when it is closed. The library outlives it.
 #pragma once
@@ -29,13 +29,21 @@ class NewSnippetWindow final : public SmallWindow {
 
   private:
     void makeForm(QFormLayout& form);
+    // What is to be changed is shown; formatted text cannot be here.
+    void showEdited();
     void fillGroups();
     void groupChosen();
     void showWarning();
+    void accept() override;
     void add();
+    void change();
     bool isNewGroupChosen() const;
     // Null for one that is yet to be made.
     std::shared_ptr<SnippetGroup> chosenGroup() const;
+    // Makes it if need be.
+    std::shared_ptr<SnippetGroup> groupToFill();
+    // What the library has now of the snippet that is changed; a download may have put an equal one into its place.
+    std::shared_ptr<Snippet> livingSnippet() const;
     bool hasEdits() const;
 
     DataManager& manager_;
@@ -49,7 +57,8 @@ class NewSnippetWindow final : public SmallWindow {
     QLabel* warning_;
     QLineEdit* label_;
     QPlainTextEdit* text_;
-    const QString draft_;  // what the text was at first
+    const std::shared_ptr<Snippet> edited_;  // null: a new one
+    QString draft_;                          // what the text was at first
     bool mayClose_ = false;
 };
 

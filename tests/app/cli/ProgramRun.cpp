@@ -44,10 +44,18 @@ void ProgramHome::set(const std::string& name, const std::optional<std::string>&
     put(name, value);
 }
 
+std::string ProgramHome::program() {
+    return (std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume").string();
+}
+
 ProgramResult ProgramHome::run(const std::vector<std::string>& arguments) const {
+    return runOther(program(), arguments);
+}
+
+ProgramResult ProgramHome::runOther(const std::string& program, const std::vector<std::string>& arguments) const {
     PosixProcessLauncher launcher;
     ProcessRequest request;
-    request.program = (std::filesystem::read_symlink("/proc/self/exe").parent_path() / "plume").string();
+    request.program = program;
     request.arguments = arguments;
     const auto started = launcher.start(request);
     if (!started) throw std::runtime_error(started.error().message);

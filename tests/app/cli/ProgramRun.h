@@ -25,6 +25,10 @@ class ProgramHome {
 
     // Waits at most 20 seconds.
     ProgramResult run(const std::vector<std::string>& arguments) const;
+    // The same for another program, by its whole path.
+    ProgramResult runOther(const std::string& program, const std::vector<std::string>& arguments) const;
+    // Where the program is.
+    static std::string program();
     // Gives the program a variable of its environment, or takes it away.
     void set(const std::string& name, const std::optional<std::string>& value);
     // Writes a file, below the home folder, and gives its path.

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <nlohmann/json.hpp>
 
 #include "tests/app/cli/ProgramRun.h"
 
@@ -134,12 +135,51 @@ TEST(Search, FindsEveryWordAnywhereInASnippet) {
     const ProgramHome home;
     const ProgramResult arrows = home.run({"search", "ARROW left"});
     EXPECT_EQ(arrows.status, 0);
-    EXPECT_THAT(arrows.output, AllOf(HasSubstr(";<-"), Not(HasSubstr(";->")), HasSubstr("Arrows and symbols")));
+    EXPECT_THAT(arrows.output, AllOf(HasSubstr(";<-"), Not(HasSubstr(";->")), HasSubstr("(Arrows and symbols)")));
     EXPECT_THAT(home.run({"search", "different in every"}).output, HasSubstr(";letter")) << "it stands in the note";
     EXPECT_THAT(home.run({"search", "sampletown"}).output, HasSubstr(";sig")) << "it stands in the content";
     const ProgramResult nothing = home.run({"search", "zebra"});
     EXPECT_EQ(nothing.status, 1);
     EXPECT_THAT(nothing.output, IsEmpty());
+    EXPECT_THAT(nothing.error, HasSubstr("zebra"));
+}
+
+TEST(Search, ShowsTheBestFirstAndWhatIsLikeItBelow) {
+    const ProgramHome home;
+    const std::string file = home.write("own.json", R"([{"name": "First", "items": [
+        {"abbreviation": "x", "content": "a sig in it"}, {"abbreviation": "sxig", "content": "like it"}]},
+        {"name": "Second", "items": [{"abbreviation": "sig", "label": "Mine", "content": "Regards\nJo"}]}])");
+    EXPECT_EQ(home.run({"search", "sig", "--library", file}).output,
+              "  sig   Mine: Regards\u2009…  (Second)\n"
+              "  x     a sig in it  (First)\n"
+              "  -- similar --\n"
+              "  sxig  like it  (First)\n");
+    const ProgramResult json = home.run({"search", "sig", "--library", file, "--json"});
+    EXPECT_EQ(json.status, 0);
+    const auto rows = nlohmann::json::parse(json.output);
+    ASSERT_EQ(rows.size(), 3U);
+    EXPECT_EQ(rows[0]["abbreviation"], "sig");
+    EXPECT_EQ(rows[0]["label"], "Mine");
+    EXPECT_EQ(rows[0]["group"], "Second");
+    EXPECT_EQ(rows[0]["content"], "Regards");
+    EXPECT_EQ(rows[0]["uuid"].get<std::string>().size(), 36U);
+    EXPECT_EQ(rows[0]["loose"], false);
+    EXPECT_EQ(rows[2]["loose"], true);
+    const ProgramResult nothing = home.run({"search", "zebra", "--library", file, "--json"});
+    EXPECT_EQ(nothing.status, 1);
+    EXPECT_EQ(nothing.output, "[]\n");
+}
+
+TEST(Search, GoesByTheSettingsForTheUsersLibraryAlone) {
+    const ProgramHome home;
+    const std::string file =
+        home.write("own.json", R"([{"name": "A", "items": [{"abbreviation": "b", "content": "key"}]}])");
+    EXPECT_THAT(home.run({"search", "sampletown"}).output, HasSubstr(";sig"));
+    home.run({"settings", "SnippetQuickSearchSearchBy", "1"});
+    home.run({"settings", "SnippetQuickSearchWildcardSearch", "1"});
+    EXPECT_EQ(home.run({"search", "sampletown"}).status, 1);
+    EXPECT_THAT(home.run({"search", ";s?g"}).output, HasSubstr(";sig"));
+    EXPECT_THAT(home.run({"search", "key", "--library", file}).output, HasSubstr("b  key  (A)"));
 }
 
 // ---- Other libraries ----

@@ -179,6 +179,23 @@ TEST_F(PreferencesPagesTest, ASearchLooksInOneFieldAtLeast) {
     EXPECT_EQ(settings.integerForKey("SnippetQuickSearchSearchBy") & 7, 4);
 }
 
+TEST_F(PreferencesPagesTest, UsesAreForgottenAndThatIsSeen) {
+    window().showPage("Search");
+    auto* button = withText<QPushButton>(window(), "Forget How Often Snippets Were Used");
+    forgetAnswer = Error{"The disk is full."};
+    QTest::mouseClick(button, Qt::LeftButton);
+    EXPECT_TRUE(complaint().contains("The disk is full."));
+    EXPECT_TRUE(button->isEnabled());
+    forgetAnswer = {};
+    QTest::mouseClick(button, Qt::LeftButton);
+    EXPECT_EQ(complaint(), "");
+    EXPECT_EQ(forgotten, 2);
+    EXPECT_FALSE(button->isEnabled()) << "nothing is left to forget";
+    window().showPage("General");
+    window().showPage("Search");
+    EXPECT_TRUE(button->isEnabled()) << "there may be something again";
+}
+
 TEST_F(PreferencesPagesTest, WhatCannotBeKeptIsToldAndTheControlGoesBack) {
     settings.isFull = true;
     auto* box = withText<QCheckBox>(window(), "Expand abbreviations");

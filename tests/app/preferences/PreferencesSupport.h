@@ -80,6 +80,8 @@ struct PreferencesWorld {
     std::vector<std::string> played;
     std::vector<std::string> commands;
     int syncChanges = 0;
+    int forgotten = 0;
+    Result<void> forgetAnswer;
 
     PreferencesServices services() {
         const auto command = [this](const char* name) { return [this, name] { commands.emplace_back(name); }; };
@@ -128,6 +130,11 @@ struct PreferencesWorld {
             .restore = command("restore"),
             .syncSettingsChanged = [this] { ++syncChanges; },
             .showDiagnostics = command("diagnostics"),
+            .forgetSnippetUses =
+                [this] {
+                    ++forgotten;
+                    return forgetAnswer;
+                },
         };
     }
 };
