@@ -8,7 +8,7 @@ PLUME_PICTURES=$(mktemp -d)
 export PLUME_PICTURES
 trap 'rm -rf "$PLUME_PICTURES"' EXIT
 
-for tests in windows preferences status; do
+for tests in windows preferences search status; do
     LC_ALL=C.UTF-8 "$build/bin/plume_${tests}_tests" --gtest_brief=1
 done
 
@@ -20,6 +20,9 @@ General preferences-general
 HotKeys preferences-hot-keys
 Applications-own preferences-applications
 Typing-dark preferences-dark
+SuggestionsExample suggestions
+QuickSearchExample quick-search
+QuickSearchExample-dark quick-search-dark
 Decisions decisions
 Restore restore
 Diagnostic diagnostics
