@@ -290,7 +290,7 @@ TEST_P(ListsTest, SearchSendsNothingIntoAWrongWindow) {
     start();
     open(TargetKind::GtkTextView);
     const auto other = rig_.startTarget(TargetKind::QtTextEdit);
-    std::mt19937 random(7);
+    std::mt19937 random(7);  // NOLINT(cert-msc32-c,cert-msc51-cpp)
     const char* const wanted = std::getenv("PLUME_SENDS");
     const int sends = wanted ? std::atoi(wanted) : 12;
     for (int send = 0; send < sends; ++send) {
