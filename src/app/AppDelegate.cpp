@@ -395,7 +395,8 @@ void AppDelegate::sendFoundSnippet(const std::shared_ptr<Snippet>& snippet) {
 }
 
 void AppDelegate::setFoundSnippets(const std::vector<std::shared_ptr<Snippet>>& snippets) {
-    feedExpansion();
+    // At every key of a search: the library is gone through only where a change of it is still to be told.
+    if (feedTimer_) feedExpansion();
     std::vector<std::optional<Expansion::SnippetPlace>> places;
     places.reserve(snippets.size());
     for (const auto& snippet : snippets) places.push_back(placeOf(snippet));
