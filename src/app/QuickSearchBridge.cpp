@@ -10,6 +10,8 @@ namespace {
 
 // Seconds.
 constexpr double LongestMove = 1;
+// The release of a key is kept back, too: one that seemed held for longer would begin to repeat.
+constexpr double LongestHold = 0.3;
 constexpr double MovePoll = 0.003;
 constexpr int MovePolls = static_cast<int>(LongestMove / MovePoll);
 // A window manager that is busy may have passed the first request over.
@@ -71,7 +73,7 @@ void QuickSearchBridge::open(bool atCaret) {
         }
         const std::u16string query = around_.typedQuery();
         typedText_ = query.empty() ? std::nullopt : std::optional(query);
-        hold_ = around_.holdUserKeys(LongestMove);
+        hold_ = around_.holdUserKeys(LongestHold);
     }
     visible_ = true;
     firstRows_.clear();
@@ -107,7 +109,7 @@ void QuickSearchBridge::close() {
 void QuickSearchBridge::closedByUser() {
     if (!std::exchange(visible_, false)) return;
     frame_ = {};
-    hold_ = around_.holdUserKeys(LongestMove);
+    hold_ = around_.holdUserKeys(LongestHold);
     moveKeyboard(
         target_.window, [this] { return isTargetBack(); }, [this](bool) { hold_ = nullptr; });
 }
@@ -135,7 +137,7 @@ void QuickSearchBridge::shortcutPressed(ZDUnregisteredHotKeyPressedEventArgs& ke
 void QuickSearchBridge::holdWhatFollows() {
     if (!visible_ || !hasKeyboard()) return;
     // The key itself goes to the window.
-    holding_ = around_.tapLoop.performAfterDelay(0, [this] { hold_ = around_.holdUserKeys(LongestMove); });
+    holding_ = around_.tapLoop.performAfterDelay(0, [this] { hold_ = around_.holdUserKeys(LongestHold); });
 }
 
 // It may have answered before the hold began.
@@ -150,7 +152,7 @@ void QuickSearchBridge::choose(std::shared_ptr<Snippet> snippet) {
     if (!std::exchange(visible_, false)) return;
     frame_ = {};
     selected_ = std::move(snippet);
-    hold_ = around_.holdUserKeys(LongestMove);
+    hold_ = around_.holdUserKeys(LongestHold);
     moveKeyboard(
         target_.window, [this] { return isTargetBack(); }, [this](bool isBack) { send(isBack); });
 }

@@ -2,7 +2,7 @@
 // opened, and has what was chosen sent when the keyboard is back where it was.
 //
 // Owned by the engine; belongs to the tap thread. Nothing waits: what takes time is asked for again and again, and what
-// is typed meanwhile is kept back for a second at most. The view outlives the main loop's calls.
+// is typed meanwhile is kept back for 0.3 seconds at most. The view outlives the main loop's calls.
 #pragma once
 
 #include <functional>

@@ -117,10 +117,11 @@ TEST_F(QuickSearchBridgeTest, KeepsKeysBackUntilTheWindowHasTheKeyboard) {
     EXPECT_EQ(bridge.windowFrame(), NotedSearchWindow::Frame);
 }
 
-TEST_F(QuickSearchBridgeTest, KeepsKeysBackForASecondAtMost) {
+// A key whose release is kept back for longer begins to repeat.
+TEST_F(QuickSearchBridgeTest, KeepsKeysBackForAMomentAtMost) {
     desk.processes.setFollowsActivation(false);
     bridge.showWindowAtCaret();
-    pass(0.99);
+    pass(0.29);
     EXPECT_TRUE(keysAreHeld());
     pass(0.02);
     EXPECT_FALSE(keysAreHeld());
