@@ -14,6 +14,7 @@ class UserKeysHold {
   public:
     UserKeysHold(OutputDelivery& delivery, RunLoop& loop, double seconds) : delivery_(delivery) {
         delivery_.holdUserKeys();
+        if (seconds > LongestUnnoticed) holdOn(loop);
         limit_ = loop.performAfterDelay(seconds, [this] { end(); });
     }
     ~UserKeysHold() { end(); }
@@ -21,15 +22,25 @@ class UserKeysHold {
     UserKeysHold& operator=(const UserKeysHold&) = delete;
 
   private:
+    // Seconds for which a key that is down may seem to stay so without repeating.
+    static constexpr double LongestUnnoticed = 0.3;
+    static constexpr double BetweenReminders = 1;
+
+    void holdOn(RunLoop& loop) {
+        delivery_.keepHoldingUserKeys();
+        reminder_ = loop.performAfterDelay(BetweenReminders, [this, &loop] { holdOn(loop); });
+    }
     void end() {
         if (ended_) return;
         ended_ = true;
+        reminder_.cancel();
         delivery_.releaseUserKeys();
     }
 
     OutputDelivery& delivery_;
     bool ended_ = false;
     Timer limit_;
+    Timer reminder_;
 };
 
 }  // namespace plume

@@ -73,6 +73,8 @@ struct FocusedPlaces {
     std::optional<Rectangle> caret;  // may have no width
     std::optional<Rectangle> element;
     std::optional<Rectangle> window;
+    // Names the element as long as it lives; empty: not told.
+    std::string elementName = {};
 };
 
 class Accessibility {

@@ -47,8 +47,9 @@ class EventPoster {
     // flight is complete, and follow in order; a port that cannot do it does nothing. They wait 2 seconds at most.
     virtual void holdUserKeys() = 0;
     virtual void releaseUserKeys() = 0;
-    // Keys that wait go on doing so for 2 seconds from now, because the program in front hangs. A click, and a key with
-    // Alt or Super, with which people leave such a program, end the waiting.
+    // Keys that wait go on doing so for 2 seconds from now, because the program in front hangs or what they are for is
+    // not there yet. Those that the programs have down are let go of, so that none begins to repeat. A click, and a key
+    // with Alt or Super, with which people leave such a program, end the waiting.
     virtual void keepHoldingUserKeys() = 0;
 };
 

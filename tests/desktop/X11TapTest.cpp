@@ -230,6 +230,24 @@ TEST_F(X11TapTest, KeysThatAreKeptWaitingFollowAClickOrAKeyWithAlt) {
     }
 }
 
+TEST_F(X11TapTest, AKeyThatIsDownDoesNotRepeatWhileKeysAreKeptWaiting) {
+    const auto target = rig_->startTarget(TargetKind::GtkTextView);
+    createTap();
+    rig_->keyboard().press(Key::LeftShift);
+    rig_->keyboard().press(38);
+    EXPECT_EQ(target->awaitText("A"), "A");
+    tap_->run([this] {
+        tap_->tap->hold();
+        tap_->tap->keepHolding();
+    });
+    EXPECT_EQ(keysDown(), std::vector<int>{50}) << "a modifier goes on counting for what follows";
+    rig_->keyboard().releaseAll();
+    rig_->keyboard().type("b");
+    tap_->run([this] { tap_->tap->release(); });
+    EXPECT_EQ(target->awaitText("Ab"), "Ab");
+    await("all is up", [] { return keysDown().empty(); });
+}
+
 TEST_F(X11TapTest, KeysHeldWhileItComesAndGoesComeUp) {
     const auto target = rig_->startTarget(TargetKind::GtkTextView);
     rig_->keyboard().press(Key::LeftShift);

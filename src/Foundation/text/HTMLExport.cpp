@@ -17,6 +17,7 @@ constexpr char16_t LineSeparator = 0x2028;
 constexpr char16_t NoBreakSpace = 0xa0;
 constexpr char16_t ParagraphSeparator = 0x2029;
 constexpr char16_t ObjectReplacementCharacter = 0xfffc;
+constexpr std::string_view ReplacementCharacter = "\xef\xbf\xbd";
 
 std::string base64(std::string_view bytes) {
     constexpr std::string_view Digits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
@@ -44,6 +45,7 @@ std::string_view imageTypeOf(std::string_view bytes) {
     return {};
 }
 
+// HTML takes a bare U+000D for a line feed, and cannot hold U+0000.
 void appendEscaped(std::string& html, std::u16string_view text) {
     for (const char c : toUtf8(text)) {
         switch (c) {
@@ -58,6 +60,12 @@ void appendEscaped(std::string& html, std::u16string_view text) {
                 break;
             case '"':
                 html += "&quot;";
+                break;
+            case '\r':
+                html += "&#13;";
+                break;
+            case '\0':
+                html += ReplacementCharacter;
                 break;
             default:
                 html += c;
@@ -296,8 +304,8 @@ class Exporter {
             } else if (c == NoBreakSpace) {
                 markup_.html += "&nbsp;";
             } else if (c >= u' ' || c == 0) {
-                const bool isPair = (c & 0xfc00) == 0xd800 && i + 1 < text.size();
-                appendEscaped(markup_.html, c == 0 ? u"\xfffd" : text.substr(i, isPair ? 2 : 1));
+                const bool isPair = (c & 0xfc00) == 0xd800 && i + 1 < text.size() && (text[i + 1] & 0xfc00) == 0xdc00;
+                appendEscaped(markup_.html, text.substr(i, isPair ? 2 : 1));
                 i += isPair ? 1 : 0;
             }
         }

@@ -65,6 +65,8 @@ class LinuxPort {
     }
     // Asked on the main thread: whether a menu of the program's own is open, and holds the keyboard.
     void setKeyboardHeldByUs(std::function<bool()> heldByUs) { secureInput_->setHeldByUs(std::move(heldByUs)); }
+    // The program that draws forms runs, with this process number, or does not: 0. From any thread.
+    void setFormProcess(std::int64_t process) { processManager_->setHelperProcess(static_cast<pid_t>(process)); }
     // Called once, on the tap thread, when the X server is gone.
     void setServerGone(std::function<void()> listener) { session_->serverGone = std::move(listener); }
     // Last of all, on the tap thread, when its loop has ended: what Plume offers on the clipboard stays there.

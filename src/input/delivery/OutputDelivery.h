@@ -61,6 +61,8 @@ class OutputDelivery {
     // The user's keys wait from the first hold to the last release, besides while an output is on its way.
     void holdUserKeys();
     void releaseUserKeys();
+    // They go on waiting, for 2 seconds from now: see EventPoster.
+    void keepHoldingUserKeys() { dependencies_.poster.keepHoldingUserKeys(); }
 
     KeySender& sender() { return sender_; }
     ClipboardDataProvider& clipboardDataProvider() { return provider_; }

@@ -10,6 +10,8 @@
 #include <memory>
 #include <string>
 
+#include "Foundation/CharacterSet.h"
+
 namespace plume {
 
 namespace {
@@ -23,17 +25,52 @@ bool isSimple(std::u16string_view text) {
     return std::all_of(text.begin(), text.end(), [](char16_t unit) { return unit < FirstMark && unit != u'\r'; });
 }
 
-template <class Visit>
-void forEachCluster(std::u16string_view text, Visit visit) {
-    UErrorCode status = U_ZERO_ERROR;
-    const std::unique_ptr<UBreakIterator, void (*)(UBreakIterator*)> clusters(
-        ubrk_open(UBRK_CHARACTER, "", text.data(), static_cast<std::int32_t>(text.size()), &status), ubrk_close);
-    if (U_FAILURE(status)) return;
-    std::int32_t start = 0;
-    for (auto end = ubrk_next(clusters.get()); end != UBRK_DONE; end = ubrk_next(clusters.get())) {
-        visit(text.substr(static_cast<std::size_t>(start), static_cast<std::size_t>(end - start)));
-        start = end;
+// Finds the clusters of one text after the other: opening takes far longer than a short text does.
+class Clusters {
+  public:
+    Clusters() : iterator_(ubrk_open(UBRK_CHARACTER, "", nullptr, 0, &status_), ubrk_close) {}
+
+    template <class Visit>
+    void forEach(std::u16string_view text, Visit visit) {
+        ubrk_setText(iterator_.get(), text.data(), static_cast<std::int32_t>(text.size()), &status_);
+        if (U_FAILURE(status_)) return;
+        std::int32_t start = 0;
+        for (auto end = ubrk_next(iterator_.get()); end != UBRK_DONE; end = ubrk_next(iterator_.get())) {
+            visit(text.substr(static_cast<std::size_t>(start), static_cast<std::size_t>(end - start)));
+            start = end;
+        }
     }
+
+  private:
+    UErrorCode status_ = U_ZERO_ERROR;
+    std::unique_ptr<UBreakIterator, void (*)(UBreakIterator*)> iterator_;
+};
+
+// Those that are a cluster by themselves between others of their kind, in most scripts nearly all.
+bool standsAlone(char16_t unit) {
+    static const CharacterSet alone = [] {
+        CharacterSet::Ranges ranges;
+        for (char32_t c = 0; c < 0x10000; ++c) {
+            const auto kind = u_getIntPropertyValue(static_cast<UChar32>(c), UCHAR_GRAPHEME_CLUSTER_BREAK);
+            const bool isAlone = kind == U_GCB_OTHER || kind == U_GCB_CONTROL || kind == U_GCB_LF || kind == U_GCB_LV ||
+                                 kind == U_GCB_LVT;
+            if (isAlone && !U16_IS_SURROGATE(c)) ranges.emplace_back(c, c);
+        }
+        return CharacterSet::withRanges(ranges);
+    }();
+    return alone.contains(unit);
+}
+
+// How far the text goes that has to be looked at as a whole, from a unit on that may belong to one behind it. Clusters
+// end between two units that stand alone; a few more of them are left to the next look, which takes longer to begin.
+std::size_t endOfMixedText(std::u16string_view text, std::size_t from) {
+    constexpr std::size_t Enough = 32;
+    std::size_t alone = 0;
+    for (std::size_t at = from; at < text.size(); ++at) {
+        alone = standsAlone(text[at]) ? alone + 1 : 0;
+        if (alone == Enough) return at;
+    }
+    return text.size();
 }
 
 // What one extended grapheme cluster is made of.
@@ -102,14 +139,24 @@ std::uint64_t backspacesForCluster(const Cluster& cluster, ErasedAtOnce atOnce) 
 std::uint64_t backspacesFor(std::u16string_view text, ErasedAtOnce atOnce) {
     if (isSimple(text)) return text.size();
     std::uint64_t count = 0;
-    forEachCluster(text, [&](std::u16string_view piece) { count += backspacesForCluster(Cluster(piece), atOnce); });
+    Clusters().forEach(text, [&](std::u16string_view piece) { count += backspacesForCluster(Cluster(piece), atOnce); });
     return count;
 }
 
 std::uint64_t leftArrowsFor(std::u16string_view text) {
     if (isSimple(text)) return text.size();
+    Clusters clusters;
     std::uint64_t count = 0;
-    forEachCluster(text, [&](std::u16string_view /*piece*/) { ++count; });
+    for (std::size_t position = 0; position < text.size();) {
+        std::size_t end = position;
+        while (end < text.size() && standsAlone(text[end])) ++end;
+        if (end == text.size()) return count + (end - position);
+        // The last of them may belong to what is behind it.
+        const std::size_t start = std::max(position, end - std::min<std::size_t>(end, 1));
+        count += start - position;
+        position = endOfMixedText(text, end);
+        clusters.forEach(text.substr(start, position - start), [&](std::u16string_view /*piece*/) { ++count; });
+    }
     return count;
 }
 

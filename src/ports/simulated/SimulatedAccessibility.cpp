@@ -99,6 +99,7 @@ void SimulatedAccessibility::askForFocusedPlaces(std::function<void(const Focuse
         const auto selected = focused->rangeAttribute("AXSelectedTextRange");
         if (selected) places.caret = focused->rectangleForRange("AXBoundsForRange", *selected);
         places.element = placeOf(*focused);
+        places.elementName = std::to_string(reinterpret_cast<std::uintptr_t>(focused.get()));
         const auto window = focused->elementAttribute("AXTopLevelUIElement");
         if (window) places.window = placeOf(*window);
     }

@@ -410,8 +410,19 @@ void TapSession::keepHolding() {
     if (ended_ || !held_) return;
     holdLimit_ = dependencies_.loop.performAfterDelay(LongestHold, [this] { release(); });
     if (std::exchange(readsAhead_, true)) return;
+    letGoOfKeys();
     dependencies_.loop.setSourcePaused(descriptor_, false);
     nextDrain_ = dependencies_.loop.performAfterDelay(0, [this] { drain(); });
+}
+
+// Their releases wait, too, and a key that seems held for so long begins to repeat.
+void TapSession::letGoOfKeys() {
+    const KeycodeSet down = dependencies_.connection.keysDown();
+    for (std::size_t i = 0; i < down.size(); ++i) {
+        const auto keycode = static_cast<xcb_keycode_t>(i);
+        if (down[i] && keymaps_.current()->modifiersOf(keycode) == 0) send({keycode, false});
+    }
+    dependencies_.connection.flush();
 }
 
 void TapSession::userClicked() {

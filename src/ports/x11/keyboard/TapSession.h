@@ -86,6 +86,7 @@ class TapSession : public std::enable_shared_from_this<TapSession> {
     void drain();
     void settle();
     void readAhead();
+    void letGoOfKeys();
     XcbOwned<xcb_generic_event_t> nextEvent();
     bool isForWindowManager(const xcb_generic_event_t& event) const;
     bool isInput(const xcb_generic_event_t& event, std::uint16_t type) const;

@@ -220,7 +220,8 @@ std::optional<ProcessSerialNumber> X11ProcessManager::processOf(xcb_window_t win
     readClass(windowClass.bytes(), identity);
     identity.gtkApplicationId = withoutTrailingZero(applicationId.bytes());
     // Numbers of another machine's processes mean something else here.
-    const std::uint32_t process = host.empty() || host == hostName_ ? toldProcess : 0;
+    std::uint32_t process = host.empty() || host == hostName_ ? toldProcess : 0;
+    if (process != 0 && process == static_cast<std::uint32_t>(helperProcess_)) process = currentProcess().lowLongOfPSN;
     const std::string executable = process != 0 ? executableOf(process) : std::string();
     identity.program = executable.substr(executable.find_last_of('/') + 1);
     if (process == 0 && identity.windowClass.empty()) return std::nullopt;

@@ -4,6 +4,7 @@
 // of a change: in between, an answer costs no round trip. Without a window manager the input focus decides.
 #pragma once
 
+#include <atomic>
 #include <functional>
 #include <map>
 #include <memory>
@@ -39,6 +40,9 @@ class X11ProcessManager final : public ProcessManager {
     // X does not tell who takes keys: those programs that are known to do it.
     std::vector<EventTapInformation> eventTaps() const override;
 
+    // The windows of this process count as this program's own; 0: of none. From any thread.
+    void setHelperProcess(pid_t process) { helperProcess_ = process; }
+
     // How often something had to be asked of the server since the start: for tests and measurements.
     int lookUps() const { return lookUps_; }
 
@@ -71,6 +75,7 @@ class X11ProcessManager final : public ProcessManager {
     X11Session::WindowEvents front_;    // the active window
     X11Session::WindowEvents focus_;    // the focused window, when there is no active one
     mutable std::map<ProcessSerialNumber, Application> applications_;
+    std::atomic<pid_t> helperProcess_ = 0;
     int lookUps_ = 0;
     std::vector<Subscription> observers_;
 };
