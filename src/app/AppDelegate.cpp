@@ -21,9 +21,9 @@ constexpr int MenuPolls = 50;
 // By itself the keyboard is tried again this long after it was given up; a moment more for that to be done.
 constexpr double ListenAgainDelay = 61;
 
-// Where windows stand, and what was used how often, is kept with the settings and sets nothing.
+// Where windows stand, how large forms are, and what was used how often, is kept with the settings and sets nothing.
 bool setsNothing(const std::string& key) {
-    return key.starts_with("WindowPlace.") || key == SnippetUses::Key;
+    return key.starts_with("WindowPlace.") || key.starts_with("FieldsEditorSize ") || key == SnippetUses::Key;
 }
 
 }  // namespace
@@ -36,7 +36,8 @@ AppDelegate::AppDelegate(Dependencies dependencies)
                   .listener = *this,
                   .hasWindows = true,
                   .suggestionView = around_.suggestionView,
-                  .quickSearchView = around_.quickSearchView}),
+                  .quickSearchView = around_.quickSearchView,
+                  .formView = around_.formView}),
       manager_(around_.dataManager),
       windows_(around_.windows) {}
 

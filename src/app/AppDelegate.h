@@ -39,6 +39,7 @@ class AppDelegate final : private ExpansionListener {
         // See Expansion.
         std::function<SuggestionView&()> suggestionView;
         std::function<QuickSearchView&()> quickSearchView;
+        std::function<FormView&()> formView;
         SnippetUses& uses;
         Composition::Ports ports;
         std::shared_ptr<const ApplicationTable> applications;

@@ -50,7 +50,22 @@ Composition::Environment Expansion::environment() {
         };
     }
     addLists(environment);
+    if (around_.formView) {
+        environment.makeFieldsEditor = [this](std::shared_ptr<SnippetExpandedContent> content,
+                                              FieldsEditor::Target& target) {
+            return makeForm(std::move(content), target);
+        };
+    }
     return environment;
+}
+
+std::unique_ptr<FieldsEditor> Expansion::makeForm(std::shared_ptr<SnippetExpandedContent> content,
+                                                  FieldsEditor::Target& target) {
+    const Composition::Ports& ports = around_.ports;
+    return std::make_unique<FormBridge>(
+        ++tap_.newestForm, std::move(content), target,
+        FormBridge::Dependencies{around_.formView, ports.tapLoop, ports.mainLoop, ports.accessibility,
+                                 ports.processManager, tap_.composition->inputService()});
 }
 
 void Expansion::addLists(Composition::Environment& environment) {

@@ -17,6 +17,7 @@
 
 #include "Foundation/Uuid.h"
 #include "app/Composition.h"
+#include "app/FormBridge.h"
 #include "app/QuickSearchBridge.h"
 #include "app/SuggestionBridge.h"
 #include "library/LibraryFeed.h"
@@ -53,6 +54,8 @@ class Expansion {
         // The windows of the lists, which outlive both loops: called on the main thread. Empty: there are none.
         std::function<SuggestionView&()> suggestionView = {};
         std::function<QuickSearchView&()> quickSearchView = {};
+        // The forms, in the same way.
+        std::function<FormView&()> formView = {};
     };
 
     // Names a snippet by where it stands in the library that was sent last.
@@ -147,6 +150,7 @@ class Expansion {
         FedLibrary library;
         std::unique_ptr<Composition> composition;
         QuickSearchBridge* quickSearch = nullptr;  // the engine's; null before it is first needed
+        FormView::Id newestForm = 0;
         Subscription searchKeys;
         Subscription searchShortcuts;
         Timer frontWait;
@@ -155,6 +159,8 @@ class Expansion {
 
     Composition::Environment environment();
     void addLists(Composition::Environment& environment);
+    std::unique_ptr<FieldsEditor> makeForm(std::shared_ptr<SnippetExpandedContent> content,
+                                           FieldsEditor::Target& target);
     std::unique_ptr<QuickSearchController> makeQuickSearch();
     std::u16string typedQuery() const;
     void make(LibraryUpdate* library, const PropertyList::Dictionary& settings);

@@ -8,14 +8,8 @@ namespace plume {
 
 namespace {
 
-// Seconds.
-constexpr double LongestMove = 1;
 // The release of a key is kept back, too: one that seemed held for longer would begin to repeat.
-constexpr double LongestHold = 0.3;
-constexpr double MovePoll = 0.003;
-constexpr int MovePolls = static_cast<int>(LongestMove / MovePoll);
-// A window manager that is busy may have passed the first request over.
-constexpr int PollsUntilAskedAgain = 30;
+constexpr double LongestHold = 0.3;  // seconds
 
 constexpr std::array DigitKeys{KeyCode::Digit1, KeyCode::Digit2, KeyCode::Digit3, KeyCode::Digit4, KeyCode::Digit5,
                                KeyCode::Digit6, KeyCode::Digit7, KeyCode::Digit8, KeyCode::Digit9, KeyCode::Digit0};
@@ -28,7 +22,9 @@ bool mayEndSearch(const ZDKeyEventArgs& key) {
 }  // namespace
 
 QuickSearchBridge::QuickSearchBridge(Dependencies dependencies)
-    : around_(std::move(dependencies)), caret_(around_.accessibility, around_.processManager, around_.tapLoop) {
+    : around_(std::move(dependencies)),
+      keyboard_(around_.processManager, around_.tapLoop),
+      caret_(around_.accessibility, around_.processManager, around_.tapLoop) {
     around_.mainLoop.perform([view = around_.view, events = events()] { view().setEvents(events); });
 }
 
@@ -65,12 +61,9 @@ void QuickSearchBridge::open(bool atCaret) {
     if (selected_) return;
     // One that is moved to the corner still sends to where it was opened.
     if (!visible_) {
-        moving_.cancel();
+        keyboard_.cancel();
         // Closed a moment ago, it may have the keyboard itself.
-        if (!hasKeyboard()) {
-            target_ = {around_.processManager.frontProcess().value_or(ProcessSerialNumber{}),
-                       around_.processManager.frontWindow()};
-        }
+        if (!hasKeyboard()) target_ = keyboard_.owner();
         const std::u16string query = around_.typedQuery();
         typedText_ = query.empty() ? std::nullopt : std::optional(query);
         hold_ = around_.holdUserKeys(LongestHold);
@@ -91,14 +84,12 @@ void QuickSearchBridge::openWindow(const std::optional<CaretPlace>& place) {
 void QuickSearchBridge::shown(std::uint32_t window) {
     if (!visible_) return;
     ownWindow_ = window;
-    moveKeyboard(
-        window, [this, window] { return around_.processManager.keysArriveIn(window); },
-        [this](bool) { hold_ = nullptr; });
+    keyboard_.giveTo(window, [this](bool) { hold_ = nullptr; });
 }
 
 void QuickSearchBridge::close() {
     caret_.cancel();
-    moving_.cancel();
+    keyboard_.cancel();
     holding_.cancel();
     hold_ = nullptr;
     frame_ = {};
@@ -110,8 +101,7 @@ void QuickSearchBridge::closedByUser() {
     if (!std::exchange(visible_, false)) return;
     frame_ = {};
     hold_ = around_.holdUserKeys(LongestHold);
-    moveKeyboard(
-        target_.window, [this] { return isTargetBack(); }, [this](bool) { hold_ = nullptr; });
+    keyboard_.giveBackTo(target_, [this](bool) { hold_ = nullptr; });
 }
 
 void QuickSearchBridge::replaced() {
@@ -153,31 +143,7 @@ void QuickSearchBridge::choose(std::shared_ptr<Snippet> snippet) {
     frame_ = {};
     selected_ = std::move(snippet);
     hold_ = around_.holdUserKeys(LongestHold);
-    moveKeyboard(
-        target_.window, [this] { return isTargetBack(); }, [this](bool isBack) { send(isBack); });
-}
-
-bool QuickSearchBridge::isTargetBack() const {
-    return around_.processManager.keysArriveIn(target_.window) &&
-           around_.processManager.frontProcess() == target_.process;
-}
-
-void QuickSearchBridge::moveKeyboard(std::uint32_t window, const std::function<bool()>& arrived,
-                                     const std::function<void(bool)>& then) {
-    if (window == 0) return then(false);
-    around_.processManager.activateWindow(window);
-    askAgain(1, window, arrived, then);
-}
-
-void QuickSearchBridge::askAgain(int attempt, std::uint32_t window, const std::function<bool()>& arrived,
-                                 const std::function<void(bool)>& then) {
-    moving_ = around_.tapLoop.performAfterDelay(MovePoll, [this, attempt, window, arrived, then] {
-        moving_.cancel();
-        const bool hasArrived = arrived();
-        if (hasArrived || attempt == MovePolls) return then(hasArrived);
-        if (attempt % PollsUntilAskedAgain == 0) around_.processManager.activateWindow(window);
-        askAgain(attempt + 1, window, arrived, then);
-    });
+    keyboard_.giveBackTo(target_, [this](bool isBack) { send(isBack); });
 }
 
 void QuickSearchBridge::send(bool targetIsBack) {

@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "app/KeyboardHandover.h"
 #include "app/QuickSearchView.h"
 #include "engine/QuickSearchController.h"
 #include "input/EventArgs.h"
@@ -70,11 +71,6 @@ class QuickSearchBridge final : public QuickSearchController {
   private:
     // What the view's events find when they arrive; null when the bridge has gone.
     using Self = std::shared_ptr<QuickSearchBridge*>;
-    // Who had the keyboard.
-    struct Owner {
-        ProcessSerialNumber process;
-        std::uint32_t window = 0;
-    };
 
     QuickSearchView::Events events() const;
     void open(bool atCaret);
@@ -84,13 +80,7 @@ class QuickSearchBridge final : public QuickSearchController {
     void replaced();
     void holdWhatFollows();
     void stayed();
-    bool hasKeyboard() const { return ownWindow_ != 0 && around_.processManager.frontWindow() == ownWindow_; }
-    bool isTargetBack() const;
-    // Asks for the window to get the keyboard until `arrived` says so or a second has gone; then calls `then`.
-    void moveKeyboard(std::uint32_t window, const std::function<bool()>& arrived,
-                      const std::function<void(bool hasArrived)>& then);
-    void askAgain(int attempt, std::uint32_t window, const std::function<bool()>& arrived,
-                  const std::function<void(bool)>& then);
+    bool hasKeyboard() const { return keyboard_.hasKeyboard(ownWindow_); }
     void send(bool targetIsBack);
 
     const Dependencies around_;
@@ -99,14 +89,14 @@ class QuickSearchBridge final : public QuickSearchController {
     std::int64_t selectorKeyModifier_ = 0;
     bool visible_ = false;
     std::uint32_t ownWindow_ = 0;
-    Owner target_;
+    KeyboardHandover keyboard_;
+    KeyboardHandover::Owner target_;
     std::shared_ptr<Snippet> selected_;
     std::optional<std::u16string> typedText_;
     std::vector<std::shared_ptr<Snippet>> firstRows_;
     Rectangle frame_;
     std::unique_ptr<UserKeysHold> hold_;
     CaretFinder caret_;
-    Timer moving_;
     Timer holding_;
 };
 

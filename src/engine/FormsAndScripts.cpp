@@ -23,8 +23,9 @@ constexpr const char* FormSound = "Pop";
 
 // ---- The form ----
 
-void SnippetSender::showFieldsEditor(const Expansion& content) {
+void SnippetSender::showFieldsEditor(const Expansion& content, KeysHold hold) {
     OpenForm& form = forms_.emplace_back();
+    form.hold = std::move(hold);
     // Not from inside the key callback.
     form.next =
         dependencies_.inputService.runLoop().performAfterDelay(0, [this, &form, content] { makeForm(form, content); });
@@ -32,6 +33,7 @@ void SnippetSender::showFieldsEditor(const Expansion& content) {
 
 void SnippetSender::makeForm(OpenForm& form, const Expansion& content) {
     form.editor = dependencies_.makeFieldsEditor(content, *this);
+    form.hold = nullptr;
     playFeedback(FormSound);
     form.next = dependencies_.inputService.runLoop().performAfterDelay(FormDelay, [&form] { form.editor->show(); });
 }
@@ -52,7 +54,7 @@ void SnippetSender::fieldsEditorDidClose(const Expansion& content) {
     mergeFields(*content);
     processScripts(*content);
     const bool runsScripts = !content->scripts.empty() || content->originalSnippet->isScript();
-    const Waiting waiting{runsScripts ? holdKeysForScripts() : nullptr};
+    const Waiting waiting{runsScripts ? holdKeys() : nullptr};
     if (content->scripts.empty()) {
         sendContent(content, SnippetTrigger::Digit, waiting);
     } else {
@@ -62,7 +64,7 @@ void SnippetSender::fieldsEditorDidClose(const Expansion& content) {
 
 // ---- Scripts ----
 
-SnippetSender::KeysHold SnippetSender::holdKeysForScripts() {
+SnippetSender::KeysHold SnippetSender::holdKeys() {
     return dependencies_.inputService.holdUserKeys(LongestKeysHold);
 }
 

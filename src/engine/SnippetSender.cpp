@@ -112,11 +112,11 @@ std::optional<SnippetSender::Sent> SnippetSender::send(const Request& request) {
 
     // The abbreviation goes at once, the content comes when the form is filled in or the script has run.
     output->cancelTrigger = true;
-    const Waiting waiting{needsForm ? nullptr : holdKeysForScripts(), dependencies_.letters.resets()};
+    const Waiting waiting{holdKeys(), dependencies_.letters.resets()};
     dependencies_.inputService.sendOutput(output);
     content->suffix = keptDelimiter(request);
     if (needsForm) {
-        showFieldsEditor(content);
+        showFieldsEditor(content, waiting.hold);
     } else if (content->scripts.empty()) {
         runScriptSnippet(content, waiting);
     } else {

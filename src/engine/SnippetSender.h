@@ -112,6 +112,7 @@ class SnippetSender final : private FieldsEditor::Target {
     };
     struct OpenForm {
         std::unique_ptr<FieldsEditor> editor;  // null until it is time to make it
+        KeysHold hold;                         // until then, when the form itself keeps keys back
         Timer next;                            // makes the form, shows it, or lets it go
     };
 
@@ -121,14 +122,14 @@ class SnippetSender final : private FieldsEditor::Target {
     // What a form or scripts have completed.
     void sendContent(const Expansion& content, SnippetTriggers snippetTrigger, const Waiting& waiting);
 
-    void showFieldsEditor(const Expansion& content);
+    void showFieldsEditor(const Expansion& content, KeysHold hold);
     void makeForm(OpenForm& form, const Expansion& content);
     void fieldsEditorWillClose(FieldsEditor& editor) override;
     void fieldsEditorAction(FieldsEditor& editor) override;
     void fieldsEditorDidClose(const Expansion& content);
 
     // The user's keys wait for a script that is soon done, and follow behind what it gives.
-    KeysHold holdKeysForScripts();
+    KeysHold holdKeys();
     void executeScripts(const Expansion& content, const Waiting& waiting);
     void runScriptSnippet(const Expansion& content, const Waiting& waiting);
     void onScriptExecuted(const PLScript& script, const Waiting& waiting);

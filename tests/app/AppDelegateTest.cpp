@@ -165,6 +165,7 @@ class RunningApplicationTest : public testing::Test {
                            .reports = reports_,
                            .suggestionView = {},
                            .quickSearchView = [this]() -> QuickSearchView& { return search_; },
+                           .formView = {},
                            .uses = uses_,
                            .ports = {desktop_.keyboardTap(), desktop_.mouseTap(), desktop_.poster(),
                                      desktop_.pasteboard(), desktop_.processManager(), desktop_.inputSources(),
