@@ -10,7 +10,7 @@ FOUNDATION = {"Foundation", "Foundation/archive", "Foundation/json", "Foundation
 CORE = FOUNDATION | {"platform", "library", "import", "content", "content/scripts", "input", "engine"}
 X11 = {"ports/x11", "ports/x11/clipboard", "ports/x11/keyboard", "ports/x11/watchdog", "ports/x11/windows"}
 PORT = FOUNDATION | {"platform"}
-WINDOWS = {"app/qt", "app/ranking", "app/status", "app/preferences", "app/search", "app/windows", "app/session"}
+WINDOWS = {"app/qt", "app/ranking", "app/status", "app/preferences", "app/search", "app/form", "app/windows", "app/session"}
 
 # Folder -> the folders whose headers it may include, besides its own. Lower layers never see higher ones. A folder that
 # is not named here belongs to the one that it lies in.
@@ -42,6 +42,8 @@ MAY_SEE = {
     "app/status": CORE | {"app", "app/qt"},
     "app/preferences": CORE | {"app", "app/qt"},
     "app/search": CORE | {"app", "app/qt", "app/ranking"},
+    "app/form": CORE | {"app", "app/qt"},
+    "app/form/helper": CORE | {"app", "app/qt", "app/form"},
     "app/windows": CORE | {"app", "app/qt"},
     "app/session": CORE | {"app", "app/qt", "ports/posix"},
     "scenario": CORE | {"app", "ports/simulated", "ports/posix"},
@@ -67,6 +69,7 @@ MAY_USE = {
     "app/status": ("Q", "xcb/"),
     "app/preferences": ("Q", "nlohmann/"),
     "app/search": ("Q",),
+    "app/form": ("Q", "nlohmann/"),
     "app/windows": ("Q",),
     "app/session": ("Q",),
     "app/cli": ("CLI/", "nlohmann/", "xcb/", "Q"),

@@ -20,7 +20,7 @@ need_packages() {
 BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config libcanberra-dev libcli11-dev libdbus-1-dev
     libexpat1-dev libicu-dev libmd4c-dev libmd4c-html0-dev libsqlite3-dev libx11-dev libxcb-xfixes0-dev libxcb-xinput-dev
     libxcb-xkb-dev libxcb-xtest0-dev libxcb1-dev libxkbcommon-dev libxkbcommon-x11-dev libxml2-dev libyaml-cpp-dev
-    nlohmann-json3-dev qt6-base-dev qt6-l10n-tools)
+    nlohmann-json3-dev qt6-base-dev qt6-l10n-tools qt6-webengine-dev)
 TEST_PACKAGES=(clang libclang-rt-14-dev libgtest-dev libgmock-dev librapidcheck-dev perl python3 tzdata)
 CHECK_PACKAGES=(clang-format clang-tidy git)
 

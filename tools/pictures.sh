@@ -8,9 +8,11 @@ PLUME_PICTURES=$(mktemp -d)
 export PLUME_PICTURES
 trap 'rm -rf "$PLUME_PICTURES"' EXIT
 
-for tests in windows preferences search status; do
+for tests in form windows preferences search status; do
     LC_ALL=C.UTF-8 "$build/bin/plume_${tests}_tests" --gtest_brief=1
 done
+
+PLUME_SCREENSHOTS=$PLUME_PICTURES "$build/bin/form_test" --gtest_brief=1 --gtest_filter='*SendsTheText/Page'
 
 while read -r taken name; do
     cp "$PLUME_PICTURES/$taken.png" "$documents/$name.png"
@@ -23,6 +25,9 @@ Typing-dark preferences-dark
 SuggestionsExample suggestions
 QuickSearchExample quick-search
 QuickSearchExample-dark quick-search-dark
+form-GTK-page form
+PlainForm-en form-plain
+UnsentText unsent-text
 Decisions decisions
 Restore restore
 Diagnostic diagnostics

@@ -519,6 +519,83 @@
         <source>Plume is deaf in these fields. Browsers and some other programs tell it only while the desktop’s accessibility is on, which this switches on when Plume starts. It costs these programs some time and memory.</source>
         <translation>In diesen Feldern hört Plume nicht zu. Browser und einige andere Programme melden sie nur, solange die Barrierefreiheit der Arbeitsumgebung eingeschaltet ist; das übernimmt Plume dann beim Start. Diese Programme kostet das etwas Zeit und Speicher.</translation>
     </message>
+    <message>
+        <source>Forms</source>
+        <translation>Formulare</translation>
+    </message>
+    <message>
+        <source>&amp;Fill in fields in a plain window</source>
+        <translation>Felder in einem &amp;schlichten Fenster ausfüllen</translation>
+    </message>
+    <message>
+        <source>Instead of a page that looks like the text. The program that draws pages needs some 200 MB while forms are in use, and goes ten minutes after the last one.</source>
+        <translation>Statt in einer Seite, die wie der Text aussieht. Das Programm, das Seiten zeichnet, braucht etwa 200 MB, solange Formulare benutzt werden, und geht zehn Minuten nach dem letzten.</translation>
+    </message>
+</context>
+<context>
+    <name>FormWords</name>
+    <message>
+        <source>This is not a number.</source>
+        <translation>Das ist keine Zahl.</translation>
+    </message>
+    <message>
+        <source>This formula cannot be computed.</source>
+        <translation>Diese Formel lässt sich nicht berechnen.</translation>
+    </message>
+    <message>
+        <source>This formula depends on itself.</source>
+        <translation>Diese Formel hängt von sich selbst ab.</translation>
+    </message>
+    <message>
+        <source>A number is missing that this is computed from.</source>
+        <translation>Eine Zahl fehlt, aus der dies berechnet wird.</translation>
+    </message>
+    <message>
+        <source>%1 character, and what the script adds</source>
+        <translation>%1 Zeichen, und was das Skript hinzufügt</translation>
+    </message>
+    <message numerus="yes">
+        <source>%1 characters, and what the script adds</source>
+        <translation>
+            <numerusform>%1 Zeichen, und was das Skript hinzufügt</numerusform>
+            <numerusform>%1 Zeichen, und was das Skript hinzufügt</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>%1 character</source>
+        <translation>%1 Zeichen</translation>
+    </message>
+    <message numerus="yes">
+        <source>%1 characters</source>
+        <translation>
+            <numerusform>%1 Zeichen</numerusform>
+            <numerusform>%1 Zeichen</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Return inserts</source>
+        <translation>Eingabe setzt ein</translation>
+    </message>
+    <message>
+        <source>Ctrl+Return inserts from anywhere</source>
+        <translation>Strg+Eingabe setzt von überall ein</translation>
+    </message>
+    <message>
+        <source>Alt+letter takes a part or leaves it out</source>
+        <translation>Alt+Buchstabe nimmt einen Teil auf oder lässt ihn weg</translation>
+    </message>
+    <message>
+        <source>Esc cancels</source>
+        <translation>Esc bricht ab</translation>
+    </message>
+    <message>
+        <source>Insert</source>
+        <translation>Einfügen</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Abbrechen</translation>
+    </message>
 </context>
 <context>
     <name>GeneralPage</name>
@@ -1073,6 +1150,46 @@
         <source>The snippet was not sent: the window that it was for is gone, or does not take the keyboard.</source>
         <translation>Das Snippet wurde nicht gesendet: Das Fenster, für das es war, ist fort oder nimmt die Tastatur nicht an.</translation>
     </message>
+    <message>
+        <source>The window that it was for is gone, or does not take the keyboard.</source>
+        <translation>Das Fenster, für das er bestimmt war, ist weg oder nimmt die Tastatur nicht an.</translation>
+    </message>
+    <message>
+        <source>Another field has the focus than the one that it was for.</source>
+        <translation>Ein anderes Feld hat den Fokus als das, für das er bestimmt war.</translation>
+    </message>
+    <message>
+        <source>A form is shown as a plain window, because no page can be drawn: %1</source>
+        <translation>Ein Formular wird als schlichtes Fenster gezeigt, weil keine Seite gezeichnet werden kann: %1</translation>
+    </message>
+    <message>
+        <source>the program plume-form is not installed.</source>
+        <translation>Das Programm plume-form ist nicht installiert.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms does not answer.</source>
+        <translation>Das Programm, das Formulare zeichnet, antwortet nicht.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms cannot be started.</source>
+        <translation>Das Programm, das Formulare zeichnet, lässt sich nicht starten.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms does not listen.</source>
+        <translation>Das Programm, das Formulare zeichnet, hört nicht zu.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms says what cannot be.</source>
+        <translation>Das Programm, das Formulare zeichnet, sagt, was nicht sein kann.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms has crashed.</source>
+        <translation>Das Programm, das Formulare zeichnet, ist abgestürzt.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms has ended with %1.</source>
+        <translation>Das Programm, das Formulare zeichnet, endete mit %1.</translation>
+    </message>
 </context>
 <context>
     <name>SnippetRow</name>
@@ -1293,6 +1410,14 @@
     <message>
         <source>The report was not saved</source>
         <translation>Der Bericht wurde nicht gespeichert</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FieldControl</name>
+    <message>
+        <source>%1: %2</source>
+        <comment>a field&apos;s name and value</comment>
+        <translation>%1: %2</translation>
     </message>
 </context>
 <context>
@@ -1590,6 +1715,17 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>They were not saved yet.</source>
         <translation>Sie wurden noch nicht gespeichert.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PlainFormWindow</name>
+    <message>
+        <source>Text of the snippet</source>
+        <translation>Text des Snippets</translation>
+    </message>
+    <message>
+        <source>Field %1</source>
+        <translation>Feld %1</translation>
     </message>
 </context>
 <context>
@@ -2034,6 +2170,17 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     </message>
 </context>
 <context>
+    <name>plume::ScriptMark</name>
+    <message>
+        <source>Script: %1</source>
+        <translation>Skript: %1</translation>
+    </message>
+    <message>
+        <source>What this script prints comes here.</source>
+        <translation>Hier steht, was dieses Skript ausgibt.</translation>
+    </message>
+</context>
+<context>
     <name>plume::SettingsModel</name>
     <message>
         <source>Setting</source>
@@ -2178,6 +2325,45 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>Plume: on</source>
         <translation>Plume: ein</translation>
+    </message>
+</context>
+<context>
+    <name>plume::UnsentTextWindow</name>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Kopieren</translation>
+    </message>
+    <message>
+        <source>Text Not Inserted</source>
+        <translation>Text nicht eingefügt</translation>
+    </message>
+    <message>
+        <source>The text was not inserted</source>
+        <translation>Der Text wurde nicht eingefügt</translation>
+    </message>
+    <message>
+        <source>Plume keeps it until you close this window.</source>
+        <translation>Plume bewahrt ihn auf, bis Sie dieses Fenster schließen.</translation>
+    </message>
+    <message>
+        <source>The text</source>
+        <translation>Der Text</translation>
+    </message>
+    <message>
+        <source>&amp;Try Again</source>
+        <translation>&amp;Erneut versuchen</translation>
+    </message>
+    <message>
+        <source>&amp;Discard</source>
+        <translation>&amp;Verwerfen</translation>
+    </message>
+    <message>
+        <source>Copied. The text is in the clipboard now.</source>
+        <translation>Kopiert. Der Text ist jetzt in der Zwischenablage.</translation>
+    </message>
+    <message>
+        <source>Discard the text? Press Esc or close the window once more to discard it.</source>
+        <translation>Den Text verwerfen? Drücken Sie noch einmal Esc oder schließen Sie das Fenster noch einmal, um ihn zu verwerfen.</translation>
     </message>
 </context>
 <context>

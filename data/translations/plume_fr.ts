@@ -519,6 +519,83 @@
         <source>Plume is deaf in these fields. Browsers and some other programs tell it only while the desktop’s accessibility is on, which this switches on when Plume starts. It costs these programs some time and memory.</source>
         <translation>Plume n’écoute pas dans ces champs. Les navigateurs et quelques autres programmes ne les signalent que si l’accessibilité du bureau est activée, ce que Plume fait alors à son lancement. Cela coûte à ces programmes un peu de temps et de mémoire.</translation>
     </message>
+    <message>
+        <source>Forms</source>
+        <translation>Formulaires</translation>
+    </message>
+    <message>
+        <source>&amp;Fill in fields in a plain window</source>
+        <translation>Remplir les champs dans une &amp;fenêtre simple</translation>
+    </message>
+    <message>
+        <source>Instead of a page that looks like the text. The program that draws pages needs some 200 MB while forms are in use, and goes ten minutes after the last one.</source>
+        <translation>Au lieu d’une page qui ressemble au texte. Le programme qui dessine les pages prend quelque 200 Mo tant que des formulaires sont utilisés, et se termine dix minutes après le dernier.</translation>
+    </message>
+</context>
+<context>
+    <name>FormWords</name>
+    <message>
+        <source>This is not a number.</source>
+        <translation>Ce n’est pas un nombre.</translation>
+    </message>
+    <message>
+        <source>This formula cannot be computed.</source>
+        <translation>Cette formule ne peut pas être calculée.</translation>
+    </message>
+    <message>
+        <source>This formula depends on itself.</source>
+        <translation>Cette formule dépend d’elle-même.</translation>
+    </message>
+    <message>
+        <source>A number is missing that this is computed from.</source>
+        <translation>Il manque un nombre nécessaire à ce calcul.</translation>
+    </message>
+    <message>
+        <source>%1 character, and what the script adds</source>
+        <translation>%1 caractère, plus ce qu’ajoute le script</translation>
+    </message>
+    <message numerus="yes">
+        <source>%1 characters, and what the script adds</source>
+        <translation>
+            <numerusform>%1 caractère, plus ce qu’ajoute le script</numerusform>
+            <numerusform>%1 caractères, plus ce qu’ajoute le script</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>%1 character</source>
+        <translation>%1 caractère</translation>
+    </message>
+    <message numerus="yes">
+        <source>%1 characters</source>
+        <translation>
+            <numerusform>%1 caractère</numerusform>
+            <numerusform>%1 caractères</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Return inserts</source>
+        <translation>Entrée insère</translation>
+    </message>
+    <message>
+        <source>Ctrl+Return inserts from anywhere</source>
+        <translation>Ctrl+Entrée insère de partout</translation>
+    </message>
+    <message>
+        <source>Alt+letter takes a part or leaves it out</source>
+        <translation>Alt+lettre prend une partie ou l’omet</translation>
+    </message>
+    <message>
+        <source>Esc cancels</source>
+        <translation>Échap annule</translation>
+    </message>
+    <message>
+        <source>Insert</source>
+        <translation>Insérer</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Annuler</translation>
+    </message>
 </context>
 <context>
     <name>GeneralPage</name>
@@ -1073,6 +1150,46 @@
         <source>The snippet was not sent: the window that it was for is gone, or does not take the keyboard.</source>
         <translation>L’extrait n’a pas été envoyé&#x202f;: la fenêtre à laquelle il était destiné a disparu, ou ne prend pas le clavier.</translation>
     </message>
+    <message>
+        <source>The window that it was for is gone, or does not take the keyboard.</source>
+        <translation>La fenêtre à laquelle il était destiné n’existe plus, ou ne prend pas le clavier.</translation>
+    </message>
+    <message>
+        <source>Another field has the focus than the one that it was for.</source>
+        <translation>Le champ actif n’est pas celui auquel il était destiné.</translation>
+    </message>
+    <message>
+        <source>A form is shown as a plain window, because no page can be drawn: %1</source>
+        <translation>Un formulaire est montré dans une fenêtre simple, faute de pouvoir dessiner une page : %1</translation>
+    </message>
+    <message>
+        <source>the program plume-form is not installed.</source>
+        <translation>le programme plume-form n’est pas installé.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms does not answer.</source>
+        <translation>Le programme qui dessine les formulaires ne répond pas.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms cannot be started.</source>
+        <translation>Le programme qui dessine les formulaires ne peut pas être lancé.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms does not listen.</source>
+        <translation>Le programme qui dessine les formulaires n’écoute pas.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms says what cannot be.</source>
+        <translation>Le programme qui dessine les formulaires dit ce qui ne peut pas être.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms has crashed.</source>
+        <translation>Le programme qui dessine les formulaires s’est arrêté brutalement.</translation>
+    </message>
+    <message>
+        <source>The program that draws forms has ended with %1.</source>
+        <translation>Le programme qui dessine les formulaires s’est terminé avec %1.</translation>
+    </message>
 </context>
 <context>
     <name>SnippetRow</name>
@@ -1293,6 +1410,14 @@
     <message>
         <source>The report was not saved</source>
         <translation>Le rapport n’a pas été enregistré</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FieldControl</name>
+    <message>
+        <source>%1: %2</source>
+        <comment>a field&apos;s name and value</comment>
+        <translation>%1&#x202f;: %2</translation>
     </message>
 </context>
 <context>
@@ -1590,6 +1715,17 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>They were not saved yet.</source>
         <translation>Elles n’ont pas encore été enregistrées.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PlainFormWindow</name>
+    <message>
+        <source>Text of the snippet</source>
+        <translation>Texte de l’extrait</translation>
+    </message>
+    <message>
+        <source>Field %1</source>
+        <translation>Champ %1</translation>
     </message>
 </context>
 <context>
@@ -2034,6 +2170,17 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
 </context>
 <context>
+    <name>plume::ScriptMark</name>
+    <message>
+        <source>Script: %1</source>
+        <translation>Script&#x202f;: %1</translation>
+    </message>
+    <message>
+        <source>What this script prints comes here.</source>
+        <translation>Ce que ce script affiche vient ici.</translation>
+    </message>
+</context>
+<context>
     <name>plume::SettingsModel</name>
     <message>
         <source>Setting</source>
@@ -2178,6 +2325,45 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>Plume: on</source>
         <translation>Plume&#x202f;: activé</translation>
+    </message>
+</context>
+<context>
+    <name>plume::UnsentTextWindow</name>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Copier</translation>
+    </message>
+    <message>
+        <source>Text Not Inserted</source>
+        <translation>Texte non inséré</translation>
+    </message>
+    <message>
+        <source>The text was not inserted</source>
+        <translation>Le texte n’a pas été inséré</translation>
+    </message>
+    <message>
+        <source>Plume keeps it until you close this window.</source>
+        <translation>Plume le garde jusqu’à ce que vous fermiez cette fenêtre.</translation>
+    </message>
+    <message>
+        <source>The text</source>
+        <translation>Le texte</translation>
+    </message>
+    <message>
+        <source>&amp;Try Again</source>
+        <translation>&amp;Réessayer</translation>
+    </message>
+    <message>
+        <source>&amp;Discard</source>
+        <translation>&amp;Abandonner</translation>
+    </message>
+    <message>
+        <source>Copied. The text is in the clipboard now.</source>
+        <translation>Copié. Le texte est maintenant dans le presse-papiers.</translation>
+    </message>
+    <message>
+        <source>Discard the text? Press Esc or close the window once more to discard it.</source>
+        <translation>Abandonner le texte&#x202f;? Appuyez de nouveau sur Échap ou fermez de nouveau la fenêtre pour l’abandonner.</translation>
     </message>
 </context>
 <context>

@@ -122,6 +122,7 @@ const std::vector<KnownSetting>& knownSettings() {
         {"CorrectDoubleCapitals", boolean},
         {"DoubleCapitalsCorrectionExclusion", string},
         {"SuggestAutomatically", boolean, false},
+        {"PlainForms", boolean, false},
         {"SnippetSelectorKeyModifier", selectorModifier},
         {"SnippetAdaptToAbbreviationCaseOption", integer},
         {"SnippetQuickSearchWildcardSearch", integer},

@@ -28,6 +28,7 @@
 #include "app/cli/UserLibrary.h"
 #include "app/cli/Version.h"
 #include "app/cli/Voice.h"
+#include "app/form/FormWindows.h"
 #include "app/linux/LinuxPort.h"
 #include "app/linux/PasswordFieldConsent.h"
 #include "app/preferences/PreferencesWindow.h"
@@ -71,6 +72,7 @@ class Application {
     void showDecisions();
     SuggestionView& suggestionView();
     QuickSearchView& quickSearchView();
+    FormView& formView();
 
     QtRunLoop& loop_;
     LinuxPort& port_;
@@ -83,6 +85,7 @@ class Application {
     std::unique_ptr<QtWindows> windows_;
     std::unique_ptr<SuggestionWindow> suggestions_;
     std::unique_ptr<QuickSearchWindow> quickSearch_;
+    std::unique_ptr<FormWindows> forms_;
     std::unique_ptr<AppDelegate> delegate_;
     std::unique_ptr<ApplicationServices> services_;
     std::unique_ptr<ApplicationCommands> commands_;
@@ -142,6 +145,7 @@ AppDelegate::Dependencies Application::delegateDependencies() {
             .reports = reports_,
             .suggestionView = [this]() -> SuggestionView& { return suggestionView(); },
             .quickSearchView = [this]() -> QuickSearchView& { return quickSearchView(); },
+            .formView = [this]() -> FormView& { return formView(); },
             .uses = *uses_,
             .ports = port_.ports(),
             .applications = installedApplications(voice_),
@@ -175,6 +179,18 @@ SuggestionView& Application::suggestionView() {
 QuickSearchView& Application::quickSearchView() {
     if (!quickSearch_) quickSearch_ = std::make_unique<QuickSearchWindow>(services_->quickSearch());
     return *quickSearch_;
+}
+
+FormView& Application::formView() {
+    if (!forms_) {
+        forms_ = std::make_unique<FormWindows>(
+            FormWindows::Services{.mainLoop = loop_,
+                                  .settings = library_->settings(),
+                                  .program = programFolder() / "plume-form",
+                                  .programRuns = [this](std::int64_t process) { port_.setFormProcess(process); },
+                                  .report = [this](const std::string& sentence) { delegate_->report(sentence); }});
+    }
+    return *forms_;
 }
 
 // Reachable before everything is there: whoever calls early is told so.
@@ -243,6 +259,7 @@ int Application::run(int signals) {
     delete preferences_;
     delete decisions_;
     quickSearch_ = nullptr;
+    forms_ = nullptr;
     suggestions_ = nullptr;
     windows_ = nullptr;
     return status_;

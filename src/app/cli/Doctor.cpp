@@ -116,6 +116,7 @@ class Examination {
         if (session_) examineIcon();
         examineSounds();
         examineWatchdog();
+        examineForms();
         examineScripts();
         examineConflicts();
         examineLibrary();
@@ -265,6 +266,14 @@ class Examination {
             return good("watchdog", "frees the keyboard should Plume hang");
         }
         bad("watchdog", program.string() + " is not there; install Plume again.");
+    }
+
+    void examineForms() {
+        std::error_code problem;
+        if (std::filesystem::exists(programFolder() / "plume-form", problem)) {
+            return good("forms", "fields are filled in where they stand in the text");
+        }
+        warn("forms", "plume-form is not installed, so fields are filled in in a plain window.");
     }
 
     void examineScripts() {

@@ -18,6 +18,10 @@ class ExpansionPage final : public PreferencesPage {
         addHeading(tr("Typing"));
         addCheckBox("ListenMouseDownEvents", tr("A mouse click &ends the abbreviation"),
                     tr("What was typed before a click and what is typed after it are then never one abbreviation."));
+        addHeading(tr("Forms"));
+        addCheckBox("PlainForms", tr("&Fill in fields in a plain window"),
+                    tr("Instead of a page that looks like the text. The program that draws pages needs some 200 MB "
+                       "while forms are in use, and goes ten minutes after the last one."));
         addHeading(tr("Passwords"));
         addCheckBox("LetProgramsTellPasswordFields", tr("Let programs tell which fields are for &passwords"),
                     tr("Plume is deaf in these fields. Browsers and some other programs tell it only while the "

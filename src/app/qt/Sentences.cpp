@@ -30,6 +30,18 @@ constexpr const char* Known[] = {
     QT_TRANSLATE_NOOP("Sentences", "The snippet was not sent: it is no longer in your library."),
     QT_TRANSLATE_NOOP("Sentences",
                       "The snippet was not sent: the window that it was for is gone, or does not take the keyboard."),
+    // Forms
+    QT_TRANSLATE_NOOP("Sentences", "The window that it was for is gone, or does not take the keyboard."),
+    QT_TRANSLATE_NOOP("Sentences", "Another field has the focus than the one that it was for."),
+    QT_TRANSLATE_NOOP("Sentences", "A form is shown as a plain window, because no page can be drawn: %1"),
+    QT_TRANSLATE_NOOP("Sentences", "the program plume-form is not installed."),
+    QT_TRANSLATE_NOOP("Sentences", "The program that draws forms does not answer."),
+    QT_TRANSLATE_NOOP("Sentences", "The program that draws forms cannot be started."),
+    QT_TRANSLATE_NOOP("Sentences", "The program that draws forms does not listen."),
+    QT_TRANSLATE_NOOP("Sentences", "The program that draws forms says what cannot be."),
+    QT_TRANSLATE_NOOP("Sentences", "The program that draws forms has crashed."),
+    QT_TRANSLATE_NOOP("Sentences", "The program that draws forms has ended with %1."),
+    // Hot keys
     QT_TRANSLATE_NOOP("Sentences", "Another hot key of Plume's has this combination already."),
     QT_TRANSLATE_NOOP("Sentences", "Another program has this combination as its hot key already: choose another."),
     QT_TRANSLATE_NOOP("Sentences", "The keyboard has no key with code %1 for the hot key."),

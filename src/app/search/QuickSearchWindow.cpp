@@ -19,8 +19,8 @@
 #include <utility>
 
 #include "app/qt/Labels.h"
+#include "app/qt/PopupPlace.h"
 #include "app/qt/Text.h"
-#include "app/search/PopupPlace.h"
 #include "app/search/QuickSearchModel.h"
 #include "app/search/SnippetPreview.h"
 #include "app/search/SnippetRowDelegate.h"

@@ -8,8 +8,8 @@
 #include <QWheelEvent>
 #include <algorithm>
 
+#include "app/qt/PopupPlace.h"
 #include "app/qt/Text.h"
-#include "app/search/PopupPlace.h"
 #include "app/search/SnippetRowDelegate.h"
 
 namespace plume {

@@ -1,4 +1,4 @@
-#include "app/search/PopupPlace.h"
+#include "app/qt/PopupPlace.h"
 
 #include <gtest/gtest.h>
 
