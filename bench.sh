@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Builds the benchmarks, optimised, and prints one line a figure: "name: value unit".
-#   ./bench.sh [matching|search|content|library|input|delivery|app]…    all of them when none is named
+#   ./bench.sh [matching|search|form|content|library|input|delivery|app]…    all of them when none is named
 #   ./bench.sh delivery --with-peer                  beside AutoKey, which it installs
 set -euo pipefail
 cd "$(dirname "$0")"
@@ -16,10 +16,10 @@ for argument in "$@"; do
         *) names+=("$argument") ;;
     esac
 done
-[ ${#names[@]} -gt 0 ] || names=(matching search content library input delivery app)
+[ ${#names[@]} -gt 0 ] || names=(matching search form content library input delivery app)
 for name in "${names[@]}"; do
     if [ ! -x "build/bench/bin/bench_$name" ]; then
-        echo "bench.sh: no benchmark is called '$name'; there are: matching search content library input delivery app" >&2
+        echo "bench.sh: no benchmark is called '$name'; there are: matching search form content library input delivery app" >&2
         exit 2
     fi
     if [ "$name" = delivery ]; then

@@ -3,31 +3,21 @@
 #include <poll.h>
 
 #include <chrono>
-#include <filesystem>
-#include <fstream>
-#include <memory>
-#include <optional>
 #include <string>
 #include <vector>
 
+#include "bench/Desk.h"
 #include "bench/Figures.h"
 #include "bench/GeneratedLibrary.h"
 #include "bench/KeyLatency.h"
 #include "bench/SearchFigures.h"
-#include "testing/rig/PlumeProgram.h"
-#include "testing/rig/XcbReply.h"
 
 namespace plume::bench {
 
 namespace {
 
-using rig::DesktopRig;
 using rig::Key;
-using rig::Milliseconds;
-using rig::TargetKind;
 using Clock = std::chrono::steady_clock;
-
-constexpr Milliseconds Bound(5'000);
 
 // What is suggested for a text that consists of this one letter, however long it is.
 constexpr const char* LongAbbreviations = R"json([
@@ -37,62 +27,12 @@ constexpr const char* LongAbbreviations = R"json([
       { "abbreviation": "zebra crossing", "content": "Look left and right." } ] }
 ])json";
 
-double since(Clock::time_point moment) {
-    return std::chrono::duration<double, std::milli>(Clock::now() - moment).count();
-}
-
-class Desk {
+// With a list and a search by hot keys.
+class ListDesk : public Desk {
   public:
-    explicit Desk(std::size_t snippetsPerGroup) {
-        rig_.session().join();
-        const auto folder = rig_.directory() / "home/.config/plume";
-        std::filesystem::create_directories(folder);
-        std::ofstream(folder / "library.json") << LongAbbreviations;
-        run({"list"});
-        const auto all = rig_.directory() / "all.plume";
-        std::ofstream(all, std::ios::binary) << libraryArchive(makeLibrary(snippetsPerGroup, 10));
-        run({"import", all.string()});
-        run({"settings", "PlayFeedbackSound", "false"});
-        run({"settings", "suggestAbbreviationsHotKey", "120"});  // F2
-        run({"settings", "quickSearchHotKey", "99"});            // F3
-        plume_ = rig::PlumeProgram::startApplication(rig_);
-        target_ = rig_.startTarget(TargetKind::GtkTextView);
-        poll(nullptr, 0, 1'500);
-    }
-
-    DesktopRig& rig() { return rig_; }
-    rig::TargetProgram& target() { return *target_; }
-    void tap(Key key) {
-        rig_.keyboard().tap(key);
-        rig_.keyboard().sync();
-    }
-
-    // What a part of the screen shows.
-    std::string picture(const xcb_rectangle_t& part) {
-        auto* connection = rig_.client().connection();
-        const auto asked = xcb_get_image(connection, XCB_IMAGE_FORMAT_Z_PIXMAP, rig_.client().root(), part.x, part.y,
-                                         part.width, part.height, 0xFFFFFFFF);
-        const auto image = rig::own(xcb_get_image_reply(connection, asked, nullptr));
-        require(image != nullptr);
-        return {reinterpret_cast<const char*>(xcb_get_image_data(image.get())),
-                static_cast<std::size_t>(xcb_get_image_data_length(image.get()))};
-    }
-    // Milliseconds from what `act` does until that part of the screen shows this.
-    template <typename Act>
-    double untilShown(const xcb_rectangle_t& part, const std::string& expected, const Act& act) {
-        const auto began = Clock::now();
-        act();
-        while (picture(part) != expected) require(since(began) < static_cast<double>(Bound.count()));
-        return since(began);
-    }
-    static void settle() { poll(nullptr, 0, 300); }
-
-  private:
-    void run(const std::vector<std::string>& arguments) { require(rig::runPlume(rig_, arguments).status == 0); }
-
-    DesktopRig rig_;
-    std::unique_ptr<rig::PlumeProgram> plume_;
-    std::unique_ptr<rig::TargetProgram> target_;
+    explicit ListDesk(std::size_t snippetsPerGroup)
+        : Desk(LongAbbreviations, {{"suggestAbbreviationsHotKey", "120"}, {"quickSearchHotKey", "99"}},  // F2, F3
+               libraryArchive(makeLibrary(snippetsPerGroup, 10))) {}
 };
 
 // Below the first line of the text, where the list stands.
@@ -210,7 +150,7 @@ void benchSend(Desk& desk) {
         desk.target().forgetReports();
         const auto pressed = Clock::now();
         desk.tap(Key::Return);
-        const auto change = desk.target().takeChange(Bound);
+        const auto change = desk.target().takeChange(Desk::Bound);
         require(change.has_value());
         times.push_back(std::chrono::duration<double, std::milli>(change->time - pressed).count());
         require(desk.target().awaitText("Look left and right.") == "Look left and right.");
@@ -222,13 +162,13 @@ void benchSend(Desk& desk) {
 
 void printListFigures() {
     {
-        Desk desk(SnippetsPerGroup);
+        ListDesk desk(SnippetsPerGroup);
         benchList(desk);
         benchKeysBesideList(desk);
         benchSend(desk);
         benchSearch(desk, "10000");
     }
-    Desk desk(10 * SnippetsPerGroup);
+    ListDesk desk(10 * SnippetsPerGroup);
     benchSearch(desk, "100000");
 }
 

@@ -7,11 +7,17 @@
 namespace plume::rig {
 
 void writeScreenshot(XClient& client, const std::filesystem::path& file) {
-    const auto width = client.screen().width_in_pixels;
-    const auto height = client.screen().height_in_pixels;
+    const auto& screen = client.screen();
+    writeScreenshot(client, file, {0, 0, screen.width_in_pixels, screen.height_in_pixels});
+}
+
+void writeScreenshot(XClient& client, const std::filesystem::path& file, const XClient::Place& part) {
+    const auto width = static_cast<std::uint16_t>(part.width);
+    const auto height = static_cast<std::uint16_t>(part.height);
     constexpr std::uint32_t AllPlanes = ~0U;
     const auto cookie =
-        xcb_get_image(client.connection(), XCB_IMAGE_FORMAT_Z_PIXMAP, client.root(), 0, 0, width, height, AllPlanes);
+        xcb_get_image(client.connection(), XCB_IMAGE_FORMAT_Z_PIXMAP, client.root(), static_cast<std::int16_t>(part.x),
+                      static_cast<std::int16_t>(part.y), width, height, AllPlanes);
     const auto reply = own(xcb_get_image_reply(client.connection(), cookie, nullptr));
     constexpr int BytesPerPixel = 4;  // the server is configured with depth 24
     if (!reply || xcb_get_image_data_length(reply.get()) < width * height * BytesPerPixel) {
