@@ -1,7 +1,6 @@
 // Forms on a desktop, with the program itself and real keys: how soon they are seen, cold and warm, how soon their text
 // arrives, and what the application costs besides.
-#include <signal.h>
-
+#include <csignal>
 #include <fstream>
 #include <string>
 #include <vector>

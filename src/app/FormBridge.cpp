@@ -78,20 +78,33 @@ void FormBridge::lost() {
 }
 
 void FormBridge::mayEnd(const ZDKeyEventArgs& key) {
+    // The key behind it may be here before the loop has come to the hold.
+    if (isInDoubt_) return holdWhatFollows();
     const bool mayEnd = key.key == KeyCode::Return || key.key == KeyCode::KeypadEnter || key.key == KeyCode::Escape;
     if (!mayEnd || !keyboard_.hasKeyboard(window_)) return;
     // The key itself goes to the form.
-    holding_ = around_.tapLoop.performAfterDelay(0, [this] { holdUserKeys(LongestDoubt); });
+    isInDoubt_ = true;
+    holding_ = around_.tapLoop.performAfterDelay(0, [this] { holdWhatFollows(); });
+}
+
+void FormBridge::holdWhatFollows() {
+    endDoubt();
+    holdUserKeys(LongestDoubt);
+}
+
+void FormBridge::endDoubt() {
+    isInDoubt_ = false;
+    holding_.cancel();
 }
 
 // It may have answered before the hold began.
 void FormBridge::stayed() {
-    holding_.cancel();
+    endDoubt();
     hold_ = nullptr;
 }
 
 void FormBridge::accepted() {
-    holding_.cancel();
+    endDoubt();
     window_ = 0;
     holdUserKeys(LongestClosing);
     keyboard_.giveBackTo(owner_, [this](bool isBack) {
@@ -103,7 +116,7 @@ void FormBridge::accepted() {
 }
 
 void FormBridge::cancelled() {
-    holding_.cancel();
+    endDoubt();
     window_ = 0;
     if (isKept_) return target_.fieldsEditorWillClose(*this);
     holdUserKeys(LongestDoubt);

@@ -59,6 +59,8 @@ class FormBridge final : public FieldsEditor {
     void keyPressed(ZDKeyEventArgs& key) { mayEnd(key); }
     void shortcutPressed(ZDUnregisteredHotKeyPressedEventArgs& key) { mayEnd(key); }
     void mayEnd(const ZDKeyEventArgs& key);
+    void holdWhatFollows();
+    void endDoubt();
     // Calls once with the field that has the focus; with an empty name when the program does not tell in time.
     void askForField(std::function<void(const std::string& field)> told);
     void checkField(int attemptsLeft);
@@ -74,6 +76,7 @@ class FormBridge final : public FieldsEditor {
     const KeyboardHandover::Owner owner_;  // who had the keyboard when the abbreviation was typed
     std::string field_;                    // that had the focus then; empty when it is not known
     bool isKept_ = false;                  // the text could not be sent once, and the user says where it goes
+    bool isInDoubt_ = false;               // a key has come that may have ended the form, and nothing is held yet
     std::uint32_t window_ = 0;
     std::unique_ptr<UserKeysHold> hold_;
     CaretFinder caret_;

@@ -1,7 +1,6 @@
 // Forms on a whole desktop, drawn as pages and as plain windows: what is typed into them, where their text goes, and
 // what becomes of it when something goes wrong.
-#include <signal.h>
-
+#include <csignal>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>

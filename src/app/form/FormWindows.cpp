@@ -98,8 +98,8 @@ FormSurface::Events FormWindows::eventsOf(Id id) {
     return {.shown = [this, onForm](
                          std::uint32_t window) { onForm([this, window](OpenForm& form) { shown(form, window); }); },
             .filled =
-                [this, onForm](std::size_t field, const std::u16string& value) {
-                    onForm([this, field, &value](OpenForm& form) { filled(form, field, value); });
+                [onForm](std::size_t field, const std::u16string& value) {
+                    onForm([field, &value](OpenForm& form) { filled(form, field, value); });
                 },
             .selected =
                 [onForm](std::size_t field, bool selected) {

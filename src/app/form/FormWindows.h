@@ -61,7 +61,7 @@ class FormWindows final : public FormView {
     FormSurface::Events eventsOf(Id id);
     void showSurface(OpenForm& form);
     void shown(OpenForm& form, std::uint32_t window);
-    void filled(OpenForm& form, std::size_t field, const std::u16string& value);
+    static void filled(OpenForm& form, std::size_t field, const std::u16string& value);
     void accepted(OpenForm& form);
     void cancelled(OpenForm& form);
     static void end(OpenForm& form);

@@ -1,6 +1,7 @@
 #include "app/form/PageForm.h"
 
 #include <algorithm>
+#include <type_traits>
 #include <utility>
 
 #include "app/form/FormWords.h"
@@ -73,15 +74,19 @@ ShownField PageForm::fieldNow(std::size_t index) const {
 // ---- What the program says ----
 
 bool PageForm::take(const FormReport& report) {
-    return std::visit([this](const auto& each) { return heard(each); }, report);
+    return std::visit(
+        [this](const auto& each) {
+            // That is said of the program, and not of a form.
+            if constexpr (std::is_same_v<decltype(each), const FormsReady&>)
+                return false;
+            else
+                return heard(each);
+        },
+        report);
 }
 
 bool PageForm::isField(std::int64_t index) const {
     return std::cmp_less(index, shown_.size()) && model_.fields()[static_cast<std::size_t>(index)].hasControl();
-}
-
-bool PageForm::heard(const FormsReady& /*report*/) {
-    return false;
 }
 
 bool PageForm::heard(const FormShown& report) {

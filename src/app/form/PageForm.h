@@ -40,7 +40,6 @@ class PageForm final : public FormSurface {
     bool isField(std::int64_t index) const;
     std::optional<std::u16string> takeValue(const FormFilled& report);
 
-    static bool heard(const FormsReady& report);
     bool heard(const FormShown& report);
     bool heard(const FormFilled& report);
     bool heard(const FormSelected& report);

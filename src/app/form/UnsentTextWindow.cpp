@@ -1,11 +1,9 @@
 #include "app/form/UnsentTextWindow.h"
 
 #include <QCloseEvent>
-#include <QCoreApplication>
 #include <QDialogButtonBox>
 #include <QLabel>
 #include <QPlainTextEdit>
-#include <QPointer>
 #include <QPushButton>
 #include <QVBoxLayout>
 #include <string_view>
@@ -83,14 +81,7 @@ QWidget* UnsentTextWindow::makeButtons() {
 void UnsentTextWindow::copy() {
     isSafe_ = true;
     tell(tr("Copied. The text is in the clipboard now."));
-    QMetaObject::invokeMethod(
-        qApp,
-        [window = QPointer(this)] {
-            if (!window) return;
-            const auto action = window->actions_.copy;
-            action();
-        },
-        Qt::QueuedConnection);
+    post(actions_.copy);
 }
 
 void UnsentTextWindow::tell(const QString& remark) {
@@ -113,13 +104,18 @@ void UnsentTextWindow::closeEvent(QCloseEvent* event) {
 
 // The window is destroyed by the action, perhaps, and so never inside a call of its own.
 void UnsentTextWindow::end(std::function<void()> action) {
-    if (std::exchange(isEnded_, true)) return;
-    QMetaObject::invokeMethod(
-        qApp,
-        [window = QPointer(this), action = std::move(action)] {
-            if (window) action();
-        },
-        Qt::QueuedConnection);
+    if (!std::exchange(isEnded_, true)) post(std::move(action));
+}
+
+void UnsentTextWindow::post(std::function<void()> action) {
+    posted_.push_back(std::move(action));
+    QMetaObject::invokeMethod(this, "perform", Qt::QueuedConnection);
+}
+
+void UnsentTextWindow::perform() {
+    const auto action = std::move(posted_.front());
+    posted_.pop_front();
+    action();
 }
 
 }  // namespace plume

@@ -5,6 +5,7 @@
 #pragma once
 
 #include <QDialog>
+#include <deque>
 #include <functional>
 #include <string>
 
@@ -38,12 +39,16 @@ class UnsentTextWindow final : public QDialog {
     void copy();
     void tell(const QString& remark);
     void end(std::function<void()> action);
+    // Actions are performed from the event loop, in their order.
+    void post(std::function<void()> action);
+    Q_INVOKABLE void perform();
 
     Actions actions_;
     QLabel* remark_;  // what has just happened, or is asked
     QPushButton* copyButton_;
     bool isSafe_ = false;  // the text may be lost: it was copied, or the user has been asked
     bool isEnded_ = false;
+    std::deque<std::function<void()>> posted_;
 };
 
 }  // namespace plume

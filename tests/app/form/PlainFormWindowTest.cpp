@@ -124,7 +124,7 @@ TEST(PlainFormWindow, PicksFromAnOpenMenuByReturn) {
     FormOwner owner(Letter().field(u"x", Menu, u"Red\nGreen"));
     owner.open();
     owner.takeNotes();
-    QComboBox& menu = owner.find<QComboBox>("x");
+    auto& menu = owner.find<QComboBox>("x");
     for (const auto& [key, notes] : {std::pair(Qt::Key_Return, std::vector<std::string>{"filled 0 Green"}),
                                      std::pair(Qt::Key_Escape, std::vector<std::string>{})}) {
         menu.showPopup();

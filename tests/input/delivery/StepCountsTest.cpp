@@ -43,7 +43,8 @@ TEST(StepCounts, AreWhatProgramsWereSeenToTake) {
 RC_GTEST_PROP(StepCounts, AreAsManyAsClustersOfTheWhole, ()) {
     const std::u16string units =
         u"aaaaaaaa\u4e2d\u4e2d\ud55c\uac00\r\n\u0301\u0903\u0600\u1100\u1161\u11a8\u200d\ufe0f\u0e33"
-        u"\U0001f469\U0001f1e9\U0001f3fd\u0915\u094d\u0000\ue000";
+        u"\U0001f469\U0001f1e9\U0001f3fd\u0915\u094d\ue000" +
+        std::u16string(1, u'\0');
     std::u16string text;
     for (int pieces = *rc::gen::inRange(0, 12); pieces > 0; --pieces) {
         text += *rc::gen::container<std::u16string>(rc::gen::elementOf(units));
