@@ -68,9 +68,10 @@ void CaretFinder::ask(const std::shared_ptr<Question>& question) {
         });
 }
 
-// Firefox lays a text out for this when it is asked for the first time, and knows only then where the caret is.
+// Firefox lays a text out for this when it is asked for the first time, and knows only then where the caret is; any
+// program may take the keys of its new window sooner than it tells of it.
 void CaretFinder::told(const std::shared_ptr<Question>& question, const FocusedPlaces& places) {
-    const bool isWorthAsking = places.element && !places.caret;
+    const bool isWorthAsking = !places.caret && (places.element || places.isMoving);
     if (!isWorthAsking || std::exchange(question->isRepeated, true)) {
         return answer(caretPlaceIn(places, processManager_.frontWindowBounds()));
     }

@@ -75,6 +75,8 @@ struct FocusedPlaces {
     std::optional<Rectangle> window;
     // Names the element as long as it lives; empty: not told.
     std::string elementName = {};
+    // The user has just come there: what is not told now may be told in a moment.
+    bool isMoving = false;
 };
 
 class Accessibility {

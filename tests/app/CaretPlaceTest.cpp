@@ -83,6 +83,9 @@ class SlowAccessibility final : public Accessibility {
     double mainScreenHeight() const override { return 1000; }
     void tell(const Rectangle& caret) const { told_({.caret = caret, .element = {}, .window = {}}); }
     void tellFieldAlone(const Rectangle& field) const { told_({.caret = {}, .element = field, .window = {}}); }
+    void tellNothing(bool isMoving) const {
+        told_({.caret = {}, .element = {}, .window = {}, .elementName = {}, .isMoving = isMoving});
+    }
 
   private:
     mutable std::function<void(const FocusedPlaces&)> told_;
@@ -124,6 +127,21 @@ TEST_F(CaretFinderTest, AsksOnceMoreForACaretThatIsNotKnownAtOnce) {
         loop_.runReady();
         EXPECT_EQ(found_, (std::vector<CaretPlace>{{becomesKnown ? Kind::Caret : Kind::Field, caret_}}));
     }
+}
+
+TEST_F(CaretFinderTest, AsksAProgramOnceMoreThatHasJustComeToTheFront) {
+    find();
+    accessibility_.tellNothing(true);
+    loop_.advance(0.05);
+    EXPECT_TRUE(found_.empty());
+    accessibility_.tell(caret_);
+    loop_.runReady();
+    EXPECT_EQ(found_, (std::vector<CaretPlace>{{Kind::Caret, caret_}}));
+
+    find();
+    accessibility_.tellNothing(false);
+    loop_.runReady();
+    EXPECT_EQ(found_.back(), CaretPlace()) << "it tells nothing, and nobody waits for it";
 }
 
 TEST_F(CaretFinderTest, WaitsForNoProgramThatHangs) {

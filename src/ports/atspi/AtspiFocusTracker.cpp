@@ -24,6 +24,7 @@ constexpr std::array TimesBetweenLooks = {0.015, 0.045, 0.190, 0.750};
 // While somebody only types; there is a look every so often then.
 constexpr milliseconds Fresh{300};
 constexpr milliseconds FreshWhileMoving{50};
+constexpr milliseconds FreshWhileUnknown{20};  // a program that has just come to the front
 constexpr milliseconds LookBound{1'000};
 constexpr milliseconds LongestWait{50};
 // An answer to a question that was asked so long after a key is none of before it.
@@ -109,7 +110,8 @@ void AtspiFocusTracker::lookAfterTyping() {
 AtspiFocused AtspiFocusTracker::focusedNow() {
     const AtspiPart known = focus_.part();
     AtspiPendingCall selections = AtspiTextReader::askForSelections(bus_, known);
-    if (Clock::now() - lookedAt_ > (isMoveExpected() ? FreshWhileMoving : Fresh)) look();
+    const milliseconds freshWhileMoving = known ? FreshWhileMoving : FreshWhileUnknown;
+    if (Clock::now() - lookedAt_ > (isMoveExpected() ? freshWhileMoving : Fresh)) look();
     const bool isStill = known && focus_.part() == known;
     return focus_.tell(known,
                        isStill ? AtspiTextReader::selectsNothing(bus_, known, std::move(selections)) : std::nullopt);

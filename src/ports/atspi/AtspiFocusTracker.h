@@ -140,6 +140,8 @@ class AtspiFocusTracker {
     // ---- On the accessibility thread ----
     // What has the focus now, or a moment ago.
     AtspiFocused focusedNow();
+    // Whether it may have moved a moment ago.
+    bool isMoveExpected() const;
 
   private:
     using Clock = std::chrono::steady_clock;
@@ -151,7 +153,6 @@ class AtspiFocusTracker {
     void lookAt(const AtspiFocus::Front& front);
     void heardFocus(const AtspiPart& part);
     void expectMove();
-    bool isMoveExpected() const;
     void search(const AtspiFocus::Front& front);
     void becomeFocused(const AtspiFocus::Front& front, const AtspiPart& part, pid_t process);
     void listenWhereItHelps(const AtspiFocus::Front& front, const AtspiFocusFinder::Found& found);

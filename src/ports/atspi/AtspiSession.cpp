@@ -86,7 +86,8 @@ void AtspiSession::askForPlaces(std::function<void(const FocusedPlaces&)> told) 
         bus_.begin(QuestionBound);
         const AtspiFocused focused = tracker_.focusedNow();
         bus_.begin(QuestionBound);
-        const FocusedPlaces places = placesOf(bus_, focused);
+        FocusedPlaces places = placesOf(bus_, focused);
+        places.isMoving = tracker_.isMoveExpected();
         // A thread that was left behind has nobody to tell any more.
         if (!queue_.hasEnded()) told(places);
     });
