@@ -28,6 +28,7 @@ FormBridge::FormBridge(FormView::Id id, std::shared_ptr<SnippetExpandedContent> 
       keyboard_(around_.processManager, around_.tapLoop),
       owner_(keyboard_.owner()),
       caret_(around_.accessibility, around_.processManager, around_.tapLoop),
+      keyInDoubt_(around_.tapLoop, [this] { holdUserKeys(LongestDoubt); }),
       keys_(around_.inputService.keyDownEvent.addObserver(this, &FormBridge::keyPressed)),
       shortcuts_(around_.inputService.unregisteredHotKeyPressedEvent.addObserver(this, &FormBridge::shortcutPressed)) {
     holdUserKeys(LongestOpening);
@@ -78,33 +79,17 @@ void FormBridge::lost() {
 }
 
 void FormBridge::mayEnd(const ZDKeyEventArgs& key) {
-    // The key behind it may be here before the loop has come to the hold.
-    if (isInDoubt_) return holdWhatFollows();
-    const bool mayEnd = key.key == KeyCode::Return || key.key == KeyCode::KeypadEnter || key.key == KeyCode::Escape;
-    if (!mayEnd || !keyboard_.hasKeyboard(window_)) return;
-    // The key itself goes to the form.
-    isInDoubt_ = true;
-    holding_ = around_.tapLoop.performAfterDelay(0, [this] { holdWhatFollows(); });
+    const bool isEnd = key.key == KeyCode::Return || key.key == KeyCode::KeypadEnter || key.key == KeyCode::Escape;
+    keyInDoubt_.keyPressed(isEnd && keyboard_.hasKeyboard(window_));
 }
 
-void FormBridge::holdWhatFollows() {
-    endDoubt();
-    holdUserKeys(LongestDoubt);
-}
-
-void FormBridge::endDoubt() {
-    isInDoubt_ = false;
-    holding_.cancel();
-}
-
-// It may have answered before the hold began.
 void FormBridge::stayed() {
-    endDoubt();
+    keyInDoubt_.end();
     hold_ = nullptr;
 }
 
 void FormBridge::accepted() {
-    endDoubt();
+    keyInDoubt_.end();
     window_ = 0;
     holdUserKeys(LongestClosing);
     keyboard_.giveBackTo(owner_, [this](bool isBack) {
@@ -116,7 +101,7 @@ void FormBridge::accepted() {
 }
 
 void FormBridge::cancelled() {
-    endDoubt();
+    keyInDoubt_.end();
     window_ = 0;
     if (isKept_) return target_.fieldsEditorWillClose(*this);
     holdUserKeys(LongestDoubt);

@@ -12,6 +12,7 @@
 
 #include "app/CaretPlace.h"
 #include "app/FormView.h"
+#include "app/KeyInDoubt.h"
 #include "app/KeyboardHandover.h"
 #include "engine/FieldsEditor.h"
 #include "input/MacInputService.h"
@@ -54,13 +55,10 @@ class FormBridge final : public FieldsEditor {
     void cancelled();
     void stayed();
     void holdUserKeys(double seconds);
-    // Within the callback of a key: what follows one that may end the form is for the program behind it, and waits
-    // until it is clear whether it does.
+    // Within the callback of a key.
     void keyPressed(ZDKeyEventArgs& key) { mayEnd(key); }
     void shortcutPressed(ZDUnregisteredHotKeyPressedEventArgs& key) { mayEnd(key); }
     void mayEnd(const ZDKeyEventArgs& key);
-    void holdWhatFollows();
-    void endDoubt();
     // Calls once with the field that has the focus; with an empty name when the program does not tell in time.
     void askForField(std::function<void(const std::string& field)> told);
     void checkField(int attemptsLeft);
@@ -76,11 +74,10 @@ class FormBridge final : public FieldsEditor {
     const KeyboardHandover::Owner owner_;  // who had the keyboard when the abbreviation was typed
     std::string field_;                    // that had the focus then; empty when it is not known
     bool isKept_ = false;                  // the text could not be sent once, and the user says where it goes
-    bool isInDoubt_ = false;               // a key has come that may have ended the form, and nothing is held yet
     std::uint32_t window_ = 0;
     std::unique_ptr<UserKeysHold> hold_;
     CaretFinder caret_;
-    Timer holding_;
+    KeyInDoubt keyInDoubt_;
     Timer checking_;
     std::shared_ptr<std::function<void(const std::string&)>> asked_;  // belongs to the tap thread
     Subscription keys_;

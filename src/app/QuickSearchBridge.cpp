@@ -24,7 +24,8 @@ bool mayEndSearch(const ZDKeyEventArgs& key) {
 QuickSearchBridge::QuickSearchBridge(Dependencies dependencies)
     : around_(std::move(dependencies)),
       keyboard_(around_.processManager, around_.tapLoop),
-      caret_(around_.accessibility, around_.processManager, around_.tapLoop) {
+      caret_(around_.accessibility, around_.processManager, around_.tapLoop),
+      keyInDoubt_(around_.tapLoop, [this] { hold_ = around_.holdUserKeys(LongestHold); }) {
     around_.mainLoop.perform([view = around_.view, events = events()] { view().setEvents(events); });
 }
 
@@ -90,7 +91,7 @@ void QuickSearchBridge::shown(std::uint32_t window) {
 void QuickSearchBridge::close() {
     caret_.cancel();
     keyboard_.cancel();
-    holding_.cancel();
+    keyInDoubt_.end();
     hold_ = nullptr;
     frame_ = {};
     if (std::exchange(visible_, false)) around_.mainLoop.perform([view = around_.view] { view().close(); });
@@ -99,6 +100,7 @@ void QuickSearchBridge::close() {
 // The keyboard goes back to where it came from, if the window manager does not know that by itself.
 void QuickSearchBridge::closedByUser() {
     if (!std::exchange(visible_, false)) return;
+    keyInDoubt_.end();
     frame_ = {};
     hold_ = around_.holdUserKeys(LongestHold);
     keyboard_.giveBackTo(target_, [this](bool) { hold_ = nullptr; });
@@ -117,22 +119,16 @@ std::shared_ptr<Snippet> QuickSearchBridge::snippetAtIndex(std::size_t index) co
 }
 
 void QuickSearchBridge::keyPressed(ZDKeyEventArgs& key) {
-    if (mayEndSearch(key)) holdWhatFollows();
+    keyInDoubt_.keyPressed(mayEndSearch(key) && isSearching());
 }
 
 void QuickSearchBridge::shortcutPressed(ZDUnregisteredHotKeyPressedEventArgs& key) {
-    if (mayEndSearch(key) || key.key == KeyCode::E || key.key == KeyCode::W) holdWhatFollows();
+    const bool mayEnd = mayEndSearch(key) || key.key == KeyCode::E || key.key == KeyCode::W;
+    keyInDoubt_.keyPressed(mayEnd && isSearching());
 }
 
-void QuickSearchBridge::holdWhatFollows() {
-    if (!visible_ || !hasKeyboard()) return;
-    // The key itself goes to the window.
-    holding_ = around_.tapLoop.performAfterDelay(0, [this] { hold_ = around_.holdUserKeys(LongestHold); });
-}
-
-// It may have answered before the hold began.
 void QuickSearchBridge::stayed() {
-    holding_.cancel();
+    keyInDoubt_.end();
     hold_ = nullptr;
 }
 
@@ -140,6 +136,7 @@ void QuickSearchBridge::choose(std::shared_ptr<Snippet> snippet) {
     if (!snippet) around_.report("The snippet was not sent: it is no longer in your library.");
     if (!snippet) return closedByUser();
     if (!std::exchange(visible_, false)) return;
+    keyInDoubt_.end();
     frame_ = {};
     selected_ = std::move(snippet);
     hold_ = around_.holdUserKeys(LongestHold);

@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "app/KeyInDoubt.h"
 #include "app/KeyboardHandover.h"
 #include "app/QuickSearchView.h"
 #include "engine/QuickSearchController.h"
@@ -60,8 +61,7 @@ class QuickSearchBridge final : public QuickSearchController {
     // The user has chosen, and the window is gone: the snippet is sent once the keyboard is where it was before. Null
     // when the library has lost it meanwhile.
     void choose(std::shared_ptr<Snippet> snippet);
-    // Called for every key, within its callback. What follows one that may end the search is for the program behind the
-    // window, and waits until it is clear whether it does.
+    // Called for every key, within its callback.
     void keyPressed(ZDKeyEventArgs& key);
     // The same for a key that is pressed with others than Shift.
     void shortcutPressed(ZDUnregisteredHotKeyPressedEventArgs& key);
@@ -78,9 +78,9 @@ class QuickSearchBridge final : public QuickSearchController {
     void shown(std::uint32_t window);
     void closedByUser();
     void replaced();
-    void holdWhatFollows();
     void stayed();
     bool hasKeyboard() const { return keyboard_.hasKeyboard(ownWindow_); }
+    bool isSearching() const { return visible_ && hasKeyboard(); }
     void send(bool targetIsBack);
 
     const Dependencies around_;
@@ -97,7 +97,7 @@ class QuickSearchBridge final : public QuickSearchController {
     Rectangle frame_;
     std::unique_ptr<UserKeysHold> hold_;
     CaretFinder caret_;
-    Timer holding_;
+    KeyInDoubt keyInDoubt_;
 };
 
 }  // namespace plume

@@ -3,9 +3,8 @@
 #include "app/FormBridge.h"
 
 #include <gmock/gmock.h>
-#include <gtest/gtest.h>
 
-#include "tests/input/InputDesk.h"
+#include "tests/app/BridgeTest.h"
 
 namespace plume {
 namespace {
@@ -63,10 +62,10 @@ class NotedTarget final : public FieldsEditor::Target {
     std::function<void(FieldsEditor&)> onSend = [](FieldsEditor&) {};
 };
 
-class FormBridgeTest : public testing::Test {
+class FormBridgeTest : public BridgeTest {
   protected:
-    FormBridgeTest() : editor(*desk.processes.frontProcess()) {
-        view.window = SimulatedProcessManager::windowOf(desk.processes.currentProcess());
+    FormBridgeTest() {
+        view.window = ownWindow();
         desk.accessibility.setFrontApplicationSource([this] { return isTold ? application : nullptr; });
         focus(body);
         target.onSend = [this](FieldsEditor& form) {
@@ -83,18 +82,6 @@ class FormBridgeTest : public testing::Test {
 
     void focus(const std::shared_ptr<SimulatedUIElement>& field) {
         application->setAttribute("AXFocusedUIElement", std::shared_ptr<UIElement>(field));
-    }
-    void settle() {
-        constexpr int Rounds = 4;
-        for (int round = 0; round < Rounds; ++round) {
-            desk.loop.runReady();
-            main.runReady();
-        }
-    }
-    void pass(double seconds) {
-        settle();
-        desk.loop.advance(seconds);
-        settle();
     }
     void make() {
         bridge = std::make_unique<FormBridge>(
@@ -118,14 +105,7 @@ class FormBridgeTest : public testing::Test {
         desk.keyDown(code, code == KeyCode::A ? u"a" : u"");
         pass(0.001);
     }
-    bool keysAreHeld() const {
-        const auto& events = desk.poster.events;
-        return std::ranges::count(events, "hold") > std::ranges::count(events, "release");
-    }
 
-    SimulatedRunLoop main;
-    InputDesk desk;
-    const ProcessSerialNumber editor;
     const std::shared_ptr<SimulatedUIElement> application = std::make_shared<SimulatedUIElement>();
     const std::shared_ptr<SimulatedUIElement> body = std::make_shared<SimulatedUIElement>();
     const std::shared_ptr<SimulatedUIElement> subject = std::make_shared<SimulatedUIElement>();

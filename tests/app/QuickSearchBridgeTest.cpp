@@ -3,9 +3,8 @@
 #include "app/QuickSearchBridge.h"
 
 #include <gmock/gmock.h>
-#include <gtest/gtest.h>
 
-#include "tests/input/InputDesk.h"
+#include "tests/app/BridgeTest.h"
 
 namespace plume {
 namespace {
@@ -39,27 +38,15 @@ ZDKeyEventArgs pressed(KeyCode code, char16_t character = 0) {
     return key;
 }
 
-class QuickSearchBridgeTest : public testing::Test {
+class QuickSearchBridgeTest : public BridgeTest {
   protected:
-    QuickSearchBridgeTest() : editor(*desk.processes.frontProcess()) {
-        view.window = SimulatedProcessManager::windowOf(desk.processes.currentProcess());
+    QuickSearchBridgeTest() {
+        view.window = ownWindow();
         bridge.setSnippetSelectedAction([this] {
             EXPECT_TRUE(keysAreHeld()) << "what is typed now would be before the snippet";
             sent.push_back(bridge.selectedSnippet());
             front.push_back(*desk.processes.frontProcess());
         });
-        settle();
-    }
-    void settle() {
-        constexpr int Rounds = 4;
-        for (int round = 0; round < Rounds; ++round) {
-            desk.loop.runReady();
-            main.runReady();
-        }
-    }
-    void pass(double seconds) {
-        settle();
-        desk.loop.advance(seconds);
         settle();
     }
     void press(ZDKeyEventArgs key) { bridge.keyPressed(key); }
@@ -79,14 +66,7 @@ class QuickSearchBridgeTest : public testing::Test {
         view.isVisible = false;
         bridge.choose(chosen);
     }
-    bool keysAreHeld() const {
-        const auto& events = desk.poster.events;
-        return std::ranges::count(events, "hold") > std::ranges::count(events, "release");
-    }
 
-    SimulatedRunLoop main;
-    InputDesk desk;
-    const ProcessSerialNumber editor;
     NotedSearchWindow view;
     std::u16string typed;
     std::vector<std::string> reports;
@@ -341,6 +321,17 @@ TEST_F(QuickSearchBridgeTest, HoldsWhatFollowsAKeyThatMayEndTheSearch) {
     press(pressed(KeyCode::Return));
     pass(0);
     EXPECT_FALSE(keysAreHeld()) << "the key is another window's";
+}
+
+TEST_F(QuickSearchBridgeTest, HoldsAKeyThatComesBeforeTheLoopHasHadTime) {
+    open();
+    press(pressed(KeyCode::Return));
+    EXPECT_FALSE(keysAreHeld());
+    press(pressed(KeyCode::A, u'a'));
+    EXPECT_TRUE(keysAreHeld());
+    view.told.stayed();
+    settle();
+    EXPECT_FALSE(keysAreHeld());
 }
 
 // Both threads hear of a key at the same moment.
