@@ -17,7 +17,6 @@ constexpr char16_t LineSeparator = 0x2028;
 constexpr char16_t NoBreakSpace = 0xa0;
 constexpr char16_t ParagraphSeparator = 0x2029;
 constexpr char16_t ObjectReplacementCharacter = 0xfffc;
-constexpr std::string_view ReplacementCharacter = "\xef\xbf\xbd";
 
 std::string base64(std::string_view bytes) {
     constexpr std::string_view Digits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
@@ -45,40 +44,6 @@ std::string_view imageTypeOf(std::string_view bytes) {
     return {};
 }
 
-// HTML takes a bare U+000D for a line feed, and cannot hold U+0000.
-void appendEscaped(std::string& html, std::u16string_view text) {
-    for (const char c : toUtf8(text)) {
-        switch (c) {
-            case '&':
-                html += "&amp;";
-                break;
-            case '<':
-                html += "&lt;";
-                break;
-            case '>':
-                html += "&gt;";
-                break;
-            case '"':
-                html += "&quot;";
-                break;
-            case '\r':
-                html += "&#13;";
-                break;
-            case '\0':
-                html += ReplacementCharacter;
-                break;
-            default:
-                html += c;
-        }
-    }
-}
-
-std::string escaped(std::u16string_view text) {
-    std::string html;
-    appendEscaped(html, text);
-    return html;
-}
-
 std::string number(double value) {
     constexpr int Digits = 4;
     std::array<char, 32> text{};
@@ -104,7 +69,7 @@ std::string styleOf(const TextAttributes& look) {
     if (look.font) {
         std::u16string family = look.font->family;
         std::erase_if(family, [](char16_t c) { return c == u'\'' || c == u'\\' || c == u';'; });
-        if (!family.empty()) style += "font-family:'" + escaped(family) + "';";
+        if (!family.empty()) style += "font-family:'" + escapedForHtml(family) + "';";
         if (look.font->size > 0) style += "font-size:" + number(look.font->size) + "pt;";
     }
     if (look.foregroundColor) style += "color:" + colorOf(*look.foregroundColor) + ";";
@@ -277,7 +242,7 @@ class Exporter {
             markup_.start(tag, attributes);
             open.push_back(tag);
         };
-        if (look.link) start("a", "href=\"" + escaped(*look.link) + "\"");
+        if (look.link) start("a", "href=\"" + escapedForHtml(*look.link) + "\"");
         if (const std::string style = styleOf(look); !style.empty()) start("span", "style=\"" + style + "\"");
         if (look.font && look.font->bold) start("b");
         if (look.font && look.font->italic) start("i");
@@ -305,7 +270,7 @@ class Exporter {
                 markup_.html += "&nbsp;";
             } else if (c >= u' ' || c == 0) {
                 const bool isPair = (c & 0xfc00) == 0xd800 && i + 1 < text.size() && (text[i + 1] & 0xfc00) == 0xdc00;
-                appendEscaped(markup_.html, text.substr(i, isPair ? 2 : 1));
+                markup_.html += escapedForHtml(text.substr(i, isPair ? 2 : 1));
                 i += isPair ? 1 : 0;
             }
         }
@@ -314,11 +279,11 @@ class Exporter {
     void writeImage(const TextAttachment& attachment) {
         const std::string_view type = imageTypeOf(attachment.contents);
         if (type.empty()) {
-            appendEscaped(markup_.html, attachment.fileName.empty() ? attachment.cellText : attachment.fileName);
+            markup_.html += escapedForHtml(attachment.fileName.empty() ? attachment.cellText : attachment.fileName);
             return;
         }
         markup_.start("img", "src=\"data:" + std::string(type) + ";base64," + base64(attachment.contents) +
-                                 "\" alt=\"" + escaped(attachment.fileName) + "\"");
+                                 "\" alt=\"" + escapedForHtml(attachment.fileName) + "\"");
     }
 
     const AttributedString& text_;
@@ -327,6 +292,36 @@ class Exporter {
 };
 
 }  // namespace
+
+std::string escapedForHtml(std::u16string_view text) {
+    constexpr std::string_view ReplacementCharacter = "\xef\xbf\xbd";
+    std::string html;
+    for (const char c : toUtf8(text)) {
+        switch (c) {
+            case '&':
+                html += "&amp;";
+                break;
+            case '<':
+                html += "&lt;";
+                break;
+            case '>':
+                html += "&gt;";
+                break;
+            case '"':
+                html += "&quot;";
+                break;
+            case '\r':
+                html += "&#13;";
+                break;
+            case '\0':
+                html += ReplacementCharacter;
+                break;
+            default:
+                html += c;
+        }
+    }
+    return html;
+}
 
 std::vector<std::string> defaultExcludedTags() {
     return {"doctype", "html", "head", "body", "xml"};

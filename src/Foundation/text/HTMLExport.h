@@ -5,11 +5,16 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "Foundation/text/AttributedString.h"
 
 namespace plume {
+
+// Text for an element or an attribute's value in double quotes. HTML takes a bare U+000D for a line feed, and cannot
+// hold U+0000, which becomes U+FFFD.
+std::string escapedForHtml(std::u16string_view text);
 
 // The elements of a whole document, left out of what is pasted into one: "doctype", "html", "head", "body", "xml".
 std::vector<std::string> defaultExcludedTags();

@@ -15,34 +15,14 @@ namespace plume {
 
 namespace {
 
-// In an attribute's value or an element's text. HTML cannot hold U+0000, and takes a bare U+000D for a line feed.
+// In an attribute's value or an element's text.
 std::string escapedForPage(std::u16string_view text) {
     std::string html;
-    for (const char c : toUtf8(text)) {
-        switch (c) {
-            case '&':
-                html += "&amp;";
-                break;
-            case '<':
-                html += "&lt;";
-                break;
-            case '>':
-                html += "&gt;";
-                break;
-            case '"':
-                html += "&quot;";
-                break;
-            case '\'':
-                html += "&#39;";
-                break;
-            case '\r':
-                html += "&#13;";
-                break;
-            case '\0':
-                html += "\xef\xbf\xbd";
-                break;
-            default:
-                html += c;
+    for (const char c : escapedForHtml(text)) {
+        if (c == '\'') {
+            html += "&#39;";
+        } else {
+            html += c;
         }
     }
     return html;
