@@ -2,6 +2,7 @@
 // decides nothing. All of this stands in one function: the page itself can call only what is put on the window below.
 
 const fields = new Map();  // by index: what the page holds of a field
+const namesakes = new Map();  // by name: the fields that are typed into and move together
 const letters = new Map();  // by letter or digit: the box that it ticks together with Alt
 let host = null;
 let edited = null;  // the field that is typed into, and not left since
@@ -29,6 +30,16 @@ function tellValue(field) {
     field.value = control.value;
     field.isUnreadable = isUnreadable;
     host.filled(field.index, field.value, -1, isUnreadable);
+    if (field.isText) showInNamesakes(field);
+}
+
+// In the frame of the letter itself: what the program answers says the same.
+function showInNamesakes(field) {
+    for (const other of namesakes.get(field.control.name) || []) {
+        if (other === field) continue;
+        other.value = field.value;
+        other.control.value = field.value;
+    }
 }
 
 function measure() {
@@ -243,10 +254,15 @@ function setLetter(letter, box) {
 function addField(control) {
     const index = Number(control.id);
     const box = document.getElementById("optional" + index);
-    const field = { index, control, box, part: box ? control.parentElement : null, problem: null, wanted: null,
+    const isText = control.tagName === "TEXTAREA" || control.type === "text";
+    const field = { index, control, isText, box, part: box ? control.parentElement : null, problem: null, wanted: null,
                     value: control.tagName === "SPAN" ? control.textContent : control.value, isUnreadable: false,
                     choice: control.tagName === "SELECT" ? control.selectedIndex : -1 };
     fields.set(index, field);
+    if (isText && control.name) {
+        if (!namesakes.has(control.name)) namesakes.set(control.name, []);
+        namesakes.get(control.name).push(field);
+    }
     if (control.tagName !== "SPAN") {
         control.setAttribute("aria-label", control.getAttribute("name") || document.title);
         control.setAttribute("autocomplete", "off");
