@@ -127,6 +127,7 @@ TEST_P(AccessibilityTest, CaretIsFoundOnTheScreen) {
     EXPECT_GE(empty.origin.x, window.x - 2);
     EXPECT_GE(empty.origin.y, window.y - 2);
     EXPECT_LT(empty.origin.y, window.y + 40);
+    EXPECT_LT(empty.size.height, 60) << "the first line of an empty text, and not the whole field";
 
     write("wide enough 😀");
     const Rectangle atEnd = caret();

@@ -21,6 +21,7 @@ constexpr std::uint32_t ScreenCoordinates = 0;
 constexpr std::int64_t MostOffset = std::numeric_limits<std::int32_t>::max();
 constexpr std::int64_t MostUnits = 1'000'000;
 constexpr std::int64_t MostCounted = 65'536;
+constexpr double LikelyLine = 24;  // pixels that the first line of a text has
 
 std::int64_t sizeOf(const std::u16string& text) {
     return static_cast<std::int64_t>(text.size());
@@ -170,11 +171,13 @@ std::optional<Rectangle> AtspiTextReader::characterAt(std::int64_t offset) const
 
 std::optional<Rectangle> AtspiTextReader::caretAt(std::int64_t offset) const {
     const std::int64_t characters = number("CharacterCount").value_or(0);
-    if (offset < characters) {
+    // Of an empty text some programs tell where its first character would be.
+    if (offset < characters || characters == 0) {
         if (const auto next = characterAt(offset)) return Rectangle{next->origin, {0, next->size.height}};
     }
-    const auto field = screenBounds(bus_, part_);
+    auto field = screenBounds(bus_, part_);
     const auto last = characterAt(offset - 1);
+    if (field && !last) field->size.height = std::min(field->size.height, LikelyLine);
     if (!last) return field;  // an empty text
     const bool startsLine = !isPassword() && fetch(offset - 1, offset) == u"\n";
     if (startsLine && field) {
