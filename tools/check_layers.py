@@ -43,7 +43,7 @@ MAY_SEE = {
     "app/preferences": CORE | {"app", "app/qt"},
     "app/search": CORE | {"app", "app/qt", "app/ranking"},
     "app/form": CORE | {"app", "app/qt"},
-    "app/form/helper": CORE | {"app", "app/qt", "app/form"},
+    "app/form/helper": CORE | {"app", "app/qt", "app/form", "app/status"},
     "app/windows": CORE | {"app", "app/qt"},
     "app/session": CORE | {"app", "app/qt", "ports/posix"},
     "scenario": CORE | {"app", "ports/simulated", "ports/posix"},

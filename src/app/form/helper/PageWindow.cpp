@@ -19,7 +19,7 @@ namespace plume {
 
 namespace {
 
-constexpr double LargestShare = 0.7;  // of the screen's room
+constexpr double LargestHeight = 0.7;  // of the screen's
 constexpr QSize SmallestSize(240, 100);
 // What a window manager may put around it, until it is known.
 constexpr QMargins LikelyFrame(2, 32, 2, 6);
@@ -118,7 +118,8 @@ QSize PageWindow::fittingSize(QSize room) const {
         const QSize wanted(qRound(place_->size->width), qRound(place_->size->height));
         return wanted.expandedTo(SmallestSize).boundedTo(room.shrunkBy(LikelyFrame));
     }
-    return measured_->boundedTo(room * LargestShare).expandedTo(SmallestSize);
+    const QSize most(room.shrunkBy(LikelyFrame).width(), qRound(room.height() * LargestHeight));
+    return measured_->boundedTo(most).expandedTo(SmallestSize);
 }
 
 // The window manager's frame counts too, which is known only once it is there.

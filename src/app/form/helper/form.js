@@ -46,7 +46,7 @@ function measure() {
     const style = document.body.style;
     document.body.classList.add("measured");
     const wanted = Math.ceil(document.body.getBoundingClientRect().width);
-    const width = Math.min(640, Math.max(420, wanted));
+    const width = Math.min(640, Math.max(420, wanted), screen.availWidth - 8);
     style.width = width + "px";
     const height = Math.ceil(document.body.getBoundingClientRect().height);
     document.body.classList.remove("measured");

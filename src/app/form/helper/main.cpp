@@ -16,6 +16,7 @@
 #include "app/form/helper/FormScheme.h"
 #include "app/form/helper/HostPipe.h"
 #include "app/qt/ColorScheme.h"
+#include "app/status/StatusIcons.h"
 
 namespace {
 
@@ -87,6 +88,7 @@ int main(int argc, char** argv) {
     QApplication application(count, words.data());
     QApplication::setApplicationName(QStringLiteral("plume-form"));
     QGuiApplication::setDesktopFileName(QStringLiteral("org.plume.Plume"));
+    QApplication::setWindowIcon(plume::applicationIcon());
     QApplication::setQuitOnLastWindowClosed(false);
     installTexts(application);
     const auto scheme = plume::followColorScheme();
