@@ -14,8 +14,9 @@ void KeyboardPort::putTogether(const std::string& display) {
     if (options_.watchdog) {
         watchdog_ = std::make_unique<Watchdog>(loop(), display,
                                                Watchdog::Shared{.tapProgress = connection_->progress().descriptor()});
-        valueOrThrow(watchdog_->start());
         watchdog_->setTapWindow(connection_->window());
+        valueOrThrow(watchdog_->start());
+        watchdog_->awaitListening();
         connection_->setReopenedListener([this](xcb_window_t window) { watchdog_->setTapWindow(window); });
     }
     tap_ = std::make_unique<X11KeyboardTap>(loop(), *connection_, *keyboard_);

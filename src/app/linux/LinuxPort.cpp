@@ -154,7 +154,9 @@ void LinuxPort::focusMayHaveMoved() {
 
 Result<void> LinuxPort::startWatchdog() {
     watchdog_->setTapWindow(tapConnection_->window());
-    return watchdog_->start();
+    const auto started = watchdog_->start();
+    watchdog_->awaitListening();
+    return started;
 }
 
 Composition::Ports LinuxPort::ports() {

@@ -8,13 +8,12 @@
 #include <sys/wait.h>
 
 #include <cerrno>
+#include <cmath>
 #include <csignal>
 #include <filesystem>
 #include <system_error>
 #include <utility>
 #include <vector>
-
-#include "ports/x11/watchdog/WatchdogProtocol.h"
 
 namespace plume {
 
@@ -22,6 +21,7 @@ namespace {
 
 constexpr std::size_t MostStarts = 3;
 constexpr double StartsPeriod = 60;
+constexpr double LongestStart = 0.5;
 // An ending process has the keyboard to free, which takes a few milliseconds.
 constexpr int EndBoundInMilliseconds = 500;
 
@@ -108,7 +108,7 @@ void Watchdog::beat() {
     while (socket_.isOpen()) {
         const auto received = receiveWatchdogMessage(socket_.get());
         if (const auto* const message = std::get_if<WatchdogMessage>(&received)) {
-            sendWatchdogMessage(socket_.get(), {WatchdogMessage::Type::Answer, message->value});
+            take(*message);
             continue;
         }
         if (std::get<WatchdogSilence>(received) == WatchdogSilence::NothingYet) return;
@@ -116,6 +116,22 @@ void Watchdog::beat() {
         socket_.close();
         reap();
         replace();
+    }
+}
+
+void Watchdog::take(const WatchdogMessage& message) {
+    if (message.type == WatchdogMessage::Type::Listening) heardWindow_ = message.value;
+    if (message.type != WatchdogMessage::Type::Ping) return;
+    sendWatchdogMessage(socket_.get(), {WatchdogMessage::Type::Answer, message.value});
+}
+
+void Watchdog::awaitListening() {
+    const double end = loop_.now() + LongestStart;
+    while (socket_.isOpen() && heardWindow_ != tapWindow_) {
+        const double left = end - loop_.now();
+        pollfd entry{socket_.get(), POLLIN, 0};
+        if (left <= 0 || poll(&entry, 1, static_cast<int>(std::ceil(left * 1000))) == 0) return;
+        beat();
     }
 }
 

@@ -24,6 +24,7 @@
 #include "Foundation/Result.h"
 #include "ports/posix/FileDescriptor.h"
 #include "ports/posix/PollRunLoop.h"
+#include "ports/x11/watchdog/WatchdogProtocol.h"
 
 namespace plume {
 
@@ -51,6 +52,10 @@ class Watchdog {
     // keyboard is taken. 0 when there is no tap: then there is nothing to watch over.
     void setTapWindow(std::uint32_t window);
 
+    // Waits until the process hears the keys that the tap is going to hold, half a second at most: those that it has
+    // not heard it could not pass on.
+    void awaitListening();
+
     // Answers at once if the watchdog has asked. Whoever waits for something on the tap thread, within a bound, calls
     // this every now and then, or the wait passes for a hang.
     void beat();
@@ -59,6 +64,7 @@ class Watchdog {
     pid_t process() const { return process_; }
 
   private:
+    void take(const WatchdogMessage& message);
     void replace();
     void reap();
 
@@ -69,7 +75,8 @@ class Watchdog {
     FileDescriptor socket_;
     pid_t process_ = 0;
     std::uint32_t tapWindow_ = 0;
-    std::deque<double> starts_;  // the moments of the latest ones
+    std::uint32_t heardWindow_ = 0;  // the process listens for that one
+    std::deque<double> starts_;      // the moments of the latest ones
     Timer laterStart_;
     Subscription source_;
 };

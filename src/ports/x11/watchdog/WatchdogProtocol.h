@@ -11,6 +11,7 @@ namespace plume {
 struct WatchdogMessage {
     enum class Type : std::uint32_t {
         TapWindow,  // from Plume: a window of the connection that holds the keyboard; 0 when none does
+        Listening,  // from the watchdog: it hears the keys that the connection of this window holds
         Ping,       // from the watchdog: are you alive? The value is to be sent back
         Answer,
     };

@@ -59,6 +59,7 @@ class WatchdogProcess {
             connection_.listen(tapWindow_ != XCB_WINDOW_NONE);
             keysWake_ = false;
             schedule_.watch(tapWindow_ != XCB_WINDOW_NONE);
+            sendWatchdogMessage(WatchdogSocket, {WatchdogMessage::Type::Listening, tapWindow_});
         }
     }
 
