@@ -154,7 +154,7 @@ void LinuxPort::focusMayHaveMoved() {
 
 Result<void> LinuxPort::startWatchdog() {
     watchdog_->setTapWindow(tapConnection_->window());
-    const auto started = watchdog_->start();
+    auto started = watchdog_->start();
     watchdog_->awaitListening();
     return started;
 }
