@@ -177,8 +177,11 @@ TEST_P(FormTest, KeepsTheTextWhenItsProgramIsGone) {
     const pid_t plume = plume_->process().pid();
     ASSERT_TRUE(waitUntil([&] { return reader().place(plume, "Try Again").has_value(); }, Bound)) << log();
     picture("unsent");
+    const xcb_window_t owner = rig_.client().selectionOwner("CLIPBOARD");
     ASSERT_TRUE(click("Copy"));
     ASSERT_TRUE(comesToFront("Text Not Inserted")) << "who clicks on it is there";
+    // Until then the window may still be taking the focus that the click has brought.
+    ASSERT_TRUE(waitUntil([&] { return rig_.client().selectionOwner("CLIPBOARD") != owner; }, Bound)) << log();
     other->activate();
     rig_.keyboard().chord({Key::LeftControl}, U'v');
     const std::string letter = "Dear Ada,\nthank you for your help.\nYours, Ada";
