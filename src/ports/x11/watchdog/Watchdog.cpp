@@ -87,6 +87,7 @@ Result<void> Watchdog::start() {
     FileDescriptor mine(ends[0]);
     const FileDescriptor theirs(ends[1]);
     starts_.push_back(loop_.now());
+    heardWindow_ = 0;
     // It finds the window waiting, should Plume be stopped before it gets any further.
     sendWatchdogMessage(mine.get(), {WatchdogMessage::Type::TapWindow, tapWindow_});
     const int code = spawn(program_, display_, theirs.get(), shared_, process_);
