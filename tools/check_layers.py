@@ -10,7 +10,7 @@ FOUNDATION = {"Foundation", "Foundation/archive", "Foundation/json", "Foundation
 CORE = FOUNDATION | {"platform", "library", "import", "content", "content/scripts", "input", "engine"}
 X11 = {"ports/x11", "ports/x11/clipboard", "ports/x11/keyboard", "ports/x11/watchdog", "ports/x11/windows"}
 PORT = FOUNDATION | {"platform"}
-WINDOWS = {"app/qt", "app/ranking", "app/status", "app/preferences", "app/search", "app/form", "app/windows", "app/session"}
+WINDOWS = {"app/qt", "app/ranking", "app/status", "app/preferences", "app/search", "app/editor", "app/form", "app/windows", "app/session"}
 
 # Folder -> the folders whose headers it may include, besides its own. Lower layers never see higher ones. A folder that
 # is not named here belongs to the one that it lies in.
@@ -38,10 +38,12 @@ MAY_SEE = {
     "app": CORE,
     "app/linux": CORE | X11 | {"app", "ports/posix", "ports/dbus", "ports/atspi"},
     "app/ranking": CORE,
+    "app/editing": CORE,
     "app/qt": CORE | {"app", "ports/posix"},
     "app/status": CORE | {"app", "app/qt"},
     "app/preferences": CORE | {"app", "app/qt"},
     "app/search": CORE | {"app", "app/qt", "app/ranking"},
+    "app/editor": CORE | {"app", "app/qt", "app/editing", "app/search", "app/preferences"},
     "app/form": CORE | {"app", "app/qt"},
     "app/form/helper": CORE | {"app", "app/qt", "app/form", "app/status"},
     "app/windows": CORE | {"app", "app/qt"},
@@ -69,6 +71,7 @@ MAY_USE = {
     "app/status": ("Q", "xcb/"),
     "app/preferences": ("Q", "nlohmann/"),
     "app/search": ("Q",),
+    "app/editor": ("Q",),
     "app/form": ("Q", "nlohmann/"),
     "app/windows": ("Q",),
     "app/session": ("Q",),

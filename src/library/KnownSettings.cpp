@@ -126,6 +126,7 @@ const std::vector<KnownSetting>& knownSettings() {
         {"SnippetSelectorKeyModifier", selectorModifier},
         {"SnippetAdaptToAbbreviationCaseOption", integer},
         {"SnippetQuickSearchWildcardSearch", integer},
+        {"WildcardSearch", integer},
         {"SnippetQuickSearchBeginsWithTyped", boolean},
         {"UseClipboard", boolean},
         {"UseClipboardIn", availability},

@@ -197,6 +197,23 @@ std::shared_ptr<Snippet> Snippet::snapshot() const {
     return copy;
 }
 
+void Snippet::takeDifferences(const Snippet& before, const Snippet& after) {
+    if (before.abbreviation_ != after.abbreviation_) setAbbreviation(after.abbreviation_);
+    const auto take = [&](auto field) {
+        if (!(before.*field == after.*field)) this->*field = after.*field;
+    };
+    take(&Snippet::caseSensitivity_);
+    take(&Snippet::contentType_);
+    take(&Snippet::richTextContent_);
+    take(&Snippet::unreadContent_);
+    take(&Snippet::label_);
+    take(&Snippet::note_);
+    take(&Snippet::dateCreated_);
+    take(&Snippet::dateModified_);
+    take(&Snippet::lastTimeUsed_);
+    ++revision_;
+}
+
 bool Snippet::isSameRecordAs(const Snippet& other) const {
     const auto record = [](const Snippet& snippet) {
         return std::tie(snippet.uuid_, snippet.abbreviation_, snippet.caseSensitivity_, snippet.contentType_,

@@ -101,6 +101,9 @@ class Snippet final : public KeyedCodable {
     // The same record, identity and dates included, as it is now, in no group: for a thread of its own, or to be
     // compared with later.
     std::shared_ptr<Snippet> snapshot() const;
+    // Whatever differs between the two records becomes as it is in `after`, dates included; all else stays, and the
+    // identity always does.
+    void takeDifferences(const Snippet& before, const Snippet& after);
     // Grows with every change of what is archived.
     std::uint64_t revision() const { return revision_; }
 
