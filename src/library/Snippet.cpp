@@ -198,7 +198,9 @@ std::shared_ptr<Snippet> Snippet::snapshot() const {
 }
 
 void Snippet::takeDifferences(const Snippet& before, const Snippet& after) {
+    const auto modified = dateModified_;
     if (before.abbreviation_ != after.abbreviation_) setAbbreviation(after.abbreviation_);
+    dateModified_ = modified;
     const auto take = [&](auto field) {
         if (!(before.*field == after.*field)) this->*field = after.*field;
     };

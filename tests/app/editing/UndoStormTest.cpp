@@ -101,8 +101,8 @@ class Storm : public test::EditedMachine {
 };
 
 TEST(UndoStormTest, EverythingCanBeUndoneAndDoneAgain) {
-    constexpr unsigned Storms = 40;
-    constexpr int Edits = 120;
+    constexpr unsigned Storms = 12;
+    constexpr int Edits = 80;
     for (unsigned seed = 0; seed < Storms; ++seed) {
         SCOPED_TRACE(seed);
         Storm storm(seed);
@@ -116,11 +116,11 @@ TEST(UndoStormTest, EverythingCanBeUndoneAndDoneAgain) {
         ASSERT_EQ(states.size(), storm.done.size() + 1);
         for (std::size_t i = storm.done.size(); i-- > 0;) {
             storm.editor.undo(storm.done[i]);
-            ASSERT_EQ(storm.bytes(), states[i]) << "undone: " << static_cast<int>(storm.done[i].kind);
+            ASSERT_TRUE(storm.bytes() == states[i]) << "undone: " << static_cast<int>(storm.done[i].kind);
         }
         for (std::size_t i = 0; i < storm.done.size(); ++i) {
             storm.editor.redo(storm.done[i]);
-            ASSERT_EQ(storm.bytes(), states[i + 1]) << "done again: " << static_cast<int>(storm.done[i].kind);
+            ASSERT_TRUE(storm.bytes() == states[i + 1]) << "done again: " << static_cast<int>(storm.done[i].kind);
         }
     }
 }
