@@ -65,7 +65,8 @@ void OutlineModel::updateAll() {
 
 const OutlineModel::Node* OutlineModel::nodeOf(const QModelIndex& index) const {
     if (!index.isValid()) return nullptr;
-    const auto row = index.internalId() == 0 ? static_cast<std::size_t>(index.row()) : index.internalId() - 1;
+    const auto row = index.internalId() == 0 ? static_cast<std::size_t>(index.row())
+                                             : static_cast<std::size_t>(index.internalId() - 1);
     return row < nodes_.size() ? &nodes_[row] : nullptr;
 }
 
