@@ -255,12 +255,12 @@ void MacrosWindowController::copyRows() {
     const LibrarySelection rows = selection();
     if (rows.isEmpty()) return;
     // The clipboard takes it over.
-    auto* data = new QMimeData;  // NOLINT(cppcoreguidelines-owning-memory)
-    data->setData(QString::fromLatin1(OutlineModel::RowsType), QByteArray::fromStdString(archiveOfRows(rows)));
+    auto* mime = new QMimeData;  // NOLINT(cppcoreguidelines-owning-memory)
+    mime->setData(QString::fromLatin1(OutlineModel::RowsType), QByteArray::fromStdString(archiveOfRows(rows)));
     std::vector<std::shared_ptr<Snippet>> snippets = rows.snippets;
     for (const auto& group : rows.groups) snippets.insert(snippets.end(), group->items().begin(), group->items().end());
-    data->setText(toQString(textFromRows(snippets)));
-    QApplication::clipboard()->setMimeData(data);
+    mime->setText(toQString(textFromRows(snippets)));
+    QApplication::clipboard()->setMimeData(mime);
 }
 
 void MacrosWindowController::copy() {
@@ -276,17 +276,17 @@ void MacrosWindowController::cut() {
 void MacrosWindowController::paste() {
     if (!listHasKeyboard()) return inField("paste");
     commitEdits();
-    const QMimeData* data = QApplication::clipboard()->mimeData();
+    const QMimeData* mime = QApplication::clipboard()->mimeData();
     LibrarySelection rows;
-    if (data->hasFormat(QString::fromLatin1(OutlineModel::RowsType))) {
-        const QByteArray bytes = data->data(QString::fromLatin1(OutlineModel::RowsType));
+    if (mime->hasFormat(QString::fromLatin1(OutlineModel::RowsType))) {
+        const QByteArray bytes = mime->data(QString::fromLatin1(OutlineModel::RowsType));
         const auto read = rowsOfArchive({bytes.constData(), static_cast<std::size_t>(bytes.size())}, editor_.groups());
         if (!read)
             return say(
                 tr("What the clipboard has could not be read: %1").arg(QString::fromStdString(read.error().message)));
         rows = read.value();
     } else {
-        rows.snippets = rowsFromText(fromQString(data->text()));
+        rows.snippets = rowsFromText(fromQString(mime->text()));
     }
     if (rows.isEmpty()) return;
     outline_->clearFilter();
