@@ -129,9 +129,8 @@ void LibraryEditor::setContent(const std::shared_ptr<Snippet>& snippet, const At
     changeSnippet(snippet, EditKind::Content, [&](Snippet& changed) { changed.setRichTextContent(kept); });
 }
 
-void LibraryEditor::keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& edited) {
-    const auto before = snippet->snapshot();
-    changeSnippet(snippet, EditKind::KeptEdit, [&](Snippet& changed) { changed.takeDifferences(*before, edited); });
+void LibraryEditor::keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& before, const Snippet& edited) {
+    changeSnippet(snippet, EditKind::KeptEdit, [&](Snippet& changed) { changed.takeDifferences(before, edited); });
     reloadDuplicateManager();
 }
 

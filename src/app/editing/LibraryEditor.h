@@ -57,8 +57,8 @@ class LibraryEditor {
     void setContentType(const std::shared_ptr<Snippet>& snippet, ContentType type);
     // Without its attributes where the snippet is not rich text.
     void setContent(const std::shared_ptr<Snippet>& snippet, const AttributedString& content);
-    // An edit that is to be kept although another library has come meanwhile.
-    void keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& edited);
+    // What an edit made of `before`, in a snippet of the library that has come meanwhile.
+    void keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& before, const Snippet& edited);
     void setCaseSensitivity(const Snippets& snippets, CaseSensitivity value);
 
     // ---- Groups' settings ----
