@@ -55,16 +55,20 @@ void LibraryEditor::finish(EditRecorder& recorder, EditKind kind, std::size_t co
     notifyDataChanged();
 }
 
-void LibraryEditor::undo(const LibraryChange& change) {
+bool LibraryEditor::undo(const LibraryChange& change) {
+    if (!change.canUndo(groups())) return false;
     change.undo(manager_.snippetGroups());
     reloadDuplicateManager();
     notifyDataChanged();
+    return true;
 }
 
-void LibraryEditor::redo(const LibraryChange& change) {
+bool LibraryEditor::redo(const LibraryChange& change) {
+    if (!change.canRedo(groups())) return false;
     change.redo(manager_.snippetGroups());
     reloadDuplicateManager();
     notifyDataChanged();
+    return true;
 }
 
 // ---- Duplicate abbreviations ----

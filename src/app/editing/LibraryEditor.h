@@ -40,8 +40,9 @@ class LibraryEditor {
     const SnippetGroups& groups() const { return manager_.snippetGroups(); }
     // A change of the library that is told now is this editor's own.
     bool isChanging() const { return isChanging_; }
-    void undo(const LibraryChange& change);
-    void redo(const LibraryChange& change);
+    // False, and nothing is done, when others have changed the lists that it is about.
+    bool undo(const LibraryChange& change);
+    bool redo(const LibraryChange& change);
 
     // ---- Duplicate abbreviations ----
     void reloadDuplicateManager();

@@ -67,6 +67,7 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
         preview_->showSoon();
     });
     connect(&undo_, &LibraryUndo::changed, this, &MacrosWindowController::undone);
+    connect(&undo_, &LibraryUndo::refused, this, &MacrosWindowController::forgetEdits, Qt::QueuedConnection);
     connect(&outline_->view(), &OutlineView::selectionWasChanged, this, &MacrosWindowController::selectionWasChanged);
     connect(&outline_->model(), &OutlineModel::renamed, this, &MacrosWindowController::rename);
     connect(&outline_->model(), &OutlineModel::dropped, this, &MacrosWindowController::drop);
@@ -220,6 +221,11 @@ void MacrosWindowController::undone(const LibraryChange& change) {
     if (!isOrder) select(rows);
     snippet_->refresh();
     preview_->showSoon();
+}
+
+void MacrosWindowController::forgetEdits() {
+    undo_.clear();
+    say(tr("Your snippets were changed elsewhere meanwhile: this can no longer be undone."));
 }
 
 void MacrosWindowController::observeLibrary() {

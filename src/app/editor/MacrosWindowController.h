@@ -60,6 +60,7 @@ class MacrosWindowController final : public QMainWindow {
     // ---- Changes ----
     void changed(const LibraryChange& change);
     void undone(const LibraryChange& change);
+    void forgetEdits();
     void showRows(const LibraryChange& change);
     void libraryWillBeReplaced(LibraryEvent& event);
     void libraryWasReplaced(LibraryEvent& event);
