@@ -13,9 +13,9 @@
 #include "app/editor/ChipFormServices.h"
 #include "content/SnippetVariable.h"
 
-class QDialogButtonBox;
 class QFormLayout;
 class QLabel;
+class QPushButton;
 
 namespace plume {
 
@@ -52,6 +52,8 @@ class ChipForm : public QDialog {
     void addOptionalRow();
 
   private:
+    // Below the controls, and reached by Tab after them.
+    void addFoot();
     // Beside the place, on its screen.
     void placeAt(const QWidget& at);
 
@@ -63,7 +65,7 @@ class ChipForm : public QDialog {
     QFormLayout* rows_;
     QLabel* value_;
     QLabel* warning_;
-    QDialogButtonBox* buttons_;
+    QPushButton* accept_ = nullptr;  // until the form is open
 };
 
 }  // namespace plume
