@@ -146,6 +146,12 @@ void ChipForm::addOptionalRow() {
     rows_->addRow(QString(), isTicked);
 }
 
+void ChipForm::fitToRows() {
+    if (!isVisible()) return;
+    layout()->activate();
+    resize(width(), sizeHint().height());
+}
+
 void ChipForm::placeAt(const QWidget& at) {
     const QRect place = services_.place.isNull() ? QRect(at.mapToGlobal(QPoint(0, 0)), at.size()) : services_.place;
     const QScreen* screen = QGuiApplication::screenAt(place.center());

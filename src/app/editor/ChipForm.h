@@ -46,6 +46,8 @@ class ChipForm : public QDialog {
     void showValue();
     // The user has changed the variable.
     void changed();
+    // Other rows are shown than before.
+    void fitToRows();
     QFormLayout& rows() { return *rows_; }
     const ChipFormServices& services() const { return services_; }
     // Whether the form that fills in lets the user leave it out.

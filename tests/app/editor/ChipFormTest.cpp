@@ -74,7 +74,7 @@ constexpr Use DateUses[] = {
     {u"date:yyyy day:1", "Pattern", "EEEE d:M", u"date:\"EEEE d:M\" day:1"},
     {u"date:short day:1 locale:de_DE", "Day:", "next", u"date:short valueType:1 weekday:0 locale:de_DE"},
     {u"date:short valueType:1 weekday:3", "Day:", "last", u"date:short valueType:2 weekday:3"},
-    {u"date:short valueType:1 weekday:3", "Day:", "Today", u"date:short"},
+    {u"date:short valueType:1 weekday:3", "Day:", "From today", u"date:short"},
     {u"date:short month:2 day:3", "Years added", "-1", u"date:short year:-1 month:2 day:3"},
     {u"date:short year:1 day:3", "Months added", "14", u"date:short year:1 month:14 day:3"},
     {u"date:short year:1 month:2 day:3", "Days added", "0", u"date:short year:1 month:2"},
@@ -104,9 +104,9 @@ constexpr Use FieldUses[] = {
     {u"field:A type:2 value:a defaultIndex:0 x:y", "Choices, one a line:", "a\nb c",
      u"field:A type:2 width:0 value:\"a\nb c\" x:y"},
     {u"field:A type:2 value:a\nb\nc", "Chosen at first:", "c", u"field:A type:2 width:2 value:a\nb\nc defaultIndex:2"},
-    {u"field:A type:1 height:3", "Width:", "40", u"field:A type:1 width:40 height:3"},
-    {u"field:A type:1 width:40", "Height:", "7", u"field:A type:1 width:40 height:7"},
-    {u"field:A type:1 width:40 height:3", "Width:", "0", u"field:A type:1 height:3"},
+    {u"field:A type:1 height:3", "Width in letters:", "40", u"field:A type:1 width:40 height:3"},
+    {u"field:A type:1 width:40", "Height in lines:", "7", u"field:A type:1 width:40 height:7"},
+    {u"field:A type:1 width:40 height:3", "Width in letters:", "0", u"field:A type:1 height:3"},
     {u"field:A width:40", "Cannot be edited in the form", "", u"field:A readonly width:40"},
     {u"field:A readonly", "Can be left out when the form is filled in", "", u"field:A optional:0 readonly"},
     {u"field:A optional:1 readonly", "Is ticked at first", "", u"field:A optional:0 readonly"},
@@ -127,9 +127,9 @@ constexpr Use OtherUses[] = {
     {u"key:↩ code:36 modifiers:1966080", "Ctrl", "", u"key:↩ code:36 modifiers:1703936"},
     {u"key:↩ code:36", "Alt", "", u"key:↩ code:36 modifiers:524288"},
     {u"key:↩ code:36", "Super", "", u"key:↩ code:36 modifiers:1048576"},
-    {u"key:odd code:36 delay:2", "Pressed:", "12", u"key:odd code:36 count:12 delay:2"},
+    {u"key:odd code:36 delay:2", "Times pressed:", "12", u"key:odd code:36 count:12 delay:2"},
     {u"key:odd code:36 count:2", "Waits before:", "1.25", u"key:odd code:36 count:2 delay:1.25"},
-    {u"▶", "Pressed:", "2", u"key:▶ code:124 count:2"},
+    {u"▶", "Times pressed:", "2", u"key:▶ code:124 count:2"},
     {u"snippet:s uuid:x", "Can be left out when the form is filled in", "", u"snippet:s uuid:x optional:0"},
 };
 INSTANTIATE_TEST_SUITE_P(Others, ChipControlTest, ::testing::ValuesIn(OtherUses));
@@ -150,7 +150,7 @@ TEST_F(ChipFormTest, ShowsWhatItGivesWhileOneTypes) {
         {u"clipboard find:a flags:1", "Find:", "(", "no valid pattern"},
         {u"field:A type:2 value:a\nb", "Chosen at first:", "b", "Gives at first: b"},
         {u"field:A type:2 value:a", "Choices, one a line:", "", "is not shown"},
-        {u"key:↩ code:36", "Pressed:", "3", "Presses Return, 3 times"},
+        {u"key:↩ code:36", "Times pressed:", "3", "Presses Return, 3 times"},
     };
     for (const auto& each : cases) {
         open(each.body);
