@@ -41,14 +41,14 @@ DelimitersEdit::DelimitersEdit(const QString& purpose, QWidget* parent)
     setFocusProxy(usual_);
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
-    layout->addWidget(usual_);
+    layout->addWidget(usual_, 0, Qt::AlignLeft);
     layout->addWidget(usualOnes_);
     layout->addWidget(own_);
     // Those that were the usual ones are where one's own begin.
     connect(usual_, &QCheckBox::toggled, this,
             [this](bool isUsual) { choose(isUsual ? Delimiters() : Delimiters(AutoText::defaultDelimiters())); });
     connect(others_, &TypedLine::edited, this, &DelimitersEdit::chooseOthers);
-    connect(others_, &QLineEdit::editingFinished, this, &DelimitersEdit::showDelimiters);
+    connect(others_, &TypedLine::left, this, &DelimitersEdit::showDelimiters);
     showDelimiters();
 }
 

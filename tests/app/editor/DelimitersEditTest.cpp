@@ -4,6 +4,7 @@
 
 #include <QCheckBox>
 #include <QLineEdit>
+#include <QListView>
 
 #include "Foundation/Strings.h"
 #include "app/editor/InputSourcesEdit.h"
@@ -25,11 +26,12 @@ class DelimitersEditTest : public testing::Test {
         test::activate(edit);
     }
     void choose(const std::u16string& characters) { edit.setDelimiters(CharacterSet::withCharacters(characters)); }
-    void click(const char* name) { test::click(edit, QString::fromUtf8(name)); }
+    void click(const char* name) { find<QCheckBox>(edit, QString::fromUtf8(name)).click(); }
     QLineEdit& others() { return find<QLineEdit>(edit, QStringLiteral("Behind: Others")); }
     void type(const char* text) {
         others().setFocus();
         others().selectAll();
+        QTest::keyClick(&others(), Qt::Key_Delete);
         QTest::keyClicks(&others(), QString::fromUtf8(text));
         QTest::keyClick(&others(), Qt::Key_Return);
     }

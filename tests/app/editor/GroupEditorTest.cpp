@@ -45,7 +45,7 @@ class GroupEditorTest : public testing::Test, protected test::EditedMachine {
 
     QComboBox& choice(const char* name) { return find<QComboBox>(form, QString::fromUtf8(name)); }
     QLineEdit& line(const char* name) { return find<QLineEdit>(form, QString::fromUtf8(name)); }
-    void click(const char* name) { test::click(form, QString::fromUtf8(name)); }
+    void click(const char* name) { find<QAbstractButton>(form, QString::fromUtf8(name)).click(); }
     void type(const char* name, const char* text) {
         line(name).setFocus();
         line(name).selectAll();
