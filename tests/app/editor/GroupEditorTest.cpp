@@ -95,16 +95,16 @@ TEST_F(GroupEditorTest, EveryControlChangesItsSettingAndNothingElse) {
     const std::vector<Row> rows{
         {[&] { type("Name", "Post"); }, [](G& g) { g.setName(u"Post"); }},
         {[&] { type("Prefix", "//"); }, [](G& g) { g.setAbbreviationPrefix(u"//"); }},
-        {[&] { choice("Behind").setCurrentIndex(1); }, [](G& g) { g.setExpandAfter(ExpandAfter::Whitespace); }},
-        {[&] { choice("Behind").setCurrentIndex(2); }, [](G& g) { g.setExpandAfter(ExpandAfter::Anything); }},
-        {[&] { choice("Behind").setCurrentIndex(3); }, [](G& g) { g.setExpandAfter(ExpandAfter::Digits); }},
+        {[&] { choice("Expands behind").setCurrentIndex(1); }, [](G& g) { g.setExpandAfter(ExpandAfter::Whitespace); }},
+        {[&] { choice("Expands behind").setCurrentIndex(2); }, [](G& g) { g.setExpandAfter(ExpandAfter::Anything); }},
+        {[&] { choice("Expands behind").setCurrentIndex(3); }, [](G& g) { g.setExpandAfter(ExpandAfter::Digits); }},
         {[&] { click("Delimiters before it: The usual ones"); }, [](G& g) { g.setExpandAfterDelimiters({}); }},
         {[&] { type("Delimiters before it: Others", "("); }, [](G& g) { g.setExpandAfterDelimiters(these(u" (")); }},
-        {[&] { choice("When").setCurrentIndex(0); }, [](G& g) { g.setExpandTrigger(ExpandTrigger::Immediately); }},
-        {[&] { choice("When").setCurrentIndex(2); },
+        {[&] { choice("Expands").setCurrentIndex(0); }, [](G& g) { g.setExpandTrigger(ExpandTrigger::Immediately); }},
+        {[&] { choice("Expands").setCurrentIndex(2); },
          [](G& g) { g.setExpandTrigger(ExpandTrigger::DelimiterSwallowed); }},
-        {[&] { choice("When").setCurrentIndex(3); }, [](G& g) { g.setExpandTrigger(ExpandTrigger::Never); }},
-        {[&] { choice("When").setCurrentIndex(4); }, [](G& g) { g.setExpandTrigger(ExpandTrigger::HotKey); }},
+        {[&] { choice("Expands").setCurrentIndex(3); }, [](G& g) { g.setExpandTrigger(ExpandTrigger::Never); }},
+        {[&] { choice("Expands").setCurrentIndex(4); }, [](G& g) { g.setExpandTrigger(ExpandTrigger::HotKey); }},
         {[&] { click("Delimiters behind it: The usual ones"); }, [](G& g) { g.setDelimiters({}); }},
         {[&] { click("Delimiters behind it: Return"); }, [](G& g) { g.setDelimiters(these(u"\t\r")); }},
         {[&] { click("Offer as suggestions"); }, [](G& g) { g.setSuggestAbbreviations(false); }},
@@ -146,8 +146,8 @@ TEST_F(GroupEditorTest, ShowsWhatWasChangedElsewhereAndTellsNothing) {
     const std::string now = bytes();
     form.refresh();
     EXPECT_EQ(line("Name").text(), QStringLiteral("Renamed"));
-    EXPECT_EQ(choice("Behind").currentIndex(), 3);
-    EXPECT_EQ(choice("When").currentIndex(), 4);
+    EXPECT_EQ(choice("Expands behind").currentIndex(), 3);
+    EXPECT_EQ(choice("Expands").currentIndex(), 4);
     EXPECT_FALSE(find<QCheckBox>(form, QStringLiteral("List in the menu")).isChecked());
     EXPECT_EQ(choice("Programs").currentIndex(), 0);
     EXPECT_THAT(test::textOf(form), HasSubstr("Type ;sig right behind a number, then press the hot key that expands."));
@@ -165,7 +165,7 @@ TEST_F(GroupEditorTest, TheSentenceFollowsEveryChange) {
     const auto sentence = [this] { return test::textOf(form); };
     EXPECT_THAT(sentence(), HasSubstr("In Kitty and gedit only: type ;sig behind a space, then Tab. "
                                       "Not with the keyboard layout English."));
-    choice("When").setCurrentIndex(0);
+    choice("Expands").setCurrentIndex(0);
     EXPECT_THAT(sentence(), HasSubstr("only: type ;sig behind a space, and it expands at once."));
     type("Prefix", "//");
     QTest::keyClick(&line("Prefix"), Qt::Key_Return);
@@ -223,18 +223,18 @@ TEST_F(GroupEditorTest, KeepsValuesThatItDoesNotKnow) {
     const std::string first = bytes();
     form.refresh();
     form.finish();
-    EXPECT_EQ(choice("Behind").currentText(), QStringLiteral("Other (7)"));
-    EXPECT_EQ(choice("When").currentText(), QStringLiteral("Other (9)"));
+    EXPECT_EQ(choice("Expands behind").currentText(), QStringLiteral("Other (7)"));
+    EXPECT_EQ(choice("Expands").currentText(), QStringLiteral("Other (9)"));
     EXPECT_EQ(choice("Letter case of new snippets").currentText(), QStringLiteral("Other (-2)"));
     EXPECT_EQ(choice("Programs").currentText(), QStringLiteral("Other (5)"));
     EXPECT_EQ(choice("Keyboard layouts").currentText(), QStringLiteral("Other (6)"));
-    choice("When").setCurrentIndex(5);
+    choice("Expands").setCurrentIndex(5);
     EXPECT_TRUE(done.empty());
     EXPECT_EQ(bytes(), first);
-    choice("When").setCurrentIndex(1);
-    EXPECT_EQ(choice("When").count(), 5);
+    choice("Expands").setCurrentIndex(1);
+    EXPECT_EQ(choice("Expands").count(), 5);
     undo();
-    EXPECT_EQ(choice("When").currentText(), QStringLiteral("Other (9)"));
+    EXPECT_EQ(choice("Expands").currentText(), QStringLiteral("Other (9)"));
     EXPECT_EQ(bytes(), first);
 }
 
@@ -262,6 +262,10 @@ TEST_F(GroupEditorTest, WhateverTakesTheKeyboardHasAName) {
 
 TEST_F(GroupEditorTest, Pictures) {
     test::takePicture(form, QStringLiteral("GroupEditor"));
+    click("Reset the letter case of all snippets");
+    const QPointer<QDialog> sheet = form.findChild<QDialog*>();
+    test::takePicture(*sheet, QStringLiteral("CaseReset"));
+    sheet->close();
     form.show(other);
     test::takePicture(form, QStringLiteral("GroupEditorPlain"));
 }
