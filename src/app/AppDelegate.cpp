@@ -299,9 +299,8 @@ void AppDelegate::makeSnippetFromSelection() {
 }
 
 void AppDelegate::makeSnippetFromClipboard() {
-    expansion_.readClipboard([this](const std::optional<std::u16string>& text) {
-        windows_.showNewSnippetWindow({.content = text.value_or(u"")});
-    });
+    expansion_.readClipboard(
+        [this](const std::optional<std::u16string>& text) { windows_.showNewSnippetWindow(text.value_or(u"")); });
 }
 
 void AppDelegate::newDocument() {
@@ -309,7 +308,7 @@ void AppDelegate::newDocument() {
 }
 
 void AppDelegate::editSnippet(const std::shared_ptr<Snippet>& snippet) {
-    windows_.showNewSnippetWindow({.content = {}, .edited = snippet});
+    windows_.showSnippet(snippet);
 }
 
 // Of this run; without one the snippets are shown.

@@ -17,12 +17,6 @@ namespace plume {
 
 class Snippet;
 
-// What a new snippet begins with, before the user has a look at it; or the one that is to be changed.
-struct SnippetDraft {
-    std::u16string content = {};
-    std::shared_ptr<Snippet> edited = {};
-};
-
 class ApplicationWindows {
   public:
     enum class FileUse { Import, Restore, Nothing };
@@ -31,7 +25,10 @@ class ApplicationWindows {
     virtual ~ApplicationWindows() = default;
 
     virtual void showMacrosWindow(bool expandAll) = 0;
-    virtual void showNewSnippetWindow(const SnippetDraft& draft) = 0;
+    // In the window of the library.
+    virtual void showSnippet(const std::shared_ptr<Snippet>& snippet) = 0;
+    // `content` is what the new snippet begins with.
+    virtual void showNewSnippetWindow(const std::u16string& content) = 0;
     // `page` is the name of a settings page, empty for the one that was seen last.
     virtual void showPreferencesWindow(const std::string& page) = 0;
     virtual void showAboutWindow() = 0;

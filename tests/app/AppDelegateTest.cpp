@@ -25,10 +25,11 @@ using testing::IsEmpty;
 class NotedWindows final : public ApplicationWindows {
   public:
     void showMacrosWindow(bool /*expandAll*/) override { shown.emplace_back("main"); }
-    void showNewSnippetWindow(const SnippetDraft& draft) override {
-        const bool isNew = !draft.edited;
-        shown.push_back(isNew ? "new snippet: " + toUtf8(draft.content)
-                              : "edit " + toUtf8(draft.edited->abbreviation().value_or(u"")));
+    void showSnippet(const std::shared_ptr<Snippet>& snippet) override {
+        shown.push_back("edit " + toUtf8(snippet->abbreviation().value_or(u"")));
+    }
+    void showNewSnippetWindow(const std::u16string& content) override {
+        shown.push_back("new snippet: " + toUtf8(content));
     }
     void showPreferencesWindow(const std::string& page) override { shown.push_back("preferences " + page); }
     void showAboutWindow() override { shown.emplace_back("about"); }

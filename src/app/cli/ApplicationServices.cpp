@@ -109,6 +109,13 @@ StatusMenuServices ApplicationServices::statusMenu() const {
     return services;
 }
 
+ProgramServices ApplicationServices::programs() const {
+    Expansion& expansion = around_.delegate.expansion();
+    return {.runningPrograms = [&expansion](auto told) { expansion.runningPrograms(std::move(told)); },
+            .nextFrontProgram = [&expansion](auto told) { expansion.nextFrontProgram(std::move(told)); },
+            .installedPrograms = installedPrograms};
+}
+
 PreferencesServices ApplicationServices::preferences() {
     AppDelegate& delegate = around_.delegate;
     Expansion& expansion = delegate.expansion();
@@ -120,9 +127,7 @@ PreferencesServices ApplicationServices::preferences() {
             .tryHotKey = [&expansion](const GeneralHotKey& hotKey,
                                       auto told) { expansion.tryHotKey(hotKey, std::move(told)); },
             .keyName = [&expansion](KeyCode key) { return expansion.keyName(key); },
-            .runningPrograms = [&expansion](auto told) { expansion.runningPrograms(std::move(told)); },
-            .nextFrontProgram = [&expansion](auto told) { expansion.nextFrontProgram(std::move(told)); },
-            .installedPrograms = installedPrograms,
+            .programs = programs(),
             .builtInApplicationRows = builtInRows(),
             .startsAtLogin = [this] { return autostart_.isOn(); },
             .setStartsAtLogin = [this](bool starts) { return autostart_.set(starts); },

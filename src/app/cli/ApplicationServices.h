@@ -32,6 +32,7 @@ class ApplicationServices {
     explicit ApplicationServices(Dependencies dependencies) : around_(dependencies), autostart_(dependencies.files) {}
 
     StatusMenuServices statusMenu() const;
+    ProgramServices programs() const;
     PreferencesServices preferences();
     DecisionsWindow::Services decisions() const;
     WelcomeServices welcome();

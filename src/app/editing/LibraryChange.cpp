@@ -1,5 +1,7 @@
 #include "app/editing/LibraryChange.h"
 
+#include <algorithm>
+
 namespace plume {
 
 namespace {
@@ -18,10 +20,31 @@ std::vector<std::shared_ptr<Record>> replaced(const std::vector<std::shared_ptr<
     return result;
 }
 
+template <typename Record>
+bool standsAt(std::size_t at, const std::vector<std::shared_ptr<Record>>& records,
+              const std::vector<std::shared_ptr<Record>>& list) {
+    return at <= list.size() && records.size() <= list.size() - at &&
+           std::equal(records.begin(), records.end(), list.begin() + static_cast<std::ptrdiff_t>(at));
+}
+
 }  // namespace
 
 bool LibraryChange::isEmpty() const {
     return snippets.empty() && groups.empty() && !changesLists();
+}
+
+bool LibraryChange::canUndo(const SnippetGroups& library) const {
+    const auto fits = [](const ItemsStep& step) {
+        return standsAt(step.items.at, step.items.added, step.group->items());
+    };
+    return standsAt(groupList.at, groupList.added, library) && std::ranges::all_of(items, fits);
+}
+
+bool LibraryChange::canRedo(const SnippetGroups& library) const {
+    const auto fits = [](const ItemsStep& step) {
+        return standsAt(step.items.at, step.items.removed, step.group->items());
+    };
+    return standsAt(groupList.at, groupList.removed, library) && std::ranges::all_of(items, fits);
 }
 
 void LibraryChange::undo(SnippetGroups& library) const {

@@ -71,6 +71,10 @@ class LibraryChange {
     bool isEmpty() const;
     // Rows have come, gone or moved.
     bool changesLists() const { return !items.empty() || !groupList.isEmpty(); }
+    // The lists are as they were after the edit, or before it: somebody else may have put other rows into them.
+    bool canUndo(const SnippetGroups& library) const;
+    bool canRedo(const SnippetGroups& library) const;
+    // Only where they can.
     void undo(SnippetGroups& library) const;
     void redo(SnippetGroups& library) const;
     // Takes in what follows it when both are about the same field of the same record; false, and nothing is done,

@@ -55,16 +55,20 @@ void LibraryEditor::finish(EditRecorder& recorder, EditKind kind, std::size_t co
     notifyDataChanged();
 }
 
-void LibraryEditor::undo(const LibraryChange& change) {
+bool LibraryEditor::undo(const LibraryChange& change) {
+    if (!change.canUndo(groups())) return false;
     change.undo(manager_.snippetGroups());
     reloadDuplicateManager();
     notifyDataChanged();
+    return true;
 }
 
-void LibraryEditor::redo(const LibraryChange& change) {
+bool LibraryEditor::redo(const LibraryChange& change) {
+    if (!change.canRedo(groups())) return false;
     change.redo(manager_.snippetGroups());
     reloadDuplicateManager();
     notifyDataChanged();
+    return true;
 }
 
 // ---- Duplicate abbreviations ----
@@ -129,9 +133,8 @@ void LibraryEditor::setContent(const std::shared_ptr<Snippet>& snippet, const At
     changeSnippet(snippet, EditKind::Content, [&](Snippet& changed) { changed.setRichTextContent(kept); });
 }
 
-void LibraryEditor::keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& edited) {
-    const auto before = snippet->snapshot();
-    changeSnippet(snippet, EditKind::KeptEdit, [&](Snippet& changed) { changed.takeDifferences(*before, edited); });
+void LibraryEditor::keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& before, const Snippet& edited) {
+    changeSnippet(snippet, EditKind::KeptEdit, [&](Snippet& changed) { changed.takeDifferences(before, edited); });
     reloadDuplicateManager();
 }
 

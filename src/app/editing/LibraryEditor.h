@@ -40,8 +40,9 @@ class LibraryEditor {
     const SnippetGroups& groups() const { return manager_.snippetGroups(); }
     // A change of the library that is told now is this editor's own.
     bool isChanging() const { return isChanging_; }
-    void undo(const LibraryChange& change);
-    void redo(const LibraryChange& change);
+    // False, and nothing is done, when others have changed the lists that it is about.
+    bool undo(const LibraryChange& change);
+    bool redo(const LibraryChange& change);
 
     // ---- Duplicate abbreviations ----
     void reloadDuplicateManager();
@@ -57,8 +58,8 @@ class LibraryEditor {
     void setContentType(const std::shared_ptr<Snippet>& snippet, ContentType type);
     // Without its attributes where the snippet is not rich text.
     void setContent(const std::shared_ptr<Snippet>& snippet, const AttributedString& content);
-    // An edit that is to be kept although another library has come meanwhile.
-    void keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& edited);
+    // What an edit made of `before`, in a snippet of the library that has come meanwhile.
+    void keepEdit(const std::shared_ptr<Snippet>& snippet, const Snippet& before, const Snippet& edited);
     void setCaseSensitivity(const Snippets& snippets, CaseSensitivity value);
 
     // ---- Groups' settings ----

@@ -52,8 +52,8 @@ void LibraryUndo::push(const LibraryChange& change) {
     lastChange_ = now;
     stack_.push(new ChangeCommand(change, isTyping, [this](const LibraryChange& applied, bool isUndo) {
         endTyping();
-        isUndo ? editor_.undo(applied) : editor_.redo(applied);
-        Q_EMIT changed(applied);
+        const bool isDone = isUndo ? editor_.undo(applied) : editor_.redo(applied);
+        isDone ? Q_EMIT changed(applied) : Q_EMIT refused();
     }));
 }
 

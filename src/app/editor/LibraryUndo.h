@@ -27,6 +27,8 @@ class LibraryUndo final : public QObject {
 
     // After each undo and redo.
     Q_SIGNAL void changed(const LibraryChange& change);
+    // Others have changed the lists that it was about: clear() is due, once the stack has returned.
+    Q_SIGNAL void refused();
 
   private:
     LibraryEditor& editor_;

@@ -21,7 +21,7 @@ constexpr int VisibleRows = 6;
 
 }  // namespace
 
-ApplicationList::ApplicationList(const PreferencesServices& services, ProgramCatalog& programs, QWidget* parent)
+ApplicationList::ApplicationList(const ProgramServices& services, ProgramCatalog& programs, QWidget* parent)
     : QWidget(parent),
       programs_(programs),
       model_(new QStandardItemModel(this)),

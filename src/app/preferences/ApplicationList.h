@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-#include "app/preferences/PreferencesServices.h"
+#include "app/preferences/ProgramServices.h"
 
 class QLabel;
 class QListView;
@@ -24,7 +24,7 @@ class ApplicationList final : public QWidget {
     using Identifiers = std::vector<std::u16string>;
 
     // Both outlive it.
-    ApplicationList(const PreferencesServices& services, ProgramCatalog& programs, QWidget* parent = nullptr);
+    ApplicationList(const ProgramServices& services, ProgramCatalog& programs, QWidget* parent = nullptr);
 
     // What it means to be in the list.
     void setTitle(const QString& title);

@@ -82,7 +82,7 @@ class ApplicationsPage final : public PreferencesPage {
 
     QLayout* makeButtons() {
         auto* row = new QHBoxLayout;
-        add_ = new ProgramAdder(services(), programs());
+        add_ = new ProgramAdder(services().programs, programs());
         change_ = new QPushButton(tr("Change as &Mine"));
         change_->setToolTip(tr("Makes a row of your own that begins as this one of Plume’s."));
         remove_ = new QPushButton(tr("Remo&ve"));

@@ -245,7 +245,7 @@ ApplicationList* PreferencesPage::addAvailability(const char* optionKey, const c
               {{PLFunctionAvailability::Everywhere, tr("In all programs")},
                {PLFunctionAvailability::ExceptListed, tr("In all programs except those below")},
                {PLFunctionAvailability::OnlyListed, tr("Only in the programs below")}});
-    auto* list = new ApplicationList(services(), programs());
+    auto* list = new ApplicationList(services().programs, programs());
     addWide(tr("Programs"), list, {}, {QLatin1String(listKey)});
     bind(listKey, [this, listKey, list] {
         list->setIdentifiers(settings().stringArrayForKey(listKey).value_or(ApplicationList::Identifiers()));

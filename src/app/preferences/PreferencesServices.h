@@ -5,23 +5,16 @@
 #pragma once
 
 #include <functional>
-#include <optional>
 #include <string>
 #include <vector>
 
 #include "Foundation/Result.h"
+#include "app/preferences/ProgramServices.h"
 #include "input/GeneralHotKey.h"
 #include "library/DataManager.h"
-#include "platform/ProcessManager.h"
 #include "platform/UserDefaults.h"
 
 namespace plume {
-
-struct InstalledProgram {
-    std::u16string identifier;
-    std::u16string name;
-    std::string icon;  // of the desktop's icon theme, or a path; empty: none
-};
 
 struct PreferencesServices {
     WritableUserDefaults& settings;
@@ -38,10 +31,7 @@ struct PreferencesServices {
     std::function<std::u16string(KeyCode)> keyName;
 
     // ---- Programs ----
-    std::function<void(std::function<void(const std::vector<RunningApplication>&)> told)> runningPrograms;
-    // The next program besides Plume that comes to the front within 20 seconds; nothing when none does.
-    std::function<void(std::function<void(const std::optional<RunningApplication>&)> told)> nextFrontProgram;
-    std::function<std::vector<InstalledProgram>()> installedPrograms;
+    ProgramServices programs;
     // The rows that Plume comes with: JSON as in data/applications.json.
     std::string builtInApplicationRows;
 

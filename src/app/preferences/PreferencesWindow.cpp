@@ -44,7 +44,7 @@ bool matches(const PreferencesPage::Row& row, const QString& title, const QStrin
 }  // namespace
 
 PreferencesWindow::PreferencesWindow(PreferencesServices services, QWidget* parent)
-    : QWidget(parent, Qt::Window), services_(std::move(services)), programs_(services_) {
+    : QWidget(parent, Qt::Window), services_(std::move(services)), programs_(services_.programs) {
     setAttribute(Qt::WA_DeleteOnClose);
     setWindowTitle(tr("Preferences"));
     resize(Opening);

@@ -12,7 +12,7 @@
 
 namespace plume {
 
-ProgramAdder::ProgramAdder(const PreferencesServices& services, ProgramCatalog& programs, QWidget* parent)
+ProgramAdder::ProgramAdder(const ProgramServices& services, ProgramCatalog& programs, QWidget* parent)
     : QPushButton(tr("Add"), parent), services_(services), programs_(programs) {
     setAccessibleName(tr("Add a program"));
     auto* menu = new QMenu(this);

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-#include "app/preferences/PreferencesServices.h"
+#include "app/preferences/ProgramServices.h"
 
 namespace plume {
 
@@ -20,7 +20,7 @@ class ProgramAdder final : public QPushButton {
     using Identifiers = std::vector<std::u16string>;
 
     // Both outlive it.
-    ProgramAdder(const PreferencesServices& services, ProgramCatalog& programs, QWidget* parent = nullptr);
+    ProgramAdder(const ProgramServices& services, ProgramCatalog& programs, QWidget* parent = nullptr);
 
   Q_SIGNALS:
     void chosen(const Identifiers& identifiers);
@@ -34,7 +34,7 @@ class ProgramAdder final : public QPushButton {
     void typeIdentifier();
     ProgramChooser* openChooser(const QString& title);
 
-    const PreferencesServices& services_;
+    const ProgramServices& services_;
     ProgramCatalog& programs_;
 };
 

@@ -9,14 +9,14 @@
 #include <string>
 #include <vector>
 
-#include "app/preferences/PreferencesServices.h"
+#include "app/preferences/ProgramServices.h"
 
 namespace plume {
 
 class ProgramCatalog {
   public:
     // The services outlive it.
-    explicit ProgramCatalog(const PreferencesServices& services) : services_(services) {}
+    explicit ProgramCatalog(const ProgramServices& services) : services_(services) {}
 
     const std::vector<InstalledProgram>& installed();
     // The identifier itself when nobody knows it. Letter case makes no difference.
@@ -29,7 +29,7 @@ class ProgramCatalog {
   private:
     const InstalledProgram* find(const std::u16string& identifier);
 
-    const PreferencesServices& services_;
+    const ProgramServices& services_;
     bool isAsked_ = false;
     std::vector<InstalledProgram> installed_;
     std::map<std::u16string, std::size_t> places_;

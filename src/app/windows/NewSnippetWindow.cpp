@@ -30,20 +30,18 @@ QString textIn(const QPlainTextEdit& field) {
 
 }  // namespace
 
-NewSnippetWindow::NewSnippetWindow(DataManager& manager, const SnippetDraft& draft, WritableUserDefaults& settings)
-    : SmallWindow(draft.edited ? tr("Edit Snippet") : tr("New Snippet")),
+NewSnippetWindow::NewSnippetWindow(DataManager& manager, const std::u16string& content, WritableUserDefaults& settings)
+    : SmallWindow(tr("New Snippet")),
       manager_(manager),
       group_(new QComboBox),
       newGroup_(new QLineEdit(tr("My Snippets"))),
       abbreviation_(new QLineEdit),
       warning_(makeTextLabel()),
       label_(new QLineEdit),
-      text_(new QPlainTextEdit(toQString(draft.content))),
-      edited_(draft.edited),
+      text_(new QPlainTextEdit(toQString(content))),
       draft_(textIn(*text_)) {
     auto* buttons = new QDialogButtonBox;
-    const QString purpose = edited_ ? tr("&Save Changes") : tr("Add &Snippet");
-    buttons->addButton(purpose, QDialogButtonBox::AcceptRole)->setDefault(true);
+    buttons->addButton(tr("Add &Snippet"), QDialogButtonBox::AcceptRole)->setDefault(true);
     buttons->addButton(tr("&Cancel"), QDialogButtonBox::RejectRole);
     connect(buttons, &QDialogButtonBox::accepted, this, &NewSnippetWindow::accept);
     connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
@@ -57,7 +55,6 @@ NewSnippetWindow::NewSnippetWindow(DataManager& manager, const SnippetDraft& dra
     layout->addLayout(form_, 1);
     layout->addWidget(buttons);
     fillGroups();
-    if (edited_) showEdited();
     groupChosen();
     connect(group_, &QComboBox::currentIndexChanged, this, &NewSnippetWindow::groupChosen);
     connect(newGroup_, &QLineEdit::textChanged, this, &NewSnippetWindow::showWarning);
@@ -84,21 +81,6 @@ void NewSnippetWindow::makeForm(QFormLayout& form) {
     form.addRow(QString(), warning_);
     form.addRow(tr("&Label:"), label_);
     form.addRow(tr("&Text:"), text_);
-}
-
-void NewSnippetWindow::showEdited() {
-    const auto group = edited_->parentGroup();
-    const auto isItsGroup = [&](const std::weak_ptr<SnippetGroup>& each) { return each.lock() == group; };
-    const auto place = std::find_if(groups_.begin(), groups_.end(), isItsGroup);
-    group_->setCurrentIndex(static_cast<int>(place - groups_.begin()));
-    group_->setEnabled(false);
-    abbreviation_->setText(toQString(edited_->abbreviation().value_or(u"")));
-    label_->setText(toQString(edited_->label().value_or(u"")));
-    text_->setPlainText(toQString(edited_->plainTextContent().value_or(u"")));
-    const bool isFormatted = edited_->contentType() == ContentType::RichText;
-    text_->setReadOnly(isFormatted);
-    if (isFormatted) text_->setToolTip(tr("Formatted text can be looked at here, and not be changed."));
-    draft_ = textIn(*text_);
 }
 
 void NewSnippetWindow::fillGroups() {
@@ -136,10 +118,9 @@ void NewSnippetWindow::showWarning() {
     const std::u16string abbreviation = fromQString(abbreviation_->text());
     const auto group = chosenGroup();
     const auto other = group && !abbreviation.empty() ? group->findSnippetWithAbbreviation(abbreviation) : nullptr;
-    const bool isItself = other && edited_ && (other == edited_ || other == livingSnippet());
     if (abbreviation.empty()) {
         warning_->setText(tr("Without an abbreviation it can only be chosen from lists."));
-    } else if (other && !isItself) {
+    } else if (other) {
         warning_->setText(tr("The group has this abbreviation already. Both will be kept."));
     } else {
         warning_->clear();
@@ -147,35 +128,12 @@ void NewSnippetWindow::showWarning() {
 }
 
 void NewSnippetWindow::accept() {
-    edited_ ? change() : add();
+    auto snippet = std::make_shared<Snippet>(fromQString(abbreviation_->text()), fromQString(textIn(*text_)));
+    if (!label_->text().isEmpty()) snippet->setLabel(fromQString(label_->text()));
+    groupToFill()->addItem(snippet);
     manager_.notifyDataChanged();
     mayClose_ = true;
     close();
-}
-
-// One that the library has lost meanwhile comes back with its changes.
-void NewSnippetWindow::change() {
-    const auto living = livingSnippet();
-    const auto snippet = living ? living : edited_;
-    const std::u16string abbreviation = fromQString(abbreviation_->text());
-    const std::u16string label = fromQString(label_->text());
-    const bool hasOtherAbbreviation = abbreviation != edited_->abbreviation().value_or(u"");
-    const bool hasOtherLabel = label != edited_->label().value_or(u"");
-    if (hasOtherAbbreviation) snippet->setAbbreviation(abbreviation);
-    if (hasOtherLabel) snippet->setLabel(label);
-    if (textIn(*text_) != draft_) snippet->setPlainTextContent(fromQString(textIn(*text_)));
-    if (!living) groupToFill()->addItem(snippet);
-}
-
-std::shared_ptr<Snippet> NewSnippetWindow::livingSnippet() const {
-    const auto isIt = [this](const std::shared_ptr<Snippet>& each) {
-        return each == edited_ || (edited_->uuid() && each->uuid() == edited_->uuid());
-    };
-    for (const auto& group : manager_.snippetGroups()) {
-        const auto found = std::find_if(group->items().begin(), group->items().end(), isIt);
-        if (found != group->items().end()) return *found;
-    }
-    return nullptr;
 }
 
 std::shared_ptr<SnippetGroup> NewSnippetWindow::groupToFill() {
@@ -185,17 +143,7 @@ std::shared_ptr<SnippetGroup> NewSnippetWindow::groupToFill() {
     return manager_.generateSnippetGroupSamples(name.empty() ? fromQString(tr("My Snippets")) : name, {});
 }
 
-void NewSnippetWindow::add() {
-    auto snippet = std::make_shared<Snippet>(fromQString(abbreviation_->text()), fromQString(textIn(*text_)));
-    if (!label_->text().isEmpty()) snippet->setLabel(fromQString(label_->text()));
-    groupToFill()->addItem(snippet);
-}
-
 bool NewSnippetWindow::hasEdits() const {
-    if (edited_) {
-        return abbreviation_->text() != toQString(edited_->abbreviation().value_or(u"")) ||
-               label_->text() != toQString(edited_->label().value_or(u"")) || textIn(*text_) != draft_;
-    }
     return !abbreviation_->text().isEmpty() || !label_->text().isEmpty() || textIn(*text_) != draft_;
 }
 
@@ -206,13 +154,8 @@ void NewSnippetWindow::closeEvent(QCloseEvent* event) {
         mayClose_ = true;
         close();
     };
-    if (edited_) {
-        ask(this, tr("Do you want to throw your changes away?"), tr("They were not saved yet."), tr("Throw Away"),
-            throwAway);
-    } else {
-        ask(this, tr("Do you want to throw this snippet away?"), tr("It was not added to your snippets yet."),
-            tr("Throw Away"), throwAway);
-    }
+    ask(this, tr("Do you want to throw this snippet away?"), tr("It was not added to your snippets yet."),
+        tr("Throw Away"), throwAway);
 }
 
 }  // namespace plume

@@ -1,4 +1,4 @@
-// Makes one snippet and puts it into the library, or changes one that is there.
+// Makes one snippet and puts it into the library.
 //
 // On the main thread; owns itself, and is gone when it is closed. The library outlives it.
 #pragma once
@@ -6,7 +6,6 @@
 #include <memory>
 #include <vector>
 
-#include "app/ApplicationWindows.h"
 #include "app/windows/SmallWindow.h"
 #include "library/DataManager.h"
 
@@ -21,7 +20,7 @@ namespace plume {
 class NewSnippetWindow final : public SmallWindow {
     Q_OBJECT
   public:
-    NewSnippetWindow(DataManager& manager, const SnippetDraft& draft, WritableUserDefaults& settings);
+    NewSnippetWindow(DataManager& manager, const std::u16string& content, WritableUserDefaults& settings);
 
   protected:
     // What was typed is not thrown away without a question.
@@ -29,21 +28,15 @@ class NewSnippetWindow final : public SmallWindow {
 
   private:
     void makeForm(QFormLayout& form);
-    // What is to be changed is shown; formatted text cannot be here.
-    void showEdited();
     void fillGroups();
     void groupChosen();
     void showWarning();
     void accept() override;
-    void add();
-    void change();
     bool isNewGroupChosen() const;
     // Null for one that is yet to be made.
     std::shared_ptr<SnippetGroup> chosenGroup() const;
     // Makes it if need be.
     std::shared_ptr<SnippetGroup> groupToFill();
-    // What the library has now of the snippet that is changed; a download may have put an equal one into its place.
-    std::shared_ptr<Snippet> livingSnippet() const;
     bool hasEdits() const;
 
     DataManager& manager_;
@@ -57,8 +50,7 @@ class NewSnippetWindow final : public SmallWindow {
     QLabel* warning_;
     QLineEdit* label_;
     QPlainTextEdit* text_;
-    const std::shared_ptr<Snippet> edited_;  // null: a new one
-    QString draft_;                          // what the text was at first
+    const QString draft_;  // what the text was at first
     bool mayClose_ = false;
 };
 

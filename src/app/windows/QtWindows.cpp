@@ -78,15 +78,10 @@ void QtWindows::showRestoreWindow() {
     }));
 }
 
-void QtWindows::showNewSnippetWindow(const SnippetDraft& draft) {
-    if (draft.edited) {
-        auto* window = new NewSnippetWindow(around_.dataManager, draft, around_.settings);
-        own(window);
-        return bringToFront(*window);
-    }
-    if (!draft.content.empty()) newSnippet_ = nullptr;
+void QtWindows::showNewSnippetWindow(const std::u16string& content) {
+    if (!content.empty()) newSnippet_ = nullptr;
     bringToFront(
-        theOnly(newSnippet_, [&] { return new NewSnippetWindow(around_.dataManager, draft, around_.settings); }));
+        theOnly(newSnippet_, [&] { return new NewSnippetWindow(around_.dataManager, content, around_.settings); }));
 }
 
 // ---- Questions and messages ----

@@ -35,6 +35,7 @@ class QtWindows final : public ApplicationWindows {
         std::function<WelcomeServices()> welcome;
         // The windows of other folders.
         std::function<void(bool expandAll)> showMacros;
+        std::function<void(const std::shared_ptr<Snippet>&)> showSnippet;
         std::function<void(const std::string& page)> showPreferences;
         std::function<void()> showDecisions;
         // Puts what is edited in them into the library.
@@ -47,8 +48,9 @@ class QtWindows final : public ApplicationWindows {
     QtWindows& operator=(const QtWindows&) = delete;
 
     void showMacrosWindow(bool expandAll) override { around_.showMacros(expandAll); }
+    void showSnippet(const std::shared_ptr<Snippet>& snippet) override { around_.showSnippet(snippet); }
     // Text to begin with has a window of its own; what is edited in another one stays.
-    void showNewSnippetWindow(const SnippetDraft& draft) override;
+    void showNewSnippetWindow(const std::u16string& content) override;
     void showPreferencesWindow(const std::string& page) override { around_.showPreferences(page); }
     void showAboutWindow() override;
     void showDiagnosticWindow(const std::u16string& report) override;

@@ -43,6 +43,10 @@ std::optional<std::u16string> ScriptOutput::text() const {
     return fromStrictUtf8(bytes);
 }
 
+std::optional<std::u16string> ScriptOutput::delivered() const {
+    return end == ScriptEnd::Finished || end == ScriptEnd::TimeLimit ? text() : std::nullopt;
+}
+
 ScriptWatch::ScriptWatch(const ScriptLimits& limits, const std::atomic<bool>& stopped)
     : outputLimit_(limits.output),
       stopped_(stopped),

@@ -39,6 +39,8 @@ struct ScriptOutput {
     // Standard output, or standard error when that is empty, without one trailing line feed. Nothing when both are
     // empty, and when the bytes are not UTF-8.
     std::optional<std::u16string> text() const;
+    // What is delivered of it: the text of a script that has finished, or that its time ran out for.
+    std::optional<std::u16string> delivered() const;
 };
 
 // Watches over one script from its start.

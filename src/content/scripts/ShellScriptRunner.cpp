@@ -38,6 +38,11 @@ std::string secondsInWords(double seconds) {
     return whole == 1 ? "1 second" : std::to_string(whole) + " seconds";
 }
 
+bool existsAppleScriptRunner() {
+    std::error_code problem;
+    return std::filesystem::exists(AppleScriptRunner, problem);
+}
+
 ScriptOutput stoppedBeforeStart() {
     ScriptOutput nothing;
     nothing.end = ScriptEnd::Stopped;
@@ -54,13 +59,17 @@ std::optional<std::u16string> ShellScriptRunner::run(std::u16string_view script,
         allSucceeded_ = false;
         return std::nullopt;
     }
-    const std::string text = toUtf8(script);
-    const ScriptOutput written =
-        !isAppleScript && belongsToSharedShell(text) ? runInSharedShell(text) : runInOwnProcess(text, isAppleScript);
+    const ScriptOutput written = outputOf(script, isAppleScript);
     reportEnd(written);
+    return written.delivered();
+}
+
+ScriptOutput ShellScriptRunner::outputOf(std::u16string_view script, bool isAppleScript) {
+    const std::string text = toUtf8(script);
+    ScriptOutput written =
+        !isAppleScript && belongsToSharedShell(text) ? runInSharedShell(text) : runInOwnProcess(text, isAppleScript);
     if (written.failed || written.end != ScriptEnd::Finished) allSucceeded_ = false;
-    const bool isDelivered = written.end == ScriptEnd::Finished || written.end == ScriptEnd::TimeLimit;
-    return isDelivered ? written.text() : std::nullopt;
+    return written;
 }
 
 ScriptOutput ShellScriptRunner::runInSharedShell(std::string_view script) {
@@ -71,14 +80,15 @@ ScriptOutput ShellScriptRunner::runInSharedShell(std::string_view script) {
 
 ScriptOutput ShellScriptRunner::runInOwnProcess(std::string_view script, bool isAppleScript) {
     if (stopped_) return stoppedBeforeStart();
+    if (isAppleScript && !existsAppleScriptRunner())
+        return ScriptOutput::notStarted(Error{std::string("there is no ") + AppleScriptRunner});
     const auto prepared = newTaskForScript(script, isAppleScript, launcher_);
     if (!prepared) return ScriptOutput::notStarted(prepared.error());
     return runScriptProcess(prepared.value(), launcher_, ScriptWatch(limits_, stopped_));
 }
 
 bool ShellScriptRunner::canRunAppleScript() {
-    std::error_code problem;
-    if (std::filesystem::exists(AppleScriptRunner, problem)) return true;
+    if (existsAppleScriptRunner()) return true;
     if (!toldAboutAppleScript_.exchange(true)) {
         report_(std::string("AppleScript snippets cannot run on this system: there is no ") + AppleScriptRunner + ".");
     }

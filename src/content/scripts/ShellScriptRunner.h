@@ -30,6 +30,8 @@ class ShellScriptRunner final : public ScriptRunner {
 
     std::optional<std::u16string> run(std::u16string_view script, bool isAppleScript) override;
     bool canRunAppleScript() override;
+    // The same as run(), with everything that the script wrote; nothing is reported.
+    ScriptOutput outputOf(std::u16string_view script, bool isAppleScript);
     // Every script that was asked for has run to its end, and none said that it failed. From any thread.
     bool allSucceeded() const { return allSucceeded_; }
     // Ends what runs, within moments, and runs nothing from now on: for quitting while a script is at work on another

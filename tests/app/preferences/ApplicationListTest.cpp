@@ -44,7 +44,7 @@ class ApplicationListTest : public testing::Test, protected test::PreferencesWor
         return qobject_cast<Dialog*>(QApplication::activeModalWidget());
     }
 
-    const PreferencesServices around = services();
+    const ProgramServices around = programs();
     ProgramCatalog catalog{around};
     std::unique_ptr<ApplicationList> list = std::make_unique<ApplicationList>(around, catalog);
     std::optional<Identifiers> edited;

@@ -83,6 +83,21 @@ struct PreferencesWorld {
     int forgotten = 0;
     Result<void> forgetAnswer;
 
+    ProgramServices programs() {
+        return ProgramServices{
+            .runningPrograms =
+                [](auto told) {
+                    told({program(u"kitty", u"Kitty"), program(u"mychat", u"My Chat"), program(u"mychat", u"My Chat"),
+                          program({}, u"Nameless")});
+                },
+            .nextFrontProgram = [this](auto told) { pointed = std::move(told); },
+            .installedPrograms =
+                [] {
+                    return std::vector<InstalledProgram>{{u"kitty", u"Kitty Terminal", ""},
+                                                         {u"org.gnome.gedit", u"Text Editor \u65E5\u672C", "none"}};
+                },
+        };
+    }
     PreferencesServices services() {
         const auto command = [this](const char* name) { return [this, name] { commands.emplace_back(name); }; };
         return PreferencesServices{
@@ -105,17 +120,7 @@ struct PreferencesWorld {
                 if (key == KeyCode::K) return u"K";
                 return key == KeyCode::F5 ? u"F5" : u"";
             },
-            .runningPrograms =
-                [](auto told) {
-                    told({program(u"kitty", u"Kitty"), program(u"mychat", u"My Chat"), program(u"mychat", u"My Chat"),
-                          program({}, u"Nameless")});
-                },
-            .nextFrontProgram = [this](auto told) { pointed = std::move(told); },
-            .installedPrograms =
-                [] {
-                    return std::vector<InstalledProgram>{{u"kitty", u"Kitty Terminal", ""},
-                                                         {u"org.gnome.gedit", u"Text Editor \u65E5\u672C", "none"}};
-                },
+            .programs = programs(),
             .builtInApplicationRows = builtInRows(),
             .startsAtLogin = [this] { return startsAtLogin; },
             .setStartsAtLogin =

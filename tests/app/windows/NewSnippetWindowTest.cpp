@@ -24,10 +24,8 @@ class NewSnippetWindowTest : public ::testing::Test {
   protected:
     void SetUp() override { machine.load(); }
     void TearDown() override { delete window; }
-    void open(const std::u16string& text = u"") { open(SnippetDraft{.content = text}); }
-    void edit(const std::shared_ptr<Snippet>& snippet) { open(SnippetDraft{.content = {}, .edited = snippet}); }
-    void open(const SnippetDraft& draft) {
-        window = new NewSnippetWindow(*machine.manager, draft, machine.settings);
+    void open(const std::u16string& content = u"") {
+        window = new NewSnippetWindow(*machine.manager, content, machine.settings);
         bringToFront(*window);
         activate(*window);
     }
@@ -123,88 +121,6 @@ TEST_F(NewSnippetWindowTest, TabLeavesTheTextAndTheWheelLeavesTheGroup) {
                       Qt::NoScrollPhase, false);
     QCoreApplication::sendEvent(&groups(), &wheel);
     EXPECT_EQ(groups().currentIndex(), 0);
-}
-
-TEST_F(NewSnippetWindowTest, ChangesASnippetThatIsThere) {
-    const auto first = machine.add(u"first", u"text\u00A0one\u2028x");
-    machine.add(u"other", u"text");
-    first->setLabel(u"Label");
-    edit(first);
-    EXPECT_EQ(window->windowTitle(), QStringLiteral("Edit Snippet"));
-    EXPECT_EQ(line("Label:").text(), QStringLiteral("Label"));
-    EXPECT_FALSE(groups().isEnabled());
-    EXPECT_THAT(textOf(*window), Not(HasSubstr("already"))) << "the abbreviation is its own";
-    takePicture(*window, QStringLiteral("EditSnippet"));
-    window->close();
-    processDeletions();
-    EXPECT_FALSE(window) << "nothing was changed: nothing is asked";
-    EXPECT_EQ(first->plainTextContent(), u"text\u00A0one\u2028x");
-
-    edit(first);
-    line("Abbreviation:").setText(QStringLiteral("other"));
-    EXPECT_THAT(textOf(*window), HasSubstr("already"));
-    line("Abbreviation:").setText(QStringLiteral("new"));
-    line("Label:").clear();
-    click(*window, QStringLiteral("Save Changes"));
-    EXPECT_THAT(machine.library(), ElementsAre("Mine: new=text\u00A0one\u2028x other=text"));
-    EXPECT_EQ(first->label(), u"");
-
-    processDeletions();
-    edit(first);
-    text().setPlainText(QStringLiteral("changed"));
-    QTest::keyClick(window, Qt::Key_Escape);
-    ASSERT_TRUE(window->isVisible());
-    click(*window->findChild<QMessageBox*>(), QStringLiteral("Throw Away"));
-    EXPECT_EQ(first->plainTextContent(), u"text\u00A0one\u2028x");
-}
-
-TEST_F(NewSnippetWindowTest, LeavesFormattedTextAndScriptsWhatTheyAre) {
-    TextAttributes bold;
-    bold.font = FontAttribute{u"Sans", 12, true, false};
-    const AttributedString formatted(u"bold", std::make_shared<const TextAttributes>(bold));
-    const auto rich = machine.add(u"rich");
-    rich->setRichTextContent(formatted);
-    rich->setContentType(ContentType::RichText);
-    edit(rich);
-    EXPECT_TRUE(text().isReadOnly());
-    line("Label:").setText(QStringLiteral("Named"));
-    click(*window, QStringLiteral("Save Changes"));
-    EXPECT_EQ(rich->richTextContent(), formatted);
-    EXPECT_EQ(rich->label(), u"Named");
-    processDeletions();
-
-    const auto script = machine.add(u"run", u"date");
-    script->setContentType(ContentType::ShellScript);
-    edit(script);
-    text().setPlainText(QStringLiteral("date --iso"));
-    click(*window, QStringLiteral("Save Changes"));
-    EXPECT_EQ(script->contentType(), ContentType::ShellScript);
-    EXPECT_EQ(script->plainTextContent(), u"date --iso");
-}
-
-TEST_F(NewSnippetWindowTest, ChangesWhatADownloadHasPutIntoItsPlace) {
-    const auto shown = machine.add(u"sig", u"text");
-    edit(shown);
-    auto& group = *machine.manager->snippetGroups().front();
-    const auto newer = std::make_shared<Snippet>(*shown->uuid());
-    newer->setAbbreviation(u"sig");
-    newer->setPlainTextContent(u"text of another machine");
-    group.removeItem(shown);
-    group.addItem(newer);
-    line("Label:").setText(QStringLiteral("Mine"));
-    line("Abbreviation:").setText(QStringLiteral("s"));
-    line("Abbreviation:").setText(QStringLiteral("sig"));
-    EXPECT_THAT(textOf(*window), Not(HasSubstr("already")));
-    click(*window, QStringLiteral("Save Changes"));
-    EXPECT_THAT(machine.library(), ElementsAre("Mine: sig=text of another machine"));
-    EXPECT_EQ(newer->label(), u"Mine");
-
-    processDeletions();
-    edit(newer);
-    machine.manager->snippetGroups().clear();
-    text().setPlainText(QStringLiteral("kept"));
-    click(*window, QStringLiteral("Save Changes"));
-    EXPECT_THAT(machine.library(), ElementsAre("Mine: sig=kept")) << "it comes back with its changes";
 }
 
 }  // namespace

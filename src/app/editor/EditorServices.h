@@ -1,0 +1,33 @@
+// What the editor of the library needs of the program around it.
+//
+// Everything is called on the main thread and outlives the editor's window.
+#pragma once
+
+#include <filesystem>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "app/editor/ChipFormServices.h"
+#include "library/DataManager.h"
+#include "platform/Files.h"
+#include "platform/UserDefaults.h"
+
+namespace plume {
+
+struct EditorServices {
+    DataManager& dataManager;
+    WritableUserDefaults& settings;
+    Files& files;
+    // The groups and dictionaries that Plume comes with.
+    std::filesystem::path resources;
+    // What placeholders and their forms ask; `groups` and `inside` are the window's.
+    ChipFormServices placeholders;
+    // See PreviewPane.
+    std::function<void(bool expands)> setExpandsInOwnWindows;
+    std::function<void()> showPreferences;
+    std::function<void()> quit;
+};
+
+}  // namespace plume

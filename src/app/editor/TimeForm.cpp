@@ -1,0 +1,18 @@
+#include "app/editor/TimeForm.h"
+
+#include <QFormLayout>
+#include <utility>
+
+namespace plume {
+
+TimeForm::TimeForm(ChipFormServices services, std::shared_ptr<SnippetTimeVariable> variable)
+    : DateTimeForm(tr("Time"), std::move(services), variable, DateTextKind::TimeOnly) {
+    addFormatRows();
+    rows().addRow(tr("Added:"), makeRow({makeOffset(variable->hour, tr("hours"), tr("Hours added")),
+                                         makeOffset(variable->minute, tr("minutes"), tr("Minutes added")),
+                                         makeOffset(variable->second, tr("seconds"), tr("Seconds added"))}));
+    addLocaleRow();
+    addOptionalRow();
+}
+
+}  // namespace plume
