@@ -17,7 +17,6 @@
 #include "app/editor/OutlineModel.h"
 #include "app/editor/OutlineView.h"
 #include "app/qt/Text.h"
-#include "app/windows/SmallWindow.h"
 #include "tests/app/windows/WindowsSupport.h"
 #include "tests/library/LibraryMachine.h"
 
@@ -56,7 +55,7 @@ class MacrosWindowTest : public ::testing::Test {
                                              .setExpandsInOwnWindows = [this](bool expands) { expandsHere = expands; },
                                              .showPreferences = [] {},
                                              .quit = [] {}});
-        bringToFront(*window);
+        window->show();
         activate(*window);
     }
     OutlineView& list() { return *window->findChild<OutlineView*>(); }
