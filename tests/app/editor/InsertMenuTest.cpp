@@ -129,6 +129,7 @@ TEST_F(InsertMenuTest, WhatAsksTellsWhenItsFormIsAccepted) {
     EXPECT_TRUE(chosen.empty());
     processDeletions();
     form = formAfter();
+    ASSERT_TRUE(form);
     activate(*form);
     QTest::keyClicks(form->focusWidget(), QStringLiteral("City"));
     QTest::keyClick(form->focusWidget(), Qt::Key_Return);
