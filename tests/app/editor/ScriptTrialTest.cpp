@@ -50,7 +50,8 @@ class ScriptTrialTest : public ::testing::Test {
 TEST_F(ScriptTrialTest, FieldsHaveWhatTheyBeginWith) {
     EXPECT_FALSE(tried(u"echo", echo)->hasFields());
     EXPECT_TRUE(tried(u"echo 【field:name value:Ada】!", echo)->hasFields());
-    EXPECT_THAT(echo.scripts, ElementsAre("echo", "echo Ada!"));
+    tried(u"echo 【field:net type:3 value:100】 【field:gross type:3 value:net*2】", echo);
+    EXPECT_THAT(echo.scripts, ElementsAre("echo", "echo Ada!", "echo 100 200"));
 }
 
 TEST_F(ScriptTrialTest, IncludedScriptsRunFirst) {
