@@ -116,7 +116,7 @@ void AppDelegate::applicationWillTerminate() {
 }
 
 void AppDelegate::applicationShouldHandleReopen() {
-    windows_.hasVisibleWindow() ? windows_.bringAllToFront() : windows_.showMacrosWindow(false);
+    windows_.hasVisibleWindow() ? windows_.bringAllToFront() : showMacrosWindow();
 }
 
 void AppDelegate::workspaceWillSleep() {
@@ -251,7 +251,7 @@ void AppDelegate::useFile(const Path& file, ApplicationWindows::FileUse use) {
     }
     for (const std::string& remark : remarks.value()) around_.reports.add(file.filename().string() + ": " + remark);
     manager_.notifyDataChanged();
-    windows_.showMacrosWindow(false);
+    showMacrosWindow();
 }
 
 void AppDelegate::saveDocumentTo() {
@@ -287,7 +287,7 @@ void AppDelegate::hotKeyPressed(HotKeyForWindow hotKey) {
         case HotKeyForWindow::MakeSnippetFromSelection:
             return makeSnippetFromSelection();
         case HotKeyForWindow::OpenMainWindow:
-            return windows_.showMacrosWindow(false);
+            return showMacrosWindow();
         case HotKeyForWindow::OpenLastUsedSnippet:
             return openLastUsedSnippet();
     }
@@ -314,7 +314,11 @@ void AppDelegate::editSnippet(const std::shared_ptr<Snippet>& snippet) {
 // Of this run; without one the snippets are shown.
 void AppDelegate::openLastUsedSnippet() {
     const auto snippet = lastUsedSnippet_ ? snippetWithUuid(*lastUsedSnippet_) : nullptr;
-    snippet ? editSnippet(snippet) : windows_.showMacrosWindow(false);
+    snippet ? editSnippet(snippet) : showMacrosWindow();
+}
+
+void AppDelegate::showMacrosWindow() {
+    windows_.showMacrosWindow(false);
 }
 
 void AppDelegate::showPreferencesWindow(const std::string& page) {

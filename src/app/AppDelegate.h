@@ -89,6 +89,7 @@ class AppDelegate final : private ExpansionListener {
     void newDocument();
     void editSnippet(const std::shared_ptr<Snippet>& snippet);
     void openLastUsedSnippet();
+    void showMacrosWindow();
     void showPreferencesWindow(const std::string& page = {});
     void showAboutWindow();
     void showWelcomeWindow();

@@ -28,6 +28,7 @@
 #include "app/cli/UserLibrary.h"
 #include "app/cli/Version.h"
 #include "app/cli/Voice.h"
+#include "app/editor/MacrosWindowController.h"
 #include "app/form/FormWindows.h"
 #include "app/linux/LinuxPort.h"
 #include "app/linux/PasswordFieldConsent.h"
@@ -70,6 +71,7 @@ class Application {
     void end(int status);
     void showPreferences(const std::string& page);
     void showDecisions();
+    MacrosWindowController& showEditor(bool expandAll);
     SuggestionView& suggestionView();
     QuickSearchView& quickSearchView();
     FormView& formView();
@@ -94,6 +96,7 @@ class Application {
     std::unique_ptr<SessionService> service_;
     QPointer<PreferencesWindow> preferences_;
     QPointer<DecisionsWindow> decisions_;
+    QPointer<MacrosWindowController> editor_;
     int status_ = ExitStatus::Success;
 };
 
@@ -105,7 +108,7 @@ Result<void> Application::open() {
     windows_ = std::make_unique<QtWindows>(windowsDependencies());
     delegate_ = std::make_unique<AppDelegate>(delegateDependencies());
     services_ = std::make_unique<ApplicationServices>(
-        ApplicationServices::Dependencies{*delegate_, *library_, *uses_, files_, port_.ports().sounds});
+        ApplicationServices::Dependencies{*delegate_, *library_, *uses_, files_, port_.ports().sounds, loop_});
     commands_ = std::make_unique<ApplicationCommands>(*delegate_, library_->manager(), files_);
     return {};
 }
@@ -130,11 +133,14 @@ QtWindows::Dependencies Application::windowsDependencies() {
             .reports = reports_,
             .version = Version,
             .welcome = [this] { return services_->welcome(); },
-            // Until there is a window for the library, its settings are the way in.
-            .showMacros = [this](bool) { showPreferences({}); },
+            .showMacros = [this](bool expandAll) { showEditor(expandAll); },
+            .showSnippet = [this](const std::shared_ptr<Snippet>& snippet) { showEditor(false).edit(snippet); },
             .showPreferences = [this](const std::string& page) { showPreferences(page); },
             .showDecisions = [this] { showDecisions(); },
-            .commitEdits = [] {}};
+            .commitEdits =
+                [this] {
+                    if (editor_) editor_->commitEdits();
+                }};
 }
 
 AppDelegate::Dependencies Application::delegateDependencies() {
@@ -168,6 +174,16 @@ void Application::showDecisions() {
     if (!decisions_ || decisions_->isHidden())
         decisions_ = new DecisionsWindow(services_->decisions(), library_->settings());
     bringToFront(*decisions_);
+}
+
+// A window that is open already stays as the user has it.
+MacrosWindowController& Application::showEditor(bool expandAll) {
+    if (!editor_ || editor_->isHidden()) {
+        editor_ = new MacrosWindowController(services_->editor());
+        if (expandAll) editor_->openAllGroups();
+    }
+    bringToFront(*editor_);
+    return *editor_;
 }
 
 // Made when they are first needed: most of the time there is neither.
@@ -258,6 +274,7 @@ int Application::run(int signals) {
     background_.finish();
     delete preferences_;
     delete decisions_;
+    delete editor_;
     quickSearch_ = nullptr;
     forms_ = nullptr;
     suggestions_ = nullptr;

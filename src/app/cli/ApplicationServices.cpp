@@ -95,6 +95,7 @@ StatusMenuServices ApplicationServices::statusMenu() const {
     services.newSnippet = [&delegate] { delegate.newDocument(); };
     services.makeSnippetFromClipboard = [&delegate] { delegate.makeSnippetFromClipboard(); };
     services.makeSnippetFromSelection = [&delegate] { delegate.makeSnippetFromSelection(); };
+    services.showMacrosWindow = [&delegate] { delegate.showMacrosWindow(); };
     services.searchSnippets = [&delegate] { delegate.searchSnippets(); };
     services.showPreferences = [&delegate] { delegate.showPreferencesWindow(); };
     services.showReports = [&delegate] { delegate.showReportsWindow(); };
@@ -157,6 +158,36 @@ QuickSearchServices ApplicationServices::quickSearch() {
             .edit = [&delegate](const std::shared_ptr<Snippet>& snippet) { delegate.editSnippet(snippet); },
             .setFirstRows = [&delegate](const auto& snippets) { delegate.setFoundSnippets(snippets); },
             .readClipboard = [&delegate](auto told) { delegate.expansion().readClipboard(std::move(told)); }};
+}
+
+ScriptRunServices ApplicationServices::scripts() {
+    return {.loop = around_.mainLoop,
+            .groups = {},
+            .readClipboard = {},
+            .inBackground = [this](std::function<void()> work,
+                                   std::function<void()> done) { trials_.begin(std::move(work), std::move(done)); },
+            .makeRunner = [this] { return makeTrialRunner(trialLauncher_, {}); }};
+}
+
+EditorServices ApplicationServices::editor() {
+    AppDelegate& delegate = around_.delegate;
+    Expansion& expansion = delegate.expansion();
+    ChipFormServices placeholders;
+    placeholders.readClipboard = [&expansion](auto told) { expansion.readClipboard(std::move(told)); };
+    placeholders.keyName = [&expansion](KeyCode key) { return expansion.keyName(key); };
+    placeholders.beginRecordingKey = [&expansion](auto pressed) { expansion.beginRecordingHotKey(std::move(pressed)); };
+    placeholders.endRecordingKey = [&expansion] { expansion.endRecordingHotKey(); };
+    return {.dataManager = around_.library.manager(),
+            .settings = around_.library.settings(),
+            .files = around_.files,
+            .resources = dataFolder(),
+            .placeholders = std::move(placeholders),
+            .scripts = scripts(),
+            .programs = programs(),
+            .inputSources = {},
+            .setExpandsInOwnWindows = [&expansion](bool expands) { expansion.setExpandsInOwnWindows(expands); },
+            .showPreferences = [&delegate] { delegate.showPreferencesWindow(); },
+            .quit = [&delegate] { delegate.terminate(); }};
 }
 
 WelcomeServices ApplicationServices::welcome() {

@@ -8,13 +8,16 @@
 
 #include "app/AppDelegate.h"
 #include "app/cli/Autostart.h"
+#include "app/cli/BackgroundWork.h"
 #include "app/cli/UserLibrary.h"
+#include "app/editor/EditorServices.h"
 #include "app/preferences/PreferencesServices.h"
 #include "app/search/QuickSearchWindow.h"
 #include "app/status/StatusMenuServices.h"
 #include "app/windows/DecisionsWindow.h"
 #include "app/windows/WelcomeServices.h"
 #include "platform/Sounds.h"
+#include "ports/posix/PosixProcessLauncher.h"
 
 namespace plume {
 
@@ -27,9 +30,11 @@ class ApplicationServices {
         SnippetUses& uses;
         Files& files;
         Sounds& sounds;
+        RunLoop& mainLoop;
     };
 
-    explicit ApplicationServices(Dependencies dependencies) : around_(dependencies), autostart_(dependencies.files) {}
+    explicit ApplicationServices(Dependencies dependencies)
+        : around_(dependencies), autostart_(dependencies.files), trials_(dependencies.mainLoop) {}
 
     StatusMenuServices statusMenu() const;
     ProgramServices programs() const;
@@ -37,12 +42,17 @@ class ApplicationServices {
     DecisionsWindow::Services decisions() const;
     WelcomeServices welcome();
     QuickSearchServices quickSearch();
+    EditorServices editor();
 
   private:
+    ScriptRunServices scripts();
     Result<std::string> importFound(const std::filesystem::path& path);
 
     const Dependencies around_;
     Autostart autostart_;
+    PosixProcessLauncher trialLauncher_;
+    // A script that is tried may take long, and nothing else is to wait for it.
+    BackgroundWork trials_;
 };
 
 }  // namespace plume

@@ -30,9 +30,9 @@ struct ScriptState {
 
     ScriptLanguage language = ScriptLanguage::Shell;
     Open open = Open::Nothing;
-    char16_t quote = 0;          // of a text in quotes
-    std::u16string terminator = {};   // of a here-document
-    bool mayBeIndented = false;  // its terminator
+    char16_t quote = 0;              // of a text in quotes
+    std::u16string terminator = {};  // of a here-document
+    bool mayBeIndented = false;      // its terminator
 
     auto operator<=>(const ScriptState&) const = default;
 };

@@ -56,6 +56,7 @@ ChipForm* ChipForm::open(QWidget* at, const std::u16string& body, ChipFormServic
     form->original_ = body;
     form->done_ = std::move(done);
     form->setParent(at, form->windowFlags());
+    form->addFoot();
     form->showValue();
     form->placeAt(*at);
     form->show();
@@ -68,8 +69,7 @@ ChipForm::ChipForm(const QString& title, ChipFormServices services, std::shared_
       variable_(std::move(variable)),
       rows_(new QFormLayout),
       value_(makeTextLabel()),
-      warning_(makeTextLabel()),
-      buttons_(new QDialogButtonBox) {
+      warning_(makeTextLabel()) {
     setWindowTitle(title);
     setWindowModality(Qt::WindowModal);
     setAttribute(Qt::WA_DeleteOnClose);
@@ -78,22 +78,24 @@ ChipForm::ChipForm(const QString& title, ChipFormServices services, std::shared_
     warning_->setAccessibleName(tr("Warning"));
     // One line is kept free for it: nothing jumps while one types.
     value_->setMinimumHeight(fontMetrics().lineSpacing());
+    auto* layout = new QVBoxLayout(this);
+    layout->addLayout(rows_, 1);
+}
+
+void ChipForm::addFoot() {
     auto* line = new QFrame;
     line->setFrameShape(QFrame::HLine);
     line->setForegroundRole(QPalette::Mid);
-    buttons_->addButton(tr("&Done"), QDialogButtonBox::AcceptRole)->setDefault(true);
-    buttons_->addButton(tr("&Cancel"), QDialogButtonBox::RejectRole);
-    connect(buttons_, &QDialogButtonBox::accepted, this, &ChipForm::accept);
-    connect(buttons_, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    auto* buttons = new QDialogButtonBox;
+    accept_ = buttons->addButton(tr("&Done"), QDialogButtonBox::AcceptRole);
+    accept_->setDefault(true);
+    buttons->addButton(tr("&Cancel"), QDialogButtonBox::RejectRole);
+    connect(buttons, &QDialogButtonBox::accepted, this, &ChipForm::accept);
+    connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
     // Return in a text of several lines is a new line.
     const auto* shortcut = new QShortcut(QKeySequence(Qt::CTRL | Qt::Key_Return), this);
     connect(shortcut, &QShortcut::activated, this, &ChipForm::accept);
-    auto* layout = new QVBoxLayout(this);
-    layout->addLayout(rows_, 1);
-    layout->addWidget(line);
-    layout->addWidget(value_);
-    layout->addWidget(warning_);
-    layout->addWidget(buttons_);
+    for (QWidget* each : std::initializer_list<QWidget*>{line, value_, warning_, buttons}) layout()->addWidget(each);
 }
 
 std::u16string ChipForm::body() const {
@@ -122,12 +124,12 @@ void ChipForm::showValue() {
     value_->setText(now.value);
     warning_->setText(warning.isEmpty() ? QString() : tr("⚠ %1").arg(warning));
     warning_->setVisible(!warning.isEmpty());
-    buttons_->buttons().constFirst()->setEnabled(canBeWritten);
+    if (accept_) accept_->setEnabled(canBeWritten);
 }
 
 void ChipForm::addOptionalRow() {
     auto* isOptional = new QCheckBox(tr("Can be &left out when the form is filled in"));
-    auto* isTicked = new QCheckBox(tr("Is tic&ked at first"));
+    auto* isTicked = new QCheckBox(tr("Is &ticked at first"));
     isOptional->setChecked(variable_->isOptional);
     isTicked->setChecked(variable_->isSelected);
     isTicked->setEnabled(variable_->isOptional);
@@ -142,6 +144,12 @@ void ChipForm::addOptionalRow() {
     });
     rows_->addRow(tr("Form:"), isOptional);
     rows_->addRow(QString(), isTicked);
+}
+
+void ChipForm::fitToRows() {
+    if (!isVisible()) return;
+    layout()->activate();
+    resize(width(), sizeHint().height());
 }
 
 void ChipForm::placeAt(const QWidget& at) {

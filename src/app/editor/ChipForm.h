@@ -13,9 +13,9 @@
 #include "app/editor/ChipFormServices.h"
 #include "content/SnippetVariable.h"
 
-class QDialogButtonBox;
 class QFormLayout;
 class QLabel;
+class QPushButton;
 
 namespace plume {
 
@@ -46,12 +46,16 @@ class ChipForm : public QDialog {
     void showValue();
     // The user has changed the variable.
     void changed();
+    // Other rows are shown than before.
+    void fitToRows();
     QFormLayout& rows() { return *rows_; }
     const ChipFormServices& services() const { return services_; }
     // Whether the form that fills in lets the user leave it out.
     void addOptionalRow();
 
   private:
+    // Below the controls, and reached by Tab after them.
+    void addFoot();
     // Beside the place, on its screen.
     void placeAt(const QWidget& at);
 
@@ -63,7 +67,7 @@ class ChipForm : public QDialog {
     QFormLayout* rows_;
     QLabel* value_;
     QLabel* warning_;
-    QDialogButtonBox* buttons_;
+    QPushButton* accept_ = nullptr;  // until the form is open
 };
 
 }  // namespace plume

@@ -6,6 +6,7 @@
 #include <QVBoxLayout>
 #include <utility>
 
+#include "app/editor/ChipForm.h"
 #include "app/editor/ContentEdit.h"
 #include "app/editor/FormatBar.h"
 #include "app/editor/InsertMenu.h"
@@ -13,18 +14,20 @@
 
 namespace plume {
 
-ContentPane::ContentPane(ChipFormServices services)
-    : services_(std::move(services)),
+ContentPane::ContentPane(ChipFormServices placeholders, ScriptRunServices scripts)
+    : services_(std::move(placeholders)),
       text_(new ContentEdit),
       format_(new FormatBar(*text_)),
       script_(new ScriptEdit),
       stack_(new QStackedWidget),
+      run_(new ScriptRunPanel(std::move(scripts))),
       scriptPage_(new QWidget),
       insert_(new QAction(tr("&Insert…"), this)),
       source_(new QAction(tr("Show So&urce"), this)) {
     auto* scriptLayout = new QVBoxLayout(scriptPage_);
     scriptLayout->setContentsMargins({});
     scriptLayout->addWidget(script_, 2);
+    scriptLayout->addWidget(run_, 1);
     stack_->addWidget(text_);
     stack_->addWidget(scriptPage_);
     text_->setAccessibleName(tr("Content"));
@@ -61,13 +64,18 @@ bool ContentPane::isScript() const {
     return stack_->currentWidget() == scriptPage_;
 }
 
-void ContentPane::setContent(const AttributedString& content, ContentType type) {
+void ContentPane::show(const std::shared_ptr<Snippet>& snippet) {
+    const AttributedString content = snippet->richTextContent().value_or(AttributedString());
+    const ContentType type = snippet->contentType();
+    services_.inside = snippet;
     const bool isScript = type == ContentType::AppleScript || type == ContentType::ShellScript;
     stack_->setCurrentWidget(isScript ? scriptPage_ : static_cast<QWidget*>(text_));
     setFocusProxy(isScript ? static_cast<QWidget*>(script_) : text_);
     source_->setEnabled(!isScript);
     format_->setVisible(type == ContentType::RichText);
+    run_->setScript(isScript ? snippet : nullptr, [this] { return script_->content().string(); });
     if (isScript) {
+        script_->setAppleScript(type == ContentType::AppleScript);
         script_->setContent(content);
     } else {
         text_->setContent(content, type == ContentType::RichText);
@@ -76,10 +84,6 @@ void ContentPane::setContent(const AttributedString& content, ContentType type) 
 
 AttributedString ContentPane::content() const {
     return isScript() ? script_->content() : text_->content();
-}
-
-void ContentPane::setScriptPanel(QWidget* panel) {
-    scriptPage_->layout()->addWidget(panel);
 }
 
 // ---- Placeholders ----

@@ -5,15 +5,15 @@
 #pragma once
 
 #include <QWidget>
-#include <functional>
+#include <memory>
 
 #include "Foundation/text/AttributedString.h"
-#include "app/editor/ChipForm.h"
+#include "app/editor/ChipFormServices.h"
+#include "app/editor/ScriptRunPanel.h"
 #include "library/Snippet.h"
 
 class QAction;
 class QStackedWidget;
-class QToolBar;
 
 namespace plume {
 
@@ -24,15 +24,11 @@ class ScriptEdit;
 class ContentPane final : public QWidget {
     Q_OBJECT
   public:
-    // What can be inserted, and forms of placeholders, need of the program; everything outlives the pane.
-    explicit ContentPane(ChipFormServices services);
+    ContentPane(ChipFormServices placeholders, ScriptRunServices scripts);
 
-    // Tells nothing. What is equal at the beginning and the end stays with the caret where it is.
-    void setContent(const AttributedString& content, ContentType type);
+    // Tells nothing. What is equal at the beginning and the end stays, with the caret where it is.
+    void show(const std::shared_ptr<Snippet>& snippet);
     AttributedString content() const;
-    void setReadOnly(bool isReadOnly);
-    // What stands beneath scripts.
-    void setScriptPanel(QWidget* panel);
     void showInsertMenu();
     QAction& sourceAction() { return *source_; }
 
@@ -44,11 +40,12 @@ class ContentPane final : public QWidget {
     void changeChip(const std::u16string& body);
     bool isScript() const;
 
-    const ChipFormServices services_;
+    ChipFormServices services_;
     ContentEdit* text_;
     FormatBar* format_;
     ScriptEdit* script_;
     QStackedWidget* stack_;
+    ScriptRunPanel* run_;
     QWidget* scriptPage_;
     QAction* insert_;
     QAction* source_;

@@ -24,18 +24,18 @@ DateForm::DateForm(ChipFormServices services, std::shared_ptr<SnippetDateVariabl
 }
 
 void DateForm::addDayRows() {
-    const Choices days{{static_cast<std::int64_t>(ValueType::Offset), tr("Today, or so long from today")},
-                       {static_cast<std::int64_t>(ValueType::NextWeekday), tr("The next such weekday")},
-                       {static_cast<std::int64_t>(ValueType::PreviousWeekday), tr("The last such weekday")}};
-    QComboBox* day = makeChoice(days, static_cast<std::int64_t>(variable_->valueType), tr("The last such weekday (%1)"),
-                                [this](std::int64_t type) {
+    const Choices days{{static_cast<std::int64_t>(ValueType::Offset), tr("From today")},
+                       {static_cast<std::int64_t>(ValueType::NextWeekday), tr("The next weekday of this name")},
+                       {static_cast<std::int64_t>(ValueType::PreviousWeekday), tr("The last weekday of this name")}};
+    QComboBox* day = makeChoice(days, static_cast<std::int64_t>(variable_->valueType),
+                                tr("The last weekday of this name (%1)"), [this](std::int64_t type) {
                                     variable_->valueType = static_cast<ValueType>(type);
                                     showDayRows();
                                     changed();
                                 });
-    offsets_ = makeRow({makeOffset(variable_->year, tr("years"), tr("Years added")),
-                        makeOffset(variable_->month, tr("months"), tr("Months added")),
-                        makeOffset(variable_->day, tr("days"), tr("Days added"))});
+    offsets_ = makeRow({makeOffset(variable_->year, tr("Years:"), tr("Years added")),
+                        makeOffset(variable_->month, tr("Months:"), tr("Months added")),
+                        makeOffset(variable_->day, tr("Days:"), tr("Days added"))});
     weekday_ = makeChoice(weekdays(), variable_->weekday, tr("Weekday %1"), [this](std::int64_t weekday) {
         variable_->weekday = weekday;
         changed();
@@ -49,6 +49,7 @@ void DateForm::addDayRows() {
 void DateForm::showDayRows() {
     rows().setRowVisible(offsets_, variable_->valueIsToday());
     rows().setRowVisible(weekday_, !variable_->valueIsToday());
+    fitToRows();
 }
 
 Choices DateForm::weekdays() const {

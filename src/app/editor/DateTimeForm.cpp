@@ -83,7 +83,6 @@ void DateTimeForm::addFormatRows() {
     patternRow_ = makeRow({pattern_, makePatternHelp()});
     rows().addRow(tr("&Style:"), style_);
     rows().addRow(tr("&Pattern:"), patternRow_);
-    static_cast<void>(pattern_);
     pattern_->setAccessibleName(tr("Pattern"));
     rows().setRowVisible(patternRow_, style_->currentData().toString().isEmpty());
     connect(style_, &QComboBox::currentIndexChanged, this, &DateTimeForm::styleChosen);
@@ -113,6 +112,7 @@ void DateTimeForm::styleChosen() {
         pattern_->setText(style.isEmpty() ? start : QString());
     }
     rows().setRowVisible(patternRow_, style.isEmpty());
+    fitToRows();
     changed();
 }
 
@@ -155,7 +155,7 @@ QWidget* DateTimeForm::makeOffset(std::int64_t& offset, const QString& unit, con
         offset = value;
         changed();
     });
-    number->setSuffix(QLatin1Char(' ') + unit);
+    number->setPrefix(unit + QLatin1Char(' '));
     number->setAccessibleName(name);
     return number;
 }

@@ -23,7 +23,7 @@ class DateTimeForm : public ChipForm {
     Shown shown() const override;
     void addFormatRows();
     void addLocaleRow();
-    // A whole number that is added, as "2 days".
+    // A whole number that is added, as "Days: 2".
     QWidget* makeOffset(std::int64_t& offset, const QString& unit, const QString& name);
 
   private:

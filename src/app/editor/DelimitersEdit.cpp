@@ -33,7 +33,7 @@ CharacterSet just(char16_t character) {
 DelimitersEdit::DelimitersEdit(const QString& purpose, QWidget* parent)
     : QWidget(parent),
       usual_(new QCheckBox(tr("The usual ones"))),
-      usualOnes_(makeHelpLabel(toQString(textFromDelimiters(AutoText::defaultDelimiters())))),
+      usualOnes_(makeHelpLabel(usualOnes())),
       others_(new TypedLine),
       own_(makeOwn(purpose)) {
     usual_->setAccessibleName(tr("%1 The usual ones").arg(purpose));
@@ -41,23 +41,33 @@ DelimitersEdit::DelimitersEdit(const QString& purpose, QWidget* parent)
     setFocusProxy(usual_);
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(0, 0, 0, 0);
-    layout->addWidget(usual_);
+    layout->addWidget(usual_, 0, Qt::AlignLeft);
     layout->addWidget(usualOnes_);
     layout->addWidget(own_);
     // Those that were the usual ones are where one's own begin.
     connect(usual_, &QCheckBox::toggled, this,
             [this](bool isUsual) { choose(isUsual ? Delimiters() : Delimiters(AutoText::defaultDelimiters())); });
     connect(others_, &TypedLine::edited, this, &DelimitersEdit::chooseOthers);
-    connect(others_, &QLineEdit::editingFinished, this, &DelimitersEdit::showDelimiters);
+    connect(others_, &TypedLine::left, this, &DelimitersEdit::showDelimiters);
     showDelimiters();
 }
 
+QStringList DelimitersEdit::namesInOrder() {
+    return {tr("Space"), tr("Tab"), tr("Return"), tr("Enter")};
+}
+
+QString DelimitersEdit::usualOnes() {
+    const CharacterSet others = AutoText::defaultDelimiters().subtracting(namedDelimiters());
+    return tr("%1 %2").arg(namesInOrder().join(u' '), toQString(textFromDelimiters(others)));
+}
+
 QWidget* DelimitersEdit::makeOwn(const QString& purpose) {
-    const std::array<QString, NamedDelimiters.size()> names{tr("Space"), tr("Tab"), tr("Return"), tr("Enter")};
+    const QStringList names = namesInOrder();
     auto* boxes = new QHBoxLayout;
     for (std::size_t i = 0; i < named_.size(); ++i) {
-        named_[i] = new QCheckBox(names[i]);
-        named_[i]->setAccessibleName(tr("%1 %2").arg(purpose, names[i]));
+        const QString& name = names[static_cast<qsizetype>(i)];
+        named_[i] = new QCheckBox(name);
+        named_[i]->setAccessibleName(tr("%1 %2").arg(purpose, name));
         boxes->addWidget(named_[i]);
         connect(named_[i], &QCheckBox::toggled, this, [this, character = NamedDelimiters[i].character](bool isOne) {
             finish();

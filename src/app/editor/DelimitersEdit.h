@@ -34,6 +34,8 @@ class DelimitersEdit final : public QWidget {
     Q_SIGNAL void changed(const std::optional<CharacterSet>& delimiters);
 
   private:
+    static QStringList namesInOrder();  // of the named ones
+    static QString usualOnes();
     QWidget* makeOwn(const QString& purpose);
     void choose(const Delimiters& delimiters);
     void chooseOthers(const std::u16string& text);

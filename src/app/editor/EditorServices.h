@@ -7,9 +7,12 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "app/editor/ChipFormServices.h"
+#include "app/editor/ScriptRunPanel.h"
+#include "app/preferences/ProgramServices.h"
 #include "library/DataManager.h"
 #include "platform/Files.h"
 #include "platform/UserDefaults.h"
@@ -24,6 +27,11 @@ struct EditorServices {
     std::filesystem::path resources;
     // What placeholders and their forms ask; `groups` and `inside` are the window's.
     ChipFormServices placeholders;
+    // What runs scripts; `groups` and `readClipboard` are the window's.
+    ScriptRunServices scripts;
+    ProgramServices programs;
+    // The keyboard layouts that the desktop has, with their names.
+    std::function<std::vector<std::pair<std::u16string, QString>>()> inputSources;
     // See PreviewPane.
     std::function<void(bool expands)> setExpandsInOwnWindows;
     std::function<void()> showPreferences;

@@ -90,19 +90,18 @@ void FieldForm::addValueRows() {
 }
 
 void FieldForm::addSizeRows() {
-    const auto make = [this](std::int64_t size, void (SnippetFieldVariable::*set)(std::int64_t), const QString& unit) {
+    const auto make = [this](std::int64_t size, void (SnippetFieldVariable::*set)(std::int64_t)) {
         QSpinBox* number = makeNumber(size, 0, LargestSize, [this, set](std::int64_t value) {
             (*variable_.*set)(value);
             changed();
         });
         number->setSpecialValueText(tr("As usual"));
-        number->setSuffix(QLatin1Char(' ') + unit);
         return number;
     };
-    width_ = make(variable_->hasWidth() ? variable_->width() : 0, &SnippetFieldVariable::setWidth, tr("letters"));
-    height_ = make(variable_->hasHeight() ? variable_->height() : 0, &SnippetFieldVariable::setHeight, tr("lines"));
-    rows().addRow(tr("&Width:"), width_);
-    rows().addRow(tr("Hei&ght:"), height_);
+    width_ = make(variable_->hasWidth() ? variable_->width() : 0, &SnippetFieldVariable::setWidth);
+    height_ = make(variable_->hasHeight() ? variable_->height() : 0, &SnippetFieldVariable::setHeight);
+    rows().addRow(tr("&Width in letters:"), width_);
+    rows().addRow(tr("Hei&ght in lines:"), height_);
 }
 
 void FieldForm::showKind() {
@@ -120,6 +119,7 @@ void FieldForm::showKind() {
     rows().setRowVisible(height_, variable_->canSetHeight());
     rows().setRowVisible(isReadonly_, variable_->canSetReadonly());
     fillFirstChoices();
+    fitToRows();
 }
 
 void FieldForm::valueEdited(std::u16string value) {

@@ -167,14 +167,14 @@ void GroupEditor::addNames() {
 void GroupEditor::addExpansion() {
     addHeading(tr("Expansion"));
     addChoice(
-        tr("Behind:"), {tr("A delimiter"), tr("White space"), tr("Anything, even a letter"), tr("A number")},
+        tr("Expands behind:"), {tr("A delimiter"), tr("White space"), tr("Anything, even a letter"), tr("A number")},
         [](const SnippetGroup& group) { return static_cast<std::int64_t>(group.expandAfter()); },
         [](SnippetGroup& group, std::int64_t value) { group.setExpandAfter(static_cast<ExpandAfter>(value)); });
     before_ = addDelimiters(
         tr("Delimiters before it:"), [](const SnippetGroup& group) { return group.expandAfterDelimiters(); },
         [](SnippetGroup& group, const auto& set) { group.setExpandAfterDelimiters(set); });
     addChoice(
-        tr("When:"),
+        tr("Expands:"),
         {tr("At once, with its last character"), tr("With a delimiter, which stays"),
          tr("With a delimiter, which is left out"), tr("Never by typing"), tr("With the hot key that expands")},
         [](const SnippetGroup& group) { return static_cast<std::int64_t>(group.expandTrigger()); },

@@ -181,14 +181,14 @@ QString Effect::example() const {
     });
     QString text = toQString(group_.abbreviationPrefix().value_or(u"")) +
                    toQString(found == items.end() ? u"abc" : *(*found)->abbreviation());
+    // What would run into the sentence around it is told from that.
+    bool isQuoted = text.back().isPunct();
     if (text.size() > LongestExample) text = text.left(LongestExample) + u'…';
-    bool hasSpaces = false;
     for (QChar& c : text) {
         if (!c.isPrint() && !c.isSurrogate()) c = QChar::Space;
-        hasSpaces = hasSpaces || c.isSpace();
+        isQuoted = isQuoted || c.isSpace();
     }
-    // What would run into the sentence around it.
-    return hasSpaces || text.back().isPunct() ? tr("“%1”").arg(text) : text;
+    return isQuoted ? tr("“%1”").arg(text) : text;
 }
 
 // ---- Lists ----

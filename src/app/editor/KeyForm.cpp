@@ -130,7 +130,7 @@ void KeyForm::addModifierRow() {
         return tick;
     };
     rows().addRow(tr("Held with it:"),
-                  makeRow({add(tr("C&trl"), EventFlag::Control), add(tr("&Alt"), EventFlag::Option),
+                  makeRow({add(tr("Ctr&l"), EventFlag::Control), add(tr("&Alt"), EventFlag::Option),
                            add(tr("&Shift"), EventFlag::Shift), add(tr("S&uper"), EventFlag::Command)}));
 }
 
@@ -141,20 +141,20 @@ void KeyForm::addTimesRows() {
                        variable_->count = static_cast<std::uint64_t>(times);
                        changed();
                    });
-    count->setSuffix(QLatin1Char(' ') + tr("times"));
     auto* delay = new QDoubleSpinBox;
     delay->setDecimals(DelayDigits);
     delay->setRange(0, SnippetKeyVariable::MaximumDelay);
     constexpr double Step = 0.1;
     delay->setSingleStep(Step);
     delay->setValue(variable_->delay);
+    delay->setSpecialValueText(tr("Not at all"));
     delay->setSuffix(QLatin1Char(' ') + tr("seconds"));
     ignoreWheelWithoutFocus(*delay);
     connect(delay, &QDoubleSpinBox::valueChanged, this, [this](double seconds) {
         variable_->delay = seconds;
         changed();
     });
-    rows().addRow(tr("&Pressed:"), count);
+    rows().addRow(tr("&Times pressed:"), count);
     rows().addRow(tr("&Waits before:"), delay);
 }
 

@@ -1,10 +1,11 @@
 #include "app/editor/LocaleChoice.h"
 
+#include <unicode/locid.h>
+
 #include <QCompleter>
 #include <QLineEdit>
-#include <QLocale>
 #include <algorithm>
-#include <map>
+#include <span>
 #include <utility>
 #include <vector>
 
@@ -30,18 +31,19 @@ LocaleChoice::LocaleChoice(const std::optional<std::u16string>& locale) {
 }
 
 void LocaleChoice::addLocales() {
-    std::map<QString, QString> names;  // locales of several scripts share an identifier
-    for (const QLocale& each :
-         QLocale::matchingLocales(QLocale::AnyLanguage, QLocale::AnyScript, QLocale::AnyTerritory)) {
-        if (each.language() == QLocale::C || each.nativeLanguageName().isEmpty()) continue;
-        names.try_emplace(each.name(), tr("%1 (%2)").arg(each.nativeLanguageName(), each.nativeTerritoryName()));
+    std::int32_t count = 0;
+    const icu::Locale* locales = icu::Locale::getAvailableLocales(count);
+    const icu::Locale shownIn(locale().name().toUtf8().constData());
+    std::vector<std::pair<QString, QString>> named;
+    for (const icu::Locale& each : std::span(locales, static_cast<std::size_t>(count))) {
+        icu::UnicodeString name;
+        each.getDisplayName(shownIn, name);
+        named.emplace_back(QString::fromUtf16(name.getBuffer(), name.length()), QString::fromUtf8(each.getName()));
     }
-    std::vector<std::pair<QString, QString>> sorted;
-    for (const auto& [identifier, name] : names) sorted.emplace_back(name, identifier);
-    std::sort(sorted.begin(), sorted.end(),
+    std::sort(named.begin(), named.end(),
               [](const auto& a, const auto& b) { return a.first.localeAwareCompare(b.first) < 0; });
     addItem(QString(), QString());
-    for (const auto& [name, identifier] : sorted) addItem(name, identifier);
+    for (const auto& [name, identifier] : named) addItem(name, identifier);
 }
 
 void LocaleChoice::typed(const QString& text) {

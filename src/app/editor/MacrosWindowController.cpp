@@ -9,6 +9,7 @@
 #include <utility>
 
 #include "app/editor/ContentPane.h"
+#include "app/editor/GroupEditor.h"
 #include "app/editor/OutlinePane.h"
 #include "app/editor/OutlineView.h"
 #include "app/editor/PreviewPane.h"
@@ -55,7 +56,8 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
                                 .readClipboard = services_.placeholders.readClipboard,
                                 .setExpandsInOwnWindows = services_.setExpandsInOwnWindows})),
       notice_(makeTextLabel()),
-      columns_(new QSplitter) {
+      columns_(new QSplitter),
+      group_(new GroupEditor({editor_, services_.programs, services_.inputSources})) {
     setWindowTitle(tr("Snippets"));
     setAttribute(Qt::WA_DeleteOnClose);
     makePanes();
@@ -64,6 +66,7 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
     connect(&reloadTimer_, &QTimer::timeout, this, [this] {
         outline_->reload();
         snippet_->refresh();
+        group_->refresh();
         preview_->showSoon();
     });
     connect(&undo_, &LibraryUndo::changed, this, &MacrosWindowController::undone);
@@ -92,7 +95,10 @@ MacrosWindowController::~MacrosWindowController() {
 void MacrosWindowController::makePanes() {
     ChipFormServices placeholders = services_.placeholders;
     placeholders.groups = [this]() -> const SnippetGroups& { return editor_.groups(); };
-    snippet_ = new SnippetEditor(editor_, *new ContentPane(std::move(placeholders)));
+    ScriptRunServices scripts = services_.scripts;
+    scripts.groups = placeholders.groups;
+    scripts.readClipboard = placeholders.readClipboard;
+    snippet_ = new SnippetEditor(editor_, *new ContentPane(std::move(placeholders), std::move(scripts)));
     connect(snippet_, &SnippetEditor::typed, preview_, &PreviewPane::showSoon);
     nothing_->setAlignment(Qt::AlignCenter);
     nothing_->setMargin(2 * fontMetrics().height());
@@ -104,6 +110,7 @@ void MacrosWindowController::makePanes() {
     page->setStretchFactor(1, 1);
     page->setChildrenCollapsible(false);
     pages_->addWidget(page);
+    pages_->addWidget(group_);
     notice_->setAccessibleName(tr("Notice"));
     notice_->setMargin(fontMetrics().height() / 2);
     notice_->hide();
@@ -133,6 +140,7 @@ void MacrosWindowController::closeEvent(QCloseEvent* event) {
 
 void MacrosWindowController::commitEdits() {
     snippet_->commit();
+    group_->finish();
 }
 
 void MacrosWindowController::say(const QString& sentence) {
@@ -167,8 +175,12 @@ void MacrosWindowController::selectionWasChanged() {
         snippet_->show(snippet);
         preview_->show(snippet);
     }
+    const bool isOneGroup = selected.groups.size() == 1 && selected.snippets.empty();
+    group_->show(isOneGroup ? selected.groups.front() : nullptr);
     if (snippet) {
         pages_->setCurrentIndex(1);
+    } else if (isOneGroup) {
+        pages_->setCurrentIndex(2);
     } else {
         showNothing(selected);
     }
@@ -220,6 +232,7 @@ void MacrosWindowController::undone(const LibraryChange& change) {
     }
     if (!isOrder) select(rows);
     snippet_->refresh();
+    group_->refresh();
     preview_->showSoon();
 }
 

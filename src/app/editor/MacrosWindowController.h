@@ -22,7 +22,7 @@ class QStackedWidget;
 
 namespace plume {
 
-class ContentPane;
+class GroupEditor;
 class OutlinePane;
 class PreviewPane;
 
@@ -105,6 +105,7 @@ class MacrosWindowController final : public QMainWindow {
     PreviewPane* preview_;
     QLabel* notice_;
     QSplitter* columns_;
+    GroupEditor* group_;
     std::optional<SnippetEditor::OpenEdit> openEdit_;
     QTimer reloadTimer_;
     std::vector<Subscription> observers_;

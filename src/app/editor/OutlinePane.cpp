@@ -1,12 +1,15 @@
 #include "app/editor/OutlinePane.h"
 
 #include <QAction>
+#include <QApplication>
+#include <QFontInfo>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
 #include <QToolButton>
 #include <QVBoxLayout>
+#include <algorithm>
 
 #include "app/editor/OutlineView.h"
 #include "app/qt/Labels.h"
@@ -18,6 +21,7 @@ namespace {
 
 // Identities of groups, apart by spaces.
 constexpr const char* OpenGroupsKey = "WindowPlace.MacrosOpenGroups";
+constexpr const char* FontSizeKey = "FontSizeDelta";
 
 }  // namespace
 
@@ -55,6 +59,8 @@ OutlinePane::OutlinePane(LibraryEditor& editor, WritableUserDefaults& settings)
     setFocusProxy(view_);
     connect(field_, &QLineEdit::textChanged, this, &OutlinePane::onFilterChanged);
     connect(view_, &OutlineView::selectionWasChanged, this, &OutlinePane::refreshStatusString);
+    fontSize_ = settings_.changedEvent.addObserver(this, &OutlinePane::settingsChanged);
+    setFontSize();
     reload();
     const QString open = toQString(settings_.stringForKey(OpenGroupsKey).value_or(u""));
     if (settings_.hasKey(OpenGroupsKey)) {
@@ -62,6 +68,18 @@ OutlinePane::OutlinePane(LibraryEditor& editor, WritableUserDefaults& settings)
     } else if (editor_.groups().size() == 1) {
         view_->openAll();
     }
+}
+
+void OutlinePane::settingsChanged(UserDefaultsChange& change) {
+    if (std::ranges::count(change.keys, FontSizeKey) > 0) setFontSize();
+}
+
+void OutlinePane::setFontSize() {
+    constexpr double Smallest = 6;
+    QFont font = QApplication::font("QAbstractItemView");
+    const auto delta = static_cast<double>(settings_.integerForKey(FontSizeKey));
+    if (delta != 0) font.setPointSizeF(std::max(QFontInfo(font).pointSizeF() + delta, Smallest));
+    view_->setFont(font);
 }
 
 void OutlinePane::keepOpenGroups() {

@@ -5,6 +5,7 @@
 
 #include <QWidget>
 
+#include "Foundation/Subscription.h"
 #include "app/editing/LibraryFilter.h"
 #include "app/editor/OutlineModel.h"
 
@@ -42,6 +43,8 @@ class OutlinePane final : public QWidget {
     void addField(SnippetSearch::SearchBy field, const QString& text);
     void onFilterChanged();
     void refreshStatusString();
+    void settingsChanged(UserDefaultsChange& change);
+    void setFontSize();
 
     LibraryEditor& editor_;
     WritableUserDefaults& settings_;
@@ -52,6 +55,7 @@ class OutlinePane final : public QWidget {
     OutlineView* view_;
     QLabel* nothing_;
     QLabel* status_;
+    Subscription fontSize_;
 };
 
 }  // namespace plume

@@ -116,9 +116,12 @@ void ScriptEdit::insertPlaceholder(const std::u16string& body) {
     ensureCursorVisible();
 }
 
-// Colours that change are told as a change of the text, too.
+// Qt tells of colours and fonts in the same way.
 void ScriptEdit::noteChange() {
-    if (std::exchange(revision_, document()->revision()) == document()->revision() || isSetting_) return;
+    QString text = document()->toRawText();
+    if (text == told_) return;
+    told_ = std::move(text);
+    if (isSetting_) return;
     isChanged_ = true;
     Q_EMIT edited();
 }

@@ -66,7 +66,7 @@ class ScriptEdit final : public QPlainTextEdit {
     bool isChanged_ = false;  // since it was set
     bool isSetting_ = false;
     bool leavesWithTab_ = false;
-    int revision_ = 0;  // of the document, as far as it was told
+    QString told_;  // the document's text when a change was noted last
 };
 
 }  // namespace plume

@@ -125,7 +125,7 @@ void SnippetEditor::setFields() {
     if (textOf(*note_) != note) note_->setPlainText(note);
     kind_->showValue(static_cast<std::int64_t>(snippet_->contentType()));
     case_->showValue(static_cast<std::int64_t>(snippet_->caseSensitivity()));
-    content_.setContent(snippet_->richTextContent().value_or(AttributedString()), snippet_->contentType());
+    content_.show(snippet_);
     showConflict();
     showDates();
     isSetting_ = false;

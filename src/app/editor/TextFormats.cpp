@@ -109,6 +109,17 @@ void showIndents(const ParagraphStyle& style, QTextBlockFormat& format) {
     if (!tabs.isEmpty()) format.setTabPositions(tabs);
 }
 
+// Lists of programs that leave the indents to who shows them.
+void showItem(const ParagraphStyle& style, QTextBlockFormat& format) {
+    if (style.textLists.empty() || style.headIndent != 0 || !style.tabStops.empty()) return;
+    constexpr double Marker = 11;
+    constexpr double Text = 36;
+    constexpr std::size_t DeepestLevel = 9;
+    format.setLeftMargin(dotsOf(Text * static_cast<double>(std::min(style.textLists.size(), DeepestLevel))));
+    format.setTextIndent(-dotsOf(Text));
+    format.setTabPositions({{dotsOf(Marker - Text), QTextOption::LeftTab}, {0, QTextOption::LeftTab}});
+}
+
 void showSpacing(const ParagraphStyle& style, QTextBlockFormat& format) {
     constexpr double Percent = 100;
     const double above = within(style.paragraphSpacingBefore, 0, LargestDistance);
@@ -155,6 +166,7 @@ QTextBlockFormat blockFormatOf(const std::optional<ParagraphStyle>& style) {
     if (!style) return format;
     if (const Qt::Alignment alignment = alignmentOf(style->alignment)) format.setAlignment(alignment);
     showIndents(*style, format);
+    showItem(*style, format);
     showSpacing(*style, format);
     format.setProperty(TextProperty::Style, QVariant::fromValue(std::make_shared<const ParagraphStyle>(*style)));
     return format;

@@ -8,9 +8,9 @@ namespace plume {
 TimeForm::TimeForm(ChipFormServices services, std::shared_ptr<SnippetTimeVariable> variable)
     : DateTimeForm(tr("Time"), std::move(services), variable, DateTextKind::TimeOnly) {
     addFormatRows();
-    rows().addRow(tr("Added:"), makeRow({makeOffset(variable->hour, tr("hours"), tr("Hours added")),
-                                         makeOffset(variable->minute, tr("minutes"), tr("Minutes added")),
-                                         makeOffset(variable->second, tr("seconds"), tr("Seconds added"))}));
+    rows().addRow(tr("Added:"), makeRow({makeOffset(variable->hour, tr("Hours:"), tr("Hours added")),
+                                         makeOffset(variable->minute, tr("Minutes:"), tr("Minutes added")),
+                                         makeOffset(variable->second, tr("Seconds:"), tr("Seconds added"))}));
     addLocaleRow();
     addOptionalRow();
 }

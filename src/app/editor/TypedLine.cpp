@@ -43,6 +43,7 @@ void TypedLine::finish() {
 void TypedLine::focusOutEvent(QFocusEvent* event) {
     finish();
     QLineEdit::focusOutEvent(event);
+    if (event->reason() != Qt::PopupFocusReason) Q_EMIT left();
 }
 
 }  // namespace plume

@@ -20,6 +20,8 @@ class TypedLine final : public QLineEdit {
     void finish();
 
     Q_SIGNAL void edited(const std::u16string& text);
+    // After what was typed has been told; not when only a menu of its own opens.
+    Q_SIGNAL void left();
 
   protected:
     void focusOutEvent(QFocusEvent* event) override;

@@ -74,12 +74,12 @@ constexpr Use DateUses[] = {
     {u"date:yyyy day:1", "Pattern", "EEEE d:M", u"date:\"EEEE d:M\" day:1"},
     {u"date:short day:1 locale:de_DE", "Day:", "next", u"date:short valueType:1 weekday:0 locale:de_DE"},
     {u"date:short valueType:1 weekday:3", "Day:", "last", u"date:short valueType:2 weekday:3"},
-    {u"date:short valueType:1 weekday:3", "Day:", "Today", u"date:short"},
+    {u"date:short valueType:1 weekday:3", "Day:", "From today", u"date:short"},
     {u"date:short month:2 day:3", "Years added", "-1", u"date:short year:-1 month:2 day:3"},
     {u"date:short year:1 day:3", "Months added", "14", u"date:short year:1 month:14 day:3"},
     {u"date:short year:1 month:2 day:3", "Days added", "0", u"date:short year:1 month:2"},
     {u"date:short valueType:2 weekday:3 x:y", "Weekday:", "Saturday", u"date:short valueType:2 weekday:6 x:y"},
-    {u"date:short day:1", "Language:", "français (France)", u"date:short day:1 locale:fr_FR"},
+    {u"date:short day:1", "Language:", "French (France)", u"date:short day:1 locale:fr_FR"},
     {u"date:short locale:fr_FR", "Language:", "xx_YY@a=b", u"date:short locale:xx_YY@a=b"},
     {u"date:short day:1", "Can be left out when the form is filled in", "", u"date:short day:1 optional:0"},
     {u"date:short optional:0", "Is ticked at first", "", u"date:short optional:1"},
@@ -88,7 +88,7 @@ constexpr Use DateUses[] = {
     {u"time:short minute:2", "Hours added", "-3", u"time:short hour:-3 minute:2"},
     {u"time:short hour:1", "Minutes added", "90", u"time:short hour:1 minute:90"},
     {u"time:short hour:1", "Seconds added", "7", u"time:short hour:1 second:7"},
-    {u"time:short hour:1", "Language:", "Deutsch (Deutschland)", u"time:short hour:1 locale:de_DE"},
+    {u"time:short hour:1", "Language:", "German (Germany)", u"time:short hour:1 locale:de_DE"},
     {u"time:short", "Can be left out when the form is filled in", "", u"time:short optional:0"},
 };
 INSTANTIATE_TEST_SUITE_P(Dates, ChipControlTest, ::testing::ValuesIn(DateUses));
@@ -104,9 +104,9 @@ constexpr Use FieldUses[] = {
     {u"field:A type:2 value:a defaultIndex:0 x:y", "Choices, one a line:", "a\nb c",
      u"field:A type:2 width:0 value:\"a\nb c\" x:y"},
     {u"field:A type:2 value:a\nb\nc", "Chosen at first:", "c", u"field:A type:2 width:2 value:a\nb\nc defaultIndex:2"},
-    {u"field:A type:1 height:3", "Width:", "40", u"field:A type:1 width:40 height:3"},
-    {u"field:A type:1 width:40", "Height:", "7", u"field:A type:1 width:40 height:7"},
-    {u"field:A type:1 width:40 height:3", "Width:", "0", u"field:A type:1 height:3"},
+    {u"field:A type:1 height:3", "Width in letters:", "40", u"field:A type:1 width:40 height:3"},
+    {u"field:A type:1 width:40", "Height in lines:", "7", u"field:A type:1 width:40 height:7"},
+    {u"field:A type:1 width:40 height:3", "Width in letters:", "0", u"field:A type:1 height:3"},
     {u"field:A width:40", "Cannot be edited in the form", "", u"field:A readonly width:40"},
     {u"field:A readonly", "Can be left out when the form is filled in", "", u"field:A optional:0 readonly"},
     {u"field:A optional:1 readonly", "Is ticked at first", "", u"field:A optional:0 readonly"},
@@ -127,9 +127,9 @@ constexpr Use OtherUses[] = {
     {u"key:↩ code:36 modifiers:1966080", "Ctrl", "", u"key:↩ code:36 modifiers:1703936"},
     {u"key:↩ code:36", "Alt", "", u"key:↩ code:36 modifiers:524288"},
     {u"key:↩ code:36", "Super", "", u"key:↩ code:36 modifiers:1048576"},
-    {u"key:odd code:36 delay:2", "Pressed:", "12", u"key:odd code:36 count:12 delay:2"},
+    {u"key:odd code:36 delay:2", "Times pressed:", "12", u"key:odd code:36 count:12 delay:2"},
     {u"key:odd code:36 count:2", "Waits before:", "1.25", u"key:odd code:36 count:2 delay:1.25"},
-    {u"▶", "Pressed:", "2", u"key:▶ code:124 count:2"},
+    {u"▶", "Times pressed:", "2", u"key:▶ code:124 count:2"},
     {u"snippet:s uuid:x", "Can be left out when the form is filled in", "", u"snippet:s uuid:x optional:0"},
 };
 INSTANTIATE_TEST_SUITE_P(Others, ChipControlTest, ::testing::ValuesIn(OtherUses));
@@ -144,13 +144,13 @@ TEST_F(ChipFormTest, ShowsWhatItGivesWhileOneTypes) {
         {u"date:short", "Days added", "1", "Gives: 3/10/26"},
         {u"date:yyyy", "Pattern", "EEEE", "Gives: Monday"},
         {u"date:yyyy", "Pattern", "bogus", "letters without a meaning"},
-        {u"date:full", "Language:", "français (France)", "Gives: lundi 9 mars 2026"},
+        {u"date:full", "Language:", "French (France)", "Gives: lundi 9 mars 2026"},
         {u"time:HH", "Minutes added", "60", "Gives: 15"},
         {u"clipboard find:a", "Replace with:", "x", "Gives: x xb bx"},
         {u"clipboard find:a flags:1", "Find:", "(", "no valid pattern"},
         {u"field:A type:2 value:a\nb", "Chosen at first:", "b", "Gives at first: b"},
         {u"field:A type:2 value:a", "Choices, one a line:", "", "is not shown"},
-        {u"key:↩ code:36", "Pressed:", "3", "Presses Return, 3 times"},
+        {u"key:↩ code:36", "Times pressed:", "3", "Presses Return, 3 times"},
     };
     for (const auto& each : cases) {
         open(each.body);
@@ -259,10 +259,11 @@ TEST_F(ChipFormTest, ASnippetIsChosenByItsIdentity) {
     EXPECT_EQ(world.done, u"snippet:sig uuid:" + second->uuid()->toString() + u" x:y");
 
     // Shown as chosen when it is opened again; another search changes nothing.
-    open(*world.done);
+    const std::u16string accepted = *world.done;
+    open(accepted);
     EXPECT_EQ(find<QListView>(*form, QStringLiteral("Snippets")).currentIndex().row(), 1);
     QTest::keyClicks(&find<QLineEdit>(*form, QStringLiteral("Search:")), QStringLiteral("jo"));
-    EXPECT_EQ(form->body(), *world.done);
+    EXPECT_EQ(form->body(), accepted);
 }
 
 TEST_F(ChipFormTest, Pictures) {
@@ -283,9 +284,9 @@ TEST_F(ChipFormTest, Pictures) {
     for (const auto& each : cases) {
         open(each.body);
         // Nothing is cut: every control has the room that it asks for.
-        for (const QWidget* control : form->findChildren<QWidget*>()) {
-            const bool isShown = control->isVisible() && qobject_cast<QAbstractButton*>(control);
-            if (isShown) EXPECT_GE(control->width(), control->minimumSizeHint().width()) << each.name;
+        for (const QAbstractButton* button : form->findChildren<QAbstractButton*>()) {
+            if (!button->isVisible()) continue;
+            EXPECT_GE(button->width(), button->minimumSizeHint().width()) << each.name;
         }
         takePicture(*form, QString::fromUtf8(each.name));
     }

@@ -51,7 +51,7 @@ TEST_F(InsertMenuTest, FindsByWordsAndByAbbreviation) {
         {"paste", "Clipboard, Clipboard", "clipboard"},
         {"cursor", "Caret, Caret", "|"},
         {"escape", "Escape, ⎋, Key", "key:⎋ code:53"},
-        {"seconds", "Time with seconds, 2:05:06 PM, Time", "time:medium"},
+        {"seconds", "Time with seconds, 2:05:06\u202FPM, Time", "time:medium"},
     };
     for (const auto& each : cases) {
         open();
@@ -66,7 +66,7 @@ TEST_F(InsertMenuTest, FindsByWordsAndByAbbreviation) {
     for (const char* typed : {"sig", "SIGNATURE", "doe jo"}) {
         open();
         type(typed);
-        EXPECT_EQ(first(), "sig, Signature, Jo Doe…, Mail");
+        EXPECT_EQ(first(), "sig, Signature, Jo Doe\u2009…, Mail");
         QTest::keyClick(&query(), Qt::Key_Enter, Qt::KeypadModifier);
         EXPECT_EQ(chosen.back(), "snippet:sig uuid:" + toUtf8(sig.uuid()->toString()));
     }
@@ -158,7 +158,7 @@ TEST_F(InsertMenuTest, TenThousandSnippetsCauseNoDelay) {
     QElapsedTimer time;
     time.start();
     open();
-    std::int64_t slowest = 0;
+    qint64 slowest = 0;
     const auto opened = time.elapsed();
     for (const QChar letter : QStringLiteral("abbr9876")) {
         time.restart();
