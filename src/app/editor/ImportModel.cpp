@@ -13,6 +13,12 @@ namespace {
 // In the index of a snippet's row: the place of its group plus one.
 constexpr quintptr GroupRow = 0;
 
+// Of a group's row, and of that of one of its snippets.
+std::size_t groupOf(const QModelIndex& index) {
+    const bool isGroup = index.internalId() == GroupRow;
+    return isGroup ? static_cast<std::size_t>(index.row()) : static_cast<std::size_t>(index.internalId()) - 1;
+}
+
 QString nameOf(const SnippetGroup& group) {
     return toQString(group.name().value_or(u""));
 }
@@ -88,7 +94,7 @@ QVariant ImportModel::headerData(int section, Qt::Orientation orientation, int r
 QVariant ImportModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid()) return {};
     const bool isGroup = index.internalId() == GroupRow;
-    const std::size_t group = isGroup ? static_cast<std::size_t>(index.row()) : index.internalId() - 1;
+    const std::size_t group = groupOf(index);
     if (isGroup && role == Qt::CheckStateRole && index.column() == NameColumn) {
         return rows_[group].isChosen ? Qt::Checked : Qt::Unchecked;
     }
@@ -139,7 +145,7 @@ QString ImportModel::snippetRemark(std::size_t group, const Snippet& snippet) co
 
 bool ImportModel::setData(const QModelIndex& index, const QVariant& value, int role) {
     if (role != Qt::CheckStateRole || !index.isValid() || index.internalId() != GroupRow) return false;
-    rows_[static_cast<std::size_t>(index.row())].isChosen = value.toInt() == Qt::Checked;
+    rows_[groupOf(index)].isChosen = value.toInt() == Qt::Checked;
     Q_EMIT dataChanged(index.siblingAtColumn(0), index.siblingAtColumn(ColumnCount - 1));
     const QModelIndex group = index.siblingAtColumn(0);
     const int snippets = rowCount(group);
@@ -155,7 +161,7 @@ Qt::ItemFlags ImportModel::flags(const QModelIndex& index) const {
         return index.column() == NameColumn ? usual | Qt::ItemIsUserCheckable : usual;
     }
     const Qt::ItemFlags leaf = Qt::ItemIsSelectable | Qt::ItemNeverHasChildren;
-    return rows_[index.internalId() - 1].isChosen ? leaf | Qt::ItemIsEnabled : leaf;
+    return rows_[groupOf(index)].isChosen ? leaf | Qt::ItemIsEnabled : leaf;
 }
 
 }  // namespace plume

@@ -93,10 +93,11 @@ Result<void> writeGroups(const SnippetGroups& groups, const std::filesystem::pat
 }  // namespace
 
 LibraryExportWindow* exportLibrary(QWidget* parent, DataManager& manager, Files& files) {
-    const auto write = [&manager, &files](const std::filesystem::path& path) {
-        // Backups have no such form.
-        const bool isRtf = extensionOf(path.filename().string()) == "rtf";
-        return isRtf ? writeGroups(manager.snippetGroups(), path, manager, files) : manager.backupToFile(path);
+    const auto write = [&manager, &files](const std::filesystem::path& path) -> Result<void> {
+        // With the identities that belong to a library.
+        const bool isArchive = extensionOf(path.filename().string()) == "plume";
+        if (isArchive) return files.write(path, manager.archivedDataIncludingPreferences(false));
+        return writeGroups(manager.snippetGroups(), path, manager, files);
     };
     return opened(new LibraryExportWindow(parent, LibraryExportWindow::tr("Export All Snippets"),
                                           LibraryExportWindow::tr("My Snippets"), write));
