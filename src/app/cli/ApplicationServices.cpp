@@ -185,6 +185,8 @@ EditorServices ApplicationServices::editor() {
             .scripts = scripts(),
             .programs = programs(),
             .inputSources = {},
+            .inBackground = [this](std::function<void()> work,
+                                   std::function<void()> done) { trials_.begin(std::move(work), std::move(done)); },
             .setExpandsInOwnWindows = [&expansion](bool expands) { expansion.setExpandsInOwnWindows(expands); },
             .showPreferences = [&delegate] { delegate.showPreferencesWindow(); },
             .quit = [&delegate] { delegate.terminate(); }};

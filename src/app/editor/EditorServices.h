@@ -32,6 +32,8 @@ struct EditorServices {
     ProgramServices programs;
     // The keyboard layouts that the desktop has, with their names.
     std::function<std::vector<std::pair<std::u16string, QString>>()> inputSources;
+    // See ImportWindow.
+    std::function<void(std::function<void()> work, std::function<void()> done)> inBackground;
     // See PreviewPane.
     std::function<void(bool expands)> setExpandsInOwnWindows;
     std::function<void()> showPreferences;

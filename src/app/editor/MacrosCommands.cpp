@@ -3,6 +3,8 @@
 #include <QActionGroup>
 #include <QApplication>
 #include <QClipboard>
+#include <QFile>
+#include <QFileDialog>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMimeData>
@@ -12,11 +14,13 @@
 
 #include "app/editing/CopiedRows.h"
 #include "app/editing/RowsAsText.h"
-#include "app/editor/ContentPane.h"
+#include "app/editor/ImportWindow.h"
+#include "app/editor/LibraryExportWindow.h"
 #include "app/editor/MacrosWindowController.h"
 #include "app/editor/OutlinePane.h"
 #include "app/editor/OutlineView.h"
 #include "app/qt/Messages.h"
+#include "app/qt/Sentences.h"
 #include "app/qt/Text.h"
 
 namespace plume {
@@ -42,6 +46,9 @@ void MacrosWindowController::fillFileMenu(QMenu& menu) {
     menus_.add(menu, tr("&New Snippet"), QKeySequence::New, [this] { newSnippet(); });
     menus_.add(menu, tr("New Snippet from Cl&ipboard"), {}, [this] { newSnippetFromClipboard(); });
     menus_.add(menu, tr("New &Group"), QKeySequence(Qt::CTRL | Qt::SHIFT | Qt::Key_N), [this] { newGroup(); });
+    menu.addSeparator();
+    menus_.add(menu, tr("&Import…"), {}, [this] { askForImport(); });
+    fillExportMenu(*menu.addMenu(tr("&Export")));
     menu.addSeparator();
     menus_.add(menu, tr("&Preferences…"), QKeySequence(Qt::CTRL | Qt::Key_Comma), services_.showPreferences);
     menus_.add(menu, tr("&Close"), QKeySequence(Qt::CTRL | Qt::Key_W), [this] { close(); });
@@ -95,6 +102,7 @@ void MacrosWindowController::fillArrangeMenu(QMenu& menu) {
         editor_.sortGroups();
     });
     menu.addSeparator();
+    addComingWithPlume(*menu.addMenu(tr("&Add")));
     menus_.add(menu, tr("&Delete Duplicated Snippets…"), {}, [this] { deleteDuplicatedSnippets(); });
 }
 
@@ -112,6 +120,81 @@ void MacrosWindowController::addSortCommands(QMenu& menu) {
         action->setChecked(static_cast<SortBy>(i) == editor_.sortBy());
         orders->addAction(action);
     }
+}
+
+void MacrosWindowController::addComingWithPlume(QMenu& menu) {
+    for (const std::string& name : BuiltInGroups::groupNames()) {
+        menus_.add(menu, QString::fromStdString(name), {}, [this, name] {
+            commitEdits();
+            showAdded(builtIn_.addBuiltInGroup(name));
+        });
+    }
+    menu.addSeparator();
+    for (const std::string& language : BuiltInGroups::dictionaryLanguages()) {
+        menus_.add(menu, tr("AutoCorrect Dictionary (%1)").arg(QString::fromStdString(language)), {}, [this, language] {
+            commitEdits();
+            showAdded(builtIn_.addAutoCorrectDictionary(language));
+        });
+    }
+}
+
+void MacrosWindowController::fillExportMenu(QMenu& menu) {
+    menus_.add(
+        menu, tr("&Selection…"), {},
+        [this] {
+            commitEdits();
+            exportSelection(this, services_.dataManager, services_.files, selection());
+        },
+        [this] { return !selection().isEmpty(); });
+    menus_.add(
+        menu, tr("&Group…"), {},
+        [this] {
+            commitEdits();
+            exportGroup(this, services_.dataManager, services_.files, outline_->view().currentGroup());
+        },
+        [this] { return outline_->view().currentGroup() != nullptr; });
+    menus_.add(menu, tr("&All Groups…"), {}, [this] {
+        commitEdits();
+        exportLibrary(this, services_.dataManager, services_.files);
+    });
+}
+
+// ---- Files ----
+
+void MacrosWindowController::askForImport() {
+    auto* panel = new QFileDialog(this, tr("Import"));
+    panel->setAttribute(Qt::WA_DeleteOnClose);
+    panel->setFileMode(QFileDialog::ExistingFile);
+    connect(panel, &QFileDialog::fileSelected, this,
+            [this](const QString& path) { importFile(QFile::encodeName(path).toStdString()); });
+    panel->open();
+}
+
+void MacrosWindowController::importFile(const std::filesystem::path& path) {
+    commitEdits();
+    ImportWindow::Services services{.files = services_.files,
+                                    .settings = services_.settings,
+                                    .library = [this]() -> const SnippetGroups& { return editor_.groups(); },
+                                    .import = [this](const ImportedLibrary& chosen) { importChosen(chosen); },
+                                    .inBackground = services_.inBackground};
+    (new ImportWindow(this, std::move(services), path))->open();
+}
+
+void MacrosWindowController::importChosen(const ImportedLibrary& chosen) {
+    commitEdits();
+    outline_->clearFilter();
+    editor_.import(chosen);
+    select({.groups = chosen.groups, .snippets = {}});
+}
+
+void MacrosWindowController::showAdded(const BuiltInGroups::Added& added) {
+    if (!added) {
+        tell(this, tr("Nothing was added."), inUsersLanguage(added.error().message));
+        return;
+    }
+    outline_->clearFilter();
+    select({.groups = {added.value()}, .snippets = {}});
+    outline_->view().expand(outline_->view().currentIndex());
 }
 
 // ---- The library ----

@@ -6,6 +6,9 @@
 #include <QSplitter>
 #include <QStackedWidget>
 #include <QVBoxLayout>
+#include <algorithm>
+#include <iterator>
+#include <unordered_set>
 #include <utility>
 
 #include "app/editor/ContentPane.h"
@@ -42,12 +45,24 @@ std::shared_ptr<Snippet> living(const Snippet& snippet, const SnippetGroups& gro
     return nullptr;
 }
 
+// What lies between them stands in the list before and afterwards.
+template <typename Record>
+void addThoseThatCameOrWent(const LibraryChange::ListStep<Record>& step, std::vector<std::shared_ptr<Record>>& rows) {
+    const auto addMissing = [&rows](const auto& from, const auto& in) {
+        const std::unordered_set<std::shared_ptr<Record>> known(in.begin(), in.end());
+        std::ranges::copy_if(from, std::back_inserter(rows), [&](const auto& each) { return !known.contains(each); });
+    };
+    addMissing(step.removed, step.added);
+    addMissing(step.added, step.removed);
+}
+
 }  // namespace
 
 MacrosWindowController::MacrosWindowController(EditorServices services)
     : services_(std::move(services)),
       editor_(services_.dataManager, [this](const LibraryChange& change) { changed(change); }),
       undo_(editor_),
+      builtIn_(editor_, services_.files, services_.resources),
       menus_(this),
       outline_(new OutlinePane(editor_, services_.settings)),
       pages_(new QStackedWidget),
@@ -222,15 +237,9 @@ void MacrosWindowController::undone(const LibraryChange& change) {
     LibrarySelection rows;
     for (const auto& step : change.snippets) rows.snippets.push_back(step.record);
     for (const auto& step : change.groups) rows.groups.push_back(step.record);
-    for (const auto& step : change.items) {
-        for (const auto* side : {&step.items.removed, &step.items.added}) {
-            rows.snippets.insert(rows.snippets.end(), side->begin(), side->end());
-        }
-    }
-    for (const auto* side : {&change.groupList.removed, &change.groupList.added}) {
-        rows.groups.insert(rows.groups.end(), side->begin(), side->end());
-    }
-    if (!isOrder) select(rows);
+    for (const auto& step : change.items) addThoseThatCameOrWent(step.items, rows.snippets);
+    addThoseThatCameOrWent(change.groupList, rows.groups);
+    if (!isOrder && !rows.isEmpty()) select(rows);
     snippet_->refresh();
     group_->refresh();
     preview_->showSoon();

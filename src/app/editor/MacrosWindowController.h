@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "Foundation/Subscription.h"
+#include "app/editing/BuiltInGroups.h"
 #include "app/editor/EditorMenus.h"
 #include "app/editor/EditorServices.h"
 #include "app/editor/LibraryUndo.h"
@@ -49,6 +50,8 @@ class MacrosWindowController final : public QMainWindow {
     void fillEditMenu(QMenu& menu);
     void fillArrangeMenu(QMenu& menu);
     void addSortCommands(QMenu& menu);
+    void addComingWithPlume(QMenu& menu);
+    void fillExportMenu(QMenu& menu);
     void observeLibrary();
 
     // ---- What is selected ----
@@ -79,6 +82,12 @@ class MacrosWindowController final : public QMainWindow {
     void drop(const LibrarySelection& rows, const std::shared_ptr<SnippetGroup>& group, std::size_t at, bool isCopy);
     void dropText(const QString& text, const std::shared_ptr<SnippetGroup>& group, std::size_t at);
 
+    // ---- Files ----
+    void askForImport();
+    void importFile(const std::filesystem::path& path);
+    void importChosen(const ImportedLibrary& chosen);
+    void showAdded(const BuiltInGroups::Added& added);
+
     // ---- The clipboard ----
     bool listHasKeyboard() const;
     // Does it in the field that has the keyboard.
@@ -97,6 +106,7 @@ class MacrosWindowController final : public QMainWindow {
     const EditorServices services_;
     LibraryEditor editor_;
     LibraryUndo undo_;
+    BuiltInGroups builtIn_;
     EditorMenus menus_;
     OutlinePane* outline_;
     QStackedWidget* pages_;
