@@ -185,6 +185,7 @@ void ContentEdit::replaceActivatedChip(const std::u16string& body) {
     insertBody(cursor, body);
     activated_ = selecting(position, position + 1);
     setTextCursor(activated_);
+    activated_.setKeepPositionOnInsert(true);
 }
 
 void ContentEdit::insertShown(const AttributedString& content) {
@@ -281,6 +282,7 @@ void ContentEdit::markerTyped() {
     const bool isNew = opening_.selectionEnd() != cursor.position() || !opening_.hasSelection();
     if (typed == OpeningMarker && isNew) {
         opening_ = selecting(cursor.position() - 1, cursor.position());
+        opening_.setKeepPositionOnInsert(true);
         Q_EMIT openingTyped();
     } else if (typed == ClosingMarker && !showsSource_) {
         closingTyped(cursor);
@@ -344,6 +346,7 @@ std::optional<int> ContentEdit::chipUnder(QPoint place) const {
 void ContentEdit::activateChip(int position) {
     activated_ = selecting(position, position + 1);
     setTextCursor(activated_);
+    activated_.setKeepPositionOnInsert(true);
     Q_EMIT chipActivated(bodyOf(formatAt(position)));
 }
 

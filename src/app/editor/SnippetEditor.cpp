@@ -9,6 +9,7 @@
 #include <QPlainTextEdit>
 #include <QTextDocument>
 #include <QVBoxLayout>
+#include <utility>
 
 #include "app/FirstLine.h"
 #include "app/editing/AbbreviationConflict.h"
@@ -172,14 +173,15 @@ void SnippetEditor::edited() {
     const auto now = std::chrono::steady_clock::now();
     if (!beforeTyping_ || now - lastTyped_ > EditLasts) beforeTyping_ = snippet_->snapshot();
     lastTyped_ = now;
+    isTyped_ = true;
     // Not put off by further letters.
     if (!commitTimer_.isActive()) commitTimer_.start();
     Q_EMIT typed();
 }
 
 void SnippetEditor::commit() {
-    if (!commitTimer_.isActive() || !snippet_) return;
     commitTimer_.stop();
+    if (!std::exchange(isTyped_, false) || !snippet_) return;
     editor_.setSnippetAbbreviation(snippet_, fromQString(abbreviation_->text()));
     editor_.setLabel(snippet_, textOrNil(label_->text()));
     editor_.setNote(snippet_, textOrNil(textOf(*note_)));
@@ -191,7 +193,7 @@ void SnippetEditor::commit() {
 // The record with what the library does not know yet.
 std::shared_ptr<Snippet> SnippetEditor::shownRecord() const {
     auto record = snippet_->snapshot();
-    if (!commitTimer_.isActive()) return record;
+    if (!isTyped_) return record;
     const std::u16string abbreviation = fromQString(abbreviation_->text());
     const AttributedString content = content_.content();
     if (record->abbreviation().value_or(u"") != abbreviation) record->setAbbreviation(abbreviation);
@@ -207,6 +209,7 @@ std::optional<SnippetEditor::OpenEdit> SnippetEditor::takeOpenEdit() {
     const bool isOpen = beforeTyping_ && std::chrono::steady_clock::now() - lastTyped_ <= EditLasts;
     if (isOpen && snippet_) edit = OpenEdit{beforeTyping_, shownRecord()};
     commitTimer_.stop();
+    isTyped_ = false;
     snippet_ = nullptr;
     return edit;
 }

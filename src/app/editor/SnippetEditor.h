@@ -70,6 +70,7 @@ class SnippetEditor final : public QWidget {
     std::shared_ptr<const Snippet> beforeTyping_;  // null: nothing was typed since it is shown
     std::chrono::steady_clock::time_point lastTyped_;
     QTimer commitTimer_;
+    bool isTyped_ = false;  // what the library does not know yet
     bool isSetting_ = false;
     QLineEdit* abbreviation_;
     QLabel* conflict_;

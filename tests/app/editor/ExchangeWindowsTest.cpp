@@ -155,7 +155,7 @@ TEST_F(ImportWindowTest, PlaceholdersOfACsvFileAreConvertedWhenAsked) {
     auto& converts = find<QCheckBox>(*window, QStringLiteral("Convert the placeholders of TextExpander"));
     takePicture(*window, QStringLiteral("ImportPlaceholders"));
     EXPECT_THAT(rows().at(1), HasSubstr("d | %Y | "));
-    click(*window, QStringLiteral("Convert the placeholders of TextExpander"));
+    converts.click();
     EXPECT_TRUE(converts.isChecked());
     EXPECT_THAT(rows().at(1), HasSubstr("【date"));
     click(*window, QStringLiteral("Import 1 Group"));

@@ -227,7 +227,7 @@ TEST_F(MacrosWindowTest, RowsOfASpreadsheetBecomeSnippets) {
     choose("Paste");
     EXPECT_THAT(machine.library(), ElementsAre("Mail: a=1 x=first y=two\nlines"));
     choose("Copy");
-    EXPECT_EQ(QApplication::clipboard()->text(), QStringLiteral("x\tfirst\t\ny\t\"two\nlines\"\tLabel\n"));
+    EXPECT_EQ(QApplication::clipboard()->text(), QStringLiteral("x\tfirst\ny\t\"two\nlines\"\tLabel\n"));
     // In a field the same commands are the field's.
     window->edit(mail->items()[0]);
     content().setFocus();
