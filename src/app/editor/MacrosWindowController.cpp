@@ -94,7 +94,9 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
     observeLibrary();
     selectionWasChanged();
     const int em = fontMetrics().height();
-    resize(64 * em, 42 * em);
+    resize(70 * em, 46 * em);
+    columns_->setSizes({26 * em, 44 * em});
+    columns_->setStretchFactor(1, 1);
     rememberPlace(*this, services_.settings, "Macros");
     outline_->view().setFocus();
 }
@@ -137,8 +139,6 @@ void MacrosWindowController::makePanes() {
     layout->addWidget(pages_, 1);
     columns_->addWidget(outline_);
     columns_->addWidget(right);
-    columns_->setStretchFactor(0, 2);
-    columns_->setStretchFactor(1, 3);
     columns_->setChildrenCollapsible(false);
     setCentralWidget(columns_);
 }

@@ -95,7 +95,7 @@ void SnippetEditor::makeForm(QFormLayout& form) {
     note_->setMaximumHeight(3 * fontMetrics().lineSpacing());
     conflict_->setAccessibleName(tr("About the abbreviation"));
     // One line is kept free for it: nothing jumps while one types.
-    conflict_->setMinimumHeight(fontMetrics().lineSpacing());
+    conflict_->setMinimumSize(24 * fontMetrics().height(), fontMetrics().lineSpacing());
     form.setFieldGrowthPolicy(QFormLayout::AllNonFixedFieldsGrow);
     form.addRow(tr("&Abbreviation:"), abbreviation_);
     form.addRow(QString(), conflict_);
@@ -161,8 +161,10 @@ void SnippetEditor::showDates() {
     QStringList dates;
     if (snippet_->dateCreated()) dates.append(tr("Created %1").arg(dayOf(*snippet_->dateCreated())));
     if (snippet_->dateModified()) dates.append(tr("Changed %1").arg(dayOf(*snippet_->dateModified())));
-    dates.append(snippet_->lastTimeUsed() ? tr("Used last %1").arg(dayOf(*snippet_->lastTimeUsed()))
-                                          : tr("Not used yet"));
+    // A new one counts as used when it was made.
+    const auto& lastUse = snippet_->lastTimeUsed();
+    const bool isUsed = lastUse && (!snippet_->dateCreated() || *lastUse - *snippet_->dateCreated() > 1s);
+    dates.append(isUsed ? tr("Used last %1").arg(dayOf(*lastUse)) : tr("Not used yet"));
     dates_->setText(dates.join(QStringLiteral(" · ")));
 }
 

@@ -39,6 +39,7 @@ class SearchPage final : public PreferencesPage {
         addForgetButton();
         addHeading(tr("The snippets window looks in"));
         addFields("MainWindowSearchBy", {tr("A&bbreviations"), tr("C&ontents"), tr("Lab&els")});
+        addBit("WildcardSearch", 1, tr("Wildcards in the snippets w&indow"), {});
     }
 
   protected:
