@@ -27,10 +27,10 @@ namespace plume {
 namespace {
 
 // Heights of a line.
-constexpr int WindowWidth = 44;
+constexpr int WindowWidth = 48;
 constexpr int WindowHeight = 28;
-constexpr int NameWidth = 14;
-constexpr int RemarkWidth = 14;
+constexpr int NameWidth = 12;
+constexpr int RemarkWidth = 19;
 constexpr int RemarksHeight = 6;
 
 }  // namespace
@@ -159,8 +159,6 @@ void ImportWindow::showFailure(const QString& heading, const QString& reason) {
     importButton_->hide();
     cancelButton_->setText(tr("Close"));
     cancelButton_->setFocus();
-    const int width = WindowWidth * fontMetrics().height();
-    resize(width, layout()->totalHeightForWidth(width));
 }
 
 // ---- What is in it ----

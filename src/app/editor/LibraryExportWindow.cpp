@@ -1,6 +1,5 @@
 #include "app/editor/LibraryExportWindow.h"
 
-#include <QFileInfo>
 #include <algorithm>
 #include <utility>
 
@@ -28,11 +27,6 @@ QString endingOf(qsizetype filter) {
     const auto& endings = exportableExtensions();
     const auto at = static_cast<std::size_t>(std::max<qsizetype>(0, filter));
     return QString::fromStdString(endings.at(std::min(at, endings.size() - 1)));
-}
-
-bool isEnding(const QString& text) {
-    const auto& endings = exportableExtensions();
-    return std::find(endings.begin(), endings.end(), text.toLower().toStdString()) != endings.end();
 }
 
 // A name without what no name of a file can hold.
@@ -64,13 +58,9 @@ LibraryExportWindow::LibraryExportWindow(QWidget* parent, const QString& title, 
     connect(this, &QFileDialog::fileSelected, this, &LibraryExportWindow::exportTo);
 }
 
+// For names without an ending; one that is there the panel changes itself.
 void LibraryExportWindow::takeEnding(const QString& filter) {
-    const QString ending = endingOf(nameFilters().indexOf(filter));
-    setDefaultSuffix(ending);
-    const QStringList files = selectedFiles();
-    if (files.isEmpty()) return;
-    const QFileInfo file(files.front());
-    if (isEnding(file.suffix())) selectFile(file.completeBaseName() + QLatin1Char('.') + ending);
+    setDefaultSuffix(endingOf(nameFilters().indexOf(filter)));
 }
 
 void LibraryExportWindow::exportTo(const QString& path) {
