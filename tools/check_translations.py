@@ -17,7 +17,7 @@ import xml.etree.ElementTree as ElementTree
 Message = collections.namedtuple("Message", "context source comment counts forms finished")
 
 # Whose texts stand in more than one window or menu. Their tests see to the mnemonics.
-SEVERAL_WINDOWS = {"plume::PreferencesWindow", "plume::StatusMenu"}
+SEVERAL_WINDOWS = {"plume::ImportWindow", "plume::MacrosWindowController", "plume::PreferencesWindow", "plume::StatusMenu"}
 
 PLACEHOLDERS = re.compile(r"%(?:\d|n|@)|\(\*[^)]*\)")
 MNEMONIC = re.compile(r"&([^&\s])")

@@ -286,6 +286,192 @@
     </message>
 </context>
 <context>
+    <name>CaseReset</name>
+    <message>
+        <source>Typed exactly as it is written</source>
+        <translation>Genau wie geschrieben getippt</translation>
+    </message>
+    <message>
+        <source>Typed in capitals or not</source>
+        <translation>Groß oder klein getippt</translation>
+    </message>
+    <message>
+        <source>Typed in capitals or not, and the text adapts</source>
+        <translation>Groß oder klein getippt, und der Text passt sich an</translation>
+    </message>
+    <message>
+        <source>Reset Case Sensitivity</source>
+        <translation>Groß-/Kleinschreibung zurücksetzen</translation>
+    </message>
+    <message>
+        <source>Case sensitivity of all snippets</source>
+        <translation>Groß-/Kleinschreibung aller Snippets</translation>
+    </message>
+    <message>
+        <source>Reset</source>
+        <translation>Zurücksetzen</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Abbrechen</translation>
+    </message>
+    <message>
+        <source>This will reset case sensitivity of all snippets in group to default setting.</source>
+        <translation>Dies setzt die Groß-/Kleinschreibung aller Snippets der Gruppe auf die Voreinstellung zurück.</translation>
+    </message>
+    <message>
+        <source>You can undo this action.</source>
+        <translation>Dies lässt sich rückgängig machen.</translation>
+    </message>
+</context>
+<context>
+    <name>ChipWords</name>
+    <message>
+        <source>today</source>
+        <translation>heute</translation>
+    </message>
+    <message>
+        <source>1 year</source>
+        <translation>1 Jahr</translation>
+    </message>
+    <message>
+        <source>%1 years</source>
+        <translation>%1 Jahre</translation>
+    </message>
+    <message>
+        <source>1 month</source>
+        <translation>1 Monat</translation>
+    </message>
+    <message>
+        <source>%1 months</source>
+        <translation>%1 Monate</translation>
+    </message>
+    <message>
+        <source>1 week</source>
+        <translation>1 Woche</translation>
+    </message>
+    <message>
+        <source>%1 weeks</source>
+        <translation>%1 Wochen</translation>
+    </message>
+    <message>
+        <source>1 day</source>
+        <translation>1 Tag</translation>
+    </message>
+    <message>
+        <source>%1 days</source>
+        <translation>%1 Tage</translation>
+    </message>
+    <message>
+        <source>now</source>
+        <translation>jetzt</translation>
+    </message>
+    <message>
+        <source>1 hour</source>
+        <translation>1 Stunde</translation>
+    </message>
+    <message>
+        <source>%1 hours</source>
+        <translation>%1 Stunden</translation>
+    </message>
+    <message>
+        <source>1 minute</source>
+        <translation>1 Minute</translation>
+    </message>
+    <message>
+        <source>%1 minutes</source>
+        <translation>%1 Minuten</translation>
+    </message>
+    <message>
+        <source>1 second</source>
+        <translation>1 Sekunde</translation>
+    </message>
+    <message>
+        <source>%1 seconds</source>
+        <translation>%1 Sekunden</translation>
+    </message>
+    <message>
+        <source>%1 (optional, ticked)</source>
+        <translation>%1 (optional, angekreuzt)</translation>
+    </message>
+    <message>
+        <source>%1 (optional)</source>
+        <translation>%1 (optional)</translation>
+    </message>
+    <message>
+        <source>Snippet</source>
+        <translation>Snippet</translation>
+    </message>
+    <message>
+        <source>Caret</source>
+        <translation>Schreibmarke</translation>
+    </message>
+    <message>
+        <source>next %1</source>
+        <translation>nächster %1</translation>
+    </message>
+    <message>
+        <source>previous %1</source>
+        <translation>voriger %1</translation>
+    </message>
+    <message>
+        <source>Date</source>
+        <translation>Datum</translation>
+    </message>
+    <message>
+        <source>Time</source>
+        <translation>Uhrzeit</translation>
+    </message>
+    <message>
+        <source>Clipboard</source>
+        <translation>Zwischenablage</translation>
+    </message>
+    <message>
+        <source>without %1</source>
+        <translation>ohne %1</translation>
+    </message>
+    <message>
+        <source>Text area</source>
+        <translation>Textbereich</translation>
+    </message>
+    <message>
+        <source>Menu</source>
+        <translation>Menü</translation>
+    </message>
+    <message>
+        <source>Number</source>
+        <translation>Zahl</translation>
+    </message>
+    <message>
+        <source>Field</source>
+        <translation>Feld</translation>
+    </message>
+    <message>
+        <source>Ctrl</source>
+        <translation>Strg</translation>
+    </message>
+    <message>
+        <source>Alt</source>
+        <translation>Alt</translation>
+    </message>
+    <message>
+        <source>Shift</source>
+        <translation>Umschalt</translation>
+    </message>
+    <message>
+        <source>Super</source>
+        <translation>Super</translation>
+    </message>
+    <message>
+        <source>Key</source>
+        <translation>Taste</translation>
+    </message>
+    <message>
+        <source>, after %1 s</source>
+        <translation>, nach %1 s</translation>
+    </message>
+</context>
+<context>
     <name>CorrectionPage</name>
     <message>
         <source>Sentences</source>
@@ -684,6 +870,147 @@
     </message>
 </context>
 <context>
+    <name>GroupEffect</name>
+    <message>
+        <source>%1 %2</source>
+        <translation>%1 %2</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: these snippets are only chosen from lists.</source>
+        <translation>Das Tippen von %1 bewirkt nichts: Diese Snippets werden nur aus Listen gewählt.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: the group is switched off in all programs.</source>
+        <translation>Das Tippen von %1 bewirkt nichts: Die Gruppe ist in allen Programmen ausgeschaltet.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: no program is chosen yet.</source>
+        <translation>Das Tippen von %1 bewirkt nichts: Noch ist kein Programm gewählt.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: no keyboard layout is chosen yet.</source>
+        <translation>Das Tippen von %1 bewirkt nichts: Noch ist keine Tastaturbelegung gewählt.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: no character is chosen to expand it.</source>
+        <translation>Das Tippen von %1 bewirkt nichts: Kein Zeichen zum Ersetzen ist gewählt.</translation>
+    </message>
+    <message>
+        <source>in %1 only: %2</source>
+        <translation>nur in %1: %2</translation>
+    </message>
+    <message>
+        <source>everywhere but in %1: %2</source>
+        <translation>überall außer in %1: %2</translation>
+    </message>
+    <message>
+        <source>Not with the keyboard layout %1.</source>
+        <translation>Nicht bei der Tastaturbelegung %1.</translation>
+    </message>
+    <message>
+        <source>Not with the keyboard layouts %1.</source>
+        <translation>Nicht bei den Tastaturbelegungen %1.</translation>
+    </message>
+    <message>
+        <source>Only with the keyboard layout %1.</source>
+        <translation>Nur bei der Tastaturbelegung %1.</translation>
+    </message>
+    <message>
+        <source>Only with the keyboard layouts %1.</source>
+        <translation>Nur bei den Tastaturbelegungen %1.</translation>
+    </message>
+    <message>
+        <source>%1, then %2.</source>
+        <translation>%1, dann %2.</translation>
+    </message>
+    <message>
+        <source>%1, then %2, which is left out.</source>
+        <translation>%1, dann %2; das Trennzeichen entfällt.</translation>
+    </message>
+    <message>
+        <source>%1, then press the hot key that expands.</source>
+        <translation>%1, dann das Tastenkürzel zum Ersetzen drücken.</translation>
+    </message>
+    <message>
+        <source>%1, and it expands at once.</source>
+        <translation>%1, und es wird sofort ersetzt.</translation>
+    </message>
+    <message>
+        <source>type %1</source>
+        <translation>das Kürzel %1 tippen</translation>
+    </message>
+    <message>
+        <source>type %1 behind a space or in a new line</source>
+        <translation>das Kürzel %1 hinter einem Leerzeichen oder in einer neuen Zeile tippen</translation>
+    </message>
+    <message>
+        <source>type %1, even inside a word</source>
+        <translation>das Kürzel %1 tippen, auch mitten im Wort</translation>
+    </message>
+    <message>
+        <source>type %1 right behind a number</source>
+        <translation>das Kürzel %1 direkt hinter einer Zahl tippen</translation>
+    </message>
+    <message>
+        <source>type %1 before anything else</source>
+        <translation>das Kürzel %1 vor allem anderen tippen</translation>
+    </message>
+    <message>
+        <source>type %1 behind %2</source>
+        <translation>erst %2, dann das Kürzel %1 tippen</translation>
+    </message>
+    <message>
+        <source>“%1”</source>
+        <translation>„%1“</translation>
+    </message>
+    <message>
+        <source>a space, Return or a punctuation mark</source>
+        <translation>ein Leerzeichen, die Eingabetaste oder ein Satzzeichen</translation>
+    </message>
+    <message>
+        <source>a space</source>
+        <translation>ein Leerzeichen</translation>
+    </message>
+    <message>
+        <source>Tab</source>
+        <translation>Tab</translation>
+    </message>
+    <message>
+        <source>Return</source>
+        <translation>die Eingabetaste</translation>
+    </message>
+    <message>
+        <source>Enter</source>
+        <translation>Enter</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n others</source>
+        <translation>
+            <numerusform>%n weiteren</numerusform>
+            <numerusform>%n weiteren</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>%1 and %2</source>
+        <translation>%1 und %2</translation>
+    </message>
+    <message>
+        <source>, </source>
+        <translation>, </translation>
+    </message>
+    <message numerus="yes">
+        <source>one of %n others</source>
+        <translation>
+            <numerusform>eines von %n weiteren</numerusform>
+            <numerusform>eines von %n weiteren</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>%1 or %2</source>
+        <translation>%1 oder %2</translation>
+    </message>
+</context>
+<context>
     <name>HotKeysPage</name>
     <message>
         <source>Switch expansion on and off</source>
@@ -783,6 +1110,93 @@
     <message>
         <source>All snippets go into one file, for another computer or another program.</source>
         <translation>Alle Snippets kommen in eine Datei, für einen anderen Computer oder ein anderes Programm.</translation>
+    </message>
+</context>
+<context>
+    <name>LibraryUndo</name>
+    <message>
+        <source>Change of Abbreviation</source>
+        <translation>Änderung des Kürzels</translation>
+    </message>
+    <message>
+        <source>Change of Label</source>
+        <translation>Änderung der Bezeichnung</translation>
+    </message>
+    <message>
+        <source>Change of Note</source>
+        <translation>Änderung der Notiz</translation>
+    </message>
+    <message>
+        <source>Change of Case</source>
+        <translation>Änderung der Schreibweise</translation>
+    </message>
+    <message>
+        <source>Change of Kind</source>
+        <translation>Änderung der Art</translation>
+    </message>
+    <message>
+        <source>Change of Content</source>
+        <translation>Änderung des Inhalts</translation>
+    </message>
+    <message>
+        <source>Change of Group Name</source>
+        <translation>Änderung des Gruppennamens</translation>
+    </message>
+    <message>
+        <source>Change of Group Settings</source>
+        <translation>Änderung der Gruppeneinstellungen</translation>
+    </message>
+    <message>
+        <source>New Snippets (%n)</source>
+        <translation>Neue Snippets (%n)</translation>
+    </message>
+    <message>
+        <source>New Groups (%n)</source>
+        <translation>Neue Gruppen (%n)</translation>
+    </message>
+    <message>
+        <source>Deletion (%n)</source>
+        <translation>Löschen (%n)</translation>
+    </message>
+    <message>
+        <source>Move (%n)</source>
+        <translation>Verschieben (%n)</translation>
+    </message>
+    <message>
+        <source>Copy (%n)</source>
+        <translation>Kopieren (%n)</translation>
+    </message>
+    <message>
+        <source>Duplication (%n)</source>
+        <translation>Duplizieren (%n)</translation>
+    </message>
+    <message>
+        <source>Deletion of Duplicates (%n)</source>
+        <translation>Löschen von Duplikaten (%n)</translation>
+    </message>
+    <message>
+        <source>Sorting</source>
+        <translation>Sortieren</translation>
+    </message>
+    <message>
+        <source>Sorting of Groups</source>
+        <translation>Sortieren der Gruppen</translation>
+    </message>
+    <message>
+        <source>Reset of Case (%n)</source>
+        <translation>Zurücksetzen der Schreibweise (%n)</translation>
+    </message>
+    <message>
+        <source>New Group</source>
+        <translation>Neue Gruppe</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Import</translation>
+    </message>
+    <message>
+        <source>Kept Edit</source>
+        <translation>Bewahrte Bearbeitung</translation>
     </message>
 </context>
 <context>
@@ -910,6 +1324,10 @@
     <message>
         <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held, and 0 picks the tenth.</source>
         <translation>In Vorschlägen und in der Schnellsuche wählen die Ziffern 1 bis 9 ein Snippet, solange diese Taste gedrückt ist, und 0 wählt das zehnte.</translation>
+    </message>
+    <message>
+        <source>Wildcards in the snippets w&amp;indow</source>
+        <translation>Platzhalter im Snippet-&amp;Fenster</translation>
     </message>
 </context>
 <context>
@@ -1323,6 +1741,371 @@
     </message>
 </context>
 <context>
+    <name>plume::ChipForm</name>
+    <message>
+        <source>What it gives</source>
+        <translation>Was es ergibt</translation>
+    </message>
+    <message>
+        <source>Warning</source>
+        <translation>Warnung</translation>
+    </message>
+    <message>
+        <source>&amp;Done</source>
+        <translation>&amp;Fertig</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>&amp;Abbrechen</translation>
+    </message>
+    <message>
+        <source>The sign %1 ends a placeholder and cannot stand in one.</source>
+        <translation>Das Zeichen %1 beendet einen Platzhalter und kann nicht darin stehen.</translation>
+    </message>
+    <message>
+        <source>⚠ %1</source>
+        <translation>⚠ %1</translation>
+    </message>
+    <message>
+        <source>Can be &amp;left out when the form is filled in</source>
+        <translation>Kann beim Ausfüllen wegge&amp;lassen werden</translation>
+    </message>
+    <message>
+        <source>Is &amp;ticked at first</source>
+        <translation>&amp;Zu Beginn angekreuzt</translation>
+    </message>
+    <message>
+        <source>Form:</source>
+        <translation>Formular:</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ChoiceBox</name>
+    <message>
+        <source>Other (%1)</source>
+        <translation>Andere (%1)</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ClipboardForm</name>
+    <message>
+        <source>Clipboard</source>
+        <translation>Zwischenablage</translation>
+    </message>
+    <message>
+        <source>&amp;Find:</source>
+        <translation>&amp;Suchen:</translation>
+    </message>
+    <message>
+        <source>&amp;Replace with:</source>
+        <translation>&amp;Ersetzen durch:</translation>
+    </message>
+    <message>
+        <source>Anywhere</source>
+        <translation>Überall</translation>
+    </message>
+    <message>
+        <source>At the start of words</source>
+        <translation>Am Wortanfang</translation>
+    </message>
+    <message>
+        <source>Whole words</source>
+        <translation>Ganze Wörter</translation>
+    </message>
+    <message>
+        <source>At the end of words</source>
+        <translation>Am Wortende</translation>
+    </message>
+    <message>
+        <source>Capitals and &amp;small letters differ</source>
+        <translation>&amp;Groß- und Kleinschreibung beachten</translation>
+    </message>
+    <message>
+        <source>Is a regular e&amp;xpression; $1 is its first group</source>
+        <translation>Ist ein &amp;regulärer Ausdruck; $1 ist seine erste Gruppe</translation>
+    </message>
+    <message>
+        <source>F&amp;ound:</source>
+        <translation>Gef&amp;unden:</translation>
+    </message>
+    <message>
+        <source>What is to be found is no valid pattern, or takes too long. The clipboard&apos;s text stays as it is.</source>
+        <translation>Das Gesuchte ist kein gültiges Muster oder dauert zu lange. Der Text der Zwischenablage bleibt, wie er ist.</translation>
+    </message>
+    <message>
+        <source>There is no text in the clipboard now.</source>
+        <translation>In der Zwischenablage ist gerade kein Text.</translation>
+    </message>
+    <message>
+        <source>Gives: %1</source>
+        <translation>Ergibt: %1</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ContentEdit</name>
+    <message>
+        <source>Ctrl+Tab types a tab.</source>
+        <translation>Strg+Tab tippt einen Tabulator.</translation>
+    </message>
+    <message>
+        <source>Cha&amp;nge…</source>
+        <translation>Ä&amp;ndern…</translation>
+    </message>
+    <message>
+        <source>Cu&amp;t</source>
+        <translation>A&amp;usschneiden</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Kopieren</translation>
+    </message>
+    <message>
+        <source>&amp;Paste</source>
+        <translation>&amp;Einfügen</translation>
+    </message>
+    <message>
+        <source>Paste Without &amp;Formatting</source>
+        <translation>Ohne &amp;Formatierung einfügen</translation>
+    </message>
+    <message>
+        <source>Select &amp;All</source>
+        <translation>&amp;Alles auswählen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ContentPane</name>
+    <message>
+        <source>&amp;Insert…</source>
+        <translation>&amp;Einfügen…</translation>
+    </message>
+    <message>
+        <source>Show So&amp;urce</source>
+        <translation>&amp;Quelltext zeigen</translation>
+    </message>
+    <message>
+        <source>Content</source>
+        <translation>Inhalt</translation>
+    </message>
+    <message>
+        <source>Script</source>
+        <translation>Skript</translation>
+    </message>
+    <message>
+        <source>Insert a date, a field, another snippet… (Ctrl+Space, or type 【)</source>
+        <translation>Datum, Feld, anderes Snippet… einfügen (Strg+Leertaste oder 【 tippen)</translation>
+    </message>
+    <message>
+        <source>Show placeholders as they are written (Ctrl+Shift+U)</source>
+        <translation>Platzhalter zeigen, wie sie geschrieben sind (Strg+Umschalt+U)</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DateForm</name>
+    <message>
+        <source>Date</source>
+        <translation>Datum</translation>
+    </message>
+    <message>
+        <source>From today</source>
+        <translation>Von heute an</translation>
+    </message>
+    <message>
+        <source>The next weekday of this name</source>
+        <translation>Der nächste Wochentag dieses Namens</translation>
+    </message>
+    <message>
+        <source>The last weekday of this name</source>
+        <translation>Der letzte Wochentag dieses Namens</translation>
+    </message>
+    <message>
+        <source>The last weekday of this name (%1)</source>
+        <translation>Der letzte Wochentag dieses Namens (%1)</translation>
+    </message>
+    <message>
+        <source>Years:</source>
+        <translation>Jahre:</translation>
+    </message>
+    <message>
+        <source>Years added</source>
+        <translation>Addierte Jahre</translation>
+    </message>
+    <message>
+        <source>Months:</source>
+        <translation>Monate:</translation>
+    </message>
+    <message>
+        <source>Months added</source>
+        <translation>Addierte Monate</translation>
+    </message>
+    <message>
+        <source>Days:</source>
+        <translation>Tage:</translation>
+    </message>
+    <message>
+        <source>Days added</source>
+        <translation>Addierte Tage</translation>
+    </message>
+    <message>
+        <source>Weekday %1</source>
+        <translation>Wochentag %1</translation>
+    </message>
+    <message>
+        <source>D&amp;ay:</source>
+        <translation>&amp;Tag:</translation>
+    </message>
+    <message>
+        <source>Added:</source>
+        <translation>Addiert:</translation>
+    </message>
+    <message>
+        <source>&amp;Weekday:</source>
+        <translation>&amp;Wochentag:</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DateTimeForm</name>
+    <message>
+        <source>Year</source>
+        <translation>Jahr</translation>
+    </message>
+    <message>
+        <source>Year, two digits</source>
+        <translation>Jahr, zweistellig</translation>
+    </message>
+    <message>
+        <source>Month</source>
+        <translation>Monat</translation>
+    </message>
+    <message>
+        <source>Month, two digits</source>
+        <translation>Monat, zweistellig</translation>
+    </message>
+    <message>
+        <source>Month, abbreviated</source>
+        <translation>Monat, abgekürzt</translation>
+    </message>
+    <message>
+        <source>Month, name</source>
+        <translation>Monat, Name</translation>
+    </message>
+    <message>
+        <source>Day</source>
+        <translation>Tag</translation>
+    </message>
+    <message>
+        <source>Day, two digits</source>
+        <translation>Tag, zweistellig</translation>
+    </message>
+    <message>
+        <source>Weekday, abbreviated</source>
+        <translation>Wochentag, abgekürzt</translation>
+    </message>
+    <message>
+        <source>Weekday, name</source>
+        <translation>Wochentag, Name</translation>
+    </message>
+    <message>
+        <source>Week of the year</source>
+        <translation>Kalenderwoche</translation>
+    </message>
+    <message>
+        <source>Day of the year</source>
+        <translation>Tag des Jahres</translation>
+    </message>
+    <message>
+        <source>Quarter</source>
+        <translation>Quartal</translation>
+    </message>
+    <message>
+        <source>Hour, 00 to 23</source>
+        <translation>Stunde, 00 bis 23</translation>
+    </message>
+    <message>
+        <source>Hour, 1 to 12</source>
+        <translation>Stunde, 1 bis 12</translation>
+    </message>
+    <message>
+        <source>Minute</source>
+        <translation>Minute</translation>
+    </message>
+    <message>
+        <source>Second</source>
+        <translation>Sekunde</translation>
+    </message>
+    <message>
+        <source>Half of the day</source>
+        <translation>Tageshälfte</translation>
+    </message>
+    <message>
+        <source>Time zone</source>
+        <translation>Zeitzone</translation>
+    </message>
+    <message>
+        <source>The pattern has letters without a meaning, so nothing is written. Put text between apostrophes.</source>
+        <translation>Das Muster hat Buchstaben ohne Bedeutung, daher wird nichts geschrieben. Text zwischen Apostrophe setzen.</translation>
+    </message>
+    <message>
+        <source>Gives: %1</source>
+        <translation>Ergibt: %1</translation>
+    </message>
+    <message>
+        <source>The pattern is empty.</source>
+        <translation>Das Muster ist leer.</translation>
+    </message>
+    <message>
+        <source>&amp;Style:</source>
+        <translation>&amp;Stil:</translation>
+    </message>
+    <message>
+        <source>&amp;Pattern:</source>
+        <translation>&amp;Muster:</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Muster</translation>
+    </message>
+    <message>
+        <source>Short: %1</source>
+        <translation>Kurz: %1</translation>
+    </message>
+    <message>
+        <source>Medium: %1</source>
+        <translation>Mittel: %1</translation>
+    </message>
+    <message>
+        <source>Long: %1</source>
+        <translation>Lang: %1</translation>
+    </message>
+    <message>
+        <source>Full: %1</source>
+        <translation>Vollständig: %1</translation>
+    </message>
+    <message>
+        <source>Own pattern</source>
+        <translation>Eigenes Muster</translation>
+    </message>
+    <message>
+        <source>Letters</source>
+        <translation>Buchstaben</translation>
+    </message>
+    <message>
+        <source>Letters of patterns</source>
+        <translation>Buchstaben für Muster</translation>
+    </message>
+    <message>
+        <source>What letters of a pattern stand for; choosing one puts it in</source>
+        <translation>Wofür die Buchstaben eines Musters stehen; Wählen setzt sie ein</translation>
+    </message>
+    <message>
+        <source>%1 (%2): %3</source>
+        <translation>%1 (%2): %3</translation>
+    </message>
+    <message>
+        <source>La&amp;nguage:</source>
+        <translation>S&amp;prache:</translation>
+    </message>
+</context>
+<context>
     <name>plume::DecisionsWindow</name>
     <message>
         <source>Why Didn&apos;t It Expand?</source>
@@ -1363,6 +2146,49 @@
     <message>
         <source>&amp;Refresh</source>
         <translation>&amp;Aktualisieren</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DelimitersEdit</name>
+    <message>
+        <source>The usual ones</source>
+        <translation>Die üblichen</translation>
+    </message>
+    <message>
+        <source>%1 The usual ones</source>
+        <translation>%1 Die üblichen</translation>
+    </message>
+    <message>
+        <source>Space</source>
+        <translation>Leerzeichen</translation>
+    </message>
+    <message>
+        <source>Tab</source>
+        <translation>Tab</translation>
+    </message>
+    <message>
+        <source>Return</source>
+        <translation>Eingabe</translation>
+    </message>
+    <message>
+        <source>Enter</source>
+        <translation>Enter</translation>
+    </message>
+    <message>
+        <source>%1 %2</source>
+        <translation>%1 %2</translation>
+    </message>
+    <message>
+        <source>Others:</source>
+        <translation>Andere:</translation>
+    </message>
+    <message>
+        <source>%1 Others</source>
+        <translation>%1 Andere</translation>
+    </message>
+    <message>
+        <source>%1 characters</source>
+        <translation>%1 Zeichen</translation>
     </message>
 </context>
 <context>
@@ -1418,6 +2244,89 @@
         <source>%1: %2</source>
         <comment>a field&apos;s name and value</comment>
         <translation>%1: %2</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FieldForm</name>
+    <message>
+        <source>Field of the Form</source>
+        <translation>Feld des Formulars</translation>
+    </message>
+    <message>
+        <source>&amp;Name:</source>
+        <translation>&amp;Name:</translation>
+    </message>
+    <message>
+        <source>Cannot be &amp;edited in the form</source>
+        <translation>Im Formular nicht zu &amp;bearbeiten</translation>
+    </message>
+    <message>
+        <source>Text in one line</source>
+        <translation>Text in einer Zeile</translation>
+    </message>
+    <message>
+        <source>Text in several lines</source>
+        <translation>Text in mehreren Zeilen</translation>
+    </message>
+    <message>
+        <source>Menu to choose from</source>
+        <translation>Menü zum Auswählen</translation>
+    </message>
+    <message>
+        <source>Number, which can be calculated</source>
+        <translation>Zahl, mit der gerechnet werden kann</translation>
+    </message>
+    <message>
+        <source>Unknown kind %1</source>
+        <translation>Unbekannte Art %1</translation>
+    </message>
+    <message>
+        <source>&amp;Kind:</source>
+        <translation>A&amp;rt:</translation>
+    </message>
+    <message>
+        <source>&amp;Begins with:</source>
+        <translation>B&amp;eginnt mit:</translation>
+    </message>
+    <message>
+        <source>C&amp;hoices, one a line:</source>
+        <translation>&amp;Möglichkeiten, eine je Zeile:</translation>
+    </message>
+    <message>
+        <source>Chosen at f&amp;irst:</source>
+        <translation>Zuerst ge&amp;wählt:</translation>
+    </message>
+    <message>
+        <source>As usual</source>
+        <translation>Wie üblich</translation>
+    </message>
+    <message>
+        <source>&amp;Width in letters:</source>
+        <translation>Breite &amp;in Zeichen:</translation>
+    </message>
+    <message>
+        <source>Hei&amp;ght in lines:</source>
+        <translation>&amp;Höhe in Zeilen:</translation>
+    </message>
+    <message>
+        <source>Without a name the form does not say what is asked for.</source>
+        <translation>Ohne Namen sagt das Formular nicht, wonach es fragt.</translation>
+    </message>
+    <message>
+        <source>Gives: nothing</source>
+        <translation>Ergibt: nichts</translation>
+    </message>
+    <message>
+        <source>A menu without choices is not shown in the form.</source>
+        <translation>Ein Menü ohne Auswahl wird im Formular nicht gezeigt.</translation>
+    </message>
+    <message>
+        <source>Gives at first: %1</source>
+        <translation>Ergibt zunächst: %1</translation>
+    </message>
+    <message>
+        <source>Gives: what is typed in the form</source>
+        <translation>Ergibt: was im Formular getippt wird</translation>
     </message>
 </context>
 <context>
@@ -1522,6 +2431,326 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     </message>
 </context>
 <context>
+    <name>plume::FormatBar</name>
+    <message>
+        <source>Red</source>
+        <translation>Rot</translation>
+    </message>
+    <message>
+        <source>Orange</source>
+        <translation>Orange</translation>
+    </message>
+    <message>
+        <source>Yellow</source>
+        <translation>Gelb</translation>
+    </message>
+    <message>
+        <source>Green</source>
+        <translation>Grün</translation>
+    </message>
+    <message>
+        <source>Blue</source>
+        <translation>Blau</translation>
+    </message>
+    <message>
+        <source>Purple</source>
+        <translation>Violett</translation>
+    </message>
+    <message>
+        <source>Gray</source>
+        <translation>Grau</translation>
+    </message>
+    <message>
+        <source>Format</source>
+        <translation>Format</translation>
+    </message>
+    <message>
+        <source>Font</source>
+        <translation>Schriftart</translation>
+    </message>
+    <message>
+        <source>Font size</source>
+        <translation>Schriftgröße</translation>
+    </message>
+    <message>
+        <source>Bold</source>
+        <translation>Fett</translation>
+    </message>
+    <message>
+        <source>B</source>
+        <comment>sign for bold</comment>
+        <translation>F</translation>
+    </message>
+    <message>
+        <source>Italic</source>
+        <translation>Kursiv</translation>
+    </message>
+    <message>
+        <source>I</source>
+        <comment>sign for italic</comment>
+        <translation>K</translation>
+    </message>
+    <message>
+        <source>Underline</source>
+        <translation>Unterstrichen</translation>
+    </message>
+    <message>
+        <source>U</source>
+        <comment>sign for underline</comment>
+        <translation>U</translation>
+    </message>
+    <message>
+        <source>Strikethrough</source>
+        <translation>Durchgestrichen</translation>
+    </message>
+    <message>
+        <source>S</source>
+        <comment>sign for strikethrough</comment>
+        <translation>D</translation>
+    </message>
+    <message>
+        <source>Text color</source>
+        <translation>Textfarbe</translation>
+    </message>
+    <message>
+        <source>Color</source>
+        <translation>Farbe</translation>
+    </message>
+    <message>
+        <source>Background color</source>
+        <translation>Hintergrundfarbe</translation>
+    </message>
+    <message>
+        <source>Marker</source>
+        <translation>Marker</translation>
+    </message>
+    <message>
+        <source>None</source>
+        <comment>color</comment>
+        <translation>Keine</translation>
+    </message>
+    <message>
+        <source>Other…</source>
+        <comment>color</comment>
+        <translation>Andere…</translation>
+    </message>
+    <message>
+        <source>Bulleted list</source>
+        <translation>Aufzählung</translation>
+    </message>
+    <message>
+        <source>Numbered list</source>
+        <translation>Nummerierte Liste</translation>
+    </message>
+    <message>
+        <source>Alignment</source>
+        <translation>Ausrichtung</translation>
+    </message>
+    <message>
+        <source>Align</source>
+        <translation>Ausrichten</translation>
+    </message>
+    <message>
+        <source>Left</source>
+        <translation>Linksbündig</translation>
+    </message>
+    <message>
+        <source>Right</source>
+        <translation>Rechtsbündig</translation>
+    </message>
+    <message>
+        <source>Centered</source>
+        <translation>Zentriert</translation>
+    </message>
+    <message>
+        <source>Justified</source>
+        <translation>Blocksatz</translation>
+    </message>
+    <message>
+        <source>Link…</source>
+        <translation>Link…</translation>
+    </message>
+    <message>
+        <source>Link</source>
+        <translation>Link</translation>
+    </message>
+    <message>
+        <source>Picture…</source>
+        <translation>Bild…</translation>
+    </message>
+    <message>
+        <source>Picture</source>
+        <translation>Bild</translation>
+    </message>
+    <message>
+        <source>Clear formatting</source>
+        <translation>Formatierung löschen</translation>
+    </message>
+    <message>
+        <source>Clear</source>
+        <translation>Löschen</translation>
+    </message>
+    <message>
+        <source>Address (empty for no link):</source>
+        <translation>Adresse (leer für keinen Link):</translation>
+    </message>
+    <message>
+        <source>Pictures (*.png *.jpg *.jpeg *.gif *.bmp *.webp *.svg)</source>
+        <translation>Bilder (*.png *.jpg *.jpeg *.gif *.bmp *.webp *.svg)</translation>
+    </message>
+    <message>
+        <source>The picture cannot be inserted.</source>
+        <translation>Das Bild lässt sich nicht einfügen.</translation>
+    </message>
+    <message>
+        <source>Pictures may have up to 16 MB.</source>
+        <translation>Bilder dürfen bis zu 16 MB groß sein.</translation>
+    </message>
+    <message>
+        <source>The file cannot be read as a picture.</source>
+        <translation>Die Datei lässt sich nicht als Bild lesen.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::GroupEditor</name>
+    <message>
+        <source>Enabled</source>
+        <translation>Eingeschaltet</translation>
+    </message>
+    <message>
+        <source>Ignored</source>
+        <translation>Ignoriert</translation>
+    </message>
+    <message>
+        <source>Name:</source>
+        <translation>Name:</translation>
+    </message>
+    <message>
+        <source>Optional: typed before every abbreviation</source>
+        <translation>Optional: vor jedem Kürzel getippt</translation>
+    </message>
+    <message>
+        <source>Prefix:</source>
+        <translation>Präfix:</translation>
+    </message>
+    <message>
+        <source>Expansion</source>
+        <translation>Ersetzen</translation>
+    </message>
+    <message>
+        <source>Expands behind:</source>
+        <translation>Ersetzt hinter:</translation>
+    </message>
+    <message>
+        <source>A delimiter</source>
+        <translation>Einem Trennzeichen</translation>
+    </message>
+    <message>
+        <source>White space</source>
+        <translation>Leerraum</translation>
+    </message>
+    <message>
+        <source>Anything, even a letter</source>
+        <translation>Allem, auch einem Buchstaben</translation>
+    </message>
+    <message>
+        <source>A number</source>
+        <translation>Einer Zahl</translation>
+    </message>
+    <message>
+        <source>Delimiters before it:</source>
+        <translation>Trennzeichen davor:</translation>
+    </message>
+    <message>
+        <source>Expands:</source>
+        <translation>Ersetzt:</translation>
+    </message>
+    <message>
+        <source>At once, with its last character</source>
+        <translation>Sofort, mit dem letzten Zeichen</translation>
+    </message>
+    <message>
+        <source>With a delimiter, which stays</source>
+        <translation>Mit einem Trennzeichen, das bleibt</translation>
+    </message>
+    <message>
+        <source>With a delimiter, which is left out</source>
+        <translation>Mit einem Trennzeichen, das entfällt</translation>
+    </message>
+    <message>
+        <source>Never by typing</source>
+        <translation>Nie durch Tippen</translation>
+    </message>
+    <message>
+        <source>With the hot key that expands</source>
+        <translation>Mit dem Tastenkürzel zum Ersetzen</translation>
+    </message>
+    <message>
+        <source>Delimiters behind it:</source>
+        <translation>Trennzeichen dahinter:</translation>
+    </message>
+    <message>
+        <source>Offer as suggestions</source>
+        <translation>Als Vorschläge anbieten</translation>
+    </message>
+    <message>
+        <source>List in the menu</source>
+        <translation>Im Menü aufführen</translation>
+    </message>
+    <message>
+        <source>Reset the formatting behind a formatted text</source>
+        <translation>Formatierung hinter formatiertem Text zurücksetzen</translation>
+    </message>
+    <message>
+        <source>Letter case</source>
+        <translation>Groß-/Kleinschreibung</translation>
+    </message>
+    <message>
+        <source>New snippets:</source>
+        <translation>Neue Snippets:</translation>
+    </message>
+    <message>
+        <source>Letter case of new snippets</source>
+        <translation>Groß-/Kleinschreibung neuer Snippets</translation>
+    </message>
+    <message>
+        <source>Reset…</source>
+        <translation>Zurücksetzen…</translation>
+    </message>
+    <message>
+        <source>Reset the letter case of all snippets</source>
+        <translation>Groß-/Kleinschreibung aller Snippets zurücksetzen</translation>
+    </message>
+    <message>
+        <source>All snippets:</source>
+        <translation>Alle Snippets:</translation>
+    </message>
+    <message>
+        <source>Where</source>
+        <translation>Wo</translation>
+    </message>
+    <message>
+        <source>Programs:</source>
+        <translation>Programme:</translation>
+    </message>
+    <message>
+        <source>In all programs</source>
+        <translation>In allen Programmen</translation>
+    </message>
+    <message>
+        <source>In all programs except those below</source>
+        <translation>In allen Programmen außer den folgenden</translation>
+    </message>
+    <message>
+        <source>Only in the programs below</source>
+        <translation>Nur in den folgenden Programmen</translation>
+    </message>
+    <message>
+        <source>Keyboard layouts:</source>
+        <translation>Tastaturbelegungen:</translation>
+    </message>
+</context>
+<context>
     <name>plume::HotKeyRecorder</name>
     <message>
         <source>Ctrl</source>
@@ -1573,6 +2802,167 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     </message>
 </context>
 <context>
+    <name>plume::ImportModel</name>
+    <message>
+        <source>No snippets</source>
+        <translation>Keine Snippets</translation>
+    </message>
+    <message>
+        <source>1 snippet</source>
+        <translation>1 Snippet</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n snippets</source>
+        <translation>
+            <numerusform>%n Snippet</numerusform>
+            <numerusform>%n Snippets</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Group, Abbreviation</source>
+        <translation>Gruppe, Kürzel</translation>
+    </message>
+    <message>
+        <source>Content</source>
+        <translation>Inhalt</translation>
+    </message>
+    <message>
+        <source>In Your Library</source>
+        <translation>In der eigenen Bibliothek</translation>
+    </message>
+    <message>
+        <source>Takes the place of your group of this name</source>
+        <translation>Tritt an die Stelle der eigenen Gruppe dieses Namens</translation>
+    </message>
+    <message>
+        <source>All of it is there already</source>
+        <translation>Alles davon ist schon da</translation>
+    </message>
+    <message>
+        <source>1 is there already</source>
+        <translation>1 ist schon da</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n are there already</source>
+        <translation>
+            <numerusform>%n ist schon da</numerusform>
+            <numerusform>%n sind schon da</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>1 abbreviation is taken</source>
+        <translation>1 Kürzel ist vergeben</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n abbreviations are taken</source>
+        <translation>
+            <numerusform>%n Kürzel ist vergeben</numerusform>
+            <numerusform>%n Kürzel sind vergeben</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Comes twice, also in “%1”</source>
+        <translation>Kommt doppelt vor, auch in „%1“</translation>
+    </message>
+    <message>
+        <source>Is there already, in “%1”</source>
+        <translation>Ist schon da, in „%1“</translation>
+    </message>
+    <message>
+        <source>Is taken by another one in “%1”</source>
+        <translation>Ist durch ein anderes in „%1“ vergeben</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ImportWindow</name>
+    <message>
+        <source>Convert the &amp;placeholders of TextExpander</source>
+        <translation>&amp;Platzhalter von TextExpander umwandeln</translation>
+    </message>
+    <message>
+        <source>What cannot be carried over &amp;whole:</source>
+        <translation>Was sich nicht &amp;ganz übernehmen lässt:</translation>
+    </message>
+    <message>
+        <source>Import Snippets</source>
+        <translation>Snippets importieren</translation>
+    </message>
+    <message>
+        <source>Groups and snippets in the file</source>
+        <translation>Gruppen und Snippets in der Datei</translation>
+    </message>
+    <message>
+        <source>What cannot be carried over whole</source>
+        <translation>Was sich nicht ganz übernehmen lässt</translation>
+    </message>
+    <message>
+        <source>Reading</source>
+        <translation>Lesen</translation>
+    </message>
+    <message>
+        <source>&amp;Import</source>
+        <translation>&amp;Importieren</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Abbrechen</translation>
+    </message>
+    <message>
+        <source>Reading “%1”…</source>
+        <translation>„%1“ wird gelesen…</translation>
+    </message>
+    <message>
+        <source>Nothing can be imported from “%1”</source>
+        <translation>Aus „%1“ lässt sich nichts importieren</translation>
+    </message>
+    <message>
+        <source>There are no snippets in “%1”</source>
+        <translation>In „%1“ sind keine Snippets</translation>
+    </message>
+    <message>
+        <source>Close</source>
+        <translation>Schließen</translation>
+    </message>
+    <message>
+        <source>in 1 group</source>
+        <translation>in 1 Gruppe</translation>
+    </message>
+    <message numerus="yes">
+        <source>in %n groups</source>
+        <translation>
+            <numerusform>in %n Gruppe</numerusform>
+            <numerusform>in %n Gruppen</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>1 snippet</source>
+        <translation>1 Snippet</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n snippets</source>
+        <translation>
+            <numerusform>%n Snippet</numerusform>
+            <numerusform>%n Snippets</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>“%1”: %2 %3</source>
+        <extracomment>The file&apos;s name, &quot;12 snippets&quot;, &quot;in 2 groups&quot;.</extracomment>
+        <translation>„%1“: %2 %3</translation>
+    </message>
+    <message>
+        <source>&amp;Import 1 Group</source>
+        <translation>1 Gruppe &amp;importieren</translation>
+    </message>
+    <message numerus="yes">
+        <source>&amp;Import %n Groups</source>
+        <translation>
+            <numerusform>%n Gruppe &amp;importieren</numerusform>
+            <numerusform>%n Gruppen &amp;importieren</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
     <name>plume::InitalSyncWindowController</name>
     <message>
         <source>Synchronize Snippets</source>
@@ -1609,6 +2999,492 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>&amp;Replace Folder’s Snippets</source>
         <translation>Snippets des Ordners &amp;ersetzen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::InputSourcesEdit</name>
+    <message>
+        <source>With all layouts</source>
+        <translation>Bei allen Belegungen</translation>
+    </message>
+    <message>
+        <source>With all layouts except those checked below</source>
+        <translation>Bei allen Belegungen außer den unten angekreuzten</translation>
+    </message>
+    <message>
+        <source>Only with the layouts checked below</source>
+        <translation>Nur bei den unten angekreuzten Belegungen</translation>
+    </message>
+    <message>
+        <source>Keyboard layouts</source>
+        <translation>Tastaturbelegungen</translation>
+    </message>
+    <message>
+        <source>Chosen keyboard layouts</source>
+        <translation>Gewählte Tastaturbelegungen</translation>
+    </message>
+    <message>
+        <source>Another layout</source>
+        <translation>Andere Belegung</translation>
+    </message>
+    <message>
+        <source>Another layout, like “de(nodeadkeys)”</source>
+        <translation>Andere Belegung, etwa „de(nodeadkeys)“</translation>
+    </message>
+    <message>
+        <source>Add Layout</source>
+        <translation>Belegung hinzufügen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::InsertMenu</name>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Nichts gefunden.</translation>
+    </message>
+    <message>
+        <source>Insert</source>
+        <translation>Einfügen</translation>
+    </message>
+    <message>
+        <source>Search what to insert</source>
+        <translation>Suchen, was eingefügt werden soll</translation>
+    </message>
+    <message>
+        <source>What can be inserted</source>
+        <translation>Was sich einfügen lässt</translation>
+    </message>
+</context>
+<context>
+    <name>plume::KeyForm</name>
+    <message>
+        <source>Return</source>
+        <translation>Eingabe</translation>
+    </message>
+    <message>
+        <source>Tab</source>
+        <translation>Tab</translation>
+    </message>
+    <message>
+        <source>Escape</source>
+        <translation>Escape</translation>
+    </message>
+    <message>
+        <source>Space</source>
+        <translation>Leertaste</translation>
+    </message>
+    <message>
+        <source>Backspace</source>
+        <translation>Rücktaste</translation>
+    </message>
+    <message>
+        <source>Delete</source>
+        <translation>Entf</translation>
+    </message>
+    <message>
+        <source>Left</source>
+        <translation>Pfeil links</translation>
+    </message>
+    <message>
+        <source>Right</source>
+        <translation>Pfeil rechts</translation>
+    </message>
+    <message>
+        <source>Up</source>
+        <translation>Pfeil auf</translation>
+    </message>
+    <message>
+        <source>Down</source>
+        <translation>Pfeil ab</translation>
+    </message>
+    <message>
+        <source>Home</source>
+        <translation>Pos1</translation>
+    </message>
+    <message>
+        <source>End</source>
+        <translation>Ende</translation>
+    </message>
+    <message>
+        <source>Page Up</source>
+        <translation>Bild auf</translation>
+    </message>
+    <message>
+        <source>Page Down</source>
+        <translation>Bild ab</translation>
+    </message>
+    <message>
+        <source>Enter of the keypad</source>
+        <translation>Enter des Ziffernblocks</translation>
+    </message>
+    <message>
+        <source>Insert</source>
+        <translation>Einfg</translation>
+    </message>
+    <message>
+        <source>Key</source>
+        <translation>Taste</translation>
+    </message>
+    <message>
+        <source>Nothing was heard. Plume may not hear the keyboard at the moment.</source>
+        <translation>Nichts wurde gehört. Vielleicht hört Plume die Tastatur gerade nicht.</translation>
+    </message>
+    <message>
+        <source>No key</source>
+        <translation>Keine Taste</translation>
+    </message>
+    <message>
+        <source>Key %1</source>
+        <translation>Taste %1</translation>
+    </message>
+    <message>
+        <source>&amp;Record</source>
+        <translation>Auf&amp;nehmen</translation>
+    </message>
+    <message>
+        <source>Takes the next key that is pressed</source>
+        <translation>Nimmt die nächste Taste, die gedrückt wird</translation>
+    </message>
+    <message>
+        <source>&amp;Key:</source>
+        <translation>&amp;Taste:</translation>
+    </message>
+    <message>
+        <source>Held with it:</source>
+        <translation>Dazu gehalten:</translation>
+    </message>
+    <message>
+        <source>Ctr&amp;l</source>
+        <translation>&amp;Strg</translation>
+    </message>
+    <message>
+        <source>&amp;Alt</source>
+        <translation>A&amp;lt</translation>
+    </message>
+    <message>
+        <source>&amp;Shift</source>
+        <translation>&amp;Umschalt</translation>
+    </message>
+    <message>
+        <source>S&amp;uper</source>
+        <translation>Su&amp;per</translation>
+    </message>
+    <message>
+        <source>Not at all</source>
+        <translation>Gar nicht</translation>
+    </message>
+    <message>
+        <source>seconds</source>
+        <translation>Sekunden</translation>
+    </message>
+    <message>
+        <source>&amp;Times pressed:</source>
+        <translation>Wie &amp;oft gedrückt:</translation>
+    </message>
+    <message>
+        <source>&amp;Waits before:</source>
+        <translation>&amp;Wartet davor:</translation>
+    </message>
+    <message>
+        <source>Presses no key.</source>
+        <translation>Drückt keine Taste.</translation>
+    </message>
+    <message>
+        <source>Presses %1</source>
+        <translation>Drückt %1</translation>
+    </message>
+    <message>
+        <source>%1, %2 times</source>
+        <translation>%1, %2-mal</translation>
+    </message>
+    <message>
+        <source>%1, after %2 seconds</source>
+        <translation>%1, nach %2 Sekunden</translation>
+    </message>
+    <message>
+        <source>Press a key… (Escape ends)</source>
+        <translation>Eine Taste drücken… (Escape beendet)</translation>
+    </message>
+</context>
+<context>
+    <name>plume::LibraryExportWindow</name>
+    <message>
+        <source>Plume library (*.plume)</source>
+        <translation>Plume-Bibliothek (*.plume)</translation>
+    </message>
+    <message>
+        <source>Comma-separated values (*.csv)</source>
+        <translation>Kommagetrennte Werte (*.csv)</translation>
+    </message>
+    <message>
+        <source>Readable library (*.json)</source>
+        <translation>Lesbare Bibliothek (*.json)</translation>
+    </message>
+    <message>
+        <source>Rich text, to read and print (*.rtf)</source>
+        <translation>Formatierter Text zum Lesen und Drucken (*.rtf)</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Exportieren</translation>
+    </message>
+    <message>
+        <source>The snippets were not exported</source>
+        <translation>Die Snippets wurden nicht exportiert</translation>
+    </message>
+    <message>
+        <source>Export All Snippets</source>
+        <translation>Alle Snippets exportieren</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Meine Snippets</translation>
+    </message>
+    <message>
+        <source>Export the Group “%1”</source>
+        <translation>Gruppe „%1“ exportieren</translation>
+    </message>
+    <message>
+        <source>Export the Selected Snippets</source>
+        <translation>Ausgewählte Snippets exportieren</translation>
+    </message>
+    <message>
+        <source>Selected Snippets</source>
+        <translation>Ausgewählte Snippets</translation>
+    </message>
+</context>
+<context>
+    <name>plume::LocaleChoice</name>
+    <message>
+        <source>Yours</source>
+        <translation>Eigene</translation>
+    </message>
+</context>
+<context>
+    <name>plume::MacrosWindowController</name>
+    <message>
+        <source>&amp;File</source>
+        <translation>&amp;Datei</translation>
+    </message>
+    <message>
+        <source>&amp;Edit</source>
+        <translation>&amp;Bearbeiten</translation>
+    </message>
+    <message>
+        <source>&amp;Library</source>
+        <translation>Bib&amp;liothek</translation>
+    </message>
+    <message>
+        <source>&amp;New Snippet</source>
+        <translation>&amp;Neues Snippet</translation>
+    </message>
+    <message>
+        <source>New Snippet from Clip&amp;board</source>
+        <translation>Neues Snippet aus der &amp;Zwischenablage</translation>
+    </message>
+    <message>
+        <source>New &amp;Group</source>
+        <translation>Neue &amp;Gruppe</translation>
+    </message>
+    <message>
+        <source>&amp;Import…</source>
+        <translation>&amp;Importieren…</translation>
+    </message>
+    <message>
+        <source>&amp;Export</source>
+        <translation>&amp;Exportieren</translation>
+    </message>
+    <message>
+        <source>&amp;Preferences…</source>
+        <translation>Einste&amp;llungen…</translation>
+    </message>
+    <message>
+        <source>&amp;Close</source>
+        <translation>&amp;Schließen</translation>
+    </message>
+    <message>
+        <source>&amp;Quit Plume</source>
+        <translation>Plume &amp;beenden</translation>
+    </message>
+    <message>
+        <source>&amp;Undo %1</source>
+        <translation>&amp;Rückgängig: %1</translation>
+    </message>
+    <message>
+        <source>&amp;Undo</source>
+        <translation>&amp;Rückgängig</translation>
+    </message>
+    <message>
+        <source>&amp;Redo %1</source>
+        <translation>&amp;Wiederholen: %1</translation>
+    </message>
+    <message>
+        <source>&amp;Redo</source>
+        <translation>&amp;Wiederholen</translation>
+    </message>
+    <message>
+        <source>Cu&amp;t</source>
+        <translation>A&amp;usschneiden</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Kopieren</translation>
+    </message>
+    <message>
+        <source>&amp;Paste</source>
+        <translation>&amp;Einfügen</translation>
+    </message>
+    <message>
+        <source>Select &amp;All</source>
+        <translation>&amp;Alles auswählen</translation>
+    </message>
+    <message>
+        <source>&amp;Duplicate</source>
+        <translation>&amp;Duplizieren</translation>
+    </message>
+    <message>
+        <source>De&amp;lete</source>
+        <translation>&amp;Löschen</translation>
+    </message>
+    <message>
+        <source>Rena&amp;me</source>
+        <translation>U&amp;mbenennen</translation>
+    </message>
+    <message>
+        <source>&amp;Find</source>
+        <translation>&amp;Suchen</translation>
+    </message>
+    <message>
+        <source>&amp;Sort Snippets</source>
+        <translation>&amp;Snippets sortieren</translation>
+    </message>
+    <message>
+        <source>Sort &amp;Groups</source>
+        <translation>&amp;Gruppen sortieren</translation>
+    </message>
+    <message>
+        <source>&amp;Add</source>
+        <translation>&amp;Hinzufügen</translation>
+    </message>
+    <message>
+        <source>&amp;Delete Duplicated Snippets…</source>
+        <translation>&amp;Doppelte Snippets löschen…</translation>
+    </message>
+    <message>
+        <source>&amp;None</source>
+        <translation>&amp;Unsortiert</translation>
+    </message>
+    <message>
+        <source>By &amp;Abbreviation</source>
+        <translation>Nach &amp;Kürzel</translation>
+    </message>
+    <message>
+        <source>By &amp;Label or Content</source>
+        <translation>Nach &amp;Bezeichnung oder Inhalt</translation>
+    </message>
+    <message>
+        <source>By Date &amp;Created</source>
+        <translation>Nach &amp;Erstelldatum</translation>
+    </message>
+    <message>
+        <source>By Date C&amp;hanged</source>
+        <translation>Nach Änderungs&amp;datum</translation>
+    </message>
+    <message>
+        <source>By Last &amp;Use</source>
+        <translation>Nach &amp;letzter Benutzung</translation>
+    </message>
+    <message>
+        <source>AutoCorrect Dictionary (%1)</source>
+        <translation>AutoKorrektur-Wörterbuch (%1)</translation>
+    </message>
+    <message>
+        <source>&amp;Selection…</source>
+        <translation>&amp;Auswahl…</translation>
+    </message>
+    <message>
+        <source>&amp;Group…</source>
+        <translation>&amp;Gruppe…</translation>
+    </message>
+    <message>
+        <source>&amp;All Groups…</source>
+        <translation>A&amp;lle Gruppen…</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Importieren</translation>
+    </message>
+    <message>
+        <source>Nothing was added.</source>
+        <translation>Nichts wurde hinzugefügt.</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Meine Snippets</translation>
+    </message>
+    <message>
+        <source>New Group</source>
+        <translation>Neue Gruppe</translation>
+    </message>
+    <message>
+        <source>There are no duplicated snippets.</source>
+        <translation>Es gibt keine doppelten Snippets.</translation>
+    </message>
+    <message>
+        <source>Duplicated are snippets with the same abbreviation and the same content.</source>
+        <translation>Doppelt sind Snippets mit demselben Kürzel und demselben Inhalt.</translation>
+    </message>
+    <message>
+        <source>Are you sure you want to delete all (#) duplicated snippets?</source>
+        <translation>Wirklich alle (#) doppelten Snippets löschen?</translation>
+    </message>
+    <message>
+        <source>One of each stays. Undo brings them back as long as this window is open.</source>
+        <translation>Je eines bleibt. Rückgängig holt sie zurück, solange dieses Fenster offen ist.</translation>
+    </message>
+    <message>
+        <source>Delete</source>
+        <translation>Löschen</translation>
+    </message>
+    <message>
+        <source>What the clipboard has could not be read: %1</source>
+        <translation>Der Inhalt der Zwischenablage ließ sich nicht lesen: %1</translation>
+    </message>
+    <message>
+        <source>Snippets</source>
+        <translation>Snippets</translation>
+    </message>
+    <message>
+        <source>Notice</source>
+        <translation>Hinweis</translation>
+    </message>
+    <message>
+        <source>This snippet is no longer in the library.</source>
+        <translation>Dieses Snippet ist nicht mehr in der Bibliothek.</translation>
+    </message>
+    <message>
+        <source>There are no snippets yet. Choose New Snippet in the menu File, or press Ctrl+N.</source>
+        <translation>Es gibt noch keine Snippets. Im Menü „Datei“ den Eintrag „Neues Snippet“ wählen oder Strg+N drücken.</translation>
+    </message>
+    <message>
+        <source>Select a snippet to see and change it.</source>
+        <translation>Ein Snippet auswählen, um es zu sehen und zu ändern.</translation>
+    </message>
+    <message>
+        <source>Several rows are selected: they can be moved, copied, duplicated and deleted.</source>
+        <translation>Mehrere Zeilen sind ausgewählt: Sie lassen sich verschieben, kopieren, duplizieren und löschen.</translation>
+    </message>
+    <message>
+        <source>Your snippets were changed elsewhere meanwhile: this can no longer be undone.</source>
+        <translation>Die Snippets wurden inzwischen anderswo geändert: Dies lässt sich nicht mehr rückgängig machen.</translation>
+    </message>
+    <message>
+        <source>Your snippets were changed elsewhere and are shown as they are now.</source>
+        <translation>Die Snippets wurden anderswo geändert und werden gezeigt, wie sie jetzt sind.</translation>
+    </message>
+    <message>
+        <source>Your snippets were changed elsewhere. What you were just editing was kept.</source>
+        <translation>Die Snippets wurden anderswo geändert. Was gerade bearbeitet wurde, blieb erhalten.</translation>
     </message>
 </context>
 <context>
@@ -1696,25 +3572,74 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
         <source>Throw Away</source>
         <translation>Verwerfen</translation>
     </message>
+</context>
+<context>
+    <name>plume::OutlineModel</name>
     <message>
-        <source>Edit Snippet</source>
-        <translation>Snippet bearbeiten</translation>
+        <source>Untitled group</source>
+        <translation>Unbenannte Gruppe</translation>
     </message>
     <message>
-        <source>&amp;Save Changes</source>
-        <translation>Änderungen &amp;speichern</translation>
+        <source>Off</source>
+        <translation>Aus</translation>
     </message>
     <message>
-        <source>Formatted text can be looked at here, and not be changed.</source>
-        <translation>Formatierter Text lässt sich hier ansehen, aber nicht ändern.</translation>
+        <source>Duplicate</source>
+        <translation>Doppelt</translation>
     </message>
     <message>
-        <source>Do you want to throw your changes away?</source>
-        <translation>Die Änderungen verwerfen?</translation>
+        <source>Script</source>
+        <translation>Skript</translation>
     </message>
     <message>
-        <source>They were not saved yet.</source>
-        <translation>Sie wurden noch nicht gespeichert.</translation>
+        <source>Formatted</source>
+        <translation>Formatiert</translation>
+    </message>
+</context>
+<context>
+    <name>plume::OutlinePane</name>
+    <message>
+        <source>&amp;Search By</source>
+        <translation>Suchen &amp;nach</translation>
+    </message>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Nichts gefunden.</translation>
+    </message>
+    <message>
+        <source>Search</source>
+        <translation>Suchen</translation>
+    </message>
+    <message>
+        <source>Search in the snippets</source>
+        <translation>In den Snippets suchen</translation>
+    </message>
+    <message>
+        <source>What is searched</source>
+        <translation>Was durchsucht wird</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviation</source>
+        <translation>&amp;Kürzel</translation>
+    </message>
+    <message>
+        <source>&amp;Label</source>
+        <translation>&amp;Bezeichnung</translation>
+    </message>
+    <message>
+        <source>&amp;Content</source>
+        <translation>&amp;Inhalt</translation>
+    </message>
+    <message>
+        <source>&amp;Wildcards: * and ?</source>
+        <translation>&amp;Platzhalter: * und ?</translation>
+    </message>
+</context>
+<context>
+    <name>plume::OutlineView</name>
+    <message>
+        <source>Groups and snippets</source>
+        <translation>Gruppen und Snippets</translation>
     </message>
 </context>
 <context>
@@ -1852,6 +3777,36 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>&amp;Restore Defaults</source>
         <translation>Standardwerte &amp;wiederherstellen</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PreviewPane</name>
+    <message>
+        <source>Included by</source>
+        <translation>Enthalten in</translation>
+    </message>
+    <message>
+        <source>Try abbreviations here: they expand.</source>
+        <translation>Hier Kürzel ausprobieren: Sie werden ersetzt.</translation>
+    </message>
+    <message>
+        <source>Field to try abbreviations in</source>
+        <translation>Feld zum Ausprobieren von Kürzeln</translation>
+    </message>
+    <message>
+        <source>What Comes Out</source>
+        <translation>Was herauskommt</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n more</source>
+        <translation>
+            <numerusform>%n weiterem</numerusform>
+            <numerusform>%n weiteren</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Included by %1</source>
+        <translation>Enthalten in %1</translation>
     </message>
 </context>
 <context>
@@ -2170,6 +4125,17 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     </message>
 </context>
 <context>
+    <name>plume::ScriptEdit</name>
+    <message>
+        <source>Script</source>
+        <translation>Skript</translation>
+    </message>
+    <message>
+        <source>Tab writes a tab. To leave the script with the keyboard, press Ctrl+Tab, or Escape and then Tab.</source>
+        <translation>Tab schreibt einen Tabulator. Um das Skript mit der Tastatur zu verlassen, Strg+Tab drücken oder Escape und dann Tab.</translation>
+    </message>
+</context>
+<context>
     <name>plume::ScriptMark</name>
     <message>
         <source>Script: %1</source>
@@ -2178,6 +4144,113 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>What this script prints comes here.</source>
         <translation>Hier steht, was dieses Skript ausgibt.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ScriptRunPanel</name>
+    <message>
+        <source>Run &amp;Now</source>
+        <translation>&amp;Jetzt ausführen</translation>
+    </message>
+    <message>
+        <source>Cance&amp;l</source>
+        <translation>Abbre&amp;chen</translation>
+    </message>
+    <message>
+        <source>Output of the script</source>
+        <translation>Ausgabe des Skripts</translation>
+    </message>
+    <message>
+        <source>What the script writes is shown here. Nothing is typed anywhere.</source>
+        <translation>Was das Skript schreibt, steht hier. Nirgends wird etwas getippt.</translation>
+    </message>
+    <message>
+        <source>Starting…</source>
+        <translation>Wird gestartet…</translation>
+    </message>
+    <message>
+        <source>The script&apos;s placeholders cannot be replaced.</source>
+        <translation>Die Platzhalter des Skripts lassen sich nicht ersetzen.</translation>
+    </message>
+    <message>
+        <source>Cancelled.</source>
+        <translation>Abgebrochen.</translation>
+    </message>
+    <message>
+        <source>Cancelling…</source>
+        <translation>Wird abgebrochen…</translation>
+    </message>
+    <message>
+        <source>Running for %1 of at most %2 seconds.</source>
+        <translation>Läuft seit %1 von höchstens %2 Sekunden.</translation>
+    </message>
+    <message>
+        <source>AppleScript cannot run on this system.</source>
+        <translation>AppleScript kann auf diesem System nicht laufen.</translation>
+    </message>
+    <message>
+        <source>A script is ended after %1 seconds.</source>
+        <translation>Ein Skript wird nach %1 Sekunden beendet.</translation>
+    </message>
+    <message>
+        <source>Errors:</source>
+        <translation>Fehler:</translation>
+    </message>
+    <message>
+        <source>The script says that it failed, after %1 seconds.</source>
+        <translation>Das Skript meldet nach %1 Sekunden, dass es gescheitert ist.</translation>
+    </message>
+    <message>
+        <source>Finished after %1 seconds.</source>
+        <translation>Fertig nach %1 Sekunden.</translation>
+    </message>
+    <message>
+        <source>Ended at the time limit of %1 seconds.</source>
+        <translation>An der Zeitgrenze von %1 Sekunden beendet.</translation>
+    </message>
+    <message>
+        <source>Ended after %1 seconds, because it wrote too much.</source>
+        <translation>Nach %1 Sekunden beendet, weil es zu viel schrieb.</translation>
+    </message>
+    <message>
+        <source>Cancelled after %1 seconds.</source>
+        <translation>Nach %1 Sekunden abgebrochen.</translation>
+    </message>
+    <message>
+        <source>The script could not be run: %1.</source>
+        <translation>Das Skript konnte nicht laufen: %1.</translation>
+    </message>
+    <message>
+        <source>A script that it includes was ended at the time limit.</source>
+        <translation>Ein darin enthaltenes Skript wurde an der Zeitgrenze beendet.</translation>
+    </message>
+    <message>
+        <source>A script that it includes wrote too much.</source>
+        <translation>Ein darin enthaltenes Skript schrieb zu viel.</translation>
+    </message>
+    <message>
+        <source>A script that it includes could not be run.</source>
+        <translation>Ein darin enthaltenes Skript konnte nicht laufen.</translation>
+    </message>
+    <message>
+        <source>Fields had the values that they begin with.</source>
+        <translation>Felder hatten die Werte, mit denen sie beginnen.</translation>
+    </message>
+    <message>
+        <source>The script wrote nothing.</source>
+        <translation>Das Skript schrieb nichts.</translation>
+    </message>
+    <message>
+        <source>As there is no other output, the errors are typed when the snippet expands.</source>
+        <translation>Da es keine andere Ausgabe gibt, werden die Fehler getippt, wenn das Snippet ersetzt wird.</translation>
+    </message>
+    <message>
+        <source>The output is no UTF-8 text: nothing is typed when the snippet expands.</source>
+        <translation>Die Ausgabe ist kein UTF-8-Text: Nichts wird getippt, wenn das Snippet ersetzt wird.</translation>
+    </message>
+    <message>
+        <source>The output is cut here: %1 more characters are not shown.</source>
+        <translation>Die Ausgabe ist hier abgeschnitten: %1 weitere Zeichen werden nicht gezeigt.</translation>
     </message>
 </context>
 <context>
@@ -2193,6 +4266,144 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>Default</source>
         <translation>Standard</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SnippetEditor</name>
+    <message>
+        <source>Plain text</source>
+        <translation>Reiner Text</translation>
+    </message>
+    <message>
+        <source>Formatted text</source>
+        <translation>Formatierter Text</translation>
+    </message>
+    <message>
+        <source>AppleScript</source>
+        <translation>AppleScript</translation>
+    </message>
+    <message>
+        <source>Shell script</source>
+        <translation>Shell-Skript</translation>
+    </message>
+    <message>
+        <source>Exactly as typed here</source>
+        <translation>Genau wie hier getippt</translation>
+    </message>
+    <message>
+        <source>Any case</source>
+        <translation>Groß oder klein</translation>
+    </message>
+    <message>
+        <source>Any case, and adapt the content to it</source>
+        <translation>Groß oder klein, und der Inhalt passt sich an</translation>
+    </message>
+    <message>
+        <source>N&amp;ote:</source>
+        <translation>&amp;Notiz:</translation>
+    </message>
+    <message>
+        <source>Optional: a name for lists</source>
+        <translation>Optional: ein Name für Listen</translation>
+    </message>
+    <message>
+        <source>Optional: for yourself</source>
+        <translation>Optional: zur eigenen Information</translation>
+    </message>
+    <message>
+        <source>About the abbreviation</source>
+        <translation>Zum Kürzel</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviation:</source>
+        <translation>&amp;Kürzel:</translation>
+    </message>
+    <message>
+        <source>La&amp;bel:</source>
+        <translation>Be&amp;zeichnung:</translation>
+    </message>
+    <message>
+        <source>&amp;Kind:</source>
+        <translation>A&amp;rt:</translation>
+    </message>
+    <message>
+        <source>&amp;Case:</source>
+        <translation>&amp;Schreibweise:</translation>
+    </message>
+    <message>
+        <source>Without an abbreviation it can only be chosen from lists.</source>
+        <translation>Ohne Kürzel lässt es sich nur aus Listen wählen.</translation>
+    </message>
+    <message>
+        <source>⚠ “%1” in “%2” has this abbreviation, too.</source>
+        <translation>⚠ „%1“ in „%2“ hat dieses Kürzel auch.</translation>
+    </message>
+    <message>
+        <source>⚠ “%1” in “%2” expands before this is typed.</source>
+        <translation>⚠ „%1“ in „%2“ wird ersetzt, bevor dieses getippt ist.</translation>
+    </message>
+    <message>
+        <source>Created %1</source>
+        <translation>Erstellt %1</translation>
+    </message>
+    <message>
+        <source>Changed %1</source>
+        <translation>Geändert %1</translation>
+    </message>
+    <message>
+        <source>Used last %1</source>
+        <translation>Zuletzt benutzt %1</translation>
+    </message>
+    <message>
+        <source>Not used yet</source>
+        <translation>Noch nicht benutzt</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SnippetForm</name>
+    <message>
+        <source>Snippet</source>
+        <translation>Snippet</translation>
+    </message>
+    <message>
+        <source>Abbreviation, label or text</source>
+        <translation>Kürzel, Bezeichnung oder Text</translation>
+    </message>
+    <message>
+        <source>&amp;Search:</source>
+        <translation>&amp;Suchen:</translation>
+    </message>
+    <message>
+        <source>Snip&amp;pet:</source>
+        <translation>Sni&amp;ppet:</translation>
+    </message>
+    <message>
+        <source>Snippets</source>
+        <translation>Snippets</translation>
+    </message>
+    <message>
+        <source>Choose a snippet.</source>
+        <translation>Ein Snippet wählen.</translation>
+    </message>
+    <message>
+        <source>Gives: nothing</source>
+        <translation>Ergibt: nichts</translation>
+    </message>
+    <message>
+        <source>The library has no snippet with this abbreviation.</source>
+        <translation>Die Bibliothek hat kein Snippet mit diesem Kürzel.</translation>
+    </message>
+    <message>
+        <source>A snippet cannot stand in itself.</source>
+        <translation>Ein Snippet kann nicht in sich selbst stehen.</translation>
+    </message>
+    <message>
+        <source>Runs the script and gives what it prints.</source>
+        <translation>Führt das Skript aus und ergibt dessen Ausgabe.</translation>
+    </message>
+    <message>
+        <source>Gives: %1</source>
+        <translation>Ergibt: %1</translation>
     </message>
 </context>
 <context>
@@ -2310,6 +4521,41 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>%1 to %2 of %3</source>
         <translation>%1 bis %2 von %3</translation>
+    </message>
+</context>
+<context>
+    <name>plume::TimeForm</name>
+    <message>
+        <source>Time</source>
+        <translation>Uhrzeit</translation>
+    </message>
+    <message>
+        <source>Added:</source>
+        <translation>Addiert:</translation>
+    </message>
+    <message>
+        <source>Hours:</source>
+        <translation>Stunden:</translation>
+    </message>
+    <message>
+        <source>Hours added</source>
+        <translation>Addierte Stunden</translation>
+    </message>
+    <message>
+        <source>Minutes:</source>
+        <translation>Minuten:</translation>
+    </message>
+    <message>
+        <source>Minutes added</source>
+        <translation>Addierte Minuten</translation>
+    </message>
+    <message>
+        <source>Seconds:</source>
+        <translation>Sekunden:</translation>
+    </message>
+    <message>
+        <source>Seconds added</source>
+        <translation>Addierte Sekunden</translation>
     </message>
 </context>
 <context>

@@ -286,6 +286,192 @@
     </message>
 </context>
 <context>
+    <name>CaseReset</name>
+    <message>
+        <source>Typed exactly as it is written</source>
+        <translation>Tapée exactement comme elle est écrite</translation>
+    </message>
+    <message>
+        <source>Typed in capitals or not</source>
+        <translation>Tapée en majuscules ou non</translation>
+    </message>
+    <message>
+        <source>Typed in capitals or not, and the text adapts</source>
+        <translation>Tapée en majuscules ou non, et le texte s’adapte</translation>
+    </message>
+    <message>
+        <source>Reset Case Sensitivity</source>
+        <translation>Réinitialiser la casse</translation>
+    </message>
+    <message>
+        <source>Case sensitivity of all snippets</source>
+        <translation>Casse de tous les extraits</translation>
+    </message>
+    <message>
+        <source>Reset</source>
+        <translation>Réinitialiser</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Annuler</translation>
+    </message>
+    <message>
+        <source>This will reset case sensitivity of all snippets in group to default setting.</source>
+        <translation>La casse de tous les extraits du groupe reprendra sa valeur par défaut.</translation>
+    </message>
+    <message>
+        <source>You can undo this action.</source>
+        <translation>Vous pouvez annuler cette action.</translation>
+    </message>
+</context>
+<context>
+    <name>ChipWords</name>
+    <message>
+        <source>today</source>
+        <translation>aujourd’hui</translation>
+    </message>
+    <message>
+        <source>1 year</source>
+        <translation>1 an</translation>
+    </message>
+    <message>
+        <source>%1 years</source>
+        <translation>%1 ans</translation>
+    </message>
+    <message>
+        <source>1 month</source>
+        <translation>1 mois</translation>
+    </message>
+    <message>
+        <source>%1 months</source>
+        <translation>%1 mois</translation>
+    </message>
+    <message>
+        <source>1 week</source>
+        <translation>1 semaine</translation>
+    </message>
+    <message>
+        <source>%1 weeks</source>
+        <translation>%1 semaines</translation>
+    </message>
+    <message>
+        <source>1 day</source>
+        <translation>1 jour</translation>
+    </message>
+    <message>
+        <source>%1 days</source>
+        <translation>%1 jours</translation>
+    </message>
+    <message>
+        <source>now</source>
+        <translation>maintenant</translation>
+    </message>
+    <message>
+        <source>1 hour</source>
+        <translation>1 heure</translation>
+    </message>
+    <message>
+        <source>%1 hours</source>
+        <translation>%1 heures</translation>
+    </message>
+    <message>
+        <source>1 minute</source>
+        <translation>1 minute</translation>
+    </message>
+    <message>
+        <source>%1 minutes</source>
+        <translation>%1 minutes</translation>
+    </message>
+    <message>
+        <source>1 second</source>
+        <translation>1 seconde</translation>
+    </message>
+    <message>
+        <source>%1 seconds</source>
+        <translation>%1 secondes</translation>
+    </message>
+    <message>
+        <source>%1 (optional, ticked)</source>
+        <translation>%1 (facultatif, coché)</translation>
+    </message>
+    <message>
+        <source>%1 (optional)</source>
+        <translation>%1 (facultatif)</translation>
+    </message>
+    <message>
+        <source>Snippet</source>
+        <translation>Extrait</translation>
+    </message>
+    <message>
+        <source>Caret</source>
+        <translation>Point d’insertion</translation>
+    </message>
+    <message>
+        <source>next %1</source>
+        <translation>%1 prochain</translation>
+    </message>
+    <message>
+        <source>previous %1</source>
+        <translation>%1 dernier</translation>
+    </message>
+    <message>
+        <source>Date</source>
+        <translation>Date</translation>
+    </message>
+    <message>
+        <source>Time</source>
+        <translation>Heure</translation>
+    </message>
+    <message>
+        <source>Clipboard</source>
+        <translation>Presse-papiers</translation>
+    </message>
+    <message>
+        <source>without %1</source>
+        <translation>sans %1</translation>
+    </message>
+    <message>
+        <source>Text area</source>
+        <translation>Zone de texte</translation>
+    </message>
+    <message>
+        <source>Menu</source>
+        <translation>Menu</translation>
+    </message>
+    <message>
+        <source>Number</source>
+        <translation>Nombre</translation>
+    </message>
+    <message>
+        <source>Field</source>
+        <translation>Champ</translation>
+    </message>
+    <message>
+        <source>Ctrl</source>
+        <translation>Ctrl</translation>
+    </message>
+    <message>
+        <source>Alt</source>
+        <translation>Alt</translation>
+    </message>
+    <message>
+        <source>Shift</source>
+        <translation>Maj</translation>
+    </message>
+    <message>
+        <source>Super</source>
+        <translation>Super</translation>
+    </message>
+    <message>
+        <source>Key</source>
+        <translation>Touche</translation>
+    </message>
+    <message>
+        <source>, after %1 s</source>
+        <translation>, après %1 s</translation>
+    </message>
+</context>
+<context>
     <name>CorrectionPage</name>
     <message>
         <source>Sentences</source>
@@ -684,6 +870,147 @@
     </message>
 </context>
 <context>
+    <name>GroupEffect</name>
+    <message>
+        <source>%1 %2</source>
+        <translation>%1 %2</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: these snippets are only chosen from lists.</source>
+        <translation>Taper %1 ne fait rien : ces extraits ne se choisissent que dans des listes.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: the group is switched off in all programs.</source>
+        <translation>Taper %1 ne fait rien : le groupe est désactivé dans tous les programmes.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: no program is chosen yet.</source>
+        <translation>Taper %1 ne fait rien : aucun programme n’est encore choisi.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: no keyboard layout is chosen yet.</source>
+        <translation>Taper %1 ne fait rien : aucune disposition de clavier n’est encore choisie.</translation>
+    </message>
+    <message>
+        <source>Typing %1 does nothing: no character is chosen to expand it.</source>
+        <translation>Taper %1 ne fait rien : aucun caractère n’est choisi pour le développement.</translation>
+    </message>
+    <message>
+        <source>in %1 only: %2</source>
+        <translation>dans %1 seulement : %2</translation>
+    </message>
+    <message>
+        <source>everywhere but in %1: %2</source>
+        <translation>partout sauf dans %1 : %2</translation>
+    </message>
+    <message>
+        <source>Not with the keyboard layout %1.</source>
+        <translation>Pas avec la disposition de clavier %1.</translation>
+    </message>
+    <message>
+        <source>Not with the keyboard layouts %1.</source>
+        <translation>Pas avec les dispositions de clavier %1.</translation>
+    </message>
+    <message>
+        <source>Only with the keyboard layout %1.</source>
+        <translation>Seulement avec la disposition de clavier %1.</translation>
+    </message>
+    <message>
+        <source>Only with the keyboard layouts %1.</source>
+        <translation>Seulement avec les dispositions de clavier %1.</translation>
+    </message>
+    <message>
+        <source>%1, then %2.</source>
+        <translation>%1, puis %2.</translation>
+    </message>
+    <message>
+        <source>%1, then %2, which is left out.</source>
+        <translation>%1, puis %2, qui ne reste pas.</translation>
+    </message>
+    <message>
+        <source>%1, then press the hot key that expands.</source>
+        <translation>%1, puis le raccourci clavier qui développe.</translation>
+    </message>
+    <message>
+        <source>%1, and it expands at once.</source>
+        <translation>%1, et le développement est immédiat.</translation>
+    </message>
+    <message>
+        <source>type %1</source>
+        <translation>tapez %1</translation>
+    </message>
+    <message>
+        <source>type %1 behind a space or in a new line</source>
+        <translation>tapez %1 après une espace ou sur une nouvelle ligne</translation>
+    </message>
+    <message>
+        <source>type %1, even inside a word</source>
+        <translation>tapez %1, même à l’intérieur d’un mot</translation>
+    </message>
+    <message>
+        <source>type %1 right behind a number</source>
+        <translation>tapez %1 juste après un nombre</translation>
+    </message>
+    <message>
+        <source>type %1 before anything else</source>
+        <translation>tapez %1 avant toute autre chose</translation>
+    </message>
+    <message>
+        <source>type %1 behind %2</source>
+        <translation>tapez %1 après %2</translation>
+    </message>
+    <message>
+        <source>“%1”</source>
+        <translation>« %1 »</translation>
+    </message>
+    <message>
+        <source>a space, Return or a punctuation mark</source>
+        <translation>une espace, Entrée ou un signe de ponctuation</translation>
+    </message>
+    <message>
+        <source>a space</source>
+        <translation>une espace</translation>
+    </message>
+    <message>
+        <source>Tab</source>
+        <translation>Tab</translation>
+    </message>
+    <message>
+        <source>Return</source>
+        <translation>Entrée</translation>
+    </message>
+    <message>
+        <source>Enter</source>
+        <translation>Entrée du pavé numérique</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n others</source>
+        <translation>
+            <numerusform>%n autre</numerusform>
+            <numerusform>%n autres</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>%1 and %2</source>
+        <translation>%1 et %2</translation>
+    </message>
+    <message>
+        <source>, </source>
+        <translation>, </translation>
+    </message>
+    <message numerus="yes">
+        <source>one of %n others</source>
+        <translation>
+            <numerusform>%n autre</numerusform>
+            <numerusform>l’un de %n autres</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>%1 or %2</source>
+        <translation>%1 ou %2</translation>
+    </message>
+</context>
+<context>
     <name>HotKeysPage</name>
     <message>
         <source>Switch expansion on and off</source>
@@ -783,6 +1110,93 @@
     <message>
         <source>All snippets go into one file, for another computer or another program.</source>
         <translation>Tous les extraits vont dans un fichier, pour un autre ordinateur ou un autre programme.</translation>
+    </message>
+</context>
+<context>
+    <name>LibraryUndo</name>
+    <message>
+        <source>Change of Abbreviation</source>
+        <translation>Changement d’abréviation</translation>
+    </message>
+    <message>
+        <source>Change of Label</source>
+        <translation>Changement de libellé</translation>
+    </message>
+    <message>
+        <source>Change of Note</source>
+        <translation>Changement de note</translation>
+    </message>
+    <message>
+        <source>Change of Case</source>
+        <translation>Changement de casse</translation>
+    </message>
+    <message>
+        <source>Change of Kind</source>
+        <translation>Changement de type</translation>
+    </message>
+    <message>
+        <source>Change of Content</source>
+        <translation>Changement de contenu</translation>
+    </message>
+    <message>
+        <source>Change of Group Name</source>
+        <translation>Changement du nom de groupe</translation>
+    </message>
+    <message>
+        <source>Change of Group Settings</source>
+        <translation>Changement des réglages du groupe</translation>
+    </message>
+    <message>
+        <source>New Snippets (%n)</source>
+        <translation>Nouveaux extraits (%n)</translation>
+    </message>
+    <message>
+        <source>New Groups (%n)</source>
+        <translation>Nouveaux groupes (%n)</translation>
+    </message>
+    <message>
+        <source>Deletion (%n)</source>
+        <translation>Suppression (%n)</translation>
+    </message>
+    <message>
+        <source>Move (%n)</source>
+        <translation>Déplacement (%n)</translation>
+    </message>
+    <message>
+        <source>Copy (%n)</source>
+        <translation>Copie (%n)</translation>
+    </message>
+    <message>
+        <source>Duplication (%n)</source>
+        <translation>Duplication (%n)</translation>
+    </message>
+    <message>
+        <source>Deletion of Duplicates (%n)</source>
+        <translation>Suppression de doublons (%n)</translation>
+    </message>
+    <message>
+        <source>Sorting</source>
+        <translation>Tri</translation>
+    </message>
+    <message>
+        <source>Sorting of Groups</source>
+        <translation>Tri des groupes</translation>
+    </message>
+    <message>
+        <source>Reset of Case (%n)</source>
+        <translation>Réinitialisation de la casse (%n)</translation>
+    </message>
+    <message>
+        <source>New Group</source>
+        <translation>Nouveau groupe</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Import</translation>
+    </message>
+    <message>
+        <source>Kept Edit</source>
+        <translation>Modification conservée</translation>
     </message>
 </context>
 <context>
@@ -910,6 +1324,10 @@
     <message>
         <source>In suggestions and in quick search, the digits 1 to 9 pick a snippet while this key is held, and 0 picks the tenth.</source>
         <translation>Dans les suggestions et la recherche rapide, les chiffres de 1 à 9 choisissent un extrait tant que cette touche est enfoncée, et 0 le dixième.</translation>
+    </message>
+    <message>
+        <source>Wildcards in the snippets w&amp;indow</source>
+        <translation>Jokers dans la &amp;fenêtre des extraits</translation>
     </message>
 </context>
 <context>
@@ -1323,6 +1741,371 @@
     </message>
 </context>
 <context>
+    <name>plume::ChipForm</name>
+    <message>
+        <source>What it gives</source>
+        <translation>Ce que cela donne</translation>
+    </message>
+    <message>
+        <source>Warning</source>
+        <translation>Avertissement</translation>
+    </message>
+    <message>
+        <source>&amp;Done</source>
+        <translation>&amp;Terminé</translation>
+    </message>
+    <message>
+        <source>&amp;Cancel</source>
+        <translation>A&amp;nnuler</translation>
+    </message>
+    <message>
+        <source>The sign %1 ends a placeholder and cannot stand in one.</source>
+        <translation>Le signe %1 termine une balise et ne peut pas y figurer.</translation>
+    </message>
+    <message>
+        <source>⚠ %1</source>
+        <translation>⚠ %1</translation>
+    </message>
+    <message>
+        <source>Can be &amp;left out when the form is filled in</source>
+        <translation>Peut être &amp;omis en remplissant le formulaire</translation>
+    </message>
+    <message>
+        <source>Is &amp;ticked at first</source>
+        <translation>&amp;Coché au départ</translation>
+    </message>
+    <message>
+        <source>Form:</source>
+        <translation>Formulaire :</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ChoiceBox</name>
+    <message>
+        <source>Other (%1)</source>
+        <translation>Autre (%1)</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ClipboardForm</name>
+    <message>
+        <source>Clipboard</source>
+        <translation>Presse-papiers</translation>
+    </message>
+    <message>
+        <source>&amp;Find:</source>
+        <translation>&amp;Rechercher :</translation>
+    </message>
+    <message>
+        <source>&amp;Replace with:</source>
+        <translation>Remp&amp;lacer par :</translation>
+    </message>
+    <message>
+        <source>Anywhere</source>
+        <translation>N’importe où</translation>
+    </message>
+    <message>
+        <source>At the start of words</source>
+        <translation>Au début des mots</translation>
+    </message>
+    <message>
+        <source>Whole words</source>
+        <translation>Mots entiers</translation>
+    </message>
+    <message>
+        <source>At the end of words</source>
+        <translation>À la fin des mots</translation>
+    </message>
+    <message>
+        <source>Capitals and &amp;small letters differ</source>
+        <translation>Distinguer &amp;majuscules et minuscules</translation>
+    </message>
+    <message>
+        <source>Is a regular e&amp;xpression; $1 is its first group</source>
+        <translation>E&amp;xpression régulière ; $1 est son premier groupe</translation>
+    </message>
+    <message>
+        <source>F&amp;ound:</source>
+        <translation>Trou&amp;vé :</translation>
+    </message>
+    <message>
+        <source>What is to be found is no valid pattern, or takes too long. The clipboard&apos;s text stays as it is.</source>
+        <translation>Le motif cherché n’est pas valable, ou prend trop de temps. Le texte du presse-papiers reste tel quel.</translation>
+    </message>
+    <message>
+        <source>There is no text in the clipboard now.</source>
+        <translation>Il n’y a pas de texte dans le presse-papiers en ce moment.</translation>
+    </message>
+    <message>
+        <source>Gives: %1</source>
+        <translation>Donne : %1</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ContentEdit</name>
+    <message>
+        <source>Ctrl+Tab types a tab.</source>
+        <translation>Ctrl+Tab insère une tabulation.</translation>
+    </message>
+    <message>
+        <source>Cha&amp;nge…</source>
+        <translation>&amp;Modifier…</translation>
+    </message>
+    <message>
+        <source>Cu&amp;t</source>
+        <translation>Co&amp;uper</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Copier</translation>
+    </message>
+    <message>
+        <source>&amp;Paste</source>
+        <translation>C&amp;oller</translation>
+    </message>
+    <message>
+        <source>Paste Without &amp;Formatting</source>
+        <translation>Coller sans mise en &amp;forme</translation>
+    </message>
+    <message>
+        <source>Select &amp;All</source>
+        <translation>&amp;Tout sélectionner</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ContentPane</name>
+    <message>
+        <source>&amp;Insert…</source>
+        <translation>&amp;Insérer…</translation>
+    </message>
+    <message>
+        <source>Show So&amp;urce</source>
+        <translation>Afficher la so&amp;urce</translation>
+    </message>
+    <message>
+        <source>Content</source>
+        <translation>Contenu</translation>
+    </message>
+    <message>
+        <source>Script</source>
+        <translation>Script</translation>
+    </message>
+    <message>
+        <source>Insert a date, a field, another snippet… (Ctrl+Space, or type 【)</source>
+        <translation>Insérer une date, un champ, un autre extrait… (Ctrl+Espace, ou tapez 【)</translation>
+    </message>
+    <message>
+        <source>Show placeholders as they are written (Ctrl+Shift+U)</source>
+        <translation>Montrer les balises telles qu’elles sont écrites (Ctrl+Maj+U)</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DateForm</name>
+    <message>
+        <source>Date</source>
+        <translation>Date</translation>
+    </message>
+    <message>
+        <source>From today</source>
+        <translation>À partir d’aujourd’hui</translation>
+    </message>
+    <message>
+        <source>The next weekday of this name</source>
+        <translation>Le prochain jour de ce nom</translation>
+    </message>
+    <message>
+        <source>The last weekday of this name</source>
+        <translation>Le dernier jour de ce nom</translation>
+    </message>
+    <message>
+        <source>The last weekday of this name (%1)</source>
+        <translation>Le dernier jour de ce nom (%1)</translation>
+    </message>
+    <message>
+        <source>Years:</source>
+        <translation>Années :</translation>
+    </message>
+    <message>
+        <source>Years added</source>
+        <translation>Années ajoutées</translation>
+    </message>
+    <message>
+        <source>Months:</source>
+        <translation>Mois :</translation>
+    </message>
+    <message>
+        <source>Months added</source>
+        <translation>Mois ajoutés</translation>
+    </message>
+    <message>
+        <source>Days:</source>
+        <translation>Jours :</translation>
+    </message>
+    <message>
+        <source>Days added</source>
+        <translation>Jours ajoutés</translation>
+    </message>
+    <message>
+        <source>Weekday %1</source>
+        <translation>Jour de semaine %1</translation>
+    </message>
+    <message>
+        <source>D&amp;ay:</source>
+        <translation>&amp;Jour :</translation>
+    </message>
+    <message>
+        <source>Added:</source>
+        <translation>Ajout :</translation>
+    </message>
+    <message>
+        <source>&amp;Weekday:</source>
+        <translation>Jour de la &amp;semaine :</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DateTimeForm</name>
+    <message>
+        <source>Year</source>
+        <translation>Année</translation>
+    </message>
+    <message>
+        <source>Year, two digits</source>
+        <translation>Année, deux chiffres</translation>
+    </message>
+    <message>
+        <source>Month</source>
+        <translation>Mois</translation>
+    </message>
+    <message>
+        <source>Month, two digits</source>
+        <translation>Mois, deux chiffres</translation>
+    </message>
+    <message>
+        <source>Month, abbreviated</source>
+        <translation>Mois, abrégé</translation>
+    </message>
+    <message>
+        <source>Month, name</source>
+        <translation>Mois, nom</translation>
+    </message>
+    <message>
+        <source>Day</source>
+        <translation>Jour</translation>
+    </message>
+    <message>
+        <source>Day, two digits</source>
+        <translation>Jour, deux chiffres</translation>
+    </message>
+    <message>
+        <source>Weekday, abbreviated</source>
+        <translation>Jour de la semaine, abrégé</translation>
+    </message>
+    <message>
+        <source>Weekday, name</source>
+        <translation>Jour de la semaine, nom</translation>
+    </message>
+    <message>
+        <source>Week of the year</source>
+        <translation>Semaine de l’année</translation>
+    </message>
+    <message>
+        <source>Day of the year</source>
+        <translation>Jour de l’année</translation>
+    </message>
+    <message>
+        <source>Quarter</source>
+        <translation>Trimestre</translation>
+    </message>
+    <message>
+        <source>Hour, 00 to 23</source>
+        <translation>Heure, 00 à 23</translation>
+    </message>
+    <message>
+        <source>Hour, 1 to 12</source>
+        <translation>Heure, 1 à 12</translation>
+    </message>
+    <message>
+        <source>Minute</source>
+        <translation>Minute</translation>
+    </message>
+    <message>
+        <source>Second</source>
+        <translation>Seconde</translation>
+    </message>
+    <message>
+        <source>Half of the day</source>
+        <translation>Matin ou après-midi</translation>
+    </message>
+    <message>
+        <source>Time zone</source>
+        <translation>Fuseau horaire</translation>
+    </message>
+    <message>
+        <source>The pattern has letters without a meaning, so nothing is written. Put text between apostrophes.</source>
+        <translation>Le modèle a des lettres sans signification : rien n’est donc écrit. Mettez le texte entre apostrophes.</translation>
+    </message>
+    <message>
+        <source>Gives: %1</source>
+        <translation>Donne : %1</translation>
+    </message>
+    <message>
+        <source>The pattern is empty.</source>
+        <translation>Le modèle est vide.</translation>
+    </message>
+    <message>
+        <source>&amp;Style:</source>
+        <translation>St&amp;yle :</translation>
+    </message>
+    <message>
+        <source>&amp;Pattern:</source>
+        <translation>&amp;Modèle :</translation>
+    </message>
+    <message>
+        <source>Pattern</source>
+        <translation>Modèle</translation>
+    </message>
+    <message>
+        <source>Short: %1</source>
+        <translation>Court : %1</translation>
+    </message>
+    <message>
+        <source>Medium: %1</source>
+        <translation>Moyen : %1</translation>
+    </message>
+    <message>
+        <source>Long: %1</source>
+        <translation>Long : %1</translation>
+    </message>
+    <message>
+        <source>Full: %1</source>
+        <translation>Complet : %1</translation>
+    </message>
+    <message>
+        <source>Own pattern</source>
+        <translation>Modèle personnel</translation>
+    </message>
+    <message>
+        <source>Letters</source>
+        <translation>Lettres</translation>
+    </message>
+    <message>
+        <source>Letters of patterns</source>
+        <translation>Lettres des modèles</translation>
+    </message>
+    <message>
+        <source>What letters of a pattern stand for; choosing one puts it in</source>
+        <translation>Ce que signifient les lettres d’un modèle ; en choisir une l’insère</translation>
+    </message>
+    <message>
+        <source>%1 (%2): %3</source>
+        <translation>%1 (%2) : %3</translation>
+    </message>
+    <message>
+        <source>La&amp;nguage:</source>
+        <translation>&amp;Langue :</translation>
+    </message>
+</context>
+<context>
     <name>plume::DecisionsWindow</name>
     <message>
         <source>Why Didn&apos;t It Expand?</source>
@@ -1363,6 +2146,49 @@
     <message>
         <source>&amp;Refresh</source>
         <translation>&amp;Actualiser</translation>
+    </message>
+</context>
+<context>
+    <name>plume::DelimitersEdit</name>
+    <message>
+        <source>The usual ones</source>
+        <translation>Les habituels</translation>
+    </message>
+    <message>
+        <source>%1 The usual ones</source>
+        <translation>%1 Les habituels</translation>
+    </message>
+    <message>
+        <source>Space</source>
+        <translation>Espace</translation>
+    </message>
+    <message>
+        <source>Tab</source>
+        <translation>Tab</translation>
+    </message>
+    <message>
+        <source>Return</source>
+        <translation>Entrée</translation>
+    </message>
+    <message>
+        <source>Enter</source>
+        <translation>Entrée du pavé numérique</translation>
+    </message>
+    <message>
+        <source>%1 %2</source>
+        <translation>%1 %2</translation>
+    </message>
+    <message>
+        <source>Others:</source>
+        <translation>Autres :</translation>
+    </message>
+    <message>
+        <source>%1 Others</source>
+        <translation>%1 Autres</translation>
+    </message>
+    <message>
+        <source>%1 characters</source>
+        <translation>%1 caractères</translation>
     </message>
 </context>
 <context>
@@ -1418,6 +2244,89 @@
         <source>%1: %2</source>
         <comment>a field&apos;s name and value</comment>
         <translation>%1&#x202f;: %2</translation>
+    </message>
+</context>
+<context>
+    <name>plume::FieldForm</name>
+    <message>
+        <source>Field of the Form</source>
+        <translation>Champ du formulaire</translation>
+    </message>
+    <message>
+        <source>&amp;Name:</source>
+        <translation>No&amp;m :</translation>
+    </message>
+    <message>
+        <source>Cannot be &amp;edited in the form</source>
+        <translation>Non modifia&amp;ble dans le formulaire</translation>
+    </message>
+    <message>
+        <source>Text in one line</source>
+        <translation>Texte sur une ligne</translation>
+    </message>
+    <message>
+        <source>Text in several lines</source>
+        <translation>Texte sur plusieurs lignes</translation>
+    </message>
+    <message>
+        <source>Menu to choose from</source>
+        <translation>Menu de choix</translation>
+    </message>
+    <message>
+        <source>Number, which can be calculated</source>
+        <translation>Nombre, qui peut être calculé</translation>
+    </message>
+    <message>
+        <source>Unknown kind %1</source>
+        <translation>Type inconnu %1</translation>
+    </message>
+    <message>
+        <source>&amp;Kind:</source>
+        <translation>T&amp;ype :</translation>
+    </message>
+    <message>
+        <source>&amp;Begins with:</source>
+        <translation>&amp;Valeur initiale :</translation>
+    </message>
+    <message>
+        <source>C&amp;hoices, one a line:</source>
+        <translation>Choi&amp;x, un par ligne :</translation>
+    </message>
+    <message>
+        <source>Chosen at f&amp;irst:</source>
+        <translation>Choix au &amp;départ :</translation>
+    </message>
+    <message>
+        <source>As usual</source>
+        <translation>Habituelle</translation>
+    </message>
+    <message>
+        <source>&amp;Width in letters:</source>
+        <translation>&amp;Largeur en lettres :</translation>
+    </message>
+    <message>
+        <source>Hei&amp;ght in lines:</source>
+        <translation>&amp;Hauteur en lignes :</translation>
+    </message>
+    <message>
+        <source>Without a name the form does not say what is asked for.</source>
+        <translation>Sans nom, le formulaire ne dit pas ce qui est demandé.</translation>
+    </message>
+    <message>
+        <source>Gives: nothing</source>
+        <translation>Donne : rien</translation>
+    </message>
+    <message>
+        <source>A menu without choices is not shown in the form.</source>
+        <translation>Un menu sans choix n’est pas montré dans le formulaire.</translation>
+    </message>
+    <message>
+        <source>Gives at first: %1</source>
+        <translation>Donne au départ : %1</translation>
+    </message>
+    <message>
+        <source>Gives: what is typed in the form</source>
+        <translation>Donne : ce qui est tapé dans le formulaire</translation>
     </message>
 </context>
 <context>
@@ -1522,6 +2431,326 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
 </context>
 <context>
+    <name>plume::FormatBar</name>
+    <message>
+        <source>Red</source>
+        <translation>Rouge</translation>
+    </message>
+    <message>
+        <source>Orange</source>
+        <translation>Orange</translation>
+    </message>
+    <message>
+        <source>Yellow</source>
+        <translation>Jaune</translation>
+    </message>
+    <message>
+        <source>Green</source>
+        <translation>Vert</translation>
+    </message>
+    <message>
+        <source>Blue</source>
+        <translation>Bleu</translation>
+    </message>
+    <message>
+        <source>Purple</source>
+        <translation>Violet</translation>
+    </message>
+    <message>
+        <source>Gray</source>
+        <translation>Gris</translation>
+    </message>
+    <message>
+        <source>Format</source>
+        <translation>Format</translation>
+    </message>
+    <message>
+        <source>Font</source>
+        <translation>Police</translation>
+    </message>
+    <message>
+        <source>Font size</source>
+        <translation>Taille de police</translation>
+    </message>
+    <message>
+        <source>Bold</source>
+        <translation>Gras</translation>
+    </message>
+    <message>
+        <source>B</source>
+        <comment>sign for bold</comment>
+        <translation>G</translation>
+    </message>
+    <message>
+        <source>Italic</source>
+        <translation>Italique</translation>
+    </message>
+    <message>
+        <source>I</source>
+        <comment>sign for italic</comment>
+        <translation>I</translation>
+    </message>
+    <message>
+        <source>Underline</source>
+        <translation>Souligné</translation>
+    </message>
+    <message>
+        <source>U</source>
+        <comment>sign for underline</comment>
+        <translation>S</translation>
+    </message>
+    <message>
+        <source>Strikethrough</source>
+        <translation>Barré</translation>
+    </message>
+    <message>
+        <source>S</source>
+        <comment>sign for strikethrough</comment>
+        <translation>B</translation>
+    </message>
+    <message>
+        <source>Text color</source>
+        <translation>Couleur du texte</translation>
+    </message>
+    <message>
+        <source>Color</source>
+        <translation>Couleur</translation>
+    </message>
+    <message>
+        <source>Background color</source>
+        <translation>Couleur de fond</translation>
+    </message>
+    <message>
+        <source>Marker</source>
+        <translation>Surligneur</translation>
+    </message>
+    <message>
+        <source>None</source>
+        <comment>color</comment>
+        <translation>Aucune</translation>
+    </message>
+    <message>
+        <source>Other…</source>
+        <comment>color</comment>
+        <translation>Autre…</translation>
+    </message>
+    <message>
+        <source>Bulleted list</source>
+        <translation>Liste à puces</translation>
+    </message>
+    <message>
+        <source>Numbered list</source>
+        <translation>Liste numérotée</translation>
+    </message>
+    <message>
+        <source>Alignment</source>
+        <translation>Alignement</translation>
+    </message>
+    <message>
+        <source>Align</source>
+        <translation>Aligner</translation>
+    </message>
+    <message>
+        <source>Left</source>
+        <translation>À gauche</translation>
+    </message>
+    <message>
+        <source>Right</source>
+        <translation>À droite</translation>
+    </message>
+    <message>
+        <source>Centered</source>
+        <translation>Centré</translation>
+    </message>
+    <message>
+        <source>Justified</source>
+        <translation>Justifié</translation>
+    </message>
+    <message>
+        <source>Link…</source>
+        <translation>Lien…</translation>
+    </message>
+    <message>
+        <source>Link</source>
+        <translation>Lien</translation>
+    </message>
+    <message>
+        <source>Picture…</source>
+        <translation>Image…</translation>
+    </message>
+    <message>
+        <source>Picture</source>
+        <translation>Image</translation>
+    </message>
+    <message>
+        <source>Clear formatting</source>
+        <translation>Effacer la mise en forme</translation>
+    </message>
+    <message>
+        <source>Clear</source>
+        <translation>Effacer</translation>
+    </message>
+    <message>
+        <source>Address (empty for no link):</source>
+        <translation>Adresse (vide pour aucun lien) :</translation>
+    </message>
+    <message>
+        <source>Pictures (*.png *.jpg *.jpeg *.gif *.bmp *.webp *.svg)</source>
+        <translation>Images (*.png *.jpg *.jpeg *.gif *.bmp *.webp *.svg)</translation>
+    </message>
+    <message>
+        <source>The picture cannot be inserted.</source>
+        <translation>L’image ne peut pas être insérée.</translation>
+    </message>
+    <message>
+        <source>Pictures may have up to 16 MB.</source>
+        <translation>Les images peuvent faire jusqu’à 16 Mo.</translation>
+    </message>
+    <message>
+        <source>The file cannot be read as a picture.</source>
+        <translation>Le fichier ne peut pas être lu comme une image.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::GroupEditor</name>
+    <message>
+        <source>Enabled</source>
+        <translation>Inclus</translation>
+    </message>
+    <message>
+        <source>Ignored</source>
+        <translation>Exclus</translation>
+    </message>
+    <message>
+        <source>Name:</source>
+        <translation>Nom :</translation>
+    </message>
+    <message>
+        <source>Optional: typed before every abbreviation</source>
+        <translation>Facultatif : à taper avant chaque abréviation</translation>
+    </message>
+    <message>
+        <source>Prefix:</source>
+        <translation>Préfixe :</translation>
+    </message>
+    <message>
+        <source>Expansion</source>
+        <translation>Développement</translation>
+    </message>
+    <message>
+        <source>Expands behind:</source>
+        <translation>Se développe après :</translation>
+    </message>
+    <message>
+        <source>A delimiter</source>
+        <translation>Un séparateur</translation>
+    </message>
+    <message>
+        <source>White space</source>
+        <translation>Une espace ou une nouvelle ligne</translation>
+    </message>
+    <message>
+        <source>Anything, even a letter</source>
+        <translation>N’importe quoi, même une lettre</translation>
+    </message>
+    <message>
+        <source>A number</source>
+        <translation>Un nombre</translation>
+    </message>
+    <message>
+        <source>Delimiters before it:</source>
+        <translation>Séparateurs avant :</translation>
+    </message>
+    <message>
+        <source>Expands:</source>
+        <translation>Se développe :</translation>
+    </message>
+    <message>
+        <source>At once, with its last character</source>
+        <translation>Aussitôt, au dernier caractère</translation>
+    </message>
+    <message>
+        <source>With a delimiter, which stays</source>
+        <translation>Par un séparateur, qui reste</translation>
+    </message>
+    <message>
+        <source>With a delimiter, which is left out</source>
+        <translation>Par un séparateur, qui ne reste pas</translation>
+    </message>
+    <message>
+        <source>Never by typing</source>
+        <translation>Jamais à la frappe</translation>
+    </message>
+    <message>
+        <source>With the hot key that expands</source>
+        <translation>Par le raccourci clavier qui développe</translation>
+    </message>
+    <message>
+        <source>Delimiters behind it:</source>
+        <translation>Séparateurs après :</translation>
+    </message>
+    <message>
+        <source>Offer as suggestions</source>
+        <translation>Proposer dans les suggestions</translation>
+    </message>
+    <message>
+        <source>List in the menu</source>
+        <translation>Afficher dans le menu</translation>
+    </message>
+    <message>
+        <source>Reset the formatting behind a formatted text</source>
+        <translation>Rétablir la mise en forme après un texte mis en forme</translation>
+    </message>
+    <message>
+        <source>Letter case</source>
+        <translation>Casse</translation>
+    </message>
+    <message>
+        <source>New snippets:</source>
+        <translation>Nouveaux extraits :</translation>
+    </message>
+    <message>
+        <source>Letter case of new snippets</source>
+        <translation>Casse des nouveaux extraits</translation>
+    </message>
+    <message>
+        <source>Reset…</source>
+        <translation>Réinitialiser…</translation>
+    </message>
+    <message>
+        <source>Reset the letter case of all snippets</source>
+        <translation>Réinitialiser la casse de tous les extraits</translation>
+    </message>
+    <message>
+        <source>All snippets:</source>
+        <translation>Tous les extraits :</translation>
+    </message>
+    <message>
+        <source>Where</source>
+        <translation>Où</translation>
+    </message>
+    <message>
+        <source>Programs:</source>
+        <translation>Programmes :</translation>
+    </message>
+    <message>
+        <source>In all programs</source>
+        <translation>Dans tous les programmes</translation>
+    </message>
+    <message>
+        <source>In all programs except those below</source>
+        <translation>Dans tous les programmes sauf ceux-ci</translation>
+    </message>
+    <message>
+        <source>Only in the programs below</source>
+        <translation>Seulement dans les programmes ci-dessous</translation>
+    </message>
+    <message>
+        <source>Keyboard layouts:</source>
+        <translation>Dispositions de clavier :</translation>
+    </message>
+</context>
+<context>
     <name>plume::HotKeyRecorder</name>
     <message>
         <source>Ctrl</source>
@@ -1573,6 +2802,167 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
 </context>
 <context>
+    <name>plume::ImportModel</name>
+    <message>
+        <source>No snippets</source>
+        <translation>Aucun extrait</translation>
+    </message>
+    <message>
+        <source>1 snippet</source>
+        <translation>1 extrait</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n snippets</source>
+        <translation>
+            <numerusform>%n extrait</numerusform>
+            <numerusform>%n extraits</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Group, Abbreviation</source>
+        <translation>Groupe, abréviation</translation>
+    </message>
+    <message>
+        <source>Content</source>
+        <translation>Contenu</translation>
+    </message>
+    <message>
+        <source>In Your Library</source>
+        <translation>Dans votre bibliothèque</translation>
+    </message>
+    <message>
+        <source>Takes the place of your group of this name</source>
+        <translation>Remplace votre groupe de ce nom</translation>
+    </message>
+    <message>
+        <source>All of it is there already</source>
+        <translation>Tout y est déjà</translation>
+    </message>
+    <message>
+        <source>1 is there already</source>
+        <translation>1 y est déjà</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n are there already</source>
+        <translation>
+            <numerusform>%n y est déjà</numerusform>
+            <numerusform>%n y sont déjà</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>1 abbreviation is taken</source>
+        <translation>1 abréviation est prise</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n abbreviations are taken</source>
+        <translation>
+            <numerusform>%n abréviation est prise</numerusform>
+            <numerusform>%n abréviations sont prises</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Comes twice, also in “%1”</source>
+        <translation>Figure deux fois, aussi dans « %1 »</translation>
+    </message>
+    <message>
+        <source>Is there already, in “%1”</source>
+        <translation>Existe déjà, dans « %1 »</translation>
+    </message>
+    <message>
+        <source>Is taken by another one in “%1”</source>
+        <translation>Est prise par un autre dans « %1 »</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ImportWindow</name>
+    <message>
+        <source>Convert the &amp;placeholders of TextExpander</source>
+        <translation>Convertir les &amp;balises de TextExpander</translation>
+    </message>
+    <message>
+        <source>What cannot be carried over &amp;whole:</source>
+        <translation>Ce qui ne peut pas être repris en &amp;entier :</translation>
+    </message>
+    <message>
+        <source>Import Snippets</source>
+        <translation>Importer des extraits</translation>
+    </message>
+    <message>
+        <source>Groups and snippets in the file</source>
+        <translation>Groupes et extraits du fichier</translation>
+    </message>
+    <message>
+        <source>What cannot be carried over whole</source>
+        <translation>Ce qui ne peut pas être repris en entier</translation>
+    </message>
+    <message>
+        <source>Reading</source>
+        <translation>Lecture</translation>
+    </message>
+    <message>
+        <source>&amp;Import</source>
+        <translation>&amp;Importer</translation>
+    </message>
+    <message>
+        <source>Cancel</source>
+        <translation>Annuler</translation>
+    </message>
+    <message>
+        <source>Reading “%1”…</source>
+        <translation>Lecture de « %1 »…</translation>
+    </message>
+    <message>
+        <source>Nothing can be imported from “%1”</source>
+        <translation>Rien ne peut être importé de « %1 »</translation>
+    </message>
+    <message>
+        <source>There are no snippets in “%1”</source>
+        <translation>Il n’y a aucun extrait dans « %1 »</translation>
+    </message>
+    <message>
+        <source>Close</source>
+        <translation>Fermer</translation>
+    </message>
+    <message>
+        <source>in 1 group</source>
+        <translation>dans 1 groupe</translation>
+    </message>
+    <message numerus="yes">
+        <source>in %n groups</source>
+        <translation>
+            <numerusform>dans %n groupe</numerusform>
+            <numerusform>dans %n groupes</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>1 snippet</source>
+        <translation>1 extrait</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n snippets</source>
+        <translation>
+            <numerusform>%n extrait</numerusform>
+            <numerusform>%n extraits</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>“%1”: %2 %3</source>
+        <extracomment>The file&apos;s name, &quot;12 snippets&quot;, &quot;in 2 groups&quot;.</extracomment>
+        <translation>« %1 » : %2 %3</translation>
+    </message>
+    <message>
+        <source>&amp;Import 1 Group</source>
+        <translation>&amp;Importer 1 groupe</translation>
+    </message>
+    <message numerus="yes">
+        <source>&amp;Import %n Groups</source>
+        <translation>
+            <numerusform>&amp;Importer %n groupe</numerusform>
+            <numerusform>&amp;Importer %n groupes</numerusform>
+        </translation>
+    </message>
+</context>
+<context>
     <name>plume::InitalSyncWindowController</name>
     <message>
         <source>Synchronize Snippets</source>
@@ -1609,6 +2999,492 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>&amp;Replace Folder’s Snippets</source>
         <translation>&amp;Remplacer les extraits du dossier</translation>
+    </message>
+</context>
+<context>
+    <name>plume::InputSourcesEdit</name>
+    <message>
+        <source>With all layouts</source>
+        <translation>Avec toutes les dispositions</translation>
+    </message>
+    <message>
+        <source>With all layouts except those checked below</source>
+        <translation>Avec toutes les dispositions sauf celles cochées ci-dessous</translation>
+    </message>
+    <message>
+        <source>Only with the layouts checked below</source>
+        <translation>Seulement avec les dispositions cochées ci-dessous</translation>
+    </message>
+    <message>
+        <source>Keyboard layouts</source>
+        <translation>Dispositions de clavier</translation>
+    </message>
+    <message>
+        <source>Chosen keyboard layouts</source>
+        <translation>Dispositions de clavier choisies</translation>
+    </message>
+    <message>
+        <source>Another layout</source>
+        <translation>Autre disposition</translation>
+    </message>
+    <message>
+        <source>Another layout, like “de(nodeadkeys)”</source>
+        <translation>Autre disposition, comme « de(nodeadkeys) »</translation>
+    </message>
+    <message>
+        <source>Add Layout</source>
+        <translation>Ajouter la disposition</translation>
+    </message>
+</context>
+<context>
+    <name>plume::InsertMenu</name>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Rien n’a été trouvé.</translation>
+    </message>
+    <message>
+        <source>Insert</source>
+        <translation>Insérer</translation>
+    </message>
+    <message>
+        <source>Search what to insert</source>
+        <translation>Chercher quoi insérer</translation>
+    </message>
+    <message>
+        <source>What can be inserted</source>
+        <translation>Ce qui peut être inséré</translation>
+    </message>
+</context>
+<context>
+    <name>plume::KeyForm</name>
+    <message>
+        <source>Return</source>
+        <translation>Entrée</translation>
+    </message>
+    <message>
+        <source>Tab</source>
+        <translation>Tab</translation>
+    </message>
+    <message>
+        <source>Escape</source>
+        <translation>Échap</translation>
+    </message>
+    <message>
+        <source>Space</source>
+        <translation>Espace</translation>
+    </message>
+    <message>
+        <source>Backspace</source>
+        <translation>Retour arrière</translation>
+    </message>
+    <message>
+        <source>Delete</source>
+        <translation>Suppr</translation>
+    </message>
+    <message>
+        <source>Left</source>
+        <translation>Gauche</translation>
+    </message>
+    <message>
+        <source>Right</source>
+        <translation>Droite</translation>
+    </message>
+    <message>
+        <source>Up</source>
+        <translation>Haut</translation>
+    </message>
+    <message>
+        <source>Down</source>
+        <translation>Bas</translation>
+    </message>
+    <message>
+        <source>Home</source>
+        <translation>Début</translation>
+    </message>
+    <message>
+        <source>End</source>
+        <translation>Fin</translation>
+    </message>
+    <message>
+        <source>Page Up</source>
+        <translation>Page précédente</translation>
+    </message>
+    <message>
+        <source>Page Down</source>
+        <translation>Page suivante</translation>
+    </message>
+    <message>
+        <source>Enter of the keypad</source>
+        <translation>Entrée du pavé numérique</translation>
+    </message>
+    <message>
+        <source>Insert</source>
+        <translation>Inser</translation>
+    </message>
+    <message>
+        <source>Key</source>
+        <translation>Touche</translation>
+    </message>
+    <message>
+        <source>Nothing was heard. Plume may not hear the keyboard at the moment.</source>
+        <translation>Rien n’a été entendu. Plume n’entend peut-être pas le clavier en ce moment.</translation>
+    </message>
+    <message>
+        <source>No key</source>
+        <translation>Aucune touche</translation>
+    </message>
+    <message>
+        <source>Key %1</source>
+        <translation>Touche %1</translation>
+    </message>
+    <message>
+        <source>&amp;Record</source>
+        <translation>Ca&amp;pturer</translation>
+    </message>
+    <message>
+        <source>Takes the next key that is pressed</source>
+        <translation>Prend la prochaine touche enfoncée</translation>
+    </message>
+    <message>
+        <source>&amp;Key:</source>
+        <translation>To&amp;uche :</translation>
+    </message>
+    <message>
+        <source>Held with it:</source>
+        <translation>Tenues avec elle :</translation>
+    </message>
+    <message>
+        <source>Ctr&amp;l</source>
+        <translation>Ctr&amp;l</translation>
+    </message>
+    <message>
+        <source>&amp;Alt</source>
+        <translation>&amp;Alt</translation>
+    </message>
+    <message>
+        <source>&amp;Shift</source>
+        <translation>&amp;Maj</translation>
+    </message>
+    <message>
+        <source>S&amp;uper</source>
+        <translation>&amp;Super</translation>
+    </message>
+    <message>
+        <source>Not at all</source>
+        <translation>Aucun</translation>
+    </message>
+    <message>
+        <source>seconds</source>
+        <translation>secondes</translation>
+    </message>
+    <message>
+        <source>&amp;Times pressed:</source>
+        <translation>Nombre de &amp;frappes :</translation>
+    </message>
+    <message>
+        <source>&amp;Waits before:</source>
+        <translation>&amp;Délai avant :</translation>
+    </message>
+    <message>
+        <source>Presses no key.</source>
+        <translation>N’appuie sur aucune touche.</translation>
+    </message>
+    <message>
+        <source>Presses %1</source>
+        <translation>Appuie sur %1</translation>
+    </message>
+    <message>
+        <source>%1, %2 times</source>
+        <translation>%1, %2 fois</translation>
+    </message>
+    <message>
+        <source>%1, after %2 seconds</source>
+        <translation>%1, après %2 secondes</translation>
+    </message>
+    <message>
+        <source>Press a key… (Escape ends)</source>
+        <translation>Appuyez sur une touche… (Échap pour annuler)</translation>
+    </message>
+</context>
+<context>
+    <name>plume::LibraryExportWindow</name>
+    <message>
+        <source>Plume library (*.plume)</source>
+        <translation>Bibliothèque de Plume (*.plume)</translation>
+    </message>
+    <message>
+        <source>Comma-separated values (*.csv)</source>
+        <translation>Valeurs séparées par des virgules (*.csv)</translation>
+    </message>
+    <message>
+        <source>Readable library (*.json)</source>
+        <translation>Bibliothèque lisible (*.json)</translation>
+    </message>
+    <message>
+        <source>Rich text, to read and print (*.rtf)</source>
+        <translation>Texte mis en forme, à lire et imprimer (*.rtf)</translation>
+    </message>
+    <message>
+        <source>Export</source>
+        <translation>Exporter</translation>
+    </message>
+    <message>
+        <source>The snippets were not exported</source>
+        <translation>Les extraits n’ont pas été exportés</translation>
+    </message>
+    <message>
+        <source>Export All Snippets</source>
+        <translation>Exporter tous les extraits</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Mes extraits</translation>
+    </message>
+    <message>
+        <source>Export the Group “%1”</source>
+        <translation>Exporter le groupe « %1 »</translation>
+    </message>
+    <message>
+        <source>Export the Selected Snippets</source>
+        <translation>Exporter les extraits sélectionnés</translation>
+    </message>
+    <message>
+        <source>Selected Snippets</source>
+        <translation>Extraits sélectionnés</translation>
+    </message>
+</context>
+<context>
+    <name>plume::LocaleChoice</name>
+    <message>
+        <source>Yours</source>
+        <translation>La vôtre</translation>
+    </message>
+</context>
+<context>
+    <name>plume::MacrosWindowController</name>
+    <message>
+        <source>&amp;File</source>
+        <translation>&amp;Fichier</translation>
+    </message>
+    <message>
+        <source>&amp;Edit</source>
+        <translation>É&amp;dition</translation>
+    </message>
+    <message>
+        <source>&amp;Library</source>
+        <translation>&amp;Bibliothèque</translation>
+    </message>
+    <message>
+        <source>&amp;New Snippet</source>
+        <translation>&amp;Nouvel extrait</translation>
+    </message>
+    <message>
+        <source>New Snippet from Clip&amp;board</source>
+        <translation>Nouvel extrait du &amp;presse-papiers</translation>
+    </message>
+    <message>
+        <source>New &amp;Group</source>
+        <translation>Nouveau &amp;groupe</translation>
+    </message>
+    <message>
+        <source>&amp;Import…</source>
+        <translation>&amp;Importer…</translation>
+    </message>
+    <message>
+        <source>&amp;Export</source>
+        <translation>&amp;Exporter</translation>
+    </message>
+    <message>
+        <source>&amp;Preferences…</source>
+        <translation>Pré&amp;férences…</translation>
+    </message>
+    <message>
+        <source>&amp;Close</source>
+        <translation>Fer&amp;mer</translation>
+    </message>
+    <message>
+        <source>&amp;Quit Plume</source>
+        <translation>&amp;Quitter Plume</translation>
+    </message>
+    <message>
+        <source>&amp;Undo %1</source>
+        <translation>&amp;Annuler : %1</translation>
+    </message>
+    <message>
+        <source>&amp;Undo</source>
+        <translation>&amp;Annuler</translation>
+    </message>
+    <message>
+        <source>&amp;Redo %1</source>
+        <translation>&amp;Rétablir : %1</translation>
+    </message>
+    <message>
+        <source>&amp;Redo</source>
+        <translation>&amp;Rétablir</translation>
+    </message>
+    <message>
+        <source>Cu&amp;t</source>
+        <translation>Co&amp;uper</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Copier</translation>
+    </message>
+    <message>
+        <source>&amp;Paste</source>
+        <translation>C&amp;oller</translation>
+    </message>
+    <message>
+        <source>Select &amp;All</source>
+        <translation>&amp;Tout sélectionner</translation>
+    </message>
+    <message>
+        <source>&amp;Duplicate</source>
+        <translation>&amp;Dupliquer</translation>
+    </message>
+    <message>
+        <source>De&amp;lete</source>
+        <translation>&amp;Supprimer</translation>
+    </message>
+    <message>
+        <source>Rena&amp;me</source>
+        <translation>Reno&amp;mmer</translation>
+    </message>
+    <message>
+        <source>&amp;Find</source>
+        <translation>Rec&amp;hercher</translation>
+    </message>
+    <message>
+        <source>&amp;Sort Snippets</source>
+        <translation>Trier les e&amp;xtraits</translation>
+    </message>
+    <message>
+        <source>Sort &amp;Groups</source>
+        <translation>Trier les &amp;groupes</translation>
+    </message>
+    <message>
+        <source>&amp;Add</source>
+        <translation>A&amp;jouter</translation>
+    </message>
+    <message>
+        <source>&amp;Delete Duplicated Snippets…</source>
+        <translation>Supprimer les &amp;doublons…</translation>
+    </message>
+    <message>
+        <source>&amp;None</source>
+        <translation>Aucu&amp;n</translation>
+    </message>
+    <message>
+        <source>By &amp;Abbreviation</source>
+        <translation>Par &amp;abréviation</translation>
+    </message>
+    <message>
+        <source>By &amp;Label or Content</source>
+        <translation>Par &amp;libellé ou contenu</translation>
+    </message>
+    <message>
+        <source>By Date &amp;Created</source>
+        <translation>Par date de &amp;création</translation>
+    </message>
+    <message>
+        <source>By Date C&amp;hanged</source>
+        <translation>Par date de &amp;modification</translation>
+    </message>
+    <message>
+        <source>By Last &amp;Use</source>
+        <translation>Par dernière &amp;utilisation</translation>
+    </message>
+    <message>
+        <source>AutoCorrect Dictionary (%1)</source>
+        <translation>Dictionnaire de correction automatique (%1)</translation>
+    </message>
+    <message>
+        <source>&amp;Selection…</source>
+        <translation>&amp;Sélection…</translation>
+    </message>
+    <message>
+        <source>&amp;Group…</source>
+        <translation>&amp;Groupe…</translation>
+    </message>
+    <message>
+        <source>&amp;All Groups…</source>
+        <translation>&amp;Tous les groupes…</translation>
+    </message>
+    <message>
+        <source>Import</source>
+        <translation>Importer</translation>
+    </message>
+    <message>
+        <source>Nothing was added.</source>
+        <translation>Rien n’a été ajouté.</translation>
+    </message>
+    <message>
+        <source>My Snippets</source>
+        <translation>Mes extraits</translation>
+    </message>
+    <message>
+        <source>New Group</source>
+        <translation>Nouveau groupe</translation>
+    </message>
+    <message>
+        <source>There are no duplicated snippets.</source>
+        <translation>Il n’y a pas d’extraits en double.</translation>
+    </message>
+    <message>
+        <source>Duplicated are snippets with the same abbreviation and the same content.</source>
+        <translation>Sont en double les extraits qui ont la même abréviation et le même contenu.</translation>
+    </message>
+    <message>
+        <source>Are you sure you want to delete all (#) duplicated snippets?</source>
+        <translation>Voulez-vous vraiment supprimer les (#) extraits en double ?</translation>
+    </message>
+    <message>
+        <source>One of each stays. Undo brings them back as long as this window is open.</source>
+        <translation>Il en reste un de chaque. Annuler les ramène tant que cette fenêtre est ouverte.</translation>
+    </message>
+    <message>
+        <source>Delete</source>
+        <translation>Supprimer</translation>
+    </message>
+    <message>
+        <source>What the clipboard has could not be read: %1</source>
+        <translation>Le contenu du presse-papiers n’a pas pu être lu : %1</translation>
+    </message>
+    <message>
+        <source>Snippets</source>
+        <translation>Extraits</translation>
+    </message>
+    <message>
+        <source>Notice</source>
+        <translation>Avis</translation>
+    </message>
+    <message>
+        <source>This snippet is no longer in the library.</source>
+        <translation>Cet extrait n’est plus dans la bibliothèque.</translation>
+    </message>
+    <message>
+        <source>There are no snippets yet. Choose New Snippet in the menu File, or press Ctrl+N.</source>
+        <translation>Il n’y a pas encore d’extraits. Choisissez Nouvel extrait dans le menu Fichier, ou appuyez sur Ctrl+N.</translation>
+    </message>
+    <message>
+        <source>Select a snippet to see and change it.</source>
+        <translation>Sélectionnez un extrait pour le voir et le modifier.</translation>
+    </message>
+    <message>
+        <source>Several rows are selected: they can be moved, copied, duplicated and deleted.</source>
+        <translation>Plusieurs lignes sont sélectionnées : elles peuvent être déplacées, copiées, dupliquées et supprimées.</translation>
+    </message>
+    <message>
+        <source>Your snippets were changed elsewhere meanwhile: this can no longer be undone.</source>
+        <translation>Vos extraits ont été modifiés ailleurs entre-temps : cela ne peut plus être annulé.</translation>
+    </message>
+    <message>
+        <source>Your snippets were changed elsewhere and are shown as they are now.</source>
+        <translation>Vos extraits ont été modifiés ailleurs et sont montrés dans leur état actuel.</translation>
+    </message>
+    <message>
+        <source>Your snippets were changed elsewhere. What you were just editing was kept.</source>
+        <translation>Vos extraits ont été modifiés ailleurs. Ce que vous étiez en train de modifier a été gardé.</translation>
     </message>
 </context>
 <context>
@@ -1696,25 +3572,74 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
         <source>Throw Away</source>
         <translation>Abandonner</translation>
     </message>
+</context>
+<context>
+    <name>plume::OutlineModel</name>
     <message>
-        <source>Edit Snippet</source>
-        <translation>Modifier l’extrait</translation>
+        <source>Untitled group</source>
+        <translation>Groupe sans nom</translation>
     </message>
     <message>
-        <source>&amp;Save Changes</source>
-        <translation>Enregi&amp;strer</translation>
+        <source>Off</source>
+        <translation>Désactivé</translation>
     </message>
     <message>
-        <source>Formatted text can be looked at here, and not be changed.</source>
-        <translation>Un texte mis en forme peut être consulté ici, mais pas modifié.</translation>
+        <source>Duplicate</source>
+        <translation>Doublon</translation>
     </message>
     <message>
-        <source>Do you want to throw your changes away?</source>
-        <translation>Voulez-vous abandonner vos modifications&#x202f;?</translation>
+        <source>Script</source>
+        <translation>Script</translation>
     </message>
     <message>
-        <source>They were not saved yet.</source>
-        <translation>Elles n’ont pas encore été enregistrées.</translation>
+        <source>Formatted</source>
+        <translation>Mis en forme</translation>
+    </message>
+</context>
+<context>
+    <name>plume::OutlinePane</name>
+    <message>
+        <source>&amp;Search By</source>
+        <translation>Chercher da&amp;ns</translation>
+    </message>
+    <message>
+        <source>Nothing was found.</source>
+        <translation>Rien n’a été trouvé.</translation>
+    </message>
+    <message>
+        <source>Search</source>
+        <translation>Rechercher</translation>
+    </message>
+    <message>
+        <source>Search in the snippets</source>
+        <translation>Rechercher dans les extraits</translation>
+    </message>
+    <message>
+        <source>What is searched</source>
+        <translation>Ce qui est parcouru</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviation</source>
+        <translation>Les &amp;abréviations</translation>
+    </message>
+    <message>
+        <source>&amp;Label</source>
+        <translation>Les &amp;libellés</translation>
+    </message>
+    <message>
+        <source>&amp;Content</source>
+        <translation>Les &amp;contenus</translation>
+    </message>
+    <message>
+        <source>&amp;Wildcards: * and ?</source>
+        <translation>Les &amp;jokers : * et ?</translation>
+    </message>
+</context>
+<context>
+    <name>plume::OutlineView</name>
+    <message>
+        <source>Groups and snippets</source>
+        <translation>Groupes et extraits</translation>
     </message>
 </context>
 <context>
@@ -1852,6 +3777,36 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>&amp;Restore Defaults</source>
         <translation>&amp;Rétablir les valeurs par défaut</translation>
+    </message>
+</context>
+<context>
+    <name>plume::PreviewPane</name>
+    <message>
+        <source>Included by</source>
+        <translation>Inclus par</translation>
+    </message>
+    <message>
+        <source>Try abbreviations here: they expand.</source>
+        <translation>Essayez des abréviations ici : elles se développent.</translation>
+    </message>
+    <message>
+        <source>Field to try abbreviations in</source>
+        <translation>Champ pour essayer des abréviations</translation>
+    </message>
+    <message>
+        <source>What Comes Out</source>
+        <translation>Résultat</translation>
+    </message>
+    <message numerus="yes">
+        <source>%n more</source>
+        <translation>
+            <numerusform>%n de plus</numerusform>
+            <numerusform>%n de plus</numerusform>
+        </translation>
+    </message>
+    <message>
+        <source>Included by %1</source>
+        <translation>Inclus par %1</translation>
     </message>
 </context>
 <context>
@@ -2170,6 +4125,17 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
 </context>
 <context>
+    <name>plume::ScriptEdit</name>
+    <message>
+        <source>Script</source>
+        <translation>Script</translation>
+    </message>
+    <message>
+        <source>Tab writes a tab. To leave the script with the keyboard, press Ctrl+Tab, or Escape and then Tab.</source>
+        <translation>Tab insère une tabulation. Pour quitter le script au clavier, appuyez sur Ctrl+Tab, ou sur Échap puis Tab.</translation>
+    </message>
+</context>
+<context>
     <name>plume::ScriptMark</name>
     <message>
         <source>Script: %1</source>
@@ -2178,6 +4144,113 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>What this script prints comes here.</source>
         <translation>Ce que ce script affiche vient ici.</translation>
+    </message>
+</context>
+<context>
+    <name>plume::ScriptRunPanel</name>
+    <message>
+        <source>Run &amp;Now</source>
+        <translation>Exécuter &amp;maintenant</translation>
+    </message>
+    <message>
+        <source>Cance&amp;l</source>
+        <translation>Annule&amp;r</translation>
+    </message>
+    <message>
+        <source>Output of the script</source>
+        <translation>Sortie du script</translation>
+    </message>
+    <message>
+        <source>What the script writes is shown here. Nothing is typed anywhere.</source>
+        <translation>Ce que le script écrit s’affiche ici. Rien n’est tapé nulle part.</translation>
+    </message>
+    <message>
+        <source>Starting…</source>
+        <translation>Démarrage…</translation>
+    </message>
+    <message>
+        <source>The script&apos;s placeholders cannot be replaced.</source>
+        <translation>Les balises du script ne peuvent pas être remplacées.</translation>
+    </message>
+    <message>
+        <source>Cancelled.</source>
+        <translation>Annulé.</translation>
+    </message>
+    <message>
+        <source>Cancelling…</source>
+        <translation>Annulation…</translation>
+    </message>
+    <message>
+        <source>Running for %1 of at most %2 seconds.</source>
+        <translation>En cours depuis %1 sur %2 secondes au plus.</translation>
+    </message>
+    <message>
+        <source>AppleScript cannot run on this system.</source>
+        <translation>AppleScript ne peut pas fonctionner sur ce système.</translation>
+    </message>
+    <message>
+        <source>A script is ended after %1 seconds.</source>
+        <translation>Un script est arrêté après %1 secondes.</translation>
+    </message>
+    <message>
+        <source>Errors:</source>
+        <translation>Erreurs :</translation>
+    </message>
+    <message>
+        <source>The script says that it failed, after %1 seconds.</source>
+        <translation>Le script signale un échec, après %1 secondes.</translation>
+    </message>
+    <message>
+        <source>Finished after %1 seconds.</source>
+        <translation>Terminé après %1 secondes.</translation>
+    </message>
+    <message>
+        <source>Ended at the time limit of %1 seconds.</source>
+        <translation>Arrêté à la limite de %1 secondes.</translation>
+    </message>
+    <message>
+        <source>Ended after %1 seconds, because it wrote too much.</source>
+        <translation>Arrêté après %1 secondes, parce qu’il écrivait trop.</translation>
+    </message>
+    <message>
+        <source>Cancelled after %1 seconds.</source>
+        <translation>Annulé après %1 secondes.</translation>
+    </message>
+    <message>
+        <source>The script could not be run: %1.</source>
+        <translation>Le script n’a pas pu être lancé : %1.</translation>
+    </message>
+    <message>
+        <source>A script that it includes was ended at the time limit.</source>
+        <translation>Un script qu’il inclut a été arrêté à la limite de temps.</translation>
+    </message>
+    <message>
+        <source>A script that it includes wrote too much.</source>
+        <translation>Un script qu’il inclut écrivait trop.</translation>
+    </message>
+    <message>
+        <source>A script that it includes could not be run.</source>
+        <translation>Un script qu’il inclut n’a pas pu être lancé.</translation>
+    </message>
+    <message>
+        <source>Fields had the values that they begin with.</source>
+        <translation>Les champs avaient leurs valeurs initiales.</translation>
+    </message>
+    <message>
+        <source>The script wrote nothing.</source>
+        <translation>Le script n’a rien écrit.</translation>
+    </message>
+    <message>
+        <source>As there is no other output, the errors are typed when the snippet expands.</source>
+        <translation>Faute d’autre sortie, les erreurs sont tapées quand l’extrait est développé.</translation>
+    </message>
+    <message>
+        <source>The output is no UTF-8 text: nothing is typed when the snippet expands.</source>
+        <translation>La sortie n’est pas du texte UTF-8 : rien n’est tapé quand l’extrait est développé.</translation>
+    </message>
+    <message>
+        <source>The output is cut here: %1 more characters are not shown.</source>
+        <translation>La sortie est coupée ici : %1 caractères de plus ne sont pas montrés.</translation>
     </message>
 </context>
 <context>
@@ -2193,6 +4266,144 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>Default</source>
         <translation>Par défaut</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SnippetEditor</name>
+    <message>
+        <source>Plain text</source>
+        <translation>Texte brut</translation>
+    </message>
+    <message>
+        <source>Formatted text</source>
+        <translation>Texte mis en forme</translation>
+    </message>
+    <message>
+        <source>AppleScript</source>
+        <translation>AppleScript</translation>
+    </message>
+    <message>
+        <source>Shell script</source>
+        <translation>Script shell</translation>
+    </message>
+    <message>
+        <source>Exactly as typed here</source>
+        <translation>Exactement comme tapée ici</translation>
+    </message>
+    <message>
+        <source>Any case</source>
+        <translation>Casse indifférente</translation>
+    </message>
+    <message>
+        <source>Any case, and adapt the content to it</source>
+        <translation>Casse indifférente, et le contenu s’y adapte</translation>
+    </message>
+    <message>
+        <source>N&amp;ote:</source>
+        <translation>&amp;Note :</translation>
+    </message>
+    <message>
+        <source>Optional: a name for lists</source>
+        <translation>Facultatif : un nom pour les listes</translation>
+    </message>
+    <message>
+        <source>Optional: for yourself</source>
+        <translation>Facultatif : pour vous-même</translation>
+    </message>
+    <message>
+        <source>About the abbreviation</source>
+        <translation>Au sujet de l’abréviation</translation>
+    </message>
+    <message>
+        <source>&amp;Abbreviation:</source>
+        <translation>&amp;Abréviation :</translation>
+    </message>
+    <message>
+        <source>La&amp;bel:</source>
+        <translation>&amp;Libellé :</translation>
+    </message>
+    <message>
+        <source>&amp;Kind:</source>
+        <translation>T&amp;ype :</translation>
+    </message>
+    <message>
+        <source>&amp;Case:</source>
+        <translation>&amp;Casse :</translation>
+    </message>
+    <message>
+        <source>Without an abbreviation it can only be chosen from lists.</source>
+        <translation>Sans abréviation, seules les listes y mènent.</translation>
+    </message>
+    <message>
+        <source>⚠ “%1” in “%2” has this abbreviation, too.</source>
+        <translation>⚠ « %1 » dans « %2 » a aussi cette abréviation.</translation>
+    </message>
+    <message>
+        <source>⚠ “%1” in “%2” expands before this is typed.</source>
+        <translation>⚠ « %1 » dans « %2 » se développe avant la fin de la frappe.</translation>
+    </message>
+    <message>
+        <source>Created %1</source>
+        <translation>Créé le %1</translation>
+    </message>
+    <message>
+        <source>Changed %1</source>
+        <translation>Modifié le %1</translation>
+    </message>
+    <message>
+        <source>Used last %1</source>
+        <translation>Utilisé le %1</translation>
+    </message>
+    <message>
+        <source>Not used yet</source>
+        <translation>Pas encore utilisé</translation>
+    </message>
+</context>
+<context>
+    <name>plume::SnippetForm</name>
+    <message>
+        <source>Snippet</source>
+        <translation>Extrait</translation>
+    </message>
+    <message>
+        <source>Abbreviation, label or text</source>
+        <translation>Abréviation, libellé ou texte</translation>
+    </message>
+    <message>
+        <source>&amp;Search:</source>
+        <translation>&amp;Rechercher :</translation>
+    </message>
+    <message>
+        <source>Snip&amp;pet:</source>
+        <translation>E&amp;xtrait :</translation>
+    </message>
+    <message>
+        <source>Snippets</source>
+        <translation>Extraits</translation>
+    </message>
+    <message>
+        <source>Choose a snippet.</source>
+        <translation>Choisissez un extrait.</translation>
+    </message>
+    <message>
+        <source>Gives: nothing</source>
+        <translation>Donne : rien</translation>
+    </message>
+    <message>
+        <source>The library has no snippet with this abbreviation.</source>
+        <translation>La bibliothèque n’a pas d’extrait avec cette abréviation.</translation>
+    </message>
+    <message>
+        <source>A snippet cannot stand in itself.</source>
+        <translation>Un extrait ne peut pas se contenir lui-même.</translation>
+    </message>
+    <message>
+        <source>Runs the script and gives what it prints.</source>
+        <translation>Exécute le script et donne ce qu’il affiche.</translation>
+    </message>
+    <message>
+        <source>Gives: %1</source>
+        <translation>Donne : %1</translation>
     </message>
 </context>
 <context>
@@ -2310,6 +4521,41 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>%1 to %2 of %3</source>
         <translation>%1 à %2 sur %3</translation>
+    </message>
+</context>
+<context>
+    <name>plume::TimeForm</name>
+    <message>
+        <source>Time</source>
+        <translation>Heure</translation>
+    </message>
+    <message>
+        <source>Added:</source>
+        <translation>Ajout :</translation>
+    </message>
+    <message>
+        <source>Hours:</source>
+        <translation>Heures :</translation>
+    </message>
+    <message>
+        <source>Hours added</source>
+        <translation>Heures ajoutées</translation>
+    </message>
+    <message>
+        <source>Minutes:</source>
+        <translation>Minutes :</translation>
+    </message>
+    <message>
+        <source>Minutes added</source>
+        <translation>Minutes ajoutées</translation>
+    </message>
+    <message>
+        <source>Seconds:</source>
+        <translation>Secondes :</translation>
+    </message>
+    <message>
+        <source>Seconds added</source>
+        <translation>Secondes ajoutées</translation>
     </message>
 </context>
 <context>

@@ -71,7 +71,7 @@ TEST_F(ApplicationTest, ASecondStartShowsTheFirst) {
     const auto target = rig_.startTarget(TargetKind::GtkTextView);
     for (int times = 0; times < 2; ++times) {
         EXPECT_EQ(runPlume(rig_, {}).status, 0);
-        EXPECT_TRUE(comesToFront("Preferences")) << times << log();
+        EXPECT_TRUE(comesToFront("Snippets")) << times << log();
         target->activate();
     }
     EXPECT_TRUE(plume_->process().isRunning());
@@ -164,7 +164,7 @@ TEST_F(ApplicationOnBusTest, LaunchersAndScriptsReachIt) {
     ASSERT_TRUE(click("Import"));
     EXPECT_TRUE(waitUntil([&] { return stateHas("\"snippets\": 3"); }, Bound)) << log();
     call(newCall(Launcher, "Activate", {BusNoOptions{}}));
-    EXPECT_TRUE(comesToFront("Preferences")) << log();
+    EXPECT_TRUE(comesToFront("Snippets")) << log();
 }
 
 // ---- Preferences ----

@@ -95,7 +95,7 @@ class LibraryEditor {
     void changeSnippet(const std::shared_ptr<Snippet>& snippet, EditKind kind,
                        const std::function<void(Snippet&)>& change);
     // Watched by the recorder, which then stands for the whole edit.
-    void takeOut(const Snippets& snippets, EditRecorder& recorder);
+    static void takeOut(const Snippets& snippets, EditRecorder& recorder);
     void finish(EditRecorder& recorder, EditKind kind, std::size_t count = 1);
     void notifyDataChanged();
 

@@ -154,7 +154,7 @@ void ContentEdit::setShowsSource(bool showsSource) {
 
 // ---- Inserting ----
 
-void ContentEdit::insertBody(QTextCursor& cursor, const std::u16string& body) {
+void ContentEdit::insertBody(QTextCursor& cursor, const std::u16string& body) const {
     const SharedAttributes look = isRich_ ? typingAttributes(cursor.charFormat()) : nullptr;
     if (showsSource_ || !startsWithKeyword(body)) {
         cursor.insertText(toQString(placeholder(body)), charFormatOf(look));

@@ -72,7 +72,7 @@ class ContentEdit final : public QTextEdit {
     AttributedString shown(const AttributedString& content) const;
     void showContent(const AttributedString& shown);
     void insertShown(const AttributedString& content);
-    void insertBody(QTextCursor& cursor, const std::u16string& body);
+    void insertBody(QTextCursor& cursor, const std::u16string& body) const;
     void insertMimeContent(const QMimeData& source, bool asRich);
 
     bool takesKey(QKeyEvent& event);

@@ -28,7 +28,7 @@ namespace {
 
 constexpr int Sizes[] = {8, 9, 10, 11, 12, 14, 16, 18, 20, 24, 28, 36, 48, 72};
 constexpr double LargestSize = 400;
-constexpr qint64 LargestPicture = 16 * 1024 * 1024;
+constexpr qint64 LargestPicture = qint64{16} * 1024 * 1024;
 
 struct NamedColor {
     const char* name;

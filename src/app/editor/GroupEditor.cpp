@@ -92,8 +92,8 @@ void GroupEditor::show(const std::shared_ptr<SnippetGroup>& group) {
 }
 
 void GroupEditor::refresh() {
-    static const std::shared_ptr<SnippetGroup> Nothing = SnippetGroup::make();
-    const SnippetGroup& shown = group_ ? *group_ : *Nothing;
+    static const std::shared_ptr<SnippetGroup> nothing = SnippetGroup::make();
+    const SnippetGroup& shown = group_ ? *group_ : *nothing;
     showValues(shown);
     showWhatMatters(shown);
 }

@@ -1,6 +1,5 @@
 // What the menus of the editor's window do.
 #include <QAction>
-#include <QActionGroup>
 #include <QApplication>
 #include <QClipboard>
 #include <QFile>
@@ -44,7 +43,7 @@ void MacrosWindowController::makeMenus() {
 
 void MacrosWindowController::fillFileMenu(QMenu& menu) {
     menus_.add(menu, tr("&New Snippet"), QKeySequence::New, [this] { newSnippet(); });
-    menus_.add(menu, tr("New Snippet from Cl&ipboard"), {}, [this] { newSnippetFromClipboard(); });
+    menus_.add(menu, tr("New Snippet from Clip&board"), {}, [this] { newSnippetFromClipboard(); });
     menus_.add(menu, tr("New &Group"), QKeySequence(Qt::CTRL | Qt::SHIFT | Qt::Key_N), [this] { newGroup(); });
     menu.addSeparator();
     menus_.add(menu, tr("&Import…"), {}, [this] { askForImport(); });
@@ -112,13 +111,12 @@ void MacrosWindowController::addSortCommands(QMenu& menu) {
                            tr("By &Label or Content"),
                            tr("By Date &Created"),
                            tr("By Date C&hanged"),
-                           tr("By &Last Use")};
-    auto* orders = new QActionGroup(this);
+                           tr("By Last &Use")};
     for (std::size_t i = 0; i < names.size(); ++i) {
         QAction* action = menus_.add(menu, names.at(i), {}, [this, i] { sort(static_cast<SortBy>(i)); });
         action->setCheckable(true);
         action->setChecked(static_cast<SortBy>(i) == editor_.sortBy());
-        orders->addAction(action);
+        sortOrders_.addAction(action);
     }
 }
 
@@ -230,7 +228,6 @@ void MacrosWindowController::newSnippet(const std::u16string& content) {
     snippet->setCaseSensitivity(group->caseSensitivity());
     editor_.insertSnippets({snippet}, group, at);
     edit(snippet);
-    snippet_->focusAbbreviation();
 }
 
 void MacrosWindowController::newSnippetFromClipboard() {

@@ -64,6 +64,7 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
       undo_(editor_),
       builtIn_(editor_, services_.files, services_.resources),
       menus_(this),
+      sortOrders_(this),
       outline_(new OutlinePane(editor_, services_.settings)),
       pages_(new QStackedWidget),
       nothing_(makeTextLabel()),
@@ -90,7 +91,7 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
     connect(&outline_->model(), &OutlineModel::renamed, this, &MacrosWindowController::rename);
     connect(&outline_->model(), &OutlineModel::dropped, this, &MacrosWindowController::drop);
     connect(&outline_->model(), &OutlineModel::textDropped, this, &MacrosWindowController::dropText);
-    connect(preview_, &PreviewPane::chosen, this, &MacrosWindowController::edit);
+    connect(preview_, &PreviewPane::chosen, this, &MacrosWindowController::reveal);
     observeLibrary();
     selectionWasChanged();
     const int em = fontMetrics().height();
@@ -174,6 +175,11 @@ void MacrosWindowController::select(const LibrarySelection& rows) {
 }
 
 void MacrosWindowController::edit(const std::shared_ptr<Snippet>& snippet) {
+    reveal(snippet);
+    if (snippet_->snippet()) snippet_->focusAbbreviation();
+}
+
+void MacrosWindowController::reveal(const std::shared_ptr<Snippet>& snippet) {
     const auto found = living(*snippet, editor_.groups());
     if (!found) return say(tr("This snippet is no longer in the library."));
     if (!outline_->model().indexOf(*found).isValid()) outline_->clearFilter();
@@ -285,7 +291,7 @@ void MacrosWindowController::keepOpenEdit(const SnippetEditor::OpenEdit& edit) {
         snippet = edit.edited;
         editor_.insertSnippets({snippet}, placeForSnippets().first, 0, EditKind::KeptEdit);
     }
-    this->edit(snippet);
+    reveal(snippet);
     say(tr("Your snippets were changed elsewhere. What you were just editing was kept."));
 }
 

@@ -4,6 +4,7 @@
 // library at once, and everything can be undone as long as the window is open and the library stays the same one.
 #pragma once
 
+#include <QActionGroup>
 #include <QMainWindow>
 #include <QTimer>
 #include <memory>
@@ -33,7 +34,7 @@ class MacrosWindowController final : public QMainWindow {
     explicit MacrosWindowController(EditorServices services);
     ~MacrosWindowController() override;
 
-    // Shows it in the list and in the editor.
+    // Shows it in the list and in the editor, with the keyboard in its abbreviation.
     void edit(const std::shared_ptr<Snippet>& snippet);
     void openAllGroups();
     // Puts what is edited into the library.
@@ -57,6 +58,7 @@ class MacrosWindowController final : public QMainWindow {
     // ---- What is selected ----
     LibrarySelection selection() const;
     void selectionWasChanged();
+    void reveal(const std::shared_ptr<Snippet>& snippet);
     void showNothing(const LibrarySelection& selected);
     void select(const LibrarySelection& rows);
 
@@ -108,6 +110,7 @@ class MacrosWindowController final : public QMainWindow {
     LibraryUndo undo_;
     BuiltInGroups builtIn_;
     EditorMenus menus_;
+    QActionGroup sortOrders_;
     OutlinePane* outline_;
     QStackedWidget* pages_;
     QLabel* nothing_;

@@ -96,7 +96,7 @@ void OutlinePane::makeOptions() {
     addField(SnippetSearch::Label, tr("&Label"));
     addField(SnippetSearch::Content, tr("&Content"));
     options_->addSeparator();
-    QAction* wildcards = options_->addAction(tr("&Wildcards (* and ?)"));
+    QAction* wildcards = options_->addAction(tr("&Wildcards: * and ?"));
     wildcards->setCheckable(true);
     wildcards->setChecked(filter_.isWildcardSearch());
     connect(wildcards, &QAction::triggered, this, [this, wildcards] {

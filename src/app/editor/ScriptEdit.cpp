@@ -145,7 +145,8 @@ void ScriptEdit::keyPressEvent(QKeyEvent* event) {
     if (key == Qt::Key_Tab || key == Qt::Key_Backtab) {
         const bool isForward = key == Qt::Key_Tab && !event->modifiers().testFlag(Qt::ShiftModifier);
         if (!followsEscape && !hasControl && !isReadOnly()) return takeTab(isForward);
-        QAbstractScrollArea::focusNextPrevChild(isForward);
+        // The text's own does nothing where Tab writes a tab.
+        QAbstractScrollArea::focusNextPrevChild(isForward);  // NOLINT(bugprone-parent-virtual-call)
     } else if ((key == Qt::Key_Return || key == Qt::Key_Enter) && !hasControl && !isReadOnly()) {
         breakLine();
     } else {

@@ -236,7 +236,7 @@ QString ScriptRunPanel::endInWords(const ScriptTrial::Ending& ending, double sec
     return {};
 }
 
-QStringList ScriptRunPanel::notesOn(const ScriptTrial& trial) const {
+QStringList ScriptRunPanel::notesOn(const ScriptTrial& trial) {
     QStringList notes;
     for (std::size_t i = 0; i + 1 < trial.endings().size(); ++i) {
         const auto& included = trial.endings()[i];

@@ -79,7 +79,7 @@ class ScriptRunPanel final : public QWidget {
     void enableButtons();
     void showOutput();
     QString endInWords(const ScriptTrial::Ending& ending, double seconds) const;
-    QStringList notesOn(const ScriptTrial& trial) const;
+    static QStringList notesOn(const ScriptTrial& trial);
 
     const ScriptRunServices services_;
     std::shared_ptr<Snippet> snippet_;

@@ -99,7 +99,7 @@ void SnippetEditor::makeForm(QFormLayout& form) {
     form.setFieldGrowthPolicy(QFormLayout::AllNonFixedFieldsGrow);
     form.addRow(tr("&Abbreviation:"), abbreviation_);
     form.addRow(QString(), conflict_);
-    form.addRow(tr("&Label:"), label_);
+    form.addRow(tr("La&bel:"), label_);
     form.addRow(tr("&Kind:"), kind_);
     form.addRow(tr("&Case:"), case_);
 }

@@ -28,7 +28,6 @@ namespace {
 using namespace test;
 using ::testing::ElementsAre;
 using ::testing::HasSubstr;
-using ::testing::IsEmpty;
 
 constexpr const char* TwoGroups = R"([
   {"name": "Mail", "abbreviationPrefix": ";", "items": [

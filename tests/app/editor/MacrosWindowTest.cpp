@@ -19,12 +19,12 @@
 #include "app/qt/Text.h"
 #include "tests/app/windows/WindowsSupport.h"
 #include "tests/library/LibraryMachine.h"
+#include "tests/support/Language.h"
 
 namespace plume {
 namespace {
 
 using namespace test;
-using ::testing::Contains;
 using ::testing::ElementsAre;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
@@ -342,6 +342,30 @@ TEST_F(MacrosWindowTest, GroupsStayOpenAndTheirSettingsAreShown) {
     EXPECT_EQ(mail->name(), u"Mail and more");
     open();
     EXPECT_THAT(shownRows(), ElementsAre("Mail and more", "  a", "Work"));
+}
+
+// No letter stands twice in a menu, nor for the menus and what the page shows.
+TEST_F(MacrosWindowTest, ItSpeaksOtherLanguages) {
+    const auto mail = addGroup(u"Mail", {u"a", u"1"});
+    mail->items()[0]->setContentType(ContentType::RichText);
+    for (const QString language : {"en", "de", "fr"}) {
+        SCOPED_TRACE(language.toStdString());
+        const SpokenLanguage spoken(language);
+        open();
+        window->edit(mail->items()[0]);
+        takePicture(*window, QStringLiteral("Editor-") + language);
+        Mnemonics all;
+        all.addAll(*window);
+        for (const QAction* menu : window->menuBar()->actions()) all.add(menu->text());
+        for (const auto* menu : window->findChildren<QMenu*>()) {
+            if (menu->menuAction()->text().isEmpty()) continue;
+            SCOPED_TRACE(menu->title().toStdString());
+            Mnemonics ofMenu;
+            for (const QAction* action : menu->actions()) ofMenu.add(action->text());
+        }
+        EXPECT_LE(window->minimumSizeHint().width(), 1024);
+        delete window;
+    }
 }
 
 TEST_F(MacrosWindowTest, ExpandsInItsFieldForTrialsAlone) {

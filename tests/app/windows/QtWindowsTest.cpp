@@ -58,6 +58,7 @@ class QtWindowsTest : public ::testing::Test {
          .welcome =
              [] { return WelcomeServices{.hasIcon = [] { return true; }, .startsAtLogin = [] { return true; }}; },
          .showMacros = [this](bool all) { asked.emplace_back(all ? "all macros" : "macros"); },
+         .showSnippet = [this](const auto& snippet) { asked.push_back(toUtf8(snippet->abbreviation().value_or(u""))); },
          .showPreferences = [this](const std::string& page) { asked.push_back("page " + page); },
          .showDecisions = [this] { asked.emplace_back("decisions"); },
          .commitEdits = [this] { asked.emplace_back("commit"); }}};
@@ -105,7 +106,7 @@ TEST_F(QtWindowsTest, EveryWindowOpensAndOnlyTheOneThatHoldsTextIsNotReused) {
     windows.showNewSnippetWindow({});
     windows.showNewSnippetWindow({});
     EXPECT_EQ(count(), 4);
-    windows.showNewSnippetWindow({u"text"});
+    windows.showNewSnippetWindow(u"text");
     EXPECT_EQ(count(), 5);
 }
 
