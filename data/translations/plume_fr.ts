@@ -3632,7 +3632,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Wildcards: * and ?</source>
-        <translation>Les &amp;jokers : * et ?</translation>
+        <translation>Les &amp;jokers : * et ?</translation>
     </message>
 </context>
 <context>
