@@ -97,7 +97,7 @@ QString chipWords(const std::u16string& body, const ContentEnvironment& environm
 }
 
 QString ChipWords::of(const SnippetVariable& variable) const {
-    const QString words = ofKind(variable);
+    QString words = ofKind(variable);
     if (!variable.isOptional) return words;
     return variable.isSelected ? tr("%1 (optional, ticked)").arg(words) : tr("%1 (optional)").arg(words);
 }

@@ -38,7 +38,7 @@ class Effect {
         : group_(group), applicationName_(std::move(applicationName)), inputSourceName_(std::move(inputSourceName)) {}
 
     QString sentence() const {
-        if (const QString reason = whyNothing(); !reason.isEmpty()) return reason;
+        if (QString reason = whyNothing(); !reason.isEmpty()) return reason;
         QString sentence = inPrograms(expansion());
         sentence[0] = sentence[0].toUpper();
         const QString keyboards = withKeyboards();

@@ -111,9 +111,9 @@ QString ImportModel::groupText(std::size_t group, int column) const {
     return groupRemark(shown);
 }
 
-QString ImportModel::groupRemark(const ImportPreview::Group& group) const {
+QString ImportModel::groupRemark(const ImportPreview::Group& group) {
     if (group.replaces) return tr("Takes the place of your group of this name");
-    const std::size_t same = static_cast<std::size_t>(
+    const auto same = static_cast<std::size_t>(
         std::count_if(group.conflicts.begin(), group.conflicts.end(), [](const auto& each) { return each.isSame; }));
     const std::size_t other = group.conflicts.size() - same;
     if (same == group.group->items().size() && same > 0) return tr("All of it is there already");

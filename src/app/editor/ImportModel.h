@@ -42,7 +42,7 @@ class ImportModel final : public QAbstractItemModel {
 
     QString groupText(std::size_t group, int column) const;
     QString snippetText(std::size_t group, const Snippet& snippet, int column) const;
-    QString groupRemark(const ImportPreview::Group& group) const;
+    static QString groupRemark(const ImportPreview::Group& group);
     QString snippetRemark(std::size_t group, const Snippet& snippet) const;
 
     ImportPreview preview_;

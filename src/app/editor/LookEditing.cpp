@@ -163,7 +163,7 @@ void enterList(const QTextBlock& block, const std::u16string& markerFormat) {
 // One edit of the document.
 class Edit {
   public:
-    explicit Edit(QTextCursor cursor) : cursor_(std::move(cursor)) { cursor_.beginEditBlock(); }
+    explicit Edit(const QTextCursor& cursor) : cursor_(cursor) { cursor_.beginEditBlock(); }
     ~Edit() { cursor_.endEditBlock(); }
     Edit(const Edit&) = delete;
     Edit& operator=(const Edit&) = delete;

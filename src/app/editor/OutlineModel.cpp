@@ -176,7 +176,7 @@ bool OutlineModel::setData(const QModelIndex& index, const QVariant& value, int 
 
 // ---- What a row says ----
 
-SnippetRow OutlineModel::rowOf(const SnippetGroup& group, std::size_t shown) const {
+SnippetRow OutlineModel::rowOf(const SnippetGroup& group, std::size_t shown) {
     SnippetRow row;
     const std::u16string name = group.name().value_or(u"");
     row.abbreviation.text = name.empty() ? tr("Untitled group") : inOneLine(name);
@@ -201,7 +201,7 @@ std::u16string OutlineModel::shownLine(const std::u16string& content) const {
     const std::size_t lineEnd = content.find_last_of(u"\n\u2028\u2029", found);
     // Enough before it to be understood, little enough to be seen.
     constexpr std::size_t MostBefore = 24;
-    const std::size_t lineStart = lineEnd == content.npos ? 0 : lineEnd + 1;
+    const std::size_t lineStart = lineEnd == std::u16string::npos ? 0 : lineEnd + 1;
     if (found - lineStart <= MostBefore) return firstLine(std::u16string_view(content).substr(lineStart));
     return u"…" + firstLine(std::u16string_view(content).substr(found - MostBefore));
 }

@@ -74,7 +74,7 @@ class OutlineModel final : public QAbstractItemModel {
     };
 
     const Node* nodeOf(const QModelIndex& index) const;
-    SnippetRow rowOf(const SnippetGroup& group, std::size_t shown) const;
+    static SnippetRow rowOf(const SnippetGroup& group, std::size_t shown);
     SnippetRow rowOf(const Snippet& snippet) const;
     MarkedText marked(const std::u16string& text) const;
     // The line in which the filter is found, or the first one.

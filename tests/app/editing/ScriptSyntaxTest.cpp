@@ -9,8 +9,6 @@
 namespace plume {
 namespace {
 
-using ::testing::ElementsAre;
-
 // Every unit by a letter for what it is shown as: "k" for keywords, "." for none.
 std::string looksOf(const std::string& script, ScriptState state = {}) {
     constexpr std::string_view Letters = "ksc$P";
