@@ -52,6 +52,11 @@ DelimitersEdit::DelimitersEdit(const QString& purpose, QWidget* parent)
     showDelimiters();
 }
 
+// The line loses the keyboard when it goes with it, and would tell so.
+DelimitersEdit::~DelimitersEdit() {
+    others_->disconnect(this);
+}
+
 QStringList DelimitersEdit::namesInOrder() {
     return {tr("Space"), tr("Tab"), tr("Return"), tr("Enter")};
 }

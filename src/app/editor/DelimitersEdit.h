@@ -25,6 +25,9 @@ class DelimitersEdit final : public QWidget {
 
     // What they are for, as the names of the controls begin for those who do not see them.
     explicit DelimitersEdit(const QString& purpose, QWidget* parent = nullptr);
+    ~DelimitersEdit() override;
+    DelimitersEdit(const DelimitersEdit&) = delete;
+    DelimitersEdit& operator=(const DelimitersEdit&) = delete;
 
     void setDelimiters(const Delimiters& delimiters);
     const Delimiters& delimiters() const { return delimiters_; }

@@ -82,6 +82,11 @@ GroupEditor::GroupEditor(GroupEditorServices services, QWidget* parent)
     show(nullptr);
 }
 
+// What loses the keyboard when it goes with the editor would tell so.
+GroupEditor::~GroupEditor() {
+    for (QWidget* control : findChildren<QWidget*>()) control->disconnect(this);
+}
+
 void GroupEditor::show(const std::shared_ptr<SnippetGroup>& group) {
     if (group == group_ && group) return refresh();
     finish();

@@ -42,6 +42,9 @@ class GroupEditor : public QWidget {
     Q_OBJECT
   public:
     explicit GroupEditor(GroupEditorServices services, QWidget* parent = nullptr);
+    ~GroupEditor() override;
+    GroupEditor(const GroupEditor&) = delete;
+    GroupEditor& operator=(const GroupEditor&) = delete;
 
     using QWidget::show;
     // What was typed for the one before is kept. Null clears the fields.

@@ -104,6 +104,8 @@ MacrosWindowController::MacrosWindowController(EditorServices services)
 
 // What the panes still tell while they go would find nobody.
 MacrosWindowController::~MacrosWindowController() {
+    commitEdits();
+    if (QWidget* focus = focusWidget()) focus->clearFocus();
     outline_->view().disconnect(this);
     snippet_->disconnect(this);
 }
