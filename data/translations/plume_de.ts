@@ -3411,10 +3411,6 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
         <translation>A&amp;lle Gruppen…</translation>
     </message>
     <message>
-        <source>Import</source>
-        <translation>Importieren</translation>
-    </message>
-    <message>
         <source>Nothing was added.</source>
         <translation>Nichts wurde hinzugefügt.</translation>
     </message>
@@ -4285,18 +4281,6 @@ Importieren fügt die Snippets der Datei zu den jetzigen hinzu.</translation>
     <message>
         <source>Shell script</source>
         <translation>Shell-Skript</translation>
-    </message>
-    <message>
-        <source>Exactly as typed here</source>
-        <translation>Genau wie hier getippt</translation>
-    </message>
-    <message>
-        <source>Any case</source>
-        <translation>Groß oder klein</translation>
-    </message>
-    <message>
-        <source>Any case, and adapt the content to it</source>
-        <translation>Groß oder klein, und der Inhalt passt sich an</translation>
     </message>
     <message>
         <source>N&amp;ote:</source>

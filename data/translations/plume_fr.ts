@@ -877,31 +877,31 @@
     </message>
     <message>
         <source>Typing %1 does nothing: these snippets are only chosen from lists.</source>
-        <translation>Taper %1 ne fait rien : ces extraits ne se choisissent que dans des listes.</translation>
+        <translation>Taper %1 ne fait rien&#x202f;: ces extraits ne se choisissent que dans des listes.</translation>
     </message>
     <message>
         <source>Typing %1 does nothing: the group is switched off in all programs.</source>
-        <translation>Taper %1 ne fait rien : le groupe est désactivé dans tous les programmes.</translation>
+        <translation>Taper %1 ne fait rien&#x202f;: le groupe est désactivé dans tous les programmes.</translation>
     </message>
     <message>
         <source>Typing %1 does nothing: no program is chosen yet.</source>
-        <translation>Taper %1 ne fait rien : aucun programme n’est encore choisi.</translation>
+        <translation>Taper %1 ne fait rien&#x202f;: aucun programme n’est encore choisi.</translation>
     </message>
     <message>
         <source>Typing %1 does nothing: no keyboard layout is chosen yet.</source>
-        <translation>Taper %1 ne fait rien : aucune disposition de clavier n’est encore choisie.</translation>
+        <translation>Taper %1 ne fait rien&#x202f;: aucune disposition de clavier n’est encore choisie.</translation>
     </message>
     <message>
         <source>Typing %1 does nothing: no character is chosen to expand it.</source>
-        <translation>Taper %1 ne fait rien : aucun caractère n’est choisi pour le développement.</translation>
+        <translation>Taper %1 ne fait rien&#x202f;: aucun caractère n’est choisi pour le développement.</translation>
     </message>
     <message>
         <source>in %1 only: %2</source>
-        <translation>dans %1 seulement : %2</translation>
+        <translation>dans %1 seulement&#x202f;: %2</translation>
     </message>
     <message>
         <source>everywhere but in %1: %2</source>
-        <translation>partout sauf dans %1 : %2</translation>
+        <translation>partout sauf dans %1&#x202f;: %2</translation>
     </message>
     <message>
         <source>Not with the keyboard layout %1.</source>
@@ -961,7 +961,7 @@
     </message>
     <message>
         <source>“%1”</source>
-        <translation>« %1 »</translation>
+        <translation>«&#x202f;%1&#x202f;»</translation>
     </message>
     <message>
         <source>a space, Return or a punctuation mark</source>
@@ -1776,7 +1776,7 @@
     </message>
     <message>
         <source>Form:</source>
-        <translation>Formulaire :</translation>
+        <translation>Formulaire&#x202f;:</translation>
     </message>
 </context>
 <context>
@@ -1794,11 +1794,11 @@
     </message>
     <message>
         <source>&amp;Find:</source>
-        <translation>&amp;Rechercher :</translation>
+        <translation>&amp;Rechercher&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Replace with:</source>
-        <translation>Remp&amp;lacer par :</translation>
+        <translation>Remp&amp;lacer par&#x202f;:</translation>
     </message>
     <message>
         <source>Anywhere</source>
@@ -1822,11 +1822,11 @@
     </message>
     <message>
         <source>Is a regular e&amp;xpression; $1 is its first group</source>
-        <translation>E&amp;xpression régulière ; $1 est son premier groupe</translation>
+        <translation>E&amp;xpression régulière&#x202f;; $1 est son premier groupe</translation>
     </message>
     <message>
         <source>F&amp;ound:</source>
-        <translation>Trou&amp;vé :</translation>
+        <translation>Trou&amp;vé&#x202f;:</translation>
     </message>
     <message>
         <source>What is to be found is no valid pattern, or takes too long. The clipboard&apos;s text stays as it is.</source>
@@ -1838,7 +1838,7 @@
     </message>
     <message>
         <source>Gives: %1</source>
-        <translation>Donne : %1</translation>
+        <translation>Donne&#x202f;: %1</translation>
     </message>
 </context>
 <context>
@@ -1923,7 +1923,7 @@
     </message>
     <message>
         <source>Years:</source>
-        <translation>Années :</translation>
+        <translation>Années&#x202f;:</translation>
     </message>
     <message>
         <source>Years added</source>
@@ -1931,7 +1931,7 @@
     </message>
     <message>
         <source>Months:</source>
-        <translation>Mois :</translation>
+        <translation>Mois&#x202f;:</translation>
     </message>
     <message>
         <source>Months added</source>
@@ -1939,7 +1939,7 @@
     </message>
     <message>
         <source>Days:</source>
-        <translation>Jours :</translation>
+        <translation>Jours&#x202f;:</translation>
     </message>
     <message>
         <source>Days added</source>
@@ -1951,15 +1951,15 @@
     </message>
     <message>
         <source>D&amp;ay:</source>
-        <translation>&amp;Jour :</translation>
+        <translation>&amp;Jour&#x202f;:</translation>
     </message>
     <message>
         <source>Added:</source>
-        <translation>Ajout :</translation>
+        <translation>Ajout&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Weekday:</source>
-        <translation>Jour de la &amp;semaine :</translation>
+        <translation>Jour de la &amp;semaine&#x202f;:</translation>
     </message>
 </context>
 <context>
@@ -2042,11 +2042,11 @@
     </message>
     <message>
         <source>The pattern has letters without a meaning, so nothing is written. Put text between apostrophes.</source>
-        <translation>Le modèle a des lettres sans signification : rien n’est donc écrit. Mettez le texte entre apostrophes.</translation>
+        <translation>Le modèle a des lettres sans signification&#x202f;: rien n’est donc écrit. Mettez le texte entre apostrophes.</translation>
     </message>
     <message>
         <source>Gives: %1</source>
-        <translation>Donne : %1</translation>
+        <translation>Donne&#x202f;: %1</translation>
     </message>
     <message>
         <source>The pattern is empty.</source>
@@ -2054,11 +2054,11 @@
     </message>
     <message>
         <source>&amp;Style:</source>
-        <translation>St&amp;yle :</translation>
+        <translation>St&amp;yle&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Pattern:</source>
-        <translation>&amp;Modèle :</translation>
+        <translation>&amp;Modèle&#x202f;:</translation>
     </message>
     <message>
         <source>Pattern</source>
@@ -2066,19 +2066,19 @@
     </message>
     <message>
         <source>Short: %1</source>
-        <translation>Court : %1</translation>
+        <translation>Court&#x202f;: %1</translation>
     </message>
     <message>
         <source>Medium: %1</source>
-        <translation>Moyen : %1</translation>
+        <translation>Moyen&#x202f;: %1</translation>
     </message>
     <message>
         <source>Long: %1</source>
-        <translation>Long : %1</translation>
+        <translation>Long&#x202f;: %1</translation>
     </message>
     <message>
         <source>Full: %1</source>
-        <translation>Complet : %1</translation>
+        <translation>Complet&#x202f;: %1</translation>
     </message>
     <message>
         <source>Own pattern</source>
@@ -2094,15 +2094,15 @@
     </message>
     <message>
         <source>What letters of a pattern stand for; choosing one puts it in</source>
-        <translation>Ce que signifient les lettres d’un modèle ; en choisir une l’insère</translation>
+        <translation>Ce que signifient les lettres d’un modèle&#x202f;; en choisir une l’insère</translation>
     </message>
     <message>
         <source>%1 (%2): %3</source>
-        <translation>%1 (%2) : %3</translation>
+        <translation>%1 (%2)&#x202f;: %3</translation>
     </message>
     <message>
         <source>La&amp;nguage:</source>
-        <translation>&amp;Langue :</translation>
+        <translation>&amp;Langue&#x202f;:</translation>
     </message>
 </context>
 <context>
@@ -2180,7 +2180,7 @@
     </message>
     <message>
         <source>Others:</source>
-        <translation>Autres :</translation>
+        <translation>Autres&#x202f;:</translation>
     </message>
     <message>
         <source>%1 Others</source>
@@ -2254,7 +2254,7 @@
     </message>
     <message>
         <source>&amp;Name:</source>
-        <translation>No&amp;m :</translation>
+        <translation>No&amp;m&#x202f;:</translation>
     </message>
     <message>
         <source>Cannot be &amp;edited in the form</source>
@@ -2282,19 +2282,19 @@
     </message>
     <message>
         <source>&amp;Kind:</source>
-        <translation>T&amp;ype :</translation>
+        <translation>T&amp;ype&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Begins with:</source>
-        <translation>&amp;Valeur initiale :</translation>
+        <translation>&amp;Valeur initiale&#x202f;:</translation>
     </message>
     <message>
         <source>C&amp;hoices, one a line:</source>
-        <translation>Choi&amp;x, un par ligne :</translation>
+        <translation>Choi&amp;x, un par ligne&#x202f;:</translation>
     </message>
     <message>
         <source>Chosen at f&amp;irst:</source>
-        <translation>Choix au &amp;départ :</translation>
+        <translation>Choix au &amp;départ&#x202f;:</translation>
     </message>
     <message>
         <source>As usual</source>
@@ -2302,11 +2302,11 @@
     </message>
     <message>
         <source>&amp;Width in letters:</source>
-        <translation>&amp;Largeur en lettres :</translation>
+        <translation>&amp;Largeur en lettres&#x202f;:</translation>
     </message>
     <message>
         <source>Hei&amp;ght in lines:</source>
-        <translation>&amp;Hauteur en lignes :</translation>
+        <translation>&amp;Hauteur en lignes&#x202f;:</translation>
     </message>
     <message>
         <source>Without a name the form does not say what is asked for.</source>
@@ -2314,7 +2314,7 @@
     </message>
     <message>
         <source>Gives: nothing</source>
-        <translation>Donne : rien</translation>
+        <translation>Donne&#x202f;: rien</translation>
     </message>
     <message>
         <source>A menu without choices is not shown in the form.</source>
@@ -2322,11 +2322,11 @@
     </message>
     <message>
         <source>Gives at first: %1</source>
-        <translation>Donne au départ : %1</translation>
+        <translation>Donne au départ&#x202f;: %1</translation>
     </message>
     <message>
         <source>Gives: what is typed in the form</source>
-        <translation>Donne : ce qui est tapé dans le formulaire</translation>
+        <translation>Donne&#x202f;: ce qui est tapé dans le formulaire</translation>
     </message>
 </context>
 <context>
@@ -2592,7 +2592,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Address (empty for no link):</source>
-        <translation>Adresse (vide pour aucun lien) :</translation>
+        <translation>Adresse (vide pour aucun lien)&#x202f;:</translation>
     </message>
     <message>
         <source>Pictures (*.png *.jpg *.jpeg *.gif *.bmp *.webp *.svg)</source>
@@ -2623,15 +2623,15 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Name:</source>
-        <translation>Nom :</translation>
+        <translation>Nom&#x202f;:</translation>
     </message>
     <message>
         <source>Optional: typed before every abbreviation</source>
-        <translation>Facultatif : à taper avant chaque abréviation</translation>
+        <translation>Facultatif&#x202f;: à taper avant chaque abréviation</translation>
     </message>
     <message>
         <source>Prefix:</source>
-        <translation>Préfixe :</translation>
+        <translation>Préfixe&#x202f;:</translation>
     </message>
     <message>
         <source>Expansion</source>
@@ -2639,7 +2639,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Expands behind:</source>
-        <translation>Se développe après :</translation>
+        <translation>Se développe après&#x202f;:</translation>
     </message>
     <message>
         <source>A delimiter</source>
@@ -2659,11 +2659,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Delimiters before it:</source>
-        <translation>Séparateurs avant :</translation>
+        <translation>Séparateurs avant&#x202f;:</translation>
     </message>
     <message>
         <source>Expands:</source>
-        <translation>Se développe :</translation>
+        <translation>Se développe&#x202f;:</translation>
     </message>
     <message>
         <source>At once, with its last character</source>
@@ -2687,7 +2687,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Delimiters behind it:</source>
-        <translation>Séparateurs après :</translation>
+        <translation>Séparateurs après&#x202f;:</translation>
     </message>
     <message>
         <source>Offer as suggestions</source>
@@ -2707,7 +2707,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>New snippets:</source>
-        <translation>Nouveaux extraits :</translation>
+        <translation>Nouveaux extraits&#x202f;:</translation>
     </message>
     <message>
         <source>Letter case of new snippets</source>
@@ -2723,7 +2723,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>All snippets:</source>
-        <translation>Tous les extraits :</translation>
+        <translation>Tous les extraits&#x202f;:</translation>
     </message>
     <message>
         <source>Where</source>
@@ -2731,7 +2731,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Programs:</source>
-        <translation>Programmes :</translation>
+        <translation>Programmes&#x202f;:</translation>
     </message>
     <message>
         <source>In all programs</source>
@@ -2747,7 +2747,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Keyboard layouts:</source>
-        <translation>Dispositions de clavier :</translation>
+        <translation>Dispositions de clavier&#x202f;:</translation>
     </message>
 </context>
 <context>
@@ -2862,15 +2862,15 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Comes twice, also in “%1”</source>
-        <translation>Figure deux fois, aussi dans « %1 »</translation>
+        <translation>Figure deux fois, aussi dans «&#x202f;%1&#x202f;»</translation>
     </message>
     <message>
         <source>Is there already, in “%1”</source>
-        <translation>Existe déjà, dans « %1 »</translation>
+        <translation>Existe déjà, dans «&#x202f;%1&#x202f;»</translation>
     </message>
     <message>
         <source>Is taken by another one in “%1”</source>
-        <translation>Est prise par un autre dans « %1 »</translation>
+        <translation>Est prise par un autre dans «&#x202f;%1&#x202f;»</translation>
     </message>
 </context>
 <context>
@@ -2881,7 +2881,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>What cannot be carried over &amp;whole:</source>
-        <translation>Ce qui ne peut pas être repris en &amp;entier :</translation>
+        <translation>Ce qui ne peut pas être repris en &amp;entier&#x202f;:</translation>
     </message>
     <message>
         <source>Import Snippets</source>
@@ -2909,15 +2909,15 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Reading “%1”…</source>
-        <translation>Lecture de « %1 »…</translation>
+        <translation>Lecture de «&#x202f;%1&#x202f;»…</translation>
     </message>
     <message>
         <source>Nothing can be imported from “%1”</source>
-        <translation>Rien ne peut être importé de « %1 »</translation>
+        <translation>Rien ne peut être importé de «&#x202f;%1&#x202f;»</translation>
     </message>
     <message>
         <source>There are no snippets in “%1”</source>
-        <translation>Il n’y a aucun extrait dans « %1 »</translation>
+        <translation>Il n’y a aucun extrait dans «&#x202f;%1&#x202f;»</translation>
     </message>
     <message>
         <source>Close</source>
@@ -2948,7 +2948,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     <message>
         <source>“%1”: %2 %3</source>
         <extracomment>The file&apos;s name, &quot;12 snippets&quot;, &quot;in 2 groups&quot;.</extracomment>
-        <translation>« %1 » : %2 %3</translation>
+        <translation>«&#x202f;%1&#x202f;»&#x202f;: %2 %3</translation>
     </message>
     <message>
         <source>&amp;Import 1 Group</source>
@@ -3029,7 +3029,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Another layout, like “de(nodeadkeys)”</source>
-        <translation>Autre disposition, comme « de(nodeadkeys) »</translation>
+        <translation>Autre disposition, comme «&#x202f;de(nodeadkeys)&#x202f;»</translation>
     </message>
     <message>
         <source>Add Layout</source>
@@ -3147,11 +3147,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Key:</source>
-        <translation>To&amp;uche :</translation>
+        <translation>To&amp;uche&#x202f;:</translation>
     </message>
     <message>
         <source>Held with it:</source>
-        <translation>Tenues avec elle :</translation>
+        <translation>Tenues avec elle&#x202f;:</translation>
     </message>
     <message>
         <source>Ctr&amp;l</source>
@@ -3179,11 +3179,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Times pressed:</source>
-        <translation>Nombre de &amp;frappes :</translation>
+        <translation>Nombre de &amp;frappes&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Waits before:</source>
-        <translation>&amp;Délai avant :</translation>
+        <translation>&amp;Délai avant&#x202f;:</translation>
     </message>
     <message>
         <source>Presses no key.</source>
@@ -3242,7 +3242,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Export the Group “%1”</source>
-        <translation>Exporter le groupe « %1 »</translation>
+        <translation>Exporter le groupe «&#x202f;%1&#x202f;»</translation>
     </message>
     <message>
         <source>Export the Selected Snippets</source>
@@ -3308,7 +3308,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Undo %1</source>
-        <translation>&amp;Annuler : %1</translation>
+        <translation>&amp;Annuler&#x202f;: %1</translation>
     </message>
     <message>
         <source>&amp;Undo</source>
@@ -3316,7 +3316,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Redo %1</source>
-        <translation>&amp;Rétablir : %1</translation>
+        <translation>&amp;Rétablir&#x202f;: %1</translation>
     </message>
     <message>
         <source>&amp;Redo</source>
@@ -3411,10 +3411,6 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
         <translation>&amp;Tous les groupes…</translation>
     </message>
     <message>
-        <source>Import</source>
-        <translation>Importer</translation>
-    </message>
-    <message>
         <source>Nothing was added.</source>
         <translation>Rien n’a été ajouté.</translation>
     </message>
@@ -3436,7 +3432,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Are you sure you want to delete all (#) duplicated snippets?</source>
-        <translation>Voulez-vous vraiment supprimer les (#) extraits en double ?</translation>
+        <translation>Voulez-vous vraiment supprimer les (#) extraits en double&#x202f;?</translation>
     </message>
     <message>
         <source>One of each stays. Undo brings them back as long as this window is open.</source>
@@ -3448,7 +3444,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>What the clipboard has could not be read: %1</source>
-        <translation>Le contenu du presse-papiers n’a pas pu être lu : %1</translation>
+        <translation>Le contenu du presse-papiers n’a pas pu être lu&#x202f;: %1</translation>
     </message>
     <message>
         <source>Snippets</source>
@@ -3472,11 +3468,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Several rows are selected: they can be moved, copied, duplicated and deleted.</source>
-        <translation>Plusieurs lignes sont sélectionnées : elles peuvent être déplacées, copiées, dupliquées et supprimées.</translation>
+        <translation>Plusieurs lignes sont sélectionnées&#x202f;: elles peuvent être déplacées, copiées, dupliquées et supprimées.</translation>
     </message>
     <message>
         <source>Your snippets were changed elsewhere meanwhile: this can no longer be undone.</source>
-        <translation>Vos extraits ont été modifiés ailleurs entre-temps : cela ne peut plus être annulé.</translation>
+        <translation>Vos extraits ont été modifiés ailleurs entre-temps&#x202f;: cela ne peut plus être annulé.</translation>
     </message>
     <message>
         <source>Your snippets were changed elsewhere and are shown as they are now.</source>
@@ -3787,7 +3783,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Try abbreviations here: they expand.</source>
-        <translation>Essayez des abréviations ici : elles se développent.</translation>
+        <translation>Essayez des abréviations ici&#x202f;: elles se développent.</translation>
     </message>
     <message>
         <source>Field to try abbreviations in</source>
@@ -4194,7 +4190,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Errors:</source>
-        <translation>Erreurs :</translation>
+        <translation>Erreurs&#x202f;:</translation>
     </message>
     <message>
         <source>The script says that it failed, after %1 seconds.</source>
@@ -4218,7 +4214,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>The script could not be run: %1.</source>
-        <translation>Le script n’a pas pu être lancé : %1.</translation>
+        <translation>Le script n’a pas pu être lancé&#x202f;: %1.</translation>
     </message>
     <message>
         <source>A script that it includes was ended at the time limit.</source>
@@ -4246,11 +4242,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>The output is no UTF-8 text: nothing is typed when the snippet expands.</source>
-        <translation>La sortie n’est pas du texte UTF-8 : rien n’est tapé quand l’extrait est développé.</translation>
+        <translation>La sortie n’est pas du texte UTF-8&#x202f;: rien n’est tapé quand l’extrait est développé.</translation>
     </message>
     <message>
         <source>The output is cut here: %1 more characters are not shown.</source>
-        <translation>La sortie est coupée ici : %1 caractères de plus ne sont pas montrés.</translation>
+        <translation>La sortie est coupée ici&#x202f;: %1 caractères de plus ne sont pas montrés.</translation>
     </message>
 </context>
 <context>
@@ -4287,28 +4283,16 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
         <translation>Script shell</translation>
     </message>
     <message>
-        <source>Exactly as typed here</source>
-        <translation>Exactement comme tapée ici</translation>
-    </message>
-    <message>
-        <source>Any case</source>
-        <translation>Casse indifférente</translation>
-    </message>
-    <message>
-        <source>Any case, and adapt the content to it</source>
-        <translation>Casse indifférente, et le contenu s’y adapte</translation>
-    </message>
-    <message>
         <source>N&amp;ote:</source>
-        <translation>&amp;Note :</translation>
+        <translation>&amp;Note&#x202f;:</translation>
     </message>
     <message>
         <source>Optional: a name for lists</source>
-        <translation>Facultatif : un nom pour les listes</translation>
+        <translation>Facultatif&#x202f;: un nom pour les listes</translation>
     </message>
     <message>
         <source>Optional: for yourself</source>
-        <translation>Facultatif : pour vous-même</translation>
+        <translation>Facultatif&#x202f;: pour vous-même</translation>
     </message>
     <message>
         <source>About the abbreviation</source>
@@ -4316,19 +4300,19 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Abbreviation:</source>
-        <translation>&amp;Abréviation :</translation>
+        <translation>&amp;Abréviation&#x202f;:</translation>
     </message>
     <message>
         <source>La&amp;bel:</source>
-        <translation>&amp;Libellé :</translation>
+        <translation>&amp;Libellé&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Kind:</source>
-        <translation>T&amp;ype :</translation>
+        <translation>T&amp;ype&#x202f;:</translation>
     </message>
     <message>
         <source>&amp;Case:</source>
-        <translation>&amp;Casse :</translation>
+        <translation>&amp;Casse&#x202f;:</translation>
     </message>
     <message>
         <source>Without an abbreviation it can only be chosen from lists.</source>
@@ -4336,11 +4320,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>⚠ “%1” in “%2” has this abbreviation, too.</source>
-        <translation>⚠ « %1 » dans « %2 » a aussi cette abréviation.</translation>
+        <translation>⚠ «&#x202f;%1&#x202f;» dans «&#x202f;%2&#x202f;» a aussi cette abréviation.</translation>
     </message>
     <message>
         <source>⚠ “%1” in “%2” expands before this is typed.</source>
-        <translation>⚠ « %1 » dans « %2 » se développe avant la fin de la frappe.</translation>
+        <translation>⚠ «&#x202f;%1&#x202f;» dans «&#x202f;%2&#x202f;» se développe avant la fin de la frappe.</translation>
     </message>
     <message>
         <source>Created %1</source>
@@ -4371,11 +4355,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>&amp;Search:</source>
-        <translation>&amp;Rechercher :</translation>
+        <translation>&amp;Rechercher&#x202f;:</translation>
     </message>
     <message>
         <source>Snip&amp;pet:</source>
-        <translation>E&amp;xtrait :</translation>
+        <translation>E&amp;xtrait&#x202f;:</translation>
     </message>
     <message>
         <source>Snippets</source>
@@ -4387,7 +4371,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Gives: nothing</source>
-        <translation>Donne : rien</translation>
+        <translation>Donne&#x202f;: rien</translation>
     </message>
     <message>
         <source>The library has no snippet with this abbreviation.</source>
@@ -4403,7 +4387,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Gives: %1</source>
-        <translation>Donne : %1</translation>
+        <translation>Donne&#x202f;: %1</translation>
     </message>
 </context>
 <context>
@@ -4531,11 +4515,11 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Added:</source>
-        <translation>Ajout :</translation>
+        <translation>Ajout&#x202f;:</translation>
     </message>
     <message>
         <source>Hours:</source>
-        <translation>Heures :</translation>
+        <translation>Heures&#x202f;:</translation>
     </message>
     <message>
         <source>Hours added</source>
@@ -4543,7 +4527,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Minutes:</source>
-        <translation>Minutes :</translation>
+        <translation>Minutes&#x202f;:</translation>
     </message>
     <message>
         <source>Minutes added</source>
@@ -4551,7 +4535,7 @@ Importer ajoute les extraits du fichier aux extraits actuels.</translation>
     </message>
     <message>
         <source>Seconds:</source>
-        <translation>Secondes :</translation>
+        <translation>Secondes&#x202f;:</translation>
     </message>
     <message>
         <source>Seconds added</source>

@@ -179,7 +179,9 @@ void Application::showDecisions() {
 // A window that is open already stays as the user has it.
 MacrosWindowController& Application::showEditor(bool expandAll) {
     if (!editor_ || editor_->isHidden()) {
-        editor_ = new MacrosWindowController(services_->editor());
+        EditorServices services = services_->editor();
+        services.askForFile = [this](auto chosen) { windows_->askForFile(std::move(chosen)); };
+        editor_ = new MacrosWindowController(std::move(services));
         if (expandAll) editor_->openAllGroups();
     }
     bringToFront(*editor_);
@@ -244,6 +246,7 @@ void Application::begin() {
                      [](QSessionManager& session) { session.setRestartHint(QSessionManager::RestartNever); });
     // The session goes on until it says otherwise; what was changed is kept whatever comes.
     QObject::connect(qApp, &QGuiApplication::commitDataRequest, qApp, [this](QSessionManager&) {
+        windows_->commitEdits();
         if (const auto saved = library_->manager().saveRest(); !saved) voice_.say(saved.error().message);
     });
     consent_ = std::make_unique<PasswordFieldConsent>(PasswordFieldConsent::Dependencies{

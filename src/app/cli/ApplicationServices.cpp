@@ -185,8 +185,9 @@ EditorServices ApplicationServices::editor() {
             .scripts = scripts(),
             .programs = programs(),
             .inputSources = {},
+            .askForFile = {},
             .inBackground = [this](std::function<void()> work,
-                                   std::function<void()> done) { trials_.begin(std::move(work), std::move(done)); },
+                                   std::function<void()> done) { imports_.begin(std::move(work), std::move(done)); },
             .setExpandsInOwnWindows = [&expansion](bool expands) { expansion.setExpandsInOwnWindows(expands); },
             .showPreferences = [&delegate] { delegate.showPreferencesWindow(); },
             .quit = [&delegate] { delegate.terminate(); }};

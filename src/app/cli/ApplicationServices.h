@@ -34,7 +34,10 @@ class ApplicationServices {
     };
 
     explicit ApplicationServices(Dependencies dependencies)
-        : around_(dependencies), autostart_(dependencies.files), trials_(dependencies.mainLoop) {}
+        : around_(dependencies),
+          autostart_(dependencies.files),
+          trials_(dependencies.mainLoop),
+          imports_(dependencies.mainLoop) {}
 
     StatusMenuServices statusMenu() const;
     ProgramServices programs() const;
@@ -53,6 +56,7 @@ class ApplicationServices {
     PosixProcessLauncher trialLauncher_;
     // A script that is tried may take long, and nothing else is to wait for it.
     BackgroundWork trials_;
+    BackgroundWork imports_;
 };
 
 }  // namespace plume

@@ -89,11 +89,24 @@ AttributedString ContentPane::content() const {
 // ---- Placeholders ----
 
 void ContentPane::showInsertMenu() {
-    QWidget* edit = focusProxy();
-    auto* menu = new InsertMenu(services_, edit);
-    connect(menu, &InsertMenu::chosen, this, &ContentPane::insert);
+    // One for each snippet, which is not offered to be put into itself.
+    delete menu_;
+    menu_ = new InsertMenu(placeholderServices(), focusProxy());
+    connect(menu_, &InsertMenu::chosen, this, &ContentPane::insert);
+    menu_->open(caretOnScreen().bottomLeft());
+}
+
+QRect ContentPane::caretOnScreen() const {
     const QRect caret = isScript() ? script_->cursorRect() : text_->cursorRect();
-    menu->open(edit->mapToGlobal(caret.bottomLeft()));
+    const QWidget* area = isScript() ? script_->viewport() : text_->viewport();
+    return {area->mapToGlobal(caret.topLeft()), caret.size()};
+}
+
+// Forms open at the caret.
+ChipFormServices ContentPane::placeholderServices() const {
+    ChipFormServices services = services_;
+    services.place = caretOnScreen();
+    return services;
 }
 
 void ContentPane::insert(const std::u16string& body) {
@@ -101,7 +114,8 @@ void ContentPane::insert(const std::u16string& body) {
 }
 
 void ContentPane::changeChip(const std::u16string& body) {
-    ChipForm::open(text_, body, services_, [this](std::u16string changed) { text_->replaceActivatedChip(changed); });
+    ChipForm::open(text_, body, placeholderServices(),
+                   [this](std::u16string changed) { text_->replaceActivatedChip(changed); });
 }
 
 }  // namespace plume

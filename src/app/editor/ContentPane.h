@@ -4,6 +4,7 @@
 // On the main thread; the editor's window owns it.
 #pragma once
 
+#include <QPointer>
 #include <QWidget>
 #include <memory>
 
@@ -19,6 +20,7 @@ namespace plume {
 
 class ContentEdit;
 class FormatBar;
+class InsertMenu;
 class ScriptEdit;
 
 class ContentPane final : public QWidget {
@@ -36,6 +38,8 @@ class ContentPane final : public QWidget {
 
   private:
     void makeBar();
+    QRect caretOnScreen() const;
+    ChipFormServices placeholderServices() const;
     void insert(const std::u16string& body);
     void changeChip(const std::u16string& body);
     bool isScript() const;
@@ -47,6 +51,7 @@ class ContentPane final : public QWidget {
     QStackedWidget* stack_;
     ScriptRunPanel* run_;
     QWidget* scriptPage_;
+    QPointer<InsertMenu> menu_;  // the one that was opened last
     QAction* insert_;
     QAction* source_;
 };

@@ -32,6 +32,8 @@ struct EditorServices {
     ProgramServices programs;
     // The keyboard layouts that the desktop has, with their names.
     std::function<std::vector<std::pair<std::u16string, QString>>()> inputSources;
+    // Lets the user choose a file to import; not called when none was chosen.
+    std::function<void(std::function<void(const std::filesystem::path&)> chosen)> askForFile;
     // See ImportWindow.
     std::function<void(std::function<void()> work, std::function<void()> done)> inBackground;
     // See PreviewPane.

@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <limits>
 
+#include "app/qt/RawText.h"
 #include "app/qt/Text.h"
 #include "app/qt/WheelGuard.h"
 
@@ -18,11 +19,6 @@ namespace plume {
 namespace {
 
 constexpr int LinesShown = 4;
-
-// Qt's own plain text has spaces in place of those that do not break.
-std::u16string rawText(const QPlainTextEdit& field) {
-    return fromQString(field.document()->toRawText().replace(QChar::ParagraphSeparator, QLatin1Char('\n')));
-}
 
 int shownNumber(std::int64_t number) {
     using Limits = std::numeric_limits<int>;
@@ -44,7 +40,7 @@ QPlainTextEdit* makeLines(const std::optional<std::u16string>& text, std::functi
     const int margins = static_cast<int>(2 * lines->document()->documentMargin()) + 2 * lines->frameWidth();
     lines->setMinimumHeight(LinesShown * lines->fontMetrics().lineSpacing() + margins);
     QObject::connect(lines, &QPlainTextEdit::textChanged, lines,
-                     [lines, edited = std::move(edited)] { edited(rawText(*lines)); });
+                     [lines, edited = std::move(edited)] { edited(fromQString(rawText(*lines->document()))); });
     return lines;
 }
 

@@ -2,8 +2,6 @@
 #include <QAction>
 #include <QApplication>
 #include <QClipboard>
-#include <QFile>
-#include <QFileDialog>
 #include <QMenu>
 #include <QMenuBar>
 #include <QMimeData>
@@ -28,6 +26,13 @@ namespace {
 
 std::size_t placeIn(const std::vector<std::shared_ptr<Snippet>>& items, const std::shared_ptr<Snippet>& snippet) {
     return static_cast<std::size_t>(std::ranges::find(items, snippet) - items.begin());
+}
+
+LibrarySelection copiesOf(const LibrarySelection& rows) {
+    LibrarySelection copies;
+    for (const auto& snippet : rows.snippets) copies.snippets.push_back(snippet->copySnippet());
+    for (const auto& group : rows.groups) copies.groups.push_back(group->copySnippetGroup(true));
+    return copies;
 }
 
 }  // namespace
@@ -160,12 +165,9 @@ void MacrosWindowController::fillExportMenu(QMenu& menu) {
 // ---- Files ----
 
 void MacrosWindowController::askForImport() {
-    auto* panel = new QFileDialog(this, tr("Import"));
-    panel->setAttribute(Qt::WA_DeleteOnClose);
-    panel->setFileMode(QFileDialog::ExistingFile);
-    connect(panel, &QFileDialog::fileSelected, this,
-            [this](const QString& path) { importFile(QFile::encodeName(path).toStdString()); });
-    panel->open();
+    services_.askForFile([window = QPointer<MacrosWindowController>(this)](const std::filesystem::path& path) {
+        if (window) window->importFile(path);
+    });
 }
 
 void MacrosWindowController::importFile(const std::filesystem::path& path) {
@@ -310,7 +312,7 @@ void MacrosWindowController::rename(const QModelIndex& row, const QString& text)
 void MacrosWindowController::drop(const LibrarySelection& rows, const std::shared_ptr<SnippetGroup>& group,
                                   std::size_t at, bool isCopy) {
     commitEdits();
-    if (isCopy) return pasteRows(rowsOfArchive(archiveOfRows(rows), editor_.groups()).value(), group, at);
+    if (isCopy) return pasteRows(copiesOf(rows), group, at);
     if (group && !rows.snippets.empty()) editor_.moveSnippets(rows.snippets, group, at);
     if (!group && !rows.groups.empty()) editor_.moveGroups(rows.groups, at);
     select(rows);

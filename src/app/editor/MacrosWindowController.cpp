@@ -269,20 +269,36 @@ void MacrosWindowController::observeLibrary() {
 }
 
 void MacrosWindowController::libraryWillBeReplaced(LibraryEvent& /*event*/) {
+    replaced_ = selection();
     openEdit_ = snippet_->takeOpenEdit();
 }
 
 // The records are others, so that nothing that was done to the former ones can be undone.
 void MacrosWindowController::libraryWasReplaced(LibraryEvent& /*event*/) {
-    if (editor_.isChanging()) return;
+    // Groups that were only added to it are rows that have changed.
+    if (!replaced_) return;
     undo_.clear();
     editor_.reloadDuplicateManager();
     outline_->reload();
+    const LibrarySelection before = *std::exchange(replaced_, std::nullopt);
     if (openEdit_) {
         keepOpenEdit(*std::exchange(openEdit_, std::nullopt));
     } else {
+        selectWhatLives(before);
         say(tr("Your snippets were changed elsewhere and are shown as they are now."));
     }
+}
+
+// One row is found again by its identity; many are not looked for.
+void MacrosWindowController::selectWhatLives(const LibrarySelection& before) {
+    LibrarySelection now;
+    if (before.snippets.size() == 1) {
+        if (auto snippet = living(*before.snippets.front(), editor_.groups()))
+            now.snippets.push_back(std::move(snippet));
+    } else if (before.groups.size() == 1) {
+        if (auto group = living(*before.groups.front(), editor_.groups())) now.groups.push_back(std::move(group));
+    }
+    select(now);
 }
 
 void MacrosWindowController::keepOpenEdit(const SnippetEditor::OpenEdit& edit) {

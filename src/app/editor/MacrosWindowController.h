@@ -70,6 +70,7 @@ class MacrosWindowController final : public QMainWindow {
     void libraryWillBeReplaced(LibraryEvent& event);
     void libraryWasReplaced(LibraryEvent& event);
     void libraryChanged(LibraryEvent& event);
+    void selectWhatLives(const LibrarySelection& before);
     void keepOpenEdit(const SnippetEditor::OpenEdit& edit);
 
     // ---- Commands ----
@@ -119,6 +120,8 @@ class MacrosWindowController final : public QMainWindow {
     QLabel* notice_;
     QSplitter* columns_;
     GroupEditor* group_;
+    // While the library is being replaced: what was selected, and what was being typed.
+    std::optional<LibrarySelection> replaced_;
     std::optional<SnippetEditor::OpenEdit> openEdit_;
     QTimer reloadTimer_;
     std::vector<Subscription> observers_;

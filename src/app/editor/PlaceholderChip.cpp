@@ -10,6 +10,7 @@
 
 #include "app/editor/ChipWords.h"
 #include "app/editor/TextFormats.h"
+#include "app/qt/MixedColor.h"
 #include "app/qt/Text.h"
 
 namespace plume {
@@ -33,11 +34,6 @@ double gapOf(const QFontMetricsF& metrics) {
 double widestOf(const QFontMetricsF& metrics) {
     constexpr int Letters = 48;
     return Letters * metrics.averageCharWidth();
-}
-
-QColor mixed(const QColor& a, const QColor& b, float part) {
-    const auto mix = [part](float x, float y) { return x + (y - x) * part; };
-    return QColor::fromRgbF(mix(a.redF(), b.redF()), mix(a.greenF(), b.greenF()), mix(a.blueF(), b.blueF()));
 }
 
 struct ChipColors {
@@ -64,7 +60,7 @@ ChipColors colorsOf(const QTextFormat& format) {
     constexpr float Edge = 0.6f;
     const QColor base = palette.color(QPalette::Base);
     const QColor accent = palette.color(QPalette::Highlight);
-    return {mixed(base, accent, Tint), mixed(base, accent, Edge), palette.color(QPalette::Text)};
+    return {mixed(accent, base, Tint), mixed(accent, base, Edge), palette.color(QPalette::Text)};
 }
 
 }  // namespace

@@ -12,6 +12,7 @@
 #include "app/editor/BracketPair.h"
 #include "app/editor/LineNumbers.h"
 #include "app/editor/ScriptHighlighter.h"
+#include "app/qt/RawText.h"
 #include "app/qt/Text.h"
 
 namespace plume {
@@ -26,11 +27,6 @@ QString withPlainBreaks(QString text) {
     text.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
     text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
     return text.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
-}
-
-// Qt's own plain text has blanks in place of those that do not break.
-QString scriptIn(const QTextDocument& document) {
-    return document.toRawText().replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
 }
 
 bool isUndoKey(const QKeyEvent& event) {
@@ -83,7 +79,7 @@ void ScriptEdit::setContent(const AttributedString& content) {
     original_ = content;
     isChanged_ = false;
     const QString text = withPlainBreaks(toQString(content.string()));
-    const QString shown = scriptIn(*document());
+    const QString shown = rawText(*document());
     if (text == shown) return;
     const auto [before, behind] = commonEnds(shown, text);
     const bool isSame = 2 * (before + behind) >= std::max(shown.size(), text.size());
@@ -104,7 +100,7 @@ void ScriptEdit::setContent(const AttributedString& content) {
 }
 
 AttributedString ScriptEdit::content() const {
-    return isChanged_ ? AttributedString(fromQString(scriptIn(*document()))) : original_;
+    return isChanged_ ? AttributedString(fromQString(rawText(*document()))) : original_;
 }
 
 void ScriptEdit::setAppleScript(bool isAppleScript) {

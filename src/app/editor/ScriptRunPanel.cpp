@@ -12,6 +12,7 @@
 #include <QVBoxLayout>
 #include <utility>
 
+#include "app/TextOnPasteboard.h"
 #include "app/editor/LegibleColor.h"
 #include "app/qt/Labels.h"
 #include "app/qt/Sentences.h"
@@ -23,21 +24,6 @@ namespace {
 
 constexpr double TickInterval = 1;  // seconds
 constexpr int OutputLines = 6;      // that can be seen without scrolling, at least
-
-// The text that was on the clipboard when the run began.
-class ClipboardText final : public PasteboardReader {
-  public:
-    explicit ClipboardText(ScriptRunServices::Clipboard text) : text_(std::move(text)) {}
-
-    std::vector<std::string> types() const override {
-        return text_ ? std::vector{std::string(PasteboardType::String)} : std::vector<std::string>();
-    }
-    std::optional<std::u16string> string() const override { return text_; }
-    std::optional<std::string> data(std::string_view /*type*/) const override { return std::nullopt; }
-
-  private:
-    ScriptRunServices::Clipboard text_;
-};
 
 QString wholeSeconds(double seconds) {
     return QLocale().toString(qRound(seconds));
@@ -119,7 +105,7 @@ void ScriptRunPanel::runNow() {
 }
 
 void ScriptRunPanel::begin(const ScriptRunServices::Clipboard& clipboard) {
-    const ClipboardText reader(clipboard);
+    const TextOnPasteboard reader(clipboard);
     ContentEnvironment environment = services_.environment;
     environment.pasteboard = &reader;
     environment.report = [run = run_](const std::string& sentence) { run->notes << inUsersLanguage(sentence); };

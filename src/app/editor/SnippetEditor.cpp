@@ -7,17 +7,17 @@
 #include <QLineEdit>
 #include <QLocale>
 #include <QPlainTextEdit>
-#include <QTextDocument>
 #include <QVBoxLayout>
 #include <utility>
 
 #include "app/FirstLine.h"
 #include "app/editing/AbbreviationConflict.h"
+#include "app/editor/CaseReset.h"
 #include "app/editor/ChoiceBox.h"
 #include "app/editor/ContentPane.h"
 #include "app/qt/Labels.h"
+#include "app/qt/RawText.h"
 #include "app/qt/Text.h"
-#include "app/qt/WheelGuard.h"
 
 namespace plume {
 
@@ -28,11 +28,6 @@ using namespace std::chrono_literals;
 constexpr auto CommitDelay = 200ms;
 // What was typed so lately is still being edited when another library comes.
 constexpr auto EditLasts = 10s;
-
-// Qt's own plain text has spaces in place of those that do not break.
-QString textOf(const QPlainTextEdit& field) {
-    return field.document()->toRawText().replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
-}
 
 std::optional<std::u16string> textOrNil(const QString& text) {
     return text.isEmpty() ? std::nullopt : std::optional(fromQString(text));
@@ -60,7 +55,7 @@ SnippetEditor::SnippetEditor(LibraryEditor& editor, ContentPane& content)
       label_(new QLineEdit),
       // In the order of their numbers.
       kind_(new ChoiceBox({tr("Plain text"), tr("Formatted text"), tr("AppleScript"), tr("Shell script")})),
-      case_(new ChoiceBox({tr("Exactly as typed here"), tr("Any case"), tr("Any case, and adapt the content to it")})),
+      case_(new ChoiceBox(caseSensitivityNames())),
       note_(new QPlainTextEdit),
       dates_(makeHelpLabel({})) {
     commitTimer_.setSingleShot(true);
@@ -85,8 +80,6 @@ SnippetEditor::SnippetEditor(LibraryEditor& editor, ContentPane& content)
 }
 
 void SnippetEditor::makeForm(QFormLayout& form) {
-    ignoreWheelWithoutFocus(*kind_);
-    ignoreWheelWithoutFocus(*case_);
     label_->setPlaceholderText(tr("Optional: a name for lists"));
     note_->setTabChangesFocus(true);
     note_->setUndoRedoEnabled(false);
@@ -123,13 +116,13 @@ void SnippetEditor::setFields() {
     setText(*abbreviation_, snippet_->abbreviation());
     setText(*label_, snippet_->label());
     const QString note = toQString(snippet_->note().value_or(u""));
-    if (textOf(*note_) != note) note_->setPlainText(note);
+    if (rawText(*note_->document()) != note) note_->setPlainText(note);
     kind_->showValue(static_cast<std::int64_t>(snippet_->contentType()));
     case_->showValue(static_cast<std::int64_t>(snippet_->caseSensitivity()));
     content_.show(snippet_);
-    showConflict();
     showDates();
     isSetting_ = false;
+    showConflict();
 }
 
 void SnippetEditor::focusAbbreviation() {
@@ -138,7 +131,8 @@ void SnippetEditor::focusAbbreviation() {
 }
 
 void SnippetEditor::showConflict() {
-    if (!snippet_) return;
+    // While the fields are set, it is told once at the end.
+    if (!snippet_ || isSetting_) return;
     const std::u16string abbreviation = fromQString(abbreviation_->text());
     const AbbreviationConflict conflict = conflictOf(*snippet_, abbreviation, editor_.groups());
     if (abbreviation.empty()) {
@@ -186,10 +180,9 @@ void SnippetEditor::commit() {
     if (!std::exchange(isTyped_, false) || !snippet_) return;
     editor_.setSnippetAbbreviation(snippet_, fromQString(abbreviation_->text()));
     editor_.setLabel(snippet_, textOrNil(label_->text()));
-    editor_.setNote(snippet_, textOrNil(textOf(*note_)));
+    editor_.setNote(snippet_, textOrNil(rawText(*note_->document())));
     editor_.setContent(snippet_, content_.content());
     showDates();
-    Q_EMIT committed();
 }
 
 // The record with what the library does not know yet.
@@ -200,7 +193,7 @@ std::shared_ptr<Snippet> SnippetEditor::shownRecord() const {
     const AttributedString content = content_.content();
     if (record->abbreviation().value_or(u"") != abbreviation) record->setAbbreviation(abbreviation);
     if (toQString(record->label().value_or(u"")) != label_->text()) record->setLabel(textOrNil(label_->text()));
-    const QString note = textOf(*note_);
+    const QString note = rawText(*note_->document());
     if (toQString(record->note().value_or(u"")) != note) record->setNote(textOrNil(note));
     if (record->richTextContent() != content) record->setRichTextContent(content);
     return record;

@@ -46,8 +46,6 @@ class SnippetEditor final : public QWidget {
     void focusAbbreviation();
     ContentPane& content() { return content_; }
 
-    // What is typed is in the library.
-    Q_SIGNAL void committed();
     // A letter was typed that the library does not know yet.
     Q_SIGNAL void typed();
 

@@ -10,6 +10,7 @@
 #include <utility>
 
 #include "Foundation/text/HTMLExport.h"
+#include "app/TextOnPasteboard.h"
 #include "app/qt/Labels.h"
 #include "app/qt/Text.h"
 
@@ -20,20 +21,6 @@ namespace {
 // More is not seen without a long way down.
 constexpr std::size_t MostShown = 4000;
 constexpr std::size_t LongestExpanded = 200'000;
-
-class TextOnClipboard final : public PasteboardReader {
-  public:
-    explicit TextOnClipboard(std::optional<std::u16string> text) : text_(std::move(text)) {}
-
-    std::vector<std::string> types() const override {
-        return text_ ? std::vector<std::string>{std::string(PasteboardType::String)} : std::vector<std::string>{};
-    }
-    std::optional<std::u16string> string() const override { return text_; }
-    std::optional<std::string> data(std::string_view /*type*/) const override { return std::nullopt; }
-
-  private:
-    std::optional<std::u16string> text_;
-};
 
 QString htmlOf(const AttributedString& text) {
     return QString::fromStdString(htmlFromAttributedString(text, defaultExcludedTags()));
@@ -66,7 +53,7 @@ void SnippetPreview::show(const std::shared_ptr<Snippet>& snippet, const Snippet
     if (snippet->contentLength() > LongestExpanded) {
         shown_ = ContentPreview{snippet->plainTextContent().value_or(u""), snippet->isScript()};
     } else {
-        const TextOnClipboard clipboard(clipboard_);
+        const TextOnPasteboard clipboard(clipboard_);
         ContentEnvironment environment;
         environment.pasteboard = &clipboard;
         shown_ = previewOf(snippet, groups, environment, {});

@@ -5,6 +5,8 @@
 #include <QTextLayout>
 #include <algorithm>
 
+#include "app/qt/MixedColor.h"
+
 namespace plume {
 
 namespace {
@@ -14,11 +16,6 @@ constexpr int Spacing = 12;
 constexpr int Padding = 4;        // above and below the text
 constexpr int ContentShare = 45;  // percent of the row that the abbreviation may take
 constexpr int GroupShare = 25;
-
-QColor mixed(const QColor& a, const QColor& b, float share) {
-    return QColor::fromRgbF(a.redF() * share + b.redF() * (1 - share), a.greenF() * share + b.greenF() * (1 - share),
-                            a.blueF() * share + b.blueF() * (1 - share));
-}
 
 QFont bold(QFont font) {
     font.setBold(true);

@@ -9,26 +9,17 @@
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QShortcut>
-#include <QTextDocument>
 #include <QVBoxLayout>
 #include <algorithm>
 
 #include "app/qt/Labels.h"
 #include "app/qt/Messages.h"
+#include "app/qt/RawText.h"
 #include "app/qt/Text.h"
 #include "app/qt/WheelGuard.h"
 #include "app/qt/WindowPlaces.h"
 
 namespace plume {
-
-namespace {
-
-// Qt's own plain text has spaces in place of those that do not break.
-QString textIn(const QPlainTextEdit& field) {
-    return field.document()->toRawText().replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
-}
-
-}  // namespace
 
 NewSnippetWindow::NewSnippetWindow(DataManager& manager, const std::u16string& content, WritableUserDefaults& settings)
     : SmallWindow(tr("New Snippet")),
@@ -39,7 +30,7 @@ NewSnippetWindow::NewSnippetWindow(DataManager& manager, const std::u16string& c
       warning_(makeTextLabel()),
       label_(new QLineEdit),
       text_(new QPlainTextEdit(toQString(content))),
-      draft_(textIn(*text_)) {
+      draft_(rawText(*text_->document())) {
     auto* buttons = new QDialogButtonBox;
     buttons->addButton(tr("Add &Snippet"), QDialogButtonBox::AcceptRole)->setDefault(true);
     buttons->addButton(tr("&Cancel"), QDialogButtonBox::RejectRole);
@@ -128,7 +119,8 @@ void NewSnippetWindow::showWarning() {
 }
 
 void NewSnippetWindow::accept() {
-    auto snippet = std::make_shared<Snippet>(fromQString(abbreviation_->text()), fromQString(textIn(*text_)));
+    auto snippet =
+        std::make_shared<Snippet>(fromQString(abbreviation_->text()), fromQString(rawText(*text_->document())));
     if (!label_->text().isEmpty()) snippet->setLabel(fromQString(label_->text()));
     groupToFill()->addItem(snippet);
     manager_.notifyDataChanged();
@@ -144,7 +136,7 @@ std::shared_ptr<SnippetGroup> NewSnippetWindow::groupToFill() {
 }
 
 bool NewSnippetWindow::hasEdits() const {
-    return !abbreviation_->text().isEmpty() || !label_->text().isEmpty() || textIn(*text_) != draft_;
+    return !abbreviation_->text().isEmpty() || !label_->text().isEmpty() || rawText(*text_->document()) != draft_;
 }
 
 void NewSnippetWindow::closeEvent(QCloseEvent* event) {

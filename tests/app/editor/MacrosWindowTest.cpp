@@ -52,6 +52,7 @@ class MacrosWindowTest : public ::testing::Test {
                                              .scripts = std::move(scripts),
                                              .programs = {},
                                              .inputSources = {},
+                                             .askForFile = {},
                                              .inBackground = {},
                                              .setExpandsInOwnWindows = [this](bool expands) { expandsHere = expands; },
                                              .showPreferences = [] {},
@@ -311,6 +312,33 @@ TEST_F(MacrosWindowTest, KeepsWhatIsEditedWhenAnotherLibraryComes) {
     other.manager->notifyDataChanged();
     world.loop.advance(1);
     EXPECT_THAT(machine.library(), ElementsAre("Mail: a=typed more and 1 b=theirs"));
+}
+
+TEST_F(MacrosWindowTest, GoesOnWithTheSameSnippetInALibraryOfOthers) {
+    const auto mail = addGroup(u"Mail", {u"a", u"1", u"b", u"2"});
+    machine.manager->notifyDataChanged();
+    ASSERT_TRUE(machine.manager->saveData());
+    Machine other(world, "two", disk);
+    other.load();
+    open();
+    window->edit(mail->items()[1]);
+    other.manager->snippetGroups().front()->items()[1]->setPlainTextContent(u"theirs");
+    other.manager->notifyDataChanged();
+    world.loop.advance(1);
+    EXPECT_EQ(content().toPlainText(), QStringLiteral("theirs"));
+    EXPECT_THAT(textOf(*window), HasSubstr("were changed elsewhere and are shown as they are now"));
+    type(content(), "x");
+    window->commitEdits();
+    EXPECT_THAT(machine.library(), ElementsAre("Mail: a=1 b=xtheirs"));
+
+    // What only adds groups leaves everything as it is.
+    ASSERT_TRUE(
+        world.files.write("/more.json", R"([{"name": "More", "items": [{"abbreviation": "m", "content": "3"}]}])"));
+    ASSERT_TRUE(machine.manager->importDataFromFile("/more.json"));
+    machine.manager->notifyDataChanged();
+    EXPECT_TRUE(QTest::qWaitFor([&] { return shownRows().back() == "More"; }, 2000));
+    choose("Undo");
+    EXPECT_THAT(machine.library(), ElementsAre("Mail: a=1 b=theirs", "More: m=3"));
 }
 
 TEST_F(MacrosWindowTest, DoesNotUndoWhatOthersHaveMadeImpossible) {
