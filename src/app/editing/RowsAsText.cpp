@@ -61,7 +61,7 @@ std::u16string textFromRows(const std::vector<std::shared_ptr<Snippet>>& snippet
 
 std::vector<std::shared_ptr<Snippet>> rowsFromText(const std::u16string& text) {
     if (trimmed(text).empty()) return {};
-    if (text.find(u'\t') == text.npos) return {std::make_shared<Snippet>(std::nullopt, text)};
+    if (text.find(u'\t') == std::u16string::npos) return {std::make_shared<Snippet>(std::nullopt, text)};
     std::vector<std::shared_ptr<Snippet>> snippets;
     for (const auto& row : rowsIn(text)) {
         if (auto snippet = snippetFromRow(row)) snippets.push_back(std::move(snippet));

@@ -17,9 +17,9 @@ bool includes(const Snippet& outer, const Snippet& inner, const SnippetGroups& g
     const auto& content = outer.richTextContent();
     if (!content) return false;
     const std::u16string& text = content->string();
-    for (std::size_t at = text.find(Beginning); at != text.npos; at = text.find(Beginning, at + 1)) {
+    for (std::size_t at = text.find(Beginning); at != std::u16string::npos; at = text.find(Beginning, at + 1)) {
         const std::size_t end = text.find(ClosingMarker, at);
-        if (end == text.npos) return false;
+        if (end == std::u16string::npos) return false;
         const auto variable = std::dynamic_pointer_cast<SnippetAbbreviationVariable>(
             parseVariable(std::u16string_view(text).substr(at + 1, end - at - 1)));
         if (variable && findSnippetBySnippetAbbreviationVariable(*variable, outer, groups).get() == &inner) return true;

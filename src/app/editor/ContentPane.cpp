@@ -115,7 +115,7 @@ void ContentPane::insert(const std::u16string& body) {
 
 void ContentPane::changeChip(const std::u16string& body) {
     ChipForm::open(text_, body, placeholderServices(),
-                   [this](std::u16string changed) { text_->replaceActivatedChip(changed); });
+                   [this](const std::u16string& changed) { text_->replaceActivatedChip(changed); });
 }
 
 }  // namespace plume

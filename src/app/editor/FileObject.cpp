@@ -46,8 +46,8 @@ QSizeF shownSize(const QImage& image, const QTextDocument& document) {
 }  // namespace
 
 const QImage& FileObject::pictureOf(const std::shared_ptr<const TextAttachment>& file) {
-    static const QImage None;
-    if (!file) return None;
+    static const QImage none;
+    if (!file) return none;
     const auto found = pictures_.constFind(file.get());
     if (found != pictures_.constEnd()) return found->image;
     QByteArray bytes = QByteArray::fromRawData(file->contents.data(), static_cast<qsizetype>(file->contents.size()));

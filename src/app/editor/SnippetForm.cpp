@@ -81,8 +81,8 @@ bool SnippetForm::eventFilter(QObject* watched, QEvent* event) {
 
 std::shared_ptr<Snippet> SnippetForm::named() const {
     if (!services().groups) return nullptr;
-    static const Snippet InNoGroup;
-    const Snippet& around = services().inside ? *services().inside : InNoGroup;
+    static const Snippet inNoGroup;
+    const Snippet& around = services().inside ? *services().inside : inNoGroup;
     return findSnippetBySnippetAbbreviationVariable(*variable_, around, services().groups());
 }
 

@@ -5,7 +5,7 @@
 
 namespace plume {
 
-TimeForm::TimeForm(ChipFormServices services, std::shared_ptr<SnippetTimeVariable> variable)
+TimeForm::TimeForm(ChipFormServices services, const std::shared_ptr<SnippetTimeVariable>& variable)
     : DateTimeForm(tr("Time"), std::move(services), variable, DateTextKind::TimeOnly) {
     addFormatRows();
     rows().addRow(tr("Added:"), makeRow({makeOffset(variable->hour, tr("Hours:"), tr("Hours added")),

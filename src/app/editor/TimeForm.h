@@ -10,7 +10,7 @@ namespace plume {
 class TimeForm final : public DateTimeForm {
     Q_OBJECT
   public:
-    TimeForm(ChipFormServices services, std::shared_ptr<SnippetTimeVariable> variable);
+    TimeForm(ChipFormServices services, const std::shared_ptr<SnippetTimeVariable>& variable);
 };
 
 }  // namespace plume

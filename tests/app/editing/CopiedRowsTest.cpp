@@ -10,7 +10,6 @@ namespace plume {
 namespace {
 
 using test::EditedMachine;
-using testing::ElementsAre;
 
 class CopiedRowsTest : public testing::Test, protected EditedMachine {};
 
